@@ -1,0 +1,3 @@
+#include "fluid/fluid.h"
+
+Fluid fluid;

@@ -1,0 +1,62 @@
+#include "gl/shader_program.h"
+
+#include <cstddef>
+#include <memory>
+#include <new>
+
+#include "jni/log.h"
+
+namespace {
+
+// Reads a text of at most `length` bytes with `get`; without memory for it the text is lost, which is all it is for.
+template <class Get>
+std::unique_ptr<char[]> readInfoLog(GLint length, Get get) {
+    if (length <= 1) return nullptr;
+    std::unique_ptr<char[]> text(new (std::nothrow) char[static_cast<std::size_t>(length)]);
+    if (text) get(length, text.get());
+    return text;
+}
+
+}  // namespace
+
+GLuint zorloadShaderScript(GLenum type, const char* source) {
+    LOG_ERROR("zorloadShaderScript");
+    const GLuint shader = glCreateShader(type);
+    if (!shader) return 0;
+    glShaderSource(shader, 1, &source, nullptr);
+    glCompileShader(shader);
+    GLint compiled = GL_FALSE;
+    glGetShaderiv(shader, GL_COMPILE_STATUS, &compiled);
+    if (compiled) return shader;
+
+    GLint length = 0;
+    glGetShaderiv(shader, GL_INFO_LOG_LENGTH, &length);
+    const auto text =
+        readInfoLog(length, [shader](GLint size, char* to) { glGetShaderInfoLog(shader, size, nullptr, to); });
+    if (text) LOG_ERROR("Could not compile shader %d:\n%s\n", static_cast<int>(type), text.get());
+    glDeleteShader(shader);
+    return 0;
+}
+
+GLuint zorCreateShaderProgram(GLuint vertexShader, GLuint fragmentShader) {
+    LOG_INFO("zorCreateShaderProgram");
+    if (!fragmentShader || !vertexShader) return 0;
+    const GLuint program = glCreateProgram();
+    if (!program) return 0;
+    glAttachShader(program, vertexShader);
+    glAttachShader(program, fragmentShader);
+    glBindAttribLocation(program, 0, "vertex");
+    glBindAttribLocation(program, 1, "texCoord");
+    glLinkProgram(program);
+    GLint linked = GL_FALSE;
+    glGetProgramiv(program, GL_LINK_STATUS, &linked);
+    if (linked) return program;
+
+    GLint length = 0;
+    glGetProgramiv(program, GL_INFO_LOG_LENGTH, &length);
+    const auto text =
+        readInfoLog(length, [program](GLint size, char* to) { glGetProgramInfoLog(program, size, nullptr, to); });
+    if (text) LOG_ERROR("Could not link program:\n%s\n", text.get());
+    glDeleteProgram(program);
+    return 0;
+}

@@ -1,0 +1,51 @@
+#include <utility>
+
+#include "fluid/fluid.h"
+#include "gl/texture_units.h"
+#include "jni/log.h"
+
+Surface_ Fluid::CreateSurface(int width, int height) {
+    LOG_ERROR("CreateSurface");
+    Surface_ surface;
+    surface.Width = width;
+    surface.Height = height;
+    glGenFramebuffers(1, &surface.FboHandle);
+    glBindFramebuffer(GL_FRAMEBUFFER, surface.FboHandle);
+    glGenTextures(1, &surface.TextureHandle);
+    glBindTexture(GL_TEXTURE_2D, surface.TextureHandle);
+    glTexParameteri(GL_TEXTURE_2D, GL_TEXTURE_WRAP_S, GL_CLAMP_TO_EDGE);
+    glTexParameteri(GL_TEXTURE_2D, GL_TEXTURE_WRAP_T, GL_CLAMP_TO_EDGE);
+    glTexParameteri(GL_TEXTURE_2D, GL_TEXTURE_MIN_FILTER, GL_LINEAR);
+    glTexParameteri(GL_TEXTURE_2D, GL_TEXTURE_MAG_FILTER, GL_LINEAR);
+    glTexImage2D(GL_TEXTURE_2D, 0, GL_RGBA, width, height, 0, GL_RGBA, GL_UNSIGNED_BYTE, nullptr);
+    glFramebufferTexture2D(GL_FRAMEBUFFER, GL_COLOR_ATTACHMENT0, GL_TEXTURE_2D, surface.TextureHandle, 0);
+    const GLenum status = glCheckFramebufferStatus(GL_FRAMEBUFFER);
+    if (status != GL_FRAMEBUFFER_COMPLETE) LOG_INFO("FRAMEBUFFER_ERROR - %d", static_cast<int>(status));
+    glClearColor(0.0f, 0.0f, 0.0f, 0.0f);
+    glClear(GL_COLOR_BUFFER_BIT);
+    glBindFramebuffer(GL_FRAMEBUFFER, 0);
+    return surface;
+}
+
+Data_ Fluid::CreateData(int width, int height) {
+    Data_ data;
+    data.Ping = CreateSurface(width, height);
+    data.Pong = CreateSurface(width, height);
+    return data;
+}
+
+void Fluid::SwapSurfaces(Data_* data) {
+    std::swap(data->Ping, data->Pong);
+}
+
+void Fluid::ClearSurface(Surface_ surface, float red, float green, float blue, float alpha) {
+    glBindFramebuffer(GL_FRAMEBUFFER, surface.FboHandle);
+    glClearColor(red, green, blue, alpha);
+    glClear(GL_COLOR_BUFFER_BIT);
+}
+
+void Fluid::ResetState() {
+    unbindTextureUnits();
+    glBindFramebuffer(GL_FRAMEBUFFER, 0);
+    glDisable(GL_BLEND);
+}

@@ -1,0 +1,28 @@
+#include "host/host_jni.h"
+
+template <class Array, class Element, class Reference>
+static Element* JNICALL getElements(JNIEnv*, Reference reference, jboolean* isCopy) {
+    if (isCopy) *isCopy = JNI_TRUE;
+    auto* const array = static_cast<Array*>(reference);
+    array->pinned = array->values;
+    return array->pinned.data();
+}
+
+template <class Array, class Element, class Reference>
+static void JNICALL releaseElements(JNIEnv*, Reference reference, Element*, jint mode) {
+    auto* const array = static_cast<Array*>(reference);
+    if (mode != JNI_ABORT) array->values = array->pinned;
+}
+
+JNIEnv* hostEnvironment() {
+    static const JNINativeInterface_ functions = [] {
+        JNINativeInterface_ table = {};
+        table.GetFloatArrayElements = getElements<FloatArray, jfloat, jfloatArray>;
+        table.GetShortArrayElements = getElements<ShortArray, jshort, jshortArray>;
+        table.ReleaseFloatArrayElements = releaseElements<FloatArray, jfloat, jfloatArray>;
+        table.ReleaseShortArrayElements = releaseElements<ShortArray, jshort, jshortArray>;
+        return table;
+    }();
+    static JNIEnv environment = {&functions};
+    return &environment;
+}

@@ -1,0 +1,21 @@
+// Java's arrays and the four calls of the Java Native Interface that the library makes, for a host in C++.
+#pragma once
+
+#include <jni.h>
+
+#include <cstddef>
+#include <vector>
+
+template <class Reference, class Element>
+struct HostArray : Reference {
+    explicit HostArray(std::size_t length) : values(length) {}
+    std::vector<Element> values;
+    std::vector<Element> pinned;  // what the library works on between Get...Elements and Release...Elements
+};
+
+using FloatArray = HostArray<_jfloatArray, jfloat>;
+using ShortArray = HostArray<_jshortArray, jshort>;
+
+// An environment whose array calls take the arrays above. It hands out copies and copies them back on release, as a
+// virtual machine with a moving collector does, so a missing release shows.
+JNIEnv* hostEnvironment();

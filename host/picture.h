@@ -1,0 +1,14 @@
+// A picture in memory: rows from the top, four bytes a pixel in R, G, B, A order, no padding.
+#pragma once
+
+#include <cstdint>
+#include <vector>
+
+struct Picture {
+    int width = 0;
+    int height = 0;
+    std::vector<std::uint8_t> rgba;  // 4 * width * height bytes
+};
+
+// The largest middle part of `picture` that has the proportions aspectWidth : aspectHeight.
+Picture cropToAspect(const Picture& picture, double aspectWidth, double aspectHeight);

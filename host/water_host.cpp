@@ -1,0 +1,181 @@
+#include "host/water_host.h"
+
+#include <algorithm>
+#include <cmath>
+
+#include "jni/natives.h"
+#include "platform/desktop_bitmap.h"
+
+#define NATIVE(method) Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_##method
+
+namespace {
+
+// A flat surface shows the picture 1.5 percent larger than the mesh, because the eye looks through the surface onto
+// a picture that lies a little behind it.
+constexpr float kPictureZoom = 1.015f;
+
+// Longest time that one frame may bring, in seconds: after a pause the water goes on and does not catch up.
+constexpr double kLongestFrame = 0.25;
+
+// A wave's turning point is slow as well, so the water rests only after this many calm steps in a row.
+constexpr int kStepsToRest = 30;
+
+// A finger that moves raises one ripple every so many cells of the mesh.
+constexpr float kTrailCells = 1.5f;
+
+void handOverOne(void (*transfer)(JNIEnv*, jobject, jobject), const Picture& picture) {
+    DesktopBitmap bitmap;
+    bitmap.info.width = static_cast<std::uint32_t>(picture.width);
+    bitmap.info.height = static_cast<std::uint32_t>(picture.height);
+    bitmap.info.stride = bitmap.info.width * 4;
+    bitmap.info.format = ANDROID_BITMAP_FORMAT_RGBA_8888;
+    bitmap.pixels = const_cast<std::uint8_t*>(picture.rgba.data());
+    transfer(hostEnvironment(), nullptr, &bitmap);
+}
+
+std::size_t vertexCount(const Look& look) {
+    return static_cast<std::size_t>(look.meshVertices) * static_cast<std::size_t>(look.meshVertices);
+}
+
+std::size_t indexCount(const Look& look) {
+    const auto cells = static_cast<std::size_t>(look.meshVertices) - 1;
+    return 6 * cells * cells;
+}
+
+}  // namespace
+
+WaterHost::WaterHost(const Look& look, int width, int height, std::uint32_t seed)
+    : look_(look),
+      random_(seed),
+      positions_(3 * vertexCount(look)),
+      indices_(indexCount(look)),
+      velocity_(vertexCount(look)),
+      heights_(vertexCount(look)),
+      heightAttribs_(3 * vertexCount(look)),
+      mvp_(16) {
+    resize(width, height);
+}
+
+void WaterHost::resize(int width, int height) {
+    width_ = width;
+    height_ = height;
+    // The mesh is a square around the view, so that its cells are squares on the screen and rings stay round. The
+    // view shows the middle of it.
+    const auto extent = static_cast<float>(look_.meshExtent);
+    const float pixel = extent / kPictureZoom / static_cast<float>(std::max(width, height));
+    visibleWidth_ = pixel * static_cast<float>(width);
+    visibleHeight_ = pixel * static_cast<float>(height);
+    pictureWidth_ = static_cast<int>(std::ceil(visibleWidth_));
+    pictureHeight_ = static_cast<int>(std::ceil(visibleHeight_));
+    mvp_.values = {2.0f / visibleWidth_, 0, 0, 0, 0, 2.0f / visibleHeight_, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1};
+    changed_ = true;
+}
+
+void WaterHost::handOver(const Picture& portrait, const Picture& landscape, const Picture& water) {
+    const int longer = std::max(pictureWidth_, pictureHeight_);
+    const int shorter = std::min(pictureWidth_, pictureHeight_);
+    handOverOne(NATIVE(transferPortraitBGBitmap), cropToAspect(portrait, shorter, longer));
+    handOverOne(NATIVE(transferLandscapeBGBitmap), cropToAspect(landscape, longer, shorter));
+    handOverOne(NATIVE(transferWaterBitmap), water);
+}
+
+void WaterHost::setUp(bool withInk) {
+    JNIEnv* const env = hostEnvironment();
+    NATIVE(onInitSetting)(env, nullptr, width_, height_, withInk);
+    NATIVE(onInitGPU)(env, nullptr);
+    NATIVE(onLoadPortraitBGTextures)(env, nullptr);
+    NATIVE(onLoadLandscapeBGTextures)(env, nullptr);
+    NATIVE(onLoadWaterTextures)(env, nullptr);
+    NATIVE(initWaters)
+    (env, nullptr, &positions_, &indices_, look_.meshVertices * look_.meshVertices, look_.meshExtent, look_.meshExtent,
+     look_.meshVertices, look_.meshVertices);
+    changed_ = true;
+}
+
+void WaterHost::touch(TouchAction action, int x, int y, float pressure) {
+    const float modelX = (static_cast<float>(x) / static_cast<float>(width_) - 0.5f) * visibleWidth_;
+    const float modelY = (0.5f - static_cast<float>(y) / static_cast<float>(height_)) * visibleHeight_;
+    const float amplitude = look_.touchAmplitude * pressure;
+    if (action == TouchAction::down) {
+        raiseRipple(modelX, modelY, amplitude);
+    } else if (action == TouchAction::move) {
+        const float cell = static_cast<float>(look_.meshExtent) / static_cast<float>(look_.meshVertices - 1);
+        const float distance = std::hypot(modelX - touchX_, modelY - touchY_);
+        if (distance < kTrailCells * cell) return;
+        const int ripples = static_cast<int>(distance / (kTrailCells * cell));
+        for (int i = 1; i <= ripples; ++i) {
+            const float t = static_cast<float>(i) / static_cast<float>(ripples);
+            raiseRipple(touchX_ + (modelX - touchX_) * t, touchY_ + (modelY - touchY_) * t, amplitude * 0.3f);
+        }
+    }
+    touchX_ = modelX;
+    touchY_ = modelY;
+}
+
+bool WaterHost::advance(double seconds) {
+    dueSteps_ += std::min(seconds, kLongestFrame) * look_.stepsPerSecond;
+    // The small extra lets a frame of exactly one step's length bring its step in spite of rounding.
+    for (; dueSteps_ > 1.0 - 1.0e-6; dueSteps_ -= 1.0) {
+        if (raining_) dropRain();
+        if (calmSteps_ < kStepsToRest) stepWater();
+    }
+    return changed_;
+}
+
+void WaterHost::stepWater() {
+    const int n = look_.meshVertices;
+    const bool calm = NATIVE(move)(
+        hostEnvironment(), nullptr, &velocity_, &heights_, 1, 1, n - 1, n - 1, n, n, JNI_TRUE, look_.damping,
+        look_.waveSpeed);
+    calmSteps_ = calm ? calmSteps_ + 1 : 0;
+    changed_ = true;
+}
+
+void WaterHost::dropRain() {
+    const auto draw = [this] {
+        return static_cast<float>(static_cast<double>(random_() - random_.min()) / (random_.max() - random_.min()));
+    };
+    if (draw() * static_cast<float>(look_.stepsPerSecond) >= look_.rainDropsPerSecond) return;
+    const float x = (draw() - 0.5f) * visibleWidth_;
+    const float y = (draw() - 0.5f) * visibleHeight_;
+    raiseRipple(x, y, look_.rainAmplitude * (0.5f + 0.5f * draw()));
+}
+
+void WaterHost::raiseRipple(float x, float y, float amplitude) {
+    // The library counts countA cells across the extent, the mesh has one interval less; these positions hit the
+    // very vertex. The fast axis runs down a column of the mesh.
+    const auto extent = static_cast<float>(look_.meshExtent);
+    const auto n = static_cast<float>(look_.meshVertices);
+    const float row = (0.5f - y / extent) * (n - 1.0f);
+    const float column = (0.5f + x / extent) * (n - 1.0f);
+    NATIVE(ripple)
+    (hostEnvironment(), nullptr, &heights_, look_.meshExtent, look_.meshExtent, look_.meshVertices, look_.meshVertices,
+     (row / n - 0.5f) * extent, (column / n - 0.5f) * extent, amplitude);
+    calmSteps_ = 0;
+}
+
+// Each vertex gets its own height and those of its right-hand and upper neighbours; vertices are stored column by
+// column from the left, each column from the top. The last ones of their kind repeat their own height.
+void WaterHost::gatherHeights() {
+    const int n = look_.meshVertices;
+    const float* const h = heights_.values.data();
+    float* attribs = heightAttribs_.values.data();
+    for (int column = 0, i = 0; column < n; ++column) {
+        for (int row = 0; row < n; ++row, ++i) {
+            *attribs++ = h[i];
+            *attribs++ = column < n - 1 ? h[i + n] : h[i];
+            *attribs++ = row > 0 ? h[i - 1] : h[i];
+        }
+    }
+}
+
+void WaterHost::draw() {
+    gatherHeights();
+    NATIVE(onDrawFrame)
+    (hostEnvironment(), nullptr, &positions_, &heightAttribs_, &indices_, static_cast<jint>(positions_.values.size()),
+     static_cast<jint>(heightAttribs_.values.size()), static_cast<jint>(indices_.values.size()), &mvp_, pictureWidth_,
+     pictureHeight_, look_.meshVertices, look_.meshVertices, look_.refractiveIndex, look_.alphaMix, look_.alphaScale1,
+     look_.alphaScale2, look_.inkRed, look_.inkGreen, look_.inkBlue, look_.fresnelRatio, look_.specularRatio,
+     look_.exponent, width_ > height_);
+    changed_ = false;
+}

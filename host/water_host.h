@@ -1,0 +1,73 @@
+// The reference host: what an app does around the library, in the order that the library asks for. It owns the mesh
+// arrays, the view, the transform and the lighting values, turns touches and rain into ripples, steps the water at a
+// fixed rate and tells when there is nothing new to draw.
+//
+// Call everything on the one thread that owns the OpenGL ES 2.0 context.
+#pragma once
+
+#include <cstdint>
+#include <random>
+
+#include "host/host_jni.h"
+#include "host/look.h"
+#include "host/picture.h"
+
+// The action codes of android.view.MotionEvent.
+enum class TouchAction { down = 0, up = 1, move = 2, cancel = 3 };
+
+class WaterHost {
+public:
+    // `seed` fixes where the rain falls. The view is width x height pixels, each at least 1.
+    WaterHost(const Look& look, int width, int height, std::uint32_t seed);
+
+    // Hands the three pictures over; before setUp. Each background is cropped to the proportions of the view that it is
+    // for: the portrait one to the view held upright, the landscape one to the view held across.
+    void handOver(const Picture& portrait, const Picture& landscape, const Picture& water);
+
+    // Sets the library up in the current context, with or without the ink. Again after a lost context or a resize.
+    void setUp(bool withInk);
+    void resize(int width, int height);
+
+    // One touch event; x and y in pixels from the top left corner of the view, pressure around 1.
+    void touch(TouchAction action, int x, int y, float pressure);
+
+    // Lets rain fall, `look.rainDropsPerSecond` drops a second, until it is switched off.
+    void rain(bool falling) { raining_ = falling; }
+
+    // Advances the water by `seconds` and says whether the picture has changed since the last draw.
+    bool advance(double seconds);
+
+    // Draws one frame into the current framebuffer.
+    void draw();
+
+private:
+    void stepWater();
+    void dropRain();
+    void raiseRipple(float x, float y, float amplitude);  // position in model units
+    void gatherHeights();
+
+    Look look_;
+    int width_ = 0;  // view size, pixels
+    int height_ = 0;
+    std::minstd_rand random_;
+    bool raining_ = false;
+    bool changed_ = true;    // since the last draw
+    int calmSteps_ = 0;      // calm steps in a row
+    double dueSteps_ = 0.0;  // steps that the time passed so far still asks for
+    float touchX_ = 0.0f;    // where the finger raised its last ripple, model units
+    float touchY_ = 0.0f;
+
+    // The part of the square mesh that the view shows, in model units, and the whole numbers at or above it, which
+    // the library takes for the picture's extent.
+    float visibleWidth_ = 0.0f;
+    float visibleHeight_ = 0.0f;
+    int pictureWidth_ = 0;
+    int pictureHeight_ = 0;
+
+    FloatArray positions_;
+    ShortArray indices_;
+    FloatArray velocity_;
+    FloatArray heights_;
+    FloatArray heightAttribs_;
+    FloatArray mvp_;
+};

@@ -1,0 +1,41 @@
+#include "jni/bitmaps.h"
+
+#include <cstddef>
+#include <cstdlib>
+#include <cstring>
+
+#include "jni/log.h"
+
+AndroidBitmapInfo bmp_portrait_bg_info;
+AndroidBitmapInfo bmp_landscape_bg_info;
+AndroidBitmapInfo bmp_water_Info;
+std::uint8_t* bmp_portrait_bg_Pixels;
+std::uint8_t* bmp_landscapebg_Pixels;
+std::uint8_t* bmp_water_Pixels;
+
+void transferBitmap(JNIEnv* env, jobject bitmap, AndroidBitmapInfo& info, std::uint8_t*& pixels) {
+    AndroidBitmapInfo handed = {};
+    int result = AndroidBitmap_getInfo(env, bitmap, &handed);
+    if (result < 0) {
+        LOG_ERROR("AndroidBitmap_getInfo () failed! error = % d", result);
+        return;
+    }
+    void* locked = nullptr;
+    result = AndroidBitmap_lockPixels(env, bitmap, &locked);
+    if (result < 0) {
+        LOG_ERROR("AndroidBitmap_lockPixels () failed! error = % d", result);
+        return;
+    }
+    // Copied, not kept locked: a host that recycles its bitmap early cannot pull the pixels from under us, and
+    // after a lost context the textures are loaded again without another hand-over. Costs one picture of memory.
+    const std::size_t bytes = std::size_t{handed.width} * handed.height * 4;
+    void* copy = std::realloc(pixels, bytes ? bytes : 1);
+    if (copy) {
+        pixels = static_cast<std::uint8_t*>(copy);
+        info = handed;
+        if (locked) std::memcpy(pixels, locked, bytes);
+    } else {
+        LOG_ERROR("no memory for a bitmap of %u x %u", handed.width, handed.height);
+    }
+    AndroidBitmap_unlockPixels(env, bitmap);
+}

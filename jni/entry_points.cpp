@@ -1,0 +1,121 @@
+#include <GLES2/gl2.h>
+
+#include "fluid/fluid.h"
+#include "jni/bitmaps.h"
+#include "jni/globals.h"
+#include "jni/log.h"
+#include "jni/natives.h"
+#include "water/mesh.h"
+#include "water/ripples.h"
+#include "water/waves.h"
+
+extern "C" {
+
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferPortraitBGBitmap(
+    JNIEnv* env, jobject, jobject bitmap) {
+    transferBitmap(env, bitmap, bmp_portrait_bg_info, bmp_portrait_bg_Pixels);
+}
+
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferLandscapeBGBitmap(
+    JNIEnv* env, jobject, jobject bitmap) {
+    transferBitmap(env, bitmap, bmp_landscape_bg_info, bmp_landscapebg_Pixels);
+}
+
+JNIEXPORT void JNICALL
+Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferWaterBitmap(JNIEnv* env, jobject, jobject bitmap) {
+    transferBitmap(env, bitmap, bmp_water_Info, bmp_water_Pixels);
+}
+
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onInitSetting(
+    JNIEnv*, jobject, jint width, jint height, jboolean withInk) {
+    SCREEN_WIDTH = width;
+    SCREEN_HEIGHT = height;
+    bWithInk = withInk;
+    LOG_INFO("onInitSetting");
+    fluid.InitializeSetting(width, height, bWithInk);
+}
+
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onInitGPU(JNIEnv*, jobject) {
+    fluid.InitializeGPU(bWithInk);
+}
+
+JNIEXPORT void JNICALL
+Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onLoadPortraitBGTextures(JNIEnv*, jobject) {
+    LOG_INFO("onLoadPortraitBGTextures");
+    fluid.LoadPortraitBGTextures(bmp_portrait_bg_info, bmp_portrait_bg_Pixels);
+}
+
+JNIEXPORT void JNICALL
+Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onLoadLandscapeBGTextures(JNIEnv*, jobject) {
+    LOG_INFO("onLoadLandscapeBGTextures");
+    fluid.LoadLandscapeBGTextures(bmp_landscape_bg_info, bmp_landscapebg_Pixels);
+}
+
+JNIEXPORT void JNICALL
+Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onLoadWaterTextures(JNIEnv*, jobject) {
+    fluid.LoadWaterTextures(bmp_water_Info, bmp_water_Pixels);
+}
+
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_initWaters(
+    JNIEnv* env, jobject, jfloatArray positions, jshortArray indices, jint vertexCount, jint meshSizeWidth,
+    jint meshSizeHeight, jint numDetailsWidth, jint numDetailsHeight) {
+    jfloat* const p = env->GetFloatArrayElements(positions, nullptr);
+    jshort* const i = env->GetShortArrayElements(indices, nullptr);
+    fillPositions(p, vertexCount, meshSizeWidth, meshSizeHeight, numDetailsWidth, numDetailsHeight);
+    fillIndices(i, numDetailsWidth, numDetailsHeight);
+    env->ReleaseFloatArrayElements(positions, p, 0);
+    env->ReleaseShortArrayElements(indices, i, 0);
+}
+
+JNIEXPORT jboolean JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_move(
+    JNIEnv* env, jobject, jfloatArray velocity, jfloatArray height, jint xStart, jint yStart, jint xEnd, jint yEnd,
+    jint stride, jint, jboolean checkCalm, jfloat damping, jfloat waveSpeed) {
+    jfloat* const v = env->GetFloatArrayElements(velocity, nullptr);
+    jfloat* const h = env->GetFloatArrayElements(height, nullptr);
+    const bool calm = stepWaves(v, h, {xStart, yStart, xEnd, yEnd, stride}, checkCalm, damping, waveSpeed);
+    env->ReleaseFloatArrayElements(velocity, v, 0);
+    env->ReleaseFloatArrayElements(height, h, 0);
+    return calm;
+}
+
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_ripple(
+    JNIEnv* env, jobject, jfloatArray field, jint extentA, jint extentB, jint countA, jint countB, jfloat posA,
+    jfloat posB, jfloat amplitude) {
+    jfloat* const values = env->GetFloatArrayElements(field, nullptr);
+    addRipple({values, extentA, extentB, countA, countB}, posA, posB, amplitude);
+    env->ReleaseFloatArrayElements(field, values, 0);
+}
+
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onDrawFrame(
+    JNIEnv* env, jobject, jfloatArray positions, jfloatArray heightAttribs, jshortArray indices, jint positionFloats,
+    jint heightFloats, jint indexCount, jfloatArray mvp, jint meshSizeWidth, jint meshSizeHeight, jint numDetailsWidth,
+    jint numDetailsHeight, jfloat refractiveIndex, jfloat alphaMix, jfloat alphaScale1, jfloat alphaScale2, jfloat,
+    jfloat, jfloat, jfloat fresnelRatio, jfloat specularRatio, jfloat exponent, jboolean landscape) {
+    glViewport(0, 0, SCREEN_WIDTH, SCREEN_HEIGHT);
+    jfloat* const p = env->GetFloatArrayElements(positions, nullptr);
+    jfloat* const h = env->GetFloatArrayElements(heightAttribs, nullptr);
+    jfloat* const m = env->GetFloatArrayElements(mvp, nullptr);
+    jshort* const i = env->GetShortArrayElements(indices, nullptr);
+    fluid.Ripple_Render(
+        p, h, i, positionFloats, heightFloats, indexCount, m, meshSizeWidth, meshSizeHeight, numDetailsWidth,
+        numDetailsHeight, refractiveIndex, alphaMix, alphaScale1, alphaScale2, fresnelRatio, specularRatio, exponent,
+        bWithInk, landscape);
+    env->ReleaseFloatArrayElements(positions, p, 0);
+    env->ReleaseFloatArrayElements(heightAttribs, h, 0);
+    env->ReleaseFloatArrayElements(mvp, m, 0);
+    env->ReleaseShortArrayElements(indices, i, 0);
+}
+
+JNIEXPORT jint JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_getClearInkValue(JNIEnv*, jobject) {
+    return static_cast<jint>(fluid.ClearInkValue);
+}
+
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_clearInkValue(JNIEnv*, jobject) {
+    state = 0;
+    step = 0;
+    fluid.ClearInkValue = 0.0f;
+    fluid.DensityDissipation = 0.0f;
+    fluid.DragMode = 0;
+}
+
+}  // extern "C"

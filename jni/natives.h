@@ -1,0 +1,75 @@
+// The native methods of com.zor.android.visualeffect.tidemark.JniTidemarkRender: the library's whole interface.
+//
+// Call them all on the one thread that owns the OpenGL ES 2.0 context, never two at a time, in this order:
+//   1. transferPortraitBGBitmap, transferLandscapeBGBitmap, transferWaterBitmap
+//   2. onInitSetting, then onInitGPU
+//   3. onLoadPortraitBGTextures, onLoadLandscapeBGTextures, onLoadWaterTextures
+//   4. initWaters, once for the mesh arrays
+//   5. for every frame: move and ripple as the animation asks, onTouch for each touch event, onDrawFrame once
+// After the context was lost, or for another view size or another mode, repeat 2 and 3.
+//
+// Array lengths and counts are the caller's word: the library does not compare them.
+#pragma once
+
+#include <jni.h>
+
+extern "C" {
+
+// Take over a picture: 32-bit RGBA, rows from the top, without padding between rows. The pixels are copied; the
+// bitmap may be recycled afterwards. A failure is logged and leaves the earlier picture in place.
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferPortraitBGBitmap(
+    JNIEnv* env, jobject, jobject bitmap);
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferLandscapeBGBitmap(
+    JNIEnv* env, jobject, jobject bitmap);
+JNIEXPORT void JNICALL
+Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferWaterBitmap(JNIEnv* env, jobject, jobject bitmap);
+
+// Fixes the view size in pixels and the mode; the GL objects come with onInitGPU, which must follow.
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onInitSetting(
+    JNIEnv* env, jobject, jint width, jint height, jboolean withInk);
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onInitGPU(JNIEnv* env, jobject);
+
+// Upload the pictures taken over last.
+JNIEXPORT void JNICALL
+Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onLoadPortraitBGTextures(JNIEnv* env, jobject);
+JNIEXPORT void JNICALL
+Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onLoadLandscapeBGTextures(JNIEnv* env, jobject);
+JNIEXPORT void JNICALL
+Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onLoadWaterTextures(JNIEnv* env, jobject);
+
+// Fills positions, 3 * vertexCount floats, and indices, 6 * (N - 1) * (N - 1) shorts, for a mesh of N x N vertices
+// (numDetailsWidth = numDetailsHeight = N, 2 to 256) that spans meshSizeWidth x meshSizeHeight model units.
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_initWaters(
+    JNIEnv* env, jobject, jfloatArray positions, jshortArray indices, jint vertexCount, jint meshSizeWidth,
+    jint meshSizeHeight, jint numDetailsWidth, jint numDetailsHeight);
+
+// One wave step over x in [xStart, xEnd), y in [yStart, yEnd) of the two fields, element y * stride + x. The fields
+// must reach one element beyond the region on each side. rowCount is ignored. True when every updated speed lies
+// within +-0.009, or when checkCalm is false.
+JNIEXPORT jboolean JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_move(
+    JNIEnv* env, jobject, jfloatArray velocity, jfloatArray height, jint xStart, jint yStart, jint xEnd, jint yEnd,
+    jint stride, jint rowCount, jboolean checkCalm, jfloat damping, jfloat waveSpeed);
+
+// Adds a cone of radius 3 cells and peak 3 * amplitude to a field of countA * countB floats, element
+// b * countA + a. posA and posB run from -extent / 2 to +extent / 2.
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_ripple(
+    JNIEnv* env, jobject, jfloatArray field, jint extentA, jint extentB, jint countA, jint countB, jfloat posA,
+    jfloat posB, jfloat amplitude);
+
+// Draws one frame into the current framebuffer, without clearing it. positions and heightAttribs hold 3 floats a
+// vertex, indices unsigned vertex numbers, mvp 16 floats by columns.
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onDrawFrame(
+    JNIEnv* env, jobject, jfloatArray positions, jfloatArray heightAttribs, jshortArray indices, jint positionFloats,
+    jint heightFloats, jint indexCount, jfloatArray mvp, jint meshSizeWidth, jint meshSizeHeight, jint numDetailsWidth,
+    jint numDetailsHeight, jfloat refractiveIndex, jfloat alphaMix, jfloat alphaScale1, jfloat alphaScale2,
+    jfloat inkRed, jfloat inkGreen, jfloat inkBlue, jfloat fresnelRatio, jfloat specularRatio, jfloat exponent,
+    jboolean landscape);
+
+// 1 while ink is shown after a touch, 0 after a cancel or clearInkValue.
+JNIEXPORT jint JNICALL
+Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_getClearInkValue(JNIEnv* env, jobject);
+
+// Clears the ink with the next frame, and ends the gesture.
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_clearInkValue(JNIEnv* env, jobject);
+
+}  // extern "C"

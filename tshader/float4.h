@@ -1,0 +1,103 @@
+// Four single-precision lanes in one register. The compiler's vector type gives + - * /, the comparisons
+// and the lane-wise ternary on SSE, NEON and WebAssembly SIMD alike, and takes a plain float beside it for
+// four equal lanes. A formula written as a template over `float` and `float4` thus reads the same for one
+// texel and for four.
+#pragma once
+
+#include <cmath>
+#include <cstring>
+
+#include "tshader/vec.h"
+
+typedef float float4 __attribute__((vector_size(16)));
+typedef int int4 __attribute__((vector_size(16)));
+
+// One or four vec2 values taken apart.
+template <class F>
+struct Pair {
+    F x, y;
+};
+
+// Rows start anywhere, so loads and stores must not assume alignment.
+template <class F>
+inline F load(const float* from) {
+    F value;
+    std::memcpy(&value, from, sizeof value);
+    return value;
+}
+
+template <class F>
+inline void store(F value, float* to) {
+    std::memcpy(to, &value, sizeof value);
+}
+
+inline float4 evenLanes(float4 a, float4 b) {
+    return __builtin_shufflevector(a, b, 0, 2, 4, 6);
+}
+
+inline float4 oddLanes(float4 a, float4 b) {
+    return __builtin_shufflevector(a, b, 1, 3, 5, 7);
+}
+
+template <class F>
+inline Pair<F> loadPairs(const vec2* from);
+
+template <>
+inline Pair<float> loadPairs<float>(const vec2* from) {
+    return {from->x, from->y};
+}
+
+template <>
+inline Pair<float4> loadPairs<float4>(const vec2* from) {
+    const float4 first = load<float4>(&from[0].x);
+    const float4 second = load<float4>(&from[2].x);
+    return {evenLanes(first, second), oddLanes(first, second)};
+}
+
+inline void storePairs(Pair<float> value, vec2* to) {
+    *to = vec2{value.x, value.y};
+}
+
+inline void storePairs(Pair<float4> value, vec2* to) {
+    store(__builtin_shufflevector(value.x, value.y, 0, 4, 1, 5), &to[0].x);
+    store(__builtin_shufflevector(value.x, value.y, 2, 6, 3, 7), &to[2].x);
+}
+
+// first, first + 1, ... in the lanes: exact while the numbers stay below 2^24.
+template <class F>
+inline F countUp(int first);
+
+template <>
+inline float countUp<float>(int first) {
+    return static_cast<float>(first);
+}
+
+template <>
+inline float4 countUp<float4>(int first) {
+    return static_cast<float>(first) + float4{0.0f, 1.0f, 2.0f, 3.0f};
+}
+
+// The lanes rounded toward zero; they must fit an int.
+inline int toInt(float value) {
+    return static_cast<int>(value);
+}
+
+inline int4 toInt(float4 value) {
+    return __builtin_convertvector(value, int4);
+}
+
+inline float toFloat(int value) {
+    return static_cast<float>(value);
+}
+
+inline float4 toFloat(int4 value) {
+    return __builtin_convertvector(value, float4);
+}
+
+inline float squareRoot(float value) {
+    return std::sqrt(value);
+}
+
+inline float4 squareRoot(float4 value) {
+    return float4{std::sqrt(value[0]), std::sqrt(value[1]), std::sqrt(value[2]), std::sqrt(value[3])};
+}

@@ -1,0 +1,63 @@
+#include <cstddef>
+
+#include "fluid/fluid.h"
+#include "gl/texture_units.h"
+#include "gl/uniforms.h"
+
+namespace {
+
+void upload(GLenum target, GLuint buffer, std::ptrdiff_t bytes, const void* data) {
+    glBindBuffer(target, buffer);
+    glBufferData(target, bytes, data, GL_STATIC_DRAW);
+    glBindBuffer(target, 0);
+}
+
+void enableVec3(GLuint attribute, GLuint buffer) {
+    glBindBuffer(GL_ARRAY_BUFFER, buffer);
+    glVertexAttribPointer(attribute, 3, GL_FLOAT, GL_FALSE, 0, nullptr);
+    glEnableVertexAttribArray(attribute);
+}
+
+}  // namespace
+
+void Fluid::Ripple_Render(const float* positions, const float* heightAttribs, const short* indices, int positionFloats,
+                          int heightFloats, int indexCount, const float* mvp, int meshSizeWidth, int meshSizeHeight,
+                          int numDetailsWidth, int numDetailsHeight, float refractiveIndex, float alphaMix,
+                          float alphaScale1, float alphaScale2, float fresnelRatio, float specularRatio, float exponent,
+                          bool, bool landscape) {
+    const GLuint program = ripple_program;
+    glViewport(0, 0, ScreenWidth, ScreenHeight);
+    glUseProgram(program);
+    setUniform(program, "uMESH_SIZE_WIDTH", static_cast<float>(meshSizeWidth));
+    setUniform(program, "uMESH_SIZE_HEIGHT", static_cast<float>(meshSizeHeight));
+    setUniform(program, "uNUM_DETAILS_WIDTH", static_cast<float>(numDetailsWidth));
+    setUniform(program, "uNUM_DETAILS_HEIGHT", static_cast<float>(numDetailsHeight));
+    setUniform(program, "uRefractiveIndex", refractiveIndex);
+    const auto aPosition = static_cast<GLuint>(glGetAttribLocation(program, "aPosition"));
+    const auto aHeights = static_cast<GLuint>(glGetAttribLocation(program, "aHeights"));
+    glUniformMatrix4fv(glGetUniformLocation(program, "uMVPMatrix"), 1, GL_FALSE, mvp);
+
+    glBindBuffer(GL_ARRAY_BUFFER, 0);
+    upload(GL_ARRAY_BUFFER, v_buf, std::ptrdiff_t{positionFloats} * 4, positions);
+    upload(GL_ARRAY_BUFFER, h_buf, std::ptrdiff_t{heightFloats} * 4, heightAttribs);
+    upload(GL_ELEMENT_ARRAY_BUFFER, i_buf, std::ptrdiff_t{indexCount} * 2, indices);
+    enableVec3(aHeights, h_buf);
+    enableVec3(aPosition, v_buf);
+
+    setUniform(program, "alphaRatio1", alphaMix * alphaScale1);
+    setUniform(program, "alphaRatio2", static_cast<float>(double{alphaScale2} * (1.0 - double{alphaMix})));
+    setUniform(program, "fresnelRatio", fresnelRatio);
+    setUniform(program, "specularRatio", specularRatio);
+    setUniform(program, "exponent", exponent);
+    setUniform(program, "viewportHeight", static_cast<float>(ScreenHeight));
+    bindTextureUnit(GL_TEXTURE0, landscape ? landscapeBG : portraitBG);
+    setUniform(program, "sBGTexture", 0);
+    bindTextureUnit(GL_TEXTURE1, environment);
+    setUniform(program, "sWaterTexture", 1);
+
+    glBindBuffer(GL_ELEMENT_ARRAY_BUFFER, i_buf);
+    glDrawElements(GL_TRIANGLES, indexCount, GL_UNSIGNED_SHORT, nullptr);
+    glDisableVertexAttribArray(aPosition);
+    glDisableVertexAttribArray(aHeights);
+    unbindTextureUnits();
+}

@@ -1,0 +1,130 @@
+#include "water/waves.h"
+
+#include <cstddef>
+#include <cstdlib>
+#include <cstring>
+#include <memory>
+#include <new>
+
+#include "jni/log.h"
+#include "tshader/groups.h"
+
+namespace {
+
+constexpr float kCalmSpeed = 0.009f;
+constexpr float kHeightLimit = 100.0f;
+
+template <class F>
+F laplacian(const float* h, std::ptrdiff_t stride) {
+    F sum = -load<F>(h) * 4.0f;
+    sum += load<F>(h - stride);
+    sum += load<F>(h - 1);
+    sum += load<F>(h + 1);
+    sum += load<F>(h + stride);
+    return sum;
+}
+
+// The integrated heights of the region and of the vertices around it, so that smoothing can write the host's
+// array while it still reads the neighbours' old heights. Lives across calls: a step allocates nothing once warm.
+struct Snapshot {
+    std::unique_ptr<float[]> heights;
+    std::size_t capacity = 0;
+
+    float* reserve(std::size_t count) {
+        if (count > capacity) {
+            heights.reset(new (std::nothrow) float[count]);
+            capacity = heights ? count : 0;
+        }
+        return heights.get();
+    }
+};
+
+Snapshot snapshot;
+
+void accelerate(float* velocity, const float* height, std::ptrdiff_t stride, int width, float damping,
+                float waveSpeed) {
+    forGroups(0, width, [=](auto lanes, int x) {
+        using F = decltype(lanes);
+        store((laplacian<F>(height + x, stride) * waveSpeed + load<F>(velocity + x)) * damping, velocity + x);
+    });
+}
+
+// A sweep of its own over a finished row: a test inside the speed pass would make each group wait for the last one.
+bool isCalm(const float* velocity, int width) {
+    int4 movingLanes = {};
+    bool moving = false;
+    forGroups(0, width, [&](auto lanes, int x) {
+        using F = decltype(lanes);
+        const F v = load<F>(velocity + x);
+        const auto fast = (v > kCalmSpeed) | (v < -kCalmSpeed);
+        if constexpr (sizeof(F) == sizeof(float4)) {
+            movingLanes |= fast;
+        } else {
+            moving |= fast != 0;
+        }
+    });
+    return !moving && !(movingLanes[0] | movingLanes[1] | movingLanes[2] | movingLanes[3]);
+}
+
+void integrate(float* height, const float* velocity, float* copy, int width) {
+    forGroups(0, width, [=](auto lanes, int x) {
+        using F = decltype(lanes);
+        const F high = F{} + kHeightLimit;
+        const F low = F{} - kHeightLimit;
+        F t = load<F>(height + x) + load<F>(velocity + x);
+        t = t > high ? high : t;
+        t = t < low ? low : t;
+        store(t, height + x);
+        if (copy) store(t, copy + x);
+    });
+}
+
+void smooth(float* height, const float* copy, std::ptrdiff_t copyStride, int width, float k) {
+    forGroups(0, width, [=](auto lanes, int x) {
+        using F = decltype(lanes);
+        store(laplacian<F>(copy + x, copyStride) * k + load<F>(height + x), height + x);
+    });
+}
+
+}  // namespace
+
+bool stepWaves(float* velocity, float* height, const WaveRegion& region, bool checkCalm, float damping,
+               float waveSpeed) {
+    const int width = region.xEnd - region.xStart;
+    const int rows = region.yEnd - region.yStart;
+    if (rows <= 0 || width <= 0) return true;
+
+    const std::ptrdiff_t stride = region.stride;
+    const std::ptrdiff_t start = region.yStart * stride + region.xStart;
+    float* const v = velocity + start;
+    float* const h = height + start;
+
+    bool calm = true;
+    for (int row = 0; row < rows; ++row) {
+        accelerate(v + row * stride, h + row * stride, stride, width, damping, waveSpeed);
+        if (checkCalm && calm) calm = isCalm(v + row * stride, width);
+    }
+
+    const std::ptrdiff_t copyStride = std::ptrdiff_t{width} + 2;
+    float* const copies = snapshot.reserve(static_cast<std::size_t>(copyStride) * (static_cast<std::size_t>(rows) + 2));
+    if (!copies) LOG_ERROR("no memory to smooth a surface of %d x %d", width, rows);
+    float* const s = copies ? copies + copyStride + 1 : nullptr;
+    for (int row = 0; row < rows; ++row) {
+        integrate(h + row * stride, v + row * stride, s ? s + row * copyStride : nullptr, width);
+    }
+    if (!s) return calm;
+
+    const std::size_t rowBytes = static_cast<std::size_t>(width) * sizeof(float);
+    std::memcpy(s - copyStride, h - stride, rowBytes);
+    std::memcpy(s + rows * copyStride, h + rows * stride, rowBytes);
+    for (int row = 0; row < rows; ++row) {
+        s[row * copyStride - 1] = h[row * stride - 1];
+        s[row * copyStride + width] = h[row * stride + width];
+    }
+
+    const float k = damping == 0.94f ? 0.068f : 0.018f;
+    for (int row = 0; row < rows; ++row) {
+        smooth(h + row * stride, s + row * copyStride, copyStride, width, k);
+    }
+    return calm;
+}

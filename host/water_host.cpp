@@ -3,10 +3,8 @@
 #include <algorithm>
 #include <cmath>
 
-#include "jni/natives.h"
+#include "host/native_names.h"
 #include "platform/desktop_bitmap.h"
-
-#define NATIVE(method) Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_##method
 
 namespace {
 
@@ -47,6 +45,7 @@ std::size_t indexCount(const Look& look) {
 WaterHost::WaterHost(const Look& look, int width, int height, std::uint32_t seed)
     : look_(look),
       random_(seed),
+      calmSteps_(kStepsToRest),
       positions_(3 * vertexCount(look)),
       indices_(indexCount(look)),
       velocity_(vertexCount(look)),
@@ -105,7 +104,7 @@ void WaterHost::touch(TouchAction action, int x, int y, float pressure) {
         const int ripples = static_cast<int>(distance / (kTrailCells * cell));
         for (int i = 1; i <= ripples; ++i) {
             const float t = static_cast<float>(i) / static_cast<float>(ripples);
-            raiseRipple(touchX_ + (modelX - touchX_) * t, touchY_ + (modelY - touchY_) * t, amplitude * 0.3f);
+            raiseRipple(touchX_ + (modelX - touchX_) * t, touchY_ + (modelY - touchY_) * t, amplitude * 0.12f);
         }
     }
     touchX_ = modelX;

@@ -52,7 +52,7 @@ private:
     std::minstd_rand random_;
     bool raining_ = false;
     bool changed_ = true;    // since the last draw
-    int calmSteps_ = 0;      // calm steps in a row
+    int calmSteps_;          // calm steps in a row
     double dueSteps_ = 0.0;  // steps that the time passed so far still asks for
     float touchX_ = 0.0f;    // where the finger raised its last ripple, model units
     float touchY_ = 0.0f;

@@ -1,0 +1,19 @@
+// What the command line says in words of its own: sizes and colours.
+#pragma once
+
+#include <optional>
+#include <string_view>
+
+struct Size {
+    int width, height;  // pixels
+};
+
+// "540x960"; each side 1 to 8192.
+std::optional<Size> parseSize(std::string_view text);
+
+struct InkColour {
+    float red, green, blue;
+};
+
+// "#rrggbb", each channel brought into the range that the ink can show.
+std::optional<InkColour> parseInkColour(std::string_view text);

@@ -1,0 +1,80 @@
+#include "preview/caustics.h"
+
+#include <array>
+#include <cmath>
+#include <complex>
+#include <numbers>
+
+#include "preview/noise.h"
+
+namespace {
+
+constexpr int kWaves = 14;
+constexpr float kFocus = 0.011f;     // how far a slope throws the light aside, in squared cells
+constexpr float kPhotonStep = 0.5f;  // pixels between neighbouring photons
+
+struct Wave {
+    float kx, ky, phase, amplitude;
+};
+
+std::array<Wave, kWaves> makeWaves(float cell, unsigned seed) {
+    Random random(seed);
+    std::array<Wave, kWaves> waves;
+    for (Wave& wave : waves) {
+        const float angle = random.in(0.0f, 2.0f * std::numbers::pi_v<float>);
+        const float length = cell * random.in(0.8f, 2.6f);
+        const float k = 2.0f * std::numbers::pi_v<float> / length;
+        wave = {k * std::cos(angle), k * std::sin(angle), random.in(0.0f, 7.0f), kFocus * cell * length};
+    }
+    return waves;
+}
+
+// A photon's brightness, shared by the four pixels around the place where it lands.
+void deposit(std::vector<float>& map, int width, int height, float x, float y) {
+    const float left = std::floor(x);
+    const float top = std::floor(y);
+    const float energy = kPhotonStep * kPhotonStep;
+    for (int corner = 0; corner < 4; ++corner) {
+        const int column = static_cast<int>(left) + corner % 2;
+        const int row = static_cast<int>(top) + corner / 2;
+        if (column < 0 || row < 0 || column >= width || row >= height) continue;
+        const float shareX = 1.0f - std::abs(x - static_cast<float>(column));
+        const float shareY = 1.0f - std::abs(y - static_cast<float>(row));
+        map[static_cast<std::size_t>(row) * static_cast<std::size_t>(width) + static_cast<std::size_t>(column)] +=
+            energy * shareX * shareY;
+    }
+}
+
+}  // namespace
+
+std::vector<float> causticNet(int width, int height, float cell, unsigned seed) {
+    std::vector<float> map(static_cast<std::size_t>(width) * static_cast<std::size_t>(height));
+    const std::array<Wave, kWaves> waves = makeWaves(cell, seed);
+    // Light from outside the picture is thrown into it, too.
+    const float margin = std::ceil(cell);
+    const int columns = static_cast<int>((static_cast<float>(width) + 2.0f * margin) / kPhotonStep);
+    const int rows = static_cast<int>((static_cast<float>(height) + 2.0f * margin) / kPhotonStep);
+    std::vector<float> landX(static_cast<std::size_t>(columns));
+    std::vector<float> landY(static_cast<std::size_t>(columns));
+    for (int row = 0; row < rows; ++row) {
+        const float y = static_cast<float>(row) * kPhotonStep - margin;
+        for (int i = 0; i < columns; ++i) {
+            landX[static_cast<std::size_t>(i)] = static_cast<float>(i) * kPhotonStep - margin;
+            landY[static_cast<std::size_t>(i)] = y;
+        }
+        for (const Wave& wave : waves) {
+            // Along a row the wave's phase turns by the same angle at every step.
+            std::complex<float> turn = std::polar(1.0f, wave.kx * -margin + wave.ky * y + wave.phase);
+            const std::complex<float> step = std::polar(1.0f, wave.kx * kPhotonStep);
+            for (std::size_t i = 0; i < landX.size(); ++i) {
+                landX[i] += wave.amplitude * wave.kx * turn.real();
+                landY[i] += wave.amplitude * wave.ky * turn.real();
+                turn = {
+                    turn.real() * step.real() - turn.imag() * step.imag(),
+                    turn.real() * step.imag() + turn.imag() * step.real()};
+            }
+        }
+        for (std::size_t i = 0; i < landX.size(); ++i) deposit(map, width, height, landX[i], landY[i]);
+    }
+    return map;
+}

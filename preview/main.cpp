@@ -1,0 +1,68 @@
+// tidemark-preview: the command line.
+#include <CLI/CLI.hpp>
+
+#include <cstdio>
+#include <string>
+
+#include "preview/log_filter.h"
+#include "preview/preview.h"
+
+// The ink is off unless it is asked for.
+static constexpr bool kInkByDefault = false;
+
+static int fail(const std::string& reason) {
+    std::fprintf(stderr, "tidemark-preview: %s\n", reason.c_str());
+    return 1;
+}
+
+int main(int argc, char** argv) {
+    PreviewOptions options;
+    std::string size = "540x960";
+    std::string ink;
+    bool noInk = false;
+    bool verbose = false;
+
+    CLI::App app("Draws rippling water over pictures, without a window, into PNG files and a video.");
+    app.get_formatter()->column_width(24);
+    const auto file = [&](const char* name, std::string& path, const char* help) {
+        app.add_option(name, path, help)->type_name("FILE");
+    };
+    file("--portrait", options.portrait, "Picture under the water of an upright view (PNG or JPEG)");
+    file("--landscape", options.landscape, "Picture under the water of a view held across (PNG or JPEG)");
+    file("--water", options.water, "Picture of the light on the waves (PNG or JPEG)");
+    file("--script", options.script, "Touches to play, one \"time_ms action x y pressure\" a line");
+    app.add_flag("--rain", options.rain, "Let it rain, as it does anyway where there is no script");
+    app.add_option("--size", size, "Size of the view in pixels")->type_name("WxH")->capture_default_str();
+    app.add_option("--seconds", options.seconds, "Length of the scene")->capture_default_str();
+    app.add_option("--fps", options.framesPerSecond, "Frames a second")->capture_default_str();
+    app.add_option("--out", options.out, "Directory for frame-0000.png and so on; \"out\" where there is no video")
+        ->type_name("DIR");
+    file("--video", options.video, "Video to make, which ends in .mp4, .webp or .gif");
+    app.add_option("--seed", options.seed, "Number that chance springs from")->capture_default_str();
+    CLI::Option* inkOption = app.add_option("--ink", ink, "Colour of the ink that touches drop")->type_name("#rrggbb");
+    app.add_flag("--no-ink", noInk, "Clear water only")->excludes(inkOption);
+    app.add_flag("--verbose", verbose, "Show the library's log");
+    try {
+        app.parse(argc, argv);
+    } catch (const CLI::Success& help) {
+        return app.exit(help);
+    } catch (const CLI::ParseError& problem) {
+        return fail(problem.what());
+    }
+
+    const std::optional<Size> parsedSize = parseSize(size);
+    if (!parsedSize) return fail("--size " + size + " is not WIDTHxHEIGHT with sides of 1 to 8192 pixels");
+    options.size = *parsedSize;
+    if (!(options.seconds > 0.0 && options.seconds <= 3600.0))
+        return fail("--seconds must be above 0 and at most 3600");
+    // The host takes longer frames for a pause.
+    if (options.framesPerSecond < 4 || options.framesPerSecond > 240) return fail("--fps must be 4 to 240");
+    if (*inkOption && !(options.inkColour = parseInkColour(ink))) return fail("--ink " + ink + " is not #rrggbb");
+    options.withInk = !noInk && (kInkByDefault || options.inkColour);
+    if (options.script.empty()) options.rain = true;
+    if (options.out.empty() && options.video.empty()) options.out = "out";
+    if (!verbose) quietenLog();
+
+    std::string error;
+    return runPreview(options, error) ? 0 : fail(error);
+}

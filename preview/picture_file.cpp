@@ -1,0 +1,45 @@
+#include "preview/picture_file.h"
+
+#include <stb/stb_image.h>
+#include <stb/stb_image_resize.h>
+
+#include <algorithm>
+#include <cerrno>
+#include <cmath>
+#include <cstdio>
+#include <cstring>
+#include <memory>
+
+static std::size_t byteCount(int width, int height) {
+    return 4 * static_cast<std::size_t>(width) * static_cast<std::size_t>(height);
+}
+
+std::optional<Picture> loadPicture(const std::string& path, std::string& error) {
+    const std::unique_ptr<std::FILE, int (*)(std::FILE*)> file(std::fopen(path.c_str(), "rb"), std::fclose);
+    if (!file) {
+        error = "cannot read the picture " + path + ": " + std::strerror(errno);
+        return std::nullopt;
+    }
+    Picture picture;
+    const std::unique_ptr<stbi_uc, void (*)(void*)> pixels(
+        stbi_load_from_file(file.get(), &picture.width, &picture.height, nullptr, STBI_rgb_alpha), stbi_image_free);
+    if (!pixels) {
+        error = path + " is not a PNG or JPEG picture that can be read: " + stbi_failure_reason();
+        return std::nullopt;
+    }
+    picture.rgba.assign(pixels.get(), pixels.get() + byteCount(picture.width, picture.height));
+    return picture;
+}
+
+Picture fitPicture(Picture picture, int longestSide) {
+    const int longer = std::max(picture.width, picture.height);
+    if (longer <= longestSide) return picture;
+    const auto shrink = [&](int side) {
+        return std::max(1, static_cast<int>(std::lround(static_cast<double>(side) * longestSide / longer)));
+    };
+    Picture fitted{shrink(picture.width), shrink(picture.height), {}};
+    fitted.rgba.resize(byteCount(fitted.width, fitted.height));
+    stbir_resize_uint8(
+        picture.rgba.data(), picture.width, picture.height, 0, fitted.rgba.data(), fitted.width, fitted.height, 0, 4);
+    return fitted;
+}

@@ -1,0 +1,26 @@
+// One run of the preview: pictures and touches in, frames out.
+#pragma once
+
+#include <cstdint>
+#include <optional>
+#include <string>
+
+#include "preview/arguments.h"
+
+// What is left empty is the built-in picture, no script, or no such output.
+struct PreviewOptions {
+    std::string portrait, landscape, water;  // files
+    std::string script;                      // file
+    bool rain = false;
+    Size size = {540, 960};
+    double seconds = 4.0;
+    int framesPerSecond = 30;
+    std::string out;    // directory
+    std::string video;  // file
+    std::uint32_t seed = 1;
+    bool withInk = false;
+    std::optional<InkColour> inkColour;  // instead of the look's own
+};
+
+// On failure says why in `error`, and leaves none of its output behind.
+bool runPreview(const PreviewOptions& options, std::string& error);

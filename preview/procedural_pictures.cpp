@@ -1,0 +1,98 @@
+#include "preview/procedural_pictures.h"
+
+#include <algorithm>
+#include <cmath>
+#include <cstddef>
+#include <future>
+#include <vector>
+
+#include "preview/caustics.h"
+#include "preview/noise.h"
+#include "preview/pebbles.h"
+
+static std::uint8_t toByte(float linear) {
+    return static_cast<std::uint8_t>(std::sqrt(std::clamp(linear, 0.0f, 1.0f)) * 255.0f + 0.5f);
+}
+
+// Rolls bright values off towards white instead of cutting them.
+static float expose(float light) {
+    return light * (1.0f + light * 0.25f) / (1.0f + light * 0.60f);
+}
+
+static void put(Picture& picture, std::size_t pixel, Rgb light) {
+    std::uint8_t* bytes = &picture.rgba[pixel * 4];
+    bytes[0] = toByte(light.r);
+    bytes[1] = toByte(light.g);
+    bytes[2] = toByte(light.b);
+    bytes[3] = 255;
+}
+
+static Picture blank(int width, int height) {
+    return {
+        width, height,
+        std::vector<std::uint8_t>(4 * static_cast<std::size_t>(width) * static_cast<std::size_t>(height))};
+}
+
+// The net at half the resolution, read between its four nearest values.
+static float sampleHalf(const std::vector<float>& net, int netWidth, int netHeight, int column, int row) {
+    const auto at = [&](int x, int y) {
+        return net[static_cast<std::size_t>(
+            std::clamp(y, 0, netHeight - 1) * netWidth + std::clamp(x, 0, netWidth - 1))];
+    };
+    const int x = column / 2;
+    const int y = row / 2;
+    const int besideX = column % 2 == 0 ? x - 1 : x + 1;
+    const int besideY = row % 2 == 0 ? y - 1 : y + 1;
+    return 0.5625f * at(x, y) + 0.1875f * (at(besideX, y) + at(x, besideY)) + 0.0625f * at(besideX, besideY);
+}
+
+// What the eye sees of a stone under `depth` of water: 0 is shallow and warm, 1 deep and blue-green.
+static Rgb underWater(Rgb stone, float depth, float caustic) {
+    const float sun = (0.65f + 0.85f * std::min(caustic, 4.5f)) * (1.30f - 0.50f * depth);
+    return {
+        expose(stone.r * sun * (1.20f - 0.80f * depth) + 0.002f),
+        expose(stone.g * sun * (1.10f - 0.28f * depth) + 0.003f + 0.016f * depth),
+        expose(stone.b * sun * (0.92f + 0.06f * depth) + 0.004f + 0.026f * depth)};
+}
+
+Picture riverBed(int width, int height) {
+    const float unit = 0.045f * std::sqrt(static_cast<float>(width) * static_cast<float>(height));
+    const int netWidth = (width + 1) / 2;
+    const int netHeight = (height + 1) / 2;
+    auto futureNet = std::async(std::launch::async, causticNet, netWidth, netHeight, unit * 0.85f, 3U);
+    Canvas bed{width, height, {}};
+    Random random(5);
+    scatterPebbles(bed, unit, random, CloudTile(11));
+
+    const std::vector<float> net = futureNet.get();
+    Picture picture = blank(width, height);
+    std::size_t pixel = 0;
+    for (int row = 0; row < height; ++row) {
+        for (int column = 0; column < width; ++column, ++pixel) {
+            const float x = static_cast<float>(column) / static_cast<float>(width);
+            const float y = static_cast<float>(row) / static_cast<float>(height);
+            const float depth = std::clamp(0.40f * x + 0.80f * y - 0.10f, 0.0f, 1.0f);
+            const float caustic = sampleHalf(net, netWidth, netHeight, column, row);
+            put(picture, pixel, underWater(bed.pixels[pixel], depth, caustic));
+        }
+    }
+    return picture;
+}
+
+// A flat surface shows the very middle, slopes lead outwards from there: sky, with the sun's glitter on it.
+Picture waterLight(int side) {
+    const CloudTile clouds(23);
+    const std::vector<float> glitter = causticNet(side, side, static_cast<float>(side) / 12.0f, 9);
+    Picture picture = blank(side, side);
+    std::size_t pixel = 0;
+    for (int row = 0; row < side; ++row) {
+        for (int column = 0; column < side; ++column, ++pixel) {
+            const float cloud = std::clamp(clouds.at(column, row) * 1.6f - 0.3f, 0.0f, 1.0f);
+            const float sun = 0.16f * std::min(glitter[pixel], 5.0f);
+            put(picture, pixel,
+                {0.14f + 0.40f * cloud + sun, 0.30f + 0.35f * cloud + sun * 0.97f,
+                 0.52f + 0.26f * cloud + sun * 0.90f});
+        }
+    }
+    return picture;
+}

@@ -1,0 +1,19 @@
+# Sourced by the scripts beside it: installs the Debian packages that are missing, as root or through sudo.
+
+build_packages=(cmake g++ ninja-build openjdk-17-jdk-headless libgles-dev libegl-dev libegl-mesa0 libgl1-mesa-dri
+    libstb-dev libcli11-dev ffmpeg)
+test_packages=(clang clang-format clang-tidy googletest libgtest-dev glslang-tools)
+
+install_missing() {
+    local missing=()
+    local package
+    for package in "$@"; do
+        dpkg-query --show --showformat='${db:Status-Abbrev}' "$package" 2>/dev/null | grep -q '^ii' || missing+=("$package")
+    done
+    [ ${#missing[@]} -eq 0 ] && return
+    echo "Installing ${missing[*]}"
+    local sudo=()
+    [ "$(id -u)" -eq 0 ] || sudo=(sudo)
+    "${sudo[@]}" apt-get update -qq
+    "${sudo[@]}" env DEBIAN_FRONTEND=noninteractive apt-get install -y -qq --no-install-recommends "${missing[@]}"
+}

@@ -1,0 +1,11 @@
+# The library exports the native methods that its header declares and nothing else.
+execute_process(COMMAND ${NM} -D --defined-only ${LIBRARY} OUTPUT_VARIABLE symbols COMMAND_ERROR_IS_FATAL ANY)
+string(REGEX MATCHALL "[^ \n]+\n" exported "${symbols}")
+list(TRANSFORM exported STRIP)
+file(READ ${NATIVES} header)
+string(REGEX MATCHALL "Java_[A-Za-z0-9_]+" declared "${header}")
+list(SORT exported)
+list(SORT declared)
+if(NOT exported STREQUAL declared)
+    message(FATAL_ERROR "exported: ${exported}\ndeclared: ${declared}")
+endif()

@@ -1,0 +1,128 @@
+#include "host/water_host.h"
+
+#include "tests/support/gl_test.h"
+#include "tests/support/test_pictures.h"
+
+namespace {
+
+class Host : public GlTest {
+protected:
+    static constexpr int kLong = 96;
+    static constexpr int kShort = 54;
+
+    WaterHost start(int width, int height, std::uint32_t seed = 1) {
+        renewContext(width, height);
+        WaterHost host(Look{}, width, height, seed);
+        host.handOver(portrait, landscape, smoothPicture(16, 16, 3));
+        host.setUp(false);
+        return host;
+    }
+
+    // A picture much wider or higher than the view, so that the crop shows.
+    Picture portrait = smoothPicture(200, 200, 1);
+    Picture landscape = smoothPicture(300, 120, 2);
+};
+
+void expectMiddleOf(const std::vector<Rgba>& pixels, int width, int height, const Picture& picture) {
+    const double scale = std::max(double{1} * width / picture.width, double{1} * height / picture.height);
+    for (int y = 0; y < height; y += 5) {
+        for (int x = 0; x < width; x += 5) {
+            const int column = static_cast<int>(picture.width / 2.0 + (x + 0.5 - width / 2.0) / scale);
+            const int row = static_cast<int>(picture.height / 2.0 - (y + 0.5 - height / 2.0) / scale);
+            for (std::size_t c = 0; c < 3; ++c) {
+                const int expected = picture.rgba[static_cast<std::size_t>((row * picture.width + column) * 4) + c];
+                ASSERT_NEAR(pixels[static_cast<std::size_t>(y * width + x)][c], expected, 6) << x << ", " << y;
+            }
+        }
+    }
+}
+
+}  // namespace
+
+TEST_F(Host, aFlatSurfaceShowsThePhotoUndistortedAndFillingTheView) {
+    start(kShort, kLong).draw();
+    expectMiddleOf(readPixels(kShort, kLong), kShort, kLong, portrait);
+    start(kLong, kShort).draw();
+    expectMiddleOf(readPixels(kLong, kShort), kLong, kShort, landscape);
+}
+
+TEST_F(Host, ringsAreRoundOnTheScreenAndComeToRest) {
+    WaterHost host = start(kShort, kLong);
+    ASSERT_TRUE(host.advance(0.0)) << "the first frame is always drawn";
+    host.draw();
+    const auto flat = readPixels(kShort, kLong);
+    EXPECT_FALSE(host.advance(1.0 / 60)) << "calm water asks for no frame";
+
+    host.touch(TouchAction::down, kShort / 2, kLong / 2, 1.0f);
+    ASSERT_TRUE(host.advance(8.0 / 60));
+    host.draw();
+    const auto ring = readPixels(kShort, kLong);
+    int left = kShort;
+    int right = 0;
+    int bottom = kLong;
+    int top = 0;
+    for (int y = 0; y < kLong; ++y) {
+        for (int x = 0; x < kShort; ++x) {
+            const auto i = static_cast<std::size_t>(y * kShort + x);
+            if (std::abs(ring[i][0] - flat[i][0]) + std::abs(ring[i][1] - flat[i][1]) < 12) continue;
+            left = std::min(left, x);
+            right = std::max(right, x);
+            bottom = std::min(bottom, y);
+            top = std::max(top, y);
+        }
+    }
+    EXPECT_GT(right - left, 5);
+    EXPECT_NEAR(right - left, top - bottom, 3);
+    EXPECT_NEAR((left + right) / 2, kShort / 2, 2);
+    EXPECT_NEAR((bottom + top) / 2, kLong / 2, 2);
+
+    double seconds = 0.0;
+    while (host.advance(1.0 / 60) && seconds < 20.0) {
+        host.draw();
+        seconds += 1.0 / 60;
+    }
+    EXPECT_GT(seconds, 1.0);
+    EXPECT_LT(seconds, 8.0) << "waves die within a few seconds";
+    EXPECT_FALSE(host.advance(1.0));
+}
+
+TEST_F(Host, theFrameRateDoesNotChangeTheWater) {
+    const auto after = [this](double frame, int frames) {
+        WaterHost host = start(kShort, kLong);
+        host.touch(TouchAction::down, 20, 30, 1.0f);
+        for (int i = 0; i < frames; ++i) host.advance(frame);
+        host.draw();
+        return readPixels(kShort, kLong);
+    };
+    EXPECT_EQ(after(1.0 / 60, 24), after(1.0 / 30, 12));
+    EXPECT_EQ(after(1.0 / 60, 24), after(1.0 / 120, 48));
+}
+
+TEST_F(Host, rainFallsWhereItsSeedSaysAndSurvivesALostContext) {
+    const auto rained = [this](std::uint32_t seed, bool loseContext) {
+        WaterHost host = start(kShort, kLong, seed);
+        host.rain(true);
+        for (int i = 0; i < 90; ++i) host.advance(1.0 / 60);
+        if (loseContext) {
+            renewContext(kShort, kLong);
+            host.setUp(false);
+        }
+        host.draw();
+        return readPixels(kShort, kLong);
+    };
+    const auto once = rained(5, false);
+    EXPECT_EQ(rained(5, false), once);
+    EXPECT_NE(rained(6, false), once);
+    EXPECT_EQ(rained(5, true), once) << "all state of the water is the host's";
+}
+
+TEST_F(Host, aResizeTurnsTheViewAndKeepsTheWater) {
+    WaterHost host = start(kShort, kLong);
+    host.draw();
+    renewContext(kLong, kShort);
+    host.resize(kLong, kShort);
+    host.setUp(false);
+    ASSERT_TRUE(host.advance(0.0));
+    host.draw();
+    expectMiddleOf(readPixels(kLong, kShort), kLong, kShort, landscape);
+}

@@ -1,0 +1,137 @@
+#include "jni/natives.h"
+
+#include <gtest/gtest.h>
+
+#include <cstring>
+
+#include "fluid/fluid.h"
+#include "host/host_jni.h"
+#include "host/native_names.h"
+#include "host/water_host.h"
+#include "jni/bitmaps.h"
+#include "jni/globals.h"
+#include "platform/desktop_bitmap.h"
+#include "tests/support/gl_test.h"
+#include "tests/support/test_pictures.h"
+
+namespace {
+
+struct Slot {
+    void (*transfer)(JNIEnv*, jobject, jobject);
+    AndroidBitmapInfo& info;
+    std::uint8_t*& pixels;
+};
+
+const Slot kSlots[] = {
+    {NATIVE(transferPortraitBGBitmap), bmp_portrait_bg_info, bmp_portrait_bg_Pixels},
+    {NATIVE(transferLandscapeBGBitmap), bmp_landscape_bg_info, bmp_landscapebg_Pixels},
+    {NATIVE(transferWaterBitmap), bmp_water_Info, bmp_water_Pixels},
+};
+
+DesktopBitmap bitmapOf(std::vector<std::uint8_t>& pixels, std::uint32_t width, std::uint32_t height) {
+    DesktopBitmap bitmap;
+    bitmap.info.width = width;
+    bitmap.info.height = height;
+    bitmap.pixels = pixels.data();
+    return bitmap;
+}
+
+}  // namespace
+
+TEST(BitmapHandOver, keepsThePixelsOfABitmapThatIsRecycledAtOnce) {
+    for (const Slot& slot : kSlots) {
+        std::vector<std::uint8_t> pixels(2 * 3 * 4);
+        for (std::size_t i = 0; i < pixels.size(); ++i) pixels[i] = static_cast<std::uint8_t>(i * 7);
+        const auto original = pixels;
+        DesktopBitmap bitmap = bitmapOf(pixels, 2, 3);
+        slot.transfer(hostEnvironment(), nullptr, &bitmap);
+        EXPECT_EQ(bitmap.locks, 0);
+        pixels.assign(pixels.size(), 0);
+        EXPECT_EQ(slot.info.height, 3u);
+        EXPECT_EQ(std::memcmp(slot.pixels, original.data(), original.size()), 0);
+    }
+}
+
+TEST(BitmapHandOver, aFailureIsLoggedAndLeavesTheSlotAlone) {
+    for (const Slot& slot : kSlots) {
+        std::vector<std::uint8_t> pixels(4 * 4 * 4, 9);
+        DesktopBitmap bitmap = bitmapOf(pixels, 4, 4);
+        slot.transfer(hostEnvironment(), nullptr, &bitmap);
+        const std::uint8_t* const stored = slot.pixels;
+
+        LogRecorder log;
+        slot.transfer(hostEnvironment(), nullptr, nullptr);
+        EXPECT_EQ(log.take(), std::vector<std::string>{"E AndroidBitmap_getInfo () failed! error = -1"});
+        DesktopBitmap unlockable;
+        unlockable.info.width = 1000;
+        slot.transfer(hostEnvironment(), nullptr, &unlockable);
+        EXPECT_EQ(log.take(), std::vector<std::string>{"E AndroidBitmap_lockPixels () failed! error = -3"});
+        EXPECT_EQ(unlockable.locks, 0);
+        EXPECT_EQ(slot.pixels, stored);
+        EXPECT_EQ(slot.info.width, 4u) << "the size always belongs to the pixels";
+    }
+}
+
+TEST(MeshNatives, workOnTheHostsArraysInPlace) {
+    JNIEnv* const env = hostEnvironment();
+    FloatArray positions(12);
+    ShortArray indices(6);
+    NATIVE(initWaters)(env, nullptr, &positions, &indices, 4, 2, 2, 2, 2);
+    EXPECT_EQ(positions.values, (std::vector<float>{-1, 1, 0, -1, -1, 0, 1, 1, 0, 1, -1, 0}));
+    EXPECT_EQ(indices.values, (std::vector<jshort>{0, 1, 3, 0, 3, 2}));
+
+    FloatArray velocity(8 * 8);
+    FloatArray height(8 * 8);
+    NATIVE(ripple)(env, nullptr, &velocity, 8, 8, 8, 8, 0.0f, 0.0f, 0.5f);
+    EXPECT_EQ(velocity.values[4 * 8 + 4], 1.5f);
+    const auto move = [&](jboolean check) {
+        return NATIVE(move)(env, nullptr, &velocity, &height, 1, 1, 7, 7, 8, 8, check, 0.5f, 0.0f);
+    };
+    EXPECT_EQ(move(JNI_TRUE), JNI_FALSE);
+    EXPECT_EQ(velocity.values[4 * 8 + 4], 0.75f);
+    EXPECT_GT(height.values[4 * 8 + 4], 0.5f);
+    EXPECT_EQ(move(JNI_FALSE), JNI_TRUE);
+}
+
+using Natives = GlTest;
+
+TEST_F(Natives, aWholeRunOfTheWaterLogsTheStatedLinesAndDraws) {
+    WaterHost host(Look{}, kSide, kSide, 1);
+    host.handOver(smoothPicture(30, 30, 1), smoothPicture(30, 30, 2), smoothPicture(8, 8, 3));
+    host.setUp(false);
+    auto lines = log.take();
+    const std::vector<std::string> wanted = {"I onInitSetting",          "I InitializeSetting",
+                                             "I InitializeGPU",          "I onLoadPortraitBGTextures",
+                                             "I LoadPortraitBGTextures", "I onLoadLandscapeBGTextures",
+                                             "I LoadLandscapeBGTextures"};
+    std::erase_if(
+        lines, [&wanted](const auto& line) { return std::find(wanted.begin(), wanted.end(), line) == wanted.end(); });
+    EXPECT_EQ(lines, wanted);
+    EXPECT_EQ(SCREEN_WIDTH, kSide);
+    EXPECT_FALSE(bWithInk);
+
+    glViewport(0, 0, 5, 5);
+    host.draw();
+    const auto flat = readPixels();
+    EXPECT_GT(flat[0][0] + flat[0][1], 60) << "something of the picture, in the corner too";
+    host.touch(TouchAction::down, kSide / 2, kSide / 2, 1.0f);
+    ASSERT_TRUE(host.advance(0.1));
+    host.draw();
+    EXPECT_NE(readPixels(), flat);
+    EXPECT_TRUE(log.take().empty()) << "a frame logs nothing";
+}
+
+TEST_F(Natives, clearingTheInkEndsTheGesture) {
+    fluid.ClearInkValue = 1.9f;
+    EXPECT_EQ(NATIVE(getClearInkValue)(hostEnvironment(), nullptr), 1) << "truncated";
+    state = 2;
+    step = 7;
+    fluid.DensityDissipation = 0.9f;
+    fluid.DragMode = 2;
+    NATIVE(clearInkValue)(hostEnvironment(), nullptr);
+    EXPECT_EQ(state, 0);
+    EXPECT_EQ(step, 0);
+    EXPECT_EQ(fluid.DensityDissipation, 0.0f);
+    EXPECT_EQ(fluid.DragMode, 0);
+    EXPECT_EQ(NATIVE(getClearInkValue)(hostEnvironment(), nullptr), 0);
+}

@@ -1,0 +1,18 @@
+// The divergence of the velocity, lowered in a disc around the touch so that the ink is pushed out of it.
+#pragma once
+
+#include "tshader/tshader_core.h"
+
+class ComputeDivergenceTShaderImpl : public TShaderCore<float> {
+public:
+    void shaderMain(const vec4& fragCoord, float& out) override;
+    void run();
+
+    Texture<vec2> Velocity;
+    vec2 Scale = {};        // screen pixels per texel
+    vec2 InverseSize = {};  // one texel in texture coordinates
+    float HalfInvCellSize = 0.0f;
+    float SourceStrength = 0.0f;
+    float SourceRadius = 0.0f;  // in screen pixels
+    vec2 center = {};           // of the disc, in screen pixels, y up
+};

@@ -1,0 +1,46 @@
+#include "tshader/JacobiTShaderImpl.h"
+
+#include <algorithm>
+
+#include "tshader/groups.h"
+
+// One relaxation from the four neighbours, for one texel or for four in a row.
+template <class F>
+static F relax(F left, F right, F below, F above, F divergence, float alpha, float inverseBeta) {
+    return ((((left + right) + below) + above) + alpha * divergence) * inverseBeta;
+}
+
+void JacobiTShaderImpl::shaderMain(const vec4& fragCoord, float& out) {
+    const vec2 uv = Vec2(fragCoord.x, fragCoord.y) * InverseSize;
+    const vec2 right = Vec2(InverseSize.x, 0.0f);
+    const vec2 up = Vec2(0.0f, InverseSize.y);
+    out = relax(
+        texture2D(Pressure, uv - right), texture2D(Pressure, uv + right), texture2D(Pressure, uv - up),
+        texture2D(Pressure, uv + up), texture2D(Divergence, uv), Alpha, InverseBeta);
+}
+
+void JacobiTShaderImpl::run() {
+    if (output.empty()) return;
+    const int width = output.width;
+    const int height = output.height;
+    // Locals, as every store could change a float field of this object.
+    const float alpha = Alpha;
+    const float inverseBeta = InverseBeta;
+
+    std::fill(output.row(0), output.row(height), 0.0f);
+    for (int j = 1; j < height - 1; ++j) {
+        const float* pressure = Pressure.row(j);
+        const float* below = Pressure.row(j - 1);
+        const float* above = Pressure.row(j + 1);
+        const float* divergence = Divergence.row(j);
+        float* out = output.row(j);
+
+        forGroups(1, width - 1, [=]<class F>(F, int i) {
+            store(
+                relax(
+                    load<F>(pressure + i - 1), load<F>(pressure + i + 1), load<F>(below + i), load<F>(above + i),
+                    load<F>(divergence + i), alpha, inverseBeta),
+                out + i);
+        });
+    }
+}

@@ -1,0 +1,19 @@
+// The base of the CPU kernels. A kernel is a fragment shader over float textures: its fields are the textures
+// and uniforms, shaderMain computes one fragment, and `run`, where a kernel has one, fills the output.
+// A kernel owns nothing; output must be another buffer than every input.
+#pragma once
+
+#include "tshader/texture.h"
+#include "tshader/vec.h"
+
+template <class T>
+class TShaderCore {
+public:
+    virtual ~TShaderCore() = default;
+
+    // fragCoord.xy is the fragment in output pixels; texel (i, j) has its centre at (i + 0.5, j + 0.5).
+    virtual void shaderMain(const vec4& fragCoord, T& out) = 0;
+
+    Texture<T> output;
+    char name[100] = {};
+};

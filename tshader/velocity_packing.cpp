@@ -1,0 +1,33 @@
+#include "tshader/velocity_packing.h"
+
+#include <cstring>
+
+#include "tshader/float4.h"
+
+// The two bytes in the low half of an int, whole part first in memory. NaN packs like 127.
+// A raised component is a multiple of 2^-18, and no such fraction times 255 lies close enough below a whole
+// number to be rounded up to it: single precision yields the same bytes as double precision would.
+template <class I, class F>
+static I packComponent(F c) {
+    const F raised = c < -127.0f ? 0.0f : (c < 127.0f ? c + 127.0f : 254.0f);
+    const I whole = toInt(raised);
+    const I fraction = toInt((raised - toFloat(whole)) * 255.0f);
+    return whole | (fraction << 8);
+}
+
+template <class I, class F>
+static I packTexel(Pair<F> u) {
+    return packComponent<I>(u.x) | (packComponent<I>(u.y) << 16);
+}
+
+void packVelocity(const vec2* velocity, std::size_t count, unsigned char* rgba) {
+    std::size_t i = 0;
+    for (; i + 4 <= count; i += 4) {
+        const int4 texels = packTexel<int4>(loadPairs<float4>(velocity + i));
+        std::memcpy(rgba + 4 * i, &texels, sizeof texels);
+    }
+    for (; i < count; ++i) {
+        const int texel = packTexel<int>(loadPairs<float>(velocity + i));
+        std::memcpy(rgba + 4 * i, &texel, sizeof texel);
+    }
+}

@@ -1,3 +1,6 @@
+#include <cstring>
+
+#include "fluid/buffers.h"
 #include "fluid/fluid.h"
 #include "gl/shader_program.h"
 #include "jni/log.h"
@@ -12,8 +15,8 @@ struct Program {
 };
 
 // Deletes what an earlier set-up built, named in the log as `name`, and builds the program anew.
-void rebuild(Program made, const char* name, const char* announcement, const char* vertexSource,
-             const char* fragmentSource) {
+void rebuild(
+    Program made, const char* name, const char* announcement, const char* vertexSource, const char* fragmentSource) {
     if (made.program) {
         LOG_INFO("glDelete %s = %u", name, made.program);
         glDeleteShader(made.vertexShader);
@@ -34,20 +37,89 @@ void renewBuffer(GLuint& buffer, const char* name) {
     glGenBuffers(1, &buffer);
 }
 
+void deleteSurface(const Surface_& surface) {
+    glDeleteFramebuffers(1, &surface.FboHandle);
+    glDeleteTextures(1, &surface.TextureHandle);
+}
+
+template <class T>
+void setName(TShaderCore<T>& kernel, const char* name) {
+    std::strncpy(kernel.name, name, sizeof kernel.name - 1);
+}
+
 }  // namespace
 
-void Fluid::InitializeSetting(int width, int height, bool) {
+void Fluid::InitializeSetting(int width, int height, bool withInk) {
     LOG_INFO("InitializeSetting");
     InkColor = {1.0f, 1.0f, 1.0f};
     ScreenWidth = width;
     ScreenHeight = height;
+    if (withInk) {
+        CellSize = 2.5f;
+        GridWidth = ScreenWidth / 12;
+        GridHeight = ScreenHeight / 12;
+        const bool landscape = width > height;
+        InkWidth = landscape ? 512 : 256;
+        InkHeight = landscape ? 256 : 512;
+        Radius = 2.0f;
+        ImpulseDensity = 200.0f;
+        NumJacobiIterations = 5;
+        TimeStep = 0.25f;
+        GradientScale = 0.2f;
+        VelocityDissipation = 0.9f;
+        DensityDissipation = 0.92f;
+        SourceStrength = 50.0f;
+        SourceRadius = 40.0f;
+        BackwardStepSize = 1.0f;
+        ClearInkValue = 1.0f;
+        InkIntensity = 0.2f;
+        DragMode = 0;
+        BoundaryMargin = 10;
+    }
     renewBuffer(v_buf, "v_buf");
     renewBuffer(h_buf, "h_buf");
     renewBuffer(i_buf, "i_buf");
 }
 
-void Fluid::InitializeGPU(bool) {
+void Fluid::InitializeGPU(bool withInk) {
     LOG_INFO("InitializeGPU");
-    rebuild({ripple_program, ripple_vertexShader, ripple_fragmentShader}, "ripple_program", "ripple_vertextShader",
-            kWaterVert, kWaterPlainFrag);
+    if (withInk) LOG_INFO("bInk is true");
+    rebuild(
+        {ripple_program, ripple_vertexShader, ripple_fragmentShader}, "ripple_program", "ripple_vertextShader",
+        kWaterVert, withInk ? kWaterInkFrag : kWaterPlainFrag);
+    if (!withInk) return;
+
+    rebuild(
+        {advect_density_program, advect_density_vertexShader, advect_density_fragmentShader}, "advect_density_program",
+        "advect_density_program", kQuadVert, kAdvectDensityFrag);
+    rebuild(
+        {addInk_program, addInk_vertexShader, addInk_fragmentShader}, "addInk_program", "addInk_program", kQuadVert,
+        kAddInkFrag);
+
+    setName(AdvectVelocityKernel, "AdvectVelocity");
+    setName(AdvectDensityKernel, "AdvectDensity");
+    setName(JacobiKernel, "Jacobi");
+    setName(SubtractGradientKernel, "SubtractGradient");
+    setName(ComputeDivergenceKernel, "ComputeDivergence");
+    setName(AddInkKernel, "AddInk");
+    setName(AddVelocityKernel, "AddVelocity");
+
+    if (Velocity.Ping.FboHandle) {
+        LOG_INFO("glDelete Velocity.Ping.FboHandle = %u", Velocity.Ping.FboHandle);
+        deleteSurface(Velocity.Ping);
+    }
+    Velocity.Ping = CreateSurface(GridWidth, GridHeight);
+    if (Density.Ping.FboHandle) {
+        LOG_INFO("glDelete Density.Ping.FboHandle = %u", Density.Ping.FboHandle);
+        deleteSurface(Density.Ping);
+        deleteSurface(Density.Pong);
+    }
+    Density = CreateData(InkWidth, InkHeight);
+    allocateBuffers(*this);
+    CreateQuad();
+    // For the host's own blending; the library never enables it.
+    glBlendFunc(GL_SRC_ALPHA, GL_ONE_MINUS_SRC_ALPHA);
+    glViewport(0, 0, InkWidth, InkHeight);
+    ClearSurface(Density.Ping, 0.0f, 0.0f, 0.0f, 0.0f);
+    ClearSurface(Density.Pong, 0.0f, 0.0f, 0.0f, 0.0f);
 }

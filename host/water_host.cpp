@@ -18,8 +18,14 @@ constexpr double kLongestFrame = 0.25;
 // A wave's turning point is slow as well, so the water rests only after this many calm steps in a row.
 constexpr int kStepsToRest = 30;
 
+// Ink has faded below the smallest step of its texture this many frames after the finger has left: the slowest preset
+// keeps 0.94 of it a frame, and 127 * 0.94^n < 1 / 255 for n = 168.
+constexpr int kFramesToFade = 180;
+
 // A finger that moves raises one ripple every so many cells of the mesh.
 constexpr float kTrailCells = 1.5f;
+constexpr float kLongestTrail = 200.0f;
+constexpr float kTrailShare = 0.12f;  // of a tap's height
 
 void handOverOne(void (*transfer)(JNIEnv*, jobject, jobject), const Picture& picture) {
     DesktopBitmap bitmap;
@@ -79,6 +85,8 @@ void WaterHost::handOver(const Picture& portrait, const Picture& landscape, cons
 }
 
 void WaterHost::setUp(bool withInk) {
+    withInk_ = withInk;
+    inkFrames_ = 0;
     JNIEnv* const env = hostEnvironment();
     NATIVE(onInitSetting)(env, nullptr, width_, height_, withInk);
     NATIVE(onInitGPU)(env, nullptr);
@@ -92,23 +100,36 @@ void WaterHost::setUp(bool withInk) {
 }
 
 void WaterHost::touch(TouchAction action, int x, int y, float pressure) {
+    raiseTouchRipples(action, x, y, look_.touchAmplitude * pressure);
+    if (!withInk_) return;
+    NATIVE(onTouch)(hostEnvironment(), nullptr, x, y, static_cast<jint>(action), pressure);
+    fingerDown_ = action == TouchAction::down || action == TouchAction::move;
+    inkFrames_ = kFramesToFade;
+}
+
+void WaterHost::raiseTouchRipples(TouchAction action, int x, int y, float amplitude) {
     const float modelX = (static_cast<float>(x) / static_cast<float>(width_) - 0.5f) * visibleWidth_;
     const float modelY = (0.5f - static_cast<float>(y) / static_cast<float>(height_)) * visibleHeight_;
-    const float amplitude = look_.touchAmplitude * pressure;
     if (action == TouchAction::down) {
         raiseRipple(modelX, modelY, amplitude);
     } else if (action == TouchAction::move) {
-        const float cell = static_cast<float>(look_.meshExtent) / static_cast<float>(look_.meshVertices - 1);
-        const float distance = std::hypot(modelX - touchX_, modelY - touchY_);
-        if (distance < kTrailCells * cell) return;
-        const int ripples = static_cast<int>(distance / (kTrailCells * cell));
-        for (int i = 1; i <= ripples; ++i) {
-            const float t = static_cast<float>(i) / static_cast<float>(ripples);
-            raiseRipple(touchX_ + (modelX - touchX_) * t, touchY_ + (modelY - touchY_) * t, amplitude * 0.12f);
+        const float spacing =
+            kTrailCells * static_cast<float>(look_.meshExtent) / static_cast<float>(look_.meshVertices - 1);
+        const float dx = modelX - touchX_;
+        const float dy = modelY - touchY_;
+        const float ripples = std::floor(std::min(std::sqrt(dx * dx + dy * dy) / spacing, kLongestTrail));
+        if (ripples < 1.0f) return;
+        for (float i = 1.0f; i <= ripples; i += 1.0f) {
+            raiseRipple(touchX_ + dx * (i / ripples), touchY_ + dy * (i / ripples), amplitude * kTrailShare);
         }
     }
     touchX_ = modelX;
     touchY_ = modelY;
+}
+
+void WaterHost::clearInk() {
+    NATIVE(clearInkValue)(hostEnvironment(), nullptr);
+    changed_ = true;
 }
 
 bool WaterHost::advance(double seconds) {
@@ -118,7 +139,7 @@ bool WaterHost::advance(double seconds) {
         if (raining_) dropRain();
         if (calmSteps_ < kStepsToRest) stepWater();
     }
-    return changed_;
+    return changed_ || (withInk_ && fingerDown_) || inkFrames_ > 0;
 }
 
 void WaterHost::stepWater() {
@@ -177,4 +198,5 @@ void WaterHost::draw() {
      look_.alphaScale2, look_.inkRed, look_.inkGreen, look_.inkBlue, look_.fresnelRatio, look_.specularRatio,
      look_.exponent, width_ > height_);
     changed_ = false;
+    if (inkFrames_ > 0) --inkFrames_;
 }

@@ -37,10 +37,14 @@ public:
     // Advances the water by `seconds` and says whether the picture has changed since the last draw.
     bool advance(double seconds);
 
-    // Draws one frame into the current framebuffer.
+    // Draws one frame into the current framebuffer. With ink, this is also one step of the ink.
     void draw();
 
+    // Lets all ink vanish with the next frame.
+    void clearInk();
+
 private:
+    void raiseTouchRipples(TouchAction action, int x, int y, float amplitude);
     void stepWater();
     void dropRain();
     void raiseRipple(float x, float y, float amplitude);  // position in model units
@@ -51,6 +55,9 @@ private:
     int height_ = 0;
     std::minstd_rand random_;
     bool raining_ = false;
+    bool withInk_ = false;
+    bool fingerDown_ = false;
+    int inkFrames_ = 0;      // frames until the ink has faded
     bool changed_ = true;    // since the last draw
     int calmSteps_;          // calm steps in a row
     double dueSteps_ = 0.0;  // steps that the time passed so far still asks for

@@ -2,7 +2,9 @@
 
 #include "fluid/fluid.h"
 #include "jni/bitmaps.h"
+#include "jni/gesture.h"
 #include "jni/globals.h"
+#include "jni/ink_frame.h"
 #include "jni/log.h"
 #include "jni/natives.h"
 #include "water/mesh.h"
@@ -86,16 +88,23 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
     env->ReleaseFloatArrayElements(field, values, 0);
 }
 
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onTouch(
+    JNIEnv*, jobject, jint x, jint y, jint action, jfloat pressure) {
+    touch(x, y, action, pressure);
+}
+
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onDrawFrame(
     JNIEnv* env, jobject, jfloatArray positions, jfloatArray heightAttribs, jshortArray indices, jint positionFloats,
     jint heightFloats, jint indexCount, jfloatArray mvp, jint meshSizeWidth, jint meshSizeHeight, jint numDetailsWidth,
-    jint numDetailsHeight, jfloat refractiveIndex, jfloat alphaMix, jfloat alphaScale1, jfloat alphaScale2, jfloat,
-    jfloat, jfloat, jfloat fresnelRatio, jfloat specularRatio, jfloat exponent, jboolean landscape) {
+    jint numDetailsHeight, jfloat refractiveIndex, jfloat alphaMix, jfloat alphaScale1, jfloat alphaScale2,
+    jfloat inkRed, jfloat inkGreen, jfloat inkBlue, jfloat fresnelRatio, jfloat specularRatio, jfloat exponent,
+    jboolean landscape) {
     glViewport(0, 0, SCREEN_WIDTH, SCREEN_HEIGHT);
     jfloat* const p = env->GetFloatArrayElements(positions, nullptr);
     jfloat* const h = env->GetFloatArrayElements(heightAttribs, nullptr);
     jfloat* const m = env->GetFloatArrayElements(mvp, nullptr);
     jshort* const i = env->GetShortArrayElements(indices, nullptr);
+    if (bWithInk) stepInk({inkRed, inkGreen, inkBlue});
     fluid.Ripple_Render(
         p, h, i, positionFloats, heightFloats, indexCount, m, meshSizeWidth, meshSizeHeight, numDetailsWidth,
         numDetailsHeight, refractiveIndex, alphaMix, alphaScale1, alphaScale2, fresnelRatio, specularRatio, exponent,

@@ -56,6 +56,11 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
     JNIEnv* env, jobject, jfloatArray field, jint extentA, jint extentB, jint countA, jint countB, jfloat posA,
     jfloat posB, jfloat amplitude);
 
+// Takes one touch event: pixels of the view from the top left, the action code of android.view.MotionEvent, and the
+// pressure. Drops ink with the next frame when the ink is on.
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onTouch(
+    JNIEnv* env, jobject, jint x, jint y, jint action, jfloat pressure);
+
 // Draws one frame into the current framebuffer, without clearing it. positions and heightAttribs hold 3 floats a
 // vertex, indices unsigned vertex numbers, mvp 16 floats by columns.
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onDrawFrame(

@@ -33,7 +33,7 @@ int main(int argc, char** argv) {
     file("--script", options.script, "Touches to play, one \"time_ms action x y pressure\" a line");
     app.add_flag("--rain", options.rain, "Let it rain, as it does anyway where there is no script");
     app.add_option("--size", size, "Size of the view in pixels")->type_name("WxH")->capture_default_str();
-    app.add_option("--seconds", options.seconds, "Length of the scene")->capture_default_str();
+    app.add_option("--seconds", options.seconds, "Length of the scene; by default the script's and a little more");
     app.add_option("--fps", options.framesPerSecond, "Frames a second")->capture_default_str();
     app.add_option("--out", options.out, "Directory for frame-0000.png and so on; \"out\" where there is no video")
         ->type_name("DIR");
@@ -53,8 +53,9 @@ int main(int argc, char** argv) {
     const std::optional<Size> parsedSize = parseSize(size);
     if (!parsedSize) return fail("--size " + size + " is not WIDTHxHEIGHT with sides of 1 to 8192 pixels");
     options.size = *parsedSize;
-    if (!(options.seconds > 0.0 && options.seconds <= 3600.0))
+    if (options.seconds && !(*options.seconds > 0.0 && *options.seconds <= 3600.0)) {
         return fail("--seconds must be above 0 and at most 3600");
+    }
     // The host takes longer frames for a pause.
     if (options.framesPerSecond < 4 || options.framesPerSecond > 240) return fail("--fps must be 4 to 240");
     if (*inkOption && !(options.inkColour = parseInkColour(ink))) return fail("--ink " + ink + " is not #rrggbb");

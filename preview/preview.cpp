@@ -91,10 +91,15 @@ void readFrame(Picture& frame) {
     }
 }
 
+int countFrames(const PreviewOptions& options, const std::vector<TouchEvent>& events) {
+    const double ownLength = events.empty() ? 4.0 : static_cast<double>(events.back().timeMs) / 1000.0 + 1.5;
+    return std::max(1, static_cast<int>(std::lround(options.seconds.value_or(ownLength) * options.framesPerSecond)));
+}
+
 bool drawFrames(
-    const PreviewOptions& options, WaterHost& host, TouchPlayer& touches, Outputs& outputs, std::string& error) {
+    const PreviewOptions& options, int frames, WaterHost& host, TouchPlayer& touches, Outputs& outputs,
+    std::string& error) {
     const auto [width, height] = options.size;
-    const int frames = std::max(1, static_cast<int>(std::lround(options.seconds * options.framesPerSecond)));
     Picture frame{width, height, std::vector<std::uint8_t>(4 * static_cast<std::size_t>(width * height))};
     Progress progress(frames);
     for (int i = 0; i < frames; ++i) {
@@ -145,6 +150,7 @@ bool runPreview(const PreviewOptions& options, std::string& error) {
     host.handOver(pictures.portrait, pictures.landscape, pictures.water);
     host.setUp(options.withInk);
     host.rain(options.rain);
+    const int frames = countFrames(options, events);
     TouchPlayer touches(std::move(events), width, height);
-    return drawFrames(options, host, touches, outputs, error);
+    return drawFrames(options, frames, host, touches, outputs, error);
 }

@@ -13,7 +13,7 @@ struct PreviewOptions {
     std::string script;                      // file
     bool rain = false;
     Size size = {540, 960};
-    double seconds = 4.0;
+    std::optional<double> seconds;  // or the script's length and a little for the water to calm
     int framesPerSecond = 30;
     std::string out;    // directory
     std::string video;  // file

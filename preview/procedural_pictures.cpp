@@ -48,7 +48,7 @@ static float sampleHalf(const std::vector<float>& net, int netWidth, int netHeig
 
 // What the eye sees of a stone under `depth` of water: 0 is shallow and warm, 1 deep and blue-green.
 static Rgb underWater(Rgb stone, float depth, float caustic) {
-    const float sun = (0.65f + 0.85f * std::min(caustic, 4.5f)) * (1.30f - 0.50f * depth);
+    const float sun = (0.75f + 0.95f * std::min(caustic, 4.5f)) * (1.30f - 0.50f * depth);
     return {
         expose(stone.r * sun * (1.20f - 0.80f * depth) + 0.002f),
         expose(stone.g * sun * (1.10f - 0.28f * depth) + 0.003f + 0.016f * depth),

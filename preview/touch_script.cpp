@@ -10,8 +10,8 @@
 
 namespace {
 
-// Longest time and farthest position that a script may name: a day, and what an int holds with room to spare.
-constexpr std::int64_t kLongestTimeMs = 24 * 3600 * 1000;
+// Longest time and farthest position that a script may name: an hour, and what an int holds with room to spare.
+constexpr std::int64_t kLongestTimeMs = 3600 * 1000;
 constexpr double kFarthest = 1.0e6;
 
 template <class Number>
@@ -47,7 +47,7 @@ std::string parseLine(std::istringstream& words, std::int64_t earliestMs, TouchE
         return "expected \"time_ms action x y pressure\"";
     }
     if (!parseNumber(time, event.timeMs) || event.timeMs < 0 || event.timeMs > kLongestTimeMs) {
-        return "the time \"" + time + "\" is not a number of milliseconds within a day";
+        return "the time \"" + time + "\" is not a number of milliseconds within an hour";
     }
     if (event.timeMs < earliestMs) {
         return "the time " + time + " is before that of the event above, " + std::to_string(earliestMs);

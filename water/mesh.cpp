@@ -3,8 +3,9 @@
 #include <cstddef>
 #include <initializer_list>
 
-void fillPositions(float* positions, int vertexCount, int meshSizeWidth, int meshSizeHeight, int numDetailsWidth,
-                   int numDetailsHeight) {
+void fillPositions(
+    float* positions, int vertexCount, int meshSizeWidth, int meshSizeHeight, int numDetailsWidth,
+    int numDetailsHeight) {
     if (numDetailsHeight < 1) return;
     const float stepX = static_cast<float>(meshSizeWidth) / static_cast<float>(numDetailsWidth - 1);
     const float stepY = static_cast<float>(meshSizeHeight) / static_cast<float>(numDetailsHeight - 1);

@@ -20,11 +20,11 @@ void enableVec3(GLuint attribute, GLuint buffer) {
 
 }  // namespace
 
-void Fluid::Ripple_Render(const float* positions, const float* heightAttribs, const short* indices, int positionFloats,
-                          int heightFloats, int indexCount, const float* mvp, int meshSizeWidth, int meshSizeHeight,
-                          int numDetailsWidth, int numDetailsHeight, float refractiveIndex, float alphaMix,
-                          float alphaScale1, float alphaScale2, float fresnelRatio, float specularRatio, float exponent,
-                          bool, bool landscape) {
+void Fluid::Ripple_Render(
+    const float* positions, const float* heightAttribs, const short* indices, int positionFloats, int heightFloats,
+    int indexCount, const float* mvp, int meshSizeWidth, int meshSizeHeight, int numDetailsWidth, int numDetailsHeight,
+    float refractiveIndex, float alphaMix, float alphaScale1, float alphaScale2, float fresnelRatio,
+    float specularRatio, float exponent, bool withInk, bool landscape) {
     const GLuint program = ripple_program;
     glViewport(0, 0, ScreenWidth, ScreenHeight);
     glUseProgram(program);
@@ -43,6 +43,16 @@ void Fluid::Ripple_Render(const float* positions, const float* heightAttribs, co
     upload(GL_ELEMENT_ARRAY_BUFFER, i_buf, std::ptrdiff_t{indexCount} * 2, indices);
     enableVec3(aHeights, h_buf);
     enableVec3(aPosition, v_buf);
+
+    if (withInk) {
+        const double a = 1.5 - double{InkColorOffset};
+        const auto tint = [a](float channel) { return static_cast<float>(a / double{channel} - 1.0); };
+        setUniform(program, "Scale", 1.0f / static_cast<float>(ScreenWidth), 1.0f / static_cast<float>(ScreenHeight));
+        setUniform(program, "ink_color", tint(InkColor.r), tint(InkColor.g), tint(InkColor.b));
+        setUniform(program, "intensity", InkIntensity * ClearInkValue);
+        bindTextureUnit(GL_TEXTURE2, Density.Ping.TextureHandle);
+        setUniform(program, "Density", 2);
+    }
 
     setUniform(program, "alphaRatio1", alphaMix * alphaScale1);
     setUniform(program, "alphaRatio2", static_cast<float>(double{alphaScale2} * (1.0 - double{alphaMix})));

@@ -23,8 +23,9 @@ int toIndex(float value) {
 // The seven cells around `centre`, kept off the cells 0, 1 and count - 1. All tests fail for a centre that is not
 // a number, which then gets the whole axis: nothing is within reach of it.
 Range boxAround(float centre, int count) {
-    return {centre > 5.0f ? toIndex(centre - kReach) : 2,
-            static_cast<float>(count - 5) > centre ? toIndex(centre + 4.0f) : count - 1};
+    return {
+        centre > 5.0f ? toIndex(centre - kReach) : 2,
+        static_cast<float>(count - 5) > centre ? toIndex(centre + 4.0f) : count - 1};
 }
 
 }  // namespace

@@ -1,5 +1,10 @@
 precision mediump float;
 // Water without ink: the picture behind it, and the water texture on the waves.
+#ifdef GL_FRAGMENT_PRECISION_HIGH
+#define FULL highp
+#else
+#define FULL mediump
+#endif
 uniform sampler2D sWaterTexture;
 uniform sampler2D sBGTexture;
 uniform float alphaRatio1;
@@ -8,7 +13,7 @@ uniform float specularRatio;
 uniform float exponent;
 uniform float viewportHeight;
 varying vec2 vWaterTextureCoord;
-varying vec2 vBGTexture1Coord;
+varying FULL vec2 vBGTexture1Coord;
 varying vec3 vNormal;
 varying vec3 vHalfVec;
 varying float vHeights;

@@ -1,13 +1,11 @@
 #include "water/waves.h"
 
 #include <cstddef>
-#include <cstdlib>
 #include <cstring>
-#include <memory>
-#include <new>
 
-#include "jni/log.h"
+#include "tshader/flush_denormals.h"
 #include "tshader/groups.h"
+#include "tshader/scratch.h"
 
 namespace {
 
@@ -24,25 +22,12 @@ F laplacian(const float* h, std::ptrdiff_t stride) {
     return sum;
 }
 
-// The integrated heights of the region and of the vertices around it, so that smoothing can write the host's
-// array while it still reads the neighbours' old heights. Lives across calls: a step allocates nothing once warm.
-struct Snapshot {
-    std::unique_ptr<float[]> heights;
-    std::size_t capacity = 0;
+// The integrated heights of the region and of the vertices around it, so that smoothing can write the host's array
+// while it still reads the neighbours' old heights.
+Scratch<float> snapshot("smoothing the water");
 
-    float* reserve(std::size_t count) {
-        if (count > capacity) {
-            heights.reset(new (std::nothrow) float[count]);
-            capacity = heights ? count : 0;
-        }
-        return heights.get();
-    }
-};
-
-Snapshot snapshot;
-
-void accelerate(float* velocity, const float* height, std::ptrdiff_t stride, int width, float damping,
-                float waveSpeed) {
+void accelerate(
+    float* velocity, const float* height, std::ptrdiff_t stride, int width, float damping, float waveSpeed) {
     forGroups(0, width, [=](auto lanes, int x) {
         using F = decltype(lanes);
         store((laplacian<F>(height + x, stride) * waveSpeed + load<F>(velocity + x)) * damping, velocity + x);
@@ -88,12 +73,14 @@ void smooth(float* height, const float* copy, std::ptrdiff_t copyStride, int wid
 
 }  // namespace
 
-bool stepWaves(float* velocity, float* height, const WaveRegion& region, bool checkCalm, float damping,
-               float waveSpeed) {
+bool stepWaves(
+    float* velocity, float* height, const WaveRegion& region, bool checkCalm, float damping, float waveSpeed) {
     const int width = region.xEnd - region.xStart;
     const int rows = region.yEnd - region.yStart;
     if (rows <= 0 || width <= 0) return true;
 
+    // A surface that comes to rest ends in denormals and stays there.
+    const FlushDenormals flush;
     const std::ptrdiff_t stride = region.stride;
     const std::ptrdiff_t start = region.yStart * stride + region.xStart;
     float* const v = velocity + start;
@@ -107,7 +94,6 @@ bool stepWaves(float* velocity, float* height, const WaveRegion& region, bool ch
 
     const std::ptrdiff_t copyStride = std::ptrdiff_t{width} + 2;
     float* const copies = snapshot.reserve(static_cast<std::size_t>(copyStride) * (static_cast<std::size_t>(rows) + 2));
-    if (!copies) LOG_ERROR("no memory to smooth a surface of %d x %d", width, rows);
     float* const s = copies ? copies + copyStride + 1 : nullptr;
     for (int row = 0; row < rows; ++row) {
         integrate(h + row * stride, v + row * stride, s ? s + row * copyStride : nullptr, width);

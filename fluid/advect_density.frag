@@ -1,0 +1,38 @@
+precision mediump float;
+// Carries the ink back along the velocity and fades it. Velocity texel: R + G/255 and B + A/255 are x and y, raised by
+// 127. Density texel: R holds the whole part, G the fraction.
+#ifdef GL_FRAGMENT_PRECISION_HIGH
+#define FULL highp
+#else
+#define FULL mediump
+#endif
+uniform FULL sampler2D VelocityTexture;
+uniform FULL sampler2D SourceTexture;
+uniform FULL vec2 TimeStep;
+uniform float BackwardStepSize;
+uniform float Dissipation;
+uniform FULL vec2 Scale;
+uniform FULL vec2 center;
+uniform int drag;
+varying FULL vec2 v_texCoord;
+
+// Half precision has 11 bits, and two bytes of ink need 15.
+FULL vec2 encode(FULL float value) {
+    value = clamp(value, -127.0, 127.0);
+    FULL vec2 packed2 = fract(value * vec2(0.00392157, 1.0));
+    packed2.x -= packed2.y / 255.0;
+    return packed2;
+}
+
+void main() {
+    FULL vec4 buf = texture2D(VelocityTexture, v_texCoord);
+    FULL vec2 u = vec2(255.0 * buf.x + buf.y, 255.0 * buf.z + buf.w) - 127.0;
+    FULL float backStep = BackwardStepSize;
+    if (drag < 2) {
+        FULL float d = distance(center, Scale * v_texCoord);
+        if (d < 80.0) backStep = 0.0075 * d;
+    }
+    FULL vec2 coord = v_texCoord - backStep * TimeStep * u;
+    buf = texture2D(SourceTexture, coord);
+    gl_FragColor = vec4(encode(Dissipation * (255.0 * buf.x + buf.y)), 0.0, 0.0);
+}

@@ -1,0 +1,54 @@
+#include "fluid/fluid.h"
+#include "fluid/touch_point.h"
+#include "gl/texture_units.h"
+#include "gl/uniforms.h"
+#include "jni/globals.h"
+
+void Fluid::AdvectDensity(Surface_ velocitySurface, Surface_ source, Surface_ destination, float dissipation) {
+    const GLuint program = advect_density_program;
+    const double texelsPerSpeed = 0.9 * double{TimeStep};
+    glUseProgram(program);
+    setUniform(program, "Scale", static_cast<float>(ScreenWidth), static_cast<float>(ScreenHeight));
+    setUniform(
+        program, "TimeStep", static_cast<float>(texelsPerSpeed / GridWidth),
+        static_cast<float>(texelsPerSpeed / GridHeight));
+    setUniform(program, "Dissipation", dissipation);
+    setUniform(program, "BackwardStepSize", BackwardStepSize);
+    setUniform(program, "center", static_cast<float>(POSITION_X), static_cast<float>(flippedTouchY(*this)));
+    setUniform(program, "drag", DragMode);
+    setUniform(program, "SourceTexture", 1);
+    glBindFramebuffer(GL_FRAMEBUFFER, destination.FboHandle);
+    bindTextureUnit(GL_TEXTURE0, velocitySurface.TextureHandle);
+    bindTextureUnit(GL_TEXTURE1, source.TextureHandle);
+    DrawQuad();
+    ResetState();
+}
+
+void Fluid::AddInk(Surface_ source, Surface_ destination, int mode, Vector_ previous, Vector_ current, float impulse) {
+    const GLuint program = addInk_program;
+    const Segment segment = segmentBetween(previous, current);
+    glViewport(0, 0, InkWidth, InkHeight);
+    glUseProgram(program);
+    setUniform(program, "current", current.x, current.y);
+    setUniform(program, "previous", previous.x, previous.y);
+    setUniform(program, "normal", segment.normal.x, segment.normal.y);
+    setUniform(program, "len", segment.length);
+    setUniform(program, "Radius", Radius);
+    setUniform(program, "ImpulseDensity", impulse);
+    setUniform(program, "Scale", static_cast<float>(ScreenWidth), static_cast<float>(ScreenHeight));
+    setUniform(program, "mode", mode);
+    setUniform(program, "Source", 0);
+    glBindFramebuffer(GL_FRAMEBUFFER, destination.FboHandle);
+    bindTextureUnit(GL_TEXTURE0, source.TextureHandle);
+    DrawQuad();
+    ResetState();
+}
+
+void Fluid::Inject(int mode, float x1, float y1, float x2, float y2, Color_ color) {
+    recordStroke(*this, x1, y1, x2, y2);
+    InkColor = color;
+    // Without the buffers nothing would ever carry this ink away.
+    if (isBoundary(POSITION_X, POSITION_Y) || !VelocityTex.data) return;
+    AddInk(Density.Ping, Density.Pong, mode, Previous, Current, ImpulseDensity);
+    SwapSurfaces(&Density);
+}

@@ -1,0 +1,62 @@
+#include "preview/picture_file.h"
+
+#include <gtest/gtest.h>
+#include <stb/stb_image_write.h>
+
+#include <filesystem>
+
+static std::string scratch(const char* name) {
+    return (std::filesystem::path(testing::TempDir()) / name).string();
+}
+
+TEST(PictureFile, ReadsPngAndJpegOfAnyKindAsOpaqueRgba) {
+    const unsigned char rgb[] = {255, 0, 0, 0, 255, 0, 0, 0, 255, 10, 20, 30, 40, 50, 60, 70, 80, 90};
+    const std::string png = scratch("rgb.png");
+    ASSERT_TRUE(stbi_write_png(png.c_str(), 3, 2, 3, rgb, 9));
+    std::string error;
+    const std::optional<Picture> read = loadPicture(png, error);
+    ASSERT_TRUE(read) << error;
+    EXPECT_EQ(read->width, 3);
+    EXPECT_EQ(read->height, 2);
+    const std::vector<std::uint8_t> expected = {255, 0,  0,  255, 0,  255, 0,  255, 0,  0,  255, 255,
+                                                10,  20, 30, 255, 40, 50,  60, 255, 70, 80, 90,  255};
+    EXPECT_EQ(read->rgba, expected);
+
+    const std::vector<unsigned char> grey(16 * 16, 100);
+    const std::string jpeg = scratch("grey.jpg");
+    ASSERT_TRUE(stbi_write_jpg(jpeg.c_str(), 16, 16, 1, grey.data(), 95));
+    const std::optional<Picture> greyRead = loadPicture(jpeg, error);
+    ASSERT_TRUE(greyRead) << error;
+    ASSERT_EQ(greyRead->rgba.size(), 16U * 16 * 4);
+    EXPECT_NEAR(greyRead->rgba[0], 100, 2);
+    EXPECT_NEAR(greyRead->rgba[2], 100, 2);
+    EXPECT_EQ(greyRead->rgba[3], 255);
+
+    // Half a file is no picture.
+    std::filesystem::resize_file(png, std::filesystem::file_size(png) / 2);
+    EXPECT_FALSE(loadPicture(png, error));
+    EXPECT_NE(error.find(png), std::string::npos) << error;
+}
+
+TEST(PictureFile, FitsLargePicturesInTheirOwnProportions) {
+    Picture wide{400, 100, {}};
+    for (int i = 0; i < 400 * 100; ++i) {
+        const bool left = i % 400 < 200;
+        wide.rgba.insert(
+            wide.rgba.end(),
+            {static_cast<std::uint8_t>(left ? 200 : 10), 50, static_cast<std::uint8_t>(left ? 10 : 200), 255});
+    }
+    EXPECT_EQ(fitPicture(wide, 400).rgba, wide.rgba);
+    const Picture fitted = fitPicture(wide, 200);
+    ASSERT_EQ(fitted.width, 200);
+    ASSERT_EQ(fitted.height, 50);
+    ASSERT_EQ(fitted.rgba.size(), 200U * 50 * 4);
+    const std::size_t middleRow = 25 * 200 * 4;
+    EXPECT_NEAR(fitted.rgba[middleRow + 20 * 4], 200, 2);
+    EXPECT_NEAR(fitted.rgba[middleRow + 180 * 4], 10, 2);
+    EXPECT_NEAR(fitted.rgba[middleRow + 180 * 4 + 2], 200, 2);
+
+    const Picture line = fitPicture({1000, 1, std::vector<std::uint8_t>(4000, 7)}, 100);
+    EXPECT_EQ(line.width, 100);
+    EXPECT_EQ(line.height, 1);
+}

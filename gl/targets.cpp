@@ -4,6 +4,9 @@
 #include "gl/texture_units.h"
 #include "jni/log.h"
 
+// No GPU has larger textures, and a driver is known to crash on sizes far beyond its limit instead of refusing them.
+static constexpr int kLargestSide = 65536;
+
 Surface_ Fluid::CreateSurface(int width, int height) {
     LOG_ERROR("CreateSurface");
     Surface_ surface;
@@ -17,7 +20,9 @@ Surface_ Fluid::CreateSurface(int width, int height) {
     glTexParameteri(GL_TEXTURE_2D, GL_TEXTURE_WRAP_T, GL_CLAMP_TO_EDGE);
     glTexParameteri(GL_TEXTURE_2D, GL_TEXTURE_MIN_FILTER, GL_LINEAR);
     glTexParameteri(GL_TEXTURE_2D, GL_TEXTURE_MAG_FILTER, GL_LINEAR);
-    glTexImage2D(GL_TEXTURE_2D, 0, GL_RGBA, width, height, 0, GL_RGBA, GL_UNSIGNED_BYTE, nullptr);
+    if (width <= kLargestSide && height <= kLargestSide) {
+        glTexImage2D(GL_TEXTURE_2D, 0, GL_RGBA, width, height, 0, GL_RGBA, GL_UNSIGNED_BYTE, nullptr);
+    }
     glFramebufferTexture2D(GL_FRAMEBUFFER, GL_COLOR_ATTACHMENT0, GL_TEXTURE_2D, surface.TextureHandle, 0);
     const GLenum status = glCheckFramebufferStatus(GL_FRAMEBUFFER);
     if (status != GL_FRAMEBUFFER_COMPLETE) LOG_INFO("FRAMEBUFFER_ERROR - %d", static_cast<int>(status));

@@ -27,7 +27,8 @@ void JacobiTShaderImpl::run() {
     const float alpha = Alpha;
     const float inverseBeta = InverseBeta;
 
-    std::fill(output.row(0), output.row(height), 0.0f);
+    std::fill_n(output.row(0), width, 0.0f);
+    std::fill_n(output.row(height - 1), width, 0.0f);
     for (int j = 1; j < height - 1; ++j) {
         const float* pressure = Pressure.row(j);
         const float* below = Pressure.row(j - 1);
@@ -35,6 +36,7 @@ void JacobiTShaderImpl::run() {
         const float* divergence = Divergence.row(j);
         float* out = output.row(j);
 
+        out[0] = 0.0f;
         forGroups(1, width - 1, [=]<class F>(F, int i) {
             store(
                 relax(
@@ -42,5 +44,6 @@ void JacobiTShaderImpl::run() {
                     load<F>(divergence + i), alpha, inverseBeta),
                 out + i);
         });
+        out[width - 1] = 0.0f;
     }
 }

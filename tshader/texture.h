@@ -29,7 +29,7 @@ inline F clampToUnit(F c) {
     return c > 0.0f ? (c < 1.0f ? c : 1.0f) : 0.0f;
 }
 
-// Bilinear weights of four neighbouring texels, for one sample or for four at once.
+// The bilinear blend of four neighbouring texels, for one sample or for four at once.
 template <class F, class T>
 inline T bilinear(T t00, T t10, T t01, T t11, F tx, F ty) {
     return (1.0f - tx) * (1.0f - ty) * t00 + tx * (1.0f - ty) * t10 + (1.0f - tx) * ty * t01 + tx * ty * t11;

@@ -6,6 +6,7 @@
 
 #include <array>
 #include <cstdint>
+#include <cstdlib>
 #include <memory>
 #include <string>
 #include <vector>
@@ -29,6 +30,8 @@ protected:
 
     // Loses everything that the last context held.
     void renewContext(int width = kSide, int height = kSide) {
+        // An OpenGL ES 2.0 driver, so that the use of anything newer shows.
+        setenv("MESA_GLES_VERSION_OVERRIDE", "2.0", 1);
         std::string error;
         context_.reset();
         context_ = HeadlessContext::create(width, height, error);

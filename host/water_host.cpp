@@ -8,25 +8,6 @@
 
 namespace {
 
-// A flat surface shows the picture 1.5 percent larger than the mesh, because the eye looks through the surface onto
-// a picture that lies a little behind it.
-constexpr float kPictureZoom = 1.015f;
-
-// Longest time that one frame may bring, in seconds: after a pause the water goes on and does not catch up.
-constexpr double kLongestFrame = 0.25;
-
-// A wave's turning point is slow as well, so the water rests only after this many calm steps in a row.
-constexpr int kStepsToRest = 30;
-
-// Ink has faded below the smallest step of its texture this many frames after the finger has left: the slowest preset
-// keeps 0.94 of it a frame, and 127 * 0.94^n < 1 / 255 for n = 168.
-constexpr int kFramesToFade = 180;
-
-// A finger that moves raises one ripple every so many cells of the mesh.
-constexpr float kTrailCells = 1.5f;
-constexpr float kLongestTrail = 200.0f;
-constexpr float kTrailShare = 0.12f;  // of a tap's height
-
 void handOverOne(void (*transfer)(JNIEnv*, jobject, jobject), const Picture& picture) {
     DesktopBitmap bitmap;
     bitmap.info.width = static_cast<std::uint32_t>(picture.width);
@@ -51,7 +32,7 @@ std::size_t indexCount(const Look& look) {
 WaterHost::WaterHost(const Look& look, int width, int height, std::uint32_t seed)
     : look_(look),
       random_(seed),
-      calmSteps_(kStepsToRest),
+      calmSteps_(look.stepsToRest),
       positions_(3 * vertexCount(look)),
       indices_(indexCount(look)),
       velocity_(vertexCount(look)),
@@ -67,7 +48,7 @@ void WaterHost::resize(int width, int height) {
     // The mesh is a square around the view, so that its cells are squares on the screen and rings stay round. The
     // view shows the middle of it.
     const auto extent = static_cast<float>(look_.meshExtent);
-    const float pixel = extent / kPictureZoom / static_cast<float>(std::max(width, height));
+    const float pixel = extent / look_.pictureZoom / static_cast<float>(std::max(width, height));
     visibleWidth_ = pixel * static_cast<float>(width);
     visibleHeight_ = pixel * static_cast<float>(height);
     pictureWidth_ = static_cast<int>(std::ceil(visibleWidth_));
@@ -104,7 +85,7 @@ void WaterHost::touch(TouchAction action, int x, int y, float pressure) {
     if (!withInk_) return;
     NATIVE(onTouch)(hostEnvironment(), nullptr, x, y, static_cast<jint>(action), pressure);
     fingerDown_ = action == TouchAction::down || action == TouchAction::move;
-    inkFrames_ = kFramesToFade;
+    inkFrames_ = look_.framesToFade;
 }
 
 void WaterHost::raiseTouchRipples(TouchAction action, int x, int y, float amplitude) {
@@ -114,13 +95,14 @@ void WaterHost::raiseTouchRipples(TouchAction action, int x, int y, float amplit
         raiseRipple(modelX, modelY, amplitude);
     } else if (action == TouchAction::move) {
         const float spacing =
-            kTrailCells * static_cast<float>(look_.meshExtent) / static_cast<float>(look_.meshVertices - 1);
+            look_.trailCells * static_cast<float>(look_.meshExtent) / static_cast<float>(look_.meshVertices - 1);
         const float dx = modelX - touchX_;
         const float dy = modelY - touchY_;
-        const float ripples = std::floor(std::min(std::sqrt(dx * dx + dy * dy) / spacing, kLongestTrail));
-        if (ripples < 1.0f) return;
-        for (float i = 1.0f; i <= ripples; i += 1.0f) {
-            raiseRipple(touchX_ + dx * (i / ripples), touchY_ + dy * (i / ripples), amplitude * kTrailShare);
+        const int ripples = static_cast<int>(std::min(std::sqrt(dx * dx + dy * dy) / spacing, look_.longestTrail));
+        if (ripples < 1) return;
+        for (int i = 1; i <= ripples; ++i) {
+            const float t = static_cast<float>(i) / static_cast<float>(ripples);
+            raiseRipple(touchX_ + dx * t, touchY_ + dy * t, amplitude * look_.trailShare);
         }
     }
     touchX_ = modelX;
@@ -133,11 +115,11 @@ void WaterHost::clearInk() {
 }
 
 bool WaterHost::advance(double seconds) {
-    dueSteps_ += std::min(seconds, kLongestFrame) * look_.stepsPerSecond;
+    dueSteps_ += std::min(seconds, double{look_.longestFrame}) * look_.stepsPerSecond;
     // The small extra lets a frame of exactly one step's length bring its step in spite of rounding.
     for (; dueSteps_ > 1.0 - 1.0e-6; dueSteps_ -= 1.0) {
         if (raining_) dropRain();
-        if (calmSteps_ < kStepsToRest) stepWater();
+        if (calmSteps_ < look_.stepsToRest) stepWater();
     }
     return changed_ || (withInk_ && fingerDown_) || inkFrames_ > 0;
 }

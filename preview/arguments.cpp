@@ -28,7 +28,7 @@ std::optional<Size> parseSize(std::string_view text) {
     return Size{*width, *height};
 }
 
-std::optional<InkColour> parseInkColour(std::string_view text) {
+std::optional<InkColor> parseInkColor(std::string_view text) {
     if (text.size() != 7 || text[0] != '#') return std::nullopt;
     float channels[3];
     for (std::size_t i = 0; i < 3; ++i) {
@@ -36,5 +36,5 @@ std::optional<InkColour> parseInkColour(std::string_view text) {
         if (!value) return std::nullopt;
         channels[i] = std::clamp(static_cast<float>(*value) / 255.0f, kDarkestChannel, kBrightestChannel);
     }
-    return InkColour{channels[0], channels[1], channels[2]};
+    return InkColor{channels[0], channels[1], channels[2]};
 }

@@ -11,9 +11,9 @@ struct Size {
 // "540x960"; each side 1 to 8192.
 std::optional<Size> parseSize(std::string_view text);
 
-struct InkColour {
+struct InkColor {
     float red, green, blue;
 };
 
 // "#rrggbb", each channel brought into the range that the ink can show.
-std::optional<InkColour> parseInkColour(std::string_view text);
+std::optional<InkColor> parseInkColor(std::string_view text);

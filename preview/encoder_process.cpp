@@ -22,6 +22,7 @@ bool EncoderProcess::start(const std::vector<std::string>& command, std::string&
     std::signal(SIGPIPE, SIG_IGN);
 
     std::vector<char*> arguments;
+    arguments.reserve(command.size() + 1);
     for (const std::string& argument : command) arguments.push_back(const_cast<char*>(argument.c_str()));
     arguments.push_back(nullptr);
     posix_spawn_file_actions_t actions;

@@ -7,9 +7,6 @@
 #include "preview/log_filter.h"
 #include "preview/preview.h"
 
-// The ink is off unless it is asked for.
-static constexpr bool kInkByDefault = false;
-
 static int fail(const std::string& reason) {
     std::fprintf(stderr, "tidemark-preview: %s\n", reason.c_str());
     return 1;
@@ -37,6 +34,7 @@ int main(int argc, char** argv) {
     app.add_option("--fps", options.framesPerSecond, "Frames a second")->capture_default_str();
     app.add_option("--out", options.out, "Directory for frame-0000.png and so on; \"out\" where there is no video")
         ->type_name("DIR");
+    app.add_option("--every", options.every, "Write every Nth frame as a picture")->check(CLI::PositiveNumber);
     file("--video", options.video, "Video to make, which ends in .mp4, .webp or .gif");
     app.add_option("--seed", options.seed, "Number that chance springs from")->capture_default_str();
     CLI::Option* inkOption = app.add_option("--ink", ink, "Colour of the ink that touches drop")->type_name("#rrggbb");
@@ -58,8 +56,8 @@ int main(int argc, char** argv) {
     }
     // The host takes longer frames for a pause.
     if (options.framesPerSecond < 4 || options.framesPerSecond > 240) return fail("--fps must be 4 to 240");
-    if (*inkOption && !(options.inkColour = parseInkColour(ink))) return fail("--ink " + ink + " is not #rrggbb");
-    options.withInk = !noInk && (kInkByDefault || options.inkColour);
+    if (*inkOption && !(options.inkColor = parseInkColor(ink))) return fail("--ink " + ink + " is not #rrggbb");
+    options.withInk = !noInk;
     if (options.script.empty()) options.rain = true;
     if (options.out.empty() && options.video.empty()) options.out = "out";
     if (!verbose) quietenLog();

@@ -35,8 +35,8 @@ struct Outputs {
         video = openVideoSink(options.video, width, height, options.framesPerSecond, error);
         return video != nullptr;
     }
-    bool write(const Picture& frame, std::string& error) {
-        return (!pictures || pictures->write(frame, error)) && (!video || video->write(frame, error));
+    bool write(const Picture& frame, bool asPicture, std::string& error) {
+        return (!pictures || !asPicture || pictures->write(frame, error)) && (!video || video->write(frame, error));
     }
     bool finish(std::string& error) {
         return (!video || video->finish(error)) && (!pictures || pictures->finish(error));
@@ -108,7 +108,7 @@ bool drawFrames(
             host.draw();
             readFrame(frame);
         }
-        if (!outputs.write(frame, error)) return false;
+        if (!outputs.write(frame, i % options.every == 0, error)) return false;
         progress.show(i + 1);
     }
     return outputs.finish(error);
@@ -116,10 +116,10 @@ bool drawFrames(
 
 Look lookFor(const PreviewOptions& options) {
     Look look;
-    if (options.inkColour) {
-        look.inkRed = options.inkColour->red;
-        look.inkGreen = options.inkColour->green;
-        look.inkBlue = options.inkColour->blue;
+    if (options.inkColor) {
+        look.inkRed = options.inkColor->red;
+        look.inkGreen = options.inkColor->green;
+        look.inkBlue = options.inkColor->blue;
     }
     return look;
 }

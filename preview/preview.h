@@ -14,12 +14,13 @@ struct PreviewOptions {
     bool rain = false;
     Size size = {540, 960};
     std::optional<double> seconds;  // or the script's length and a little for the water to calm
-    int framesPerSecond = 30;
+    int framesPerSecond = 60;
     std::string out;    // directory
+    int every = 1;      // frames from one picture in it to the next
     std::string video;  // file
     std::uint32_t seed = 1;
     bool withInk = false;
-    std::optional<InkColour> inkColour;  // instead of the look's own
+    std::optional<InkColor> inkColor;  // instead of the look's own
 };
 
 // On failure says why in `error`, and leaves none of its output behind.

@@ -5,6 +5,8 @@ set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/packages.sh
 install_missing "${build_packages[@]}"
-cmake --preset release -DTIDEMARK_TESTS=OFF >build-demo.log 2>&1 || { cat build-demo.log; exit 1; }
+[ -f build/release/build.ninja ] || cmake --preset release -DTIDEMARK_TESTS=OFF >/dev/null
 cmake --build --preset release --target tidemark-preview
-exec build/release/preview/tidemark-preview --script scenes/demo.touch --out out --video out/demo.mp4 "$@"
+build/release/preview/tidemark-preview --script scenes/demo.touch --size 720x1280 \
+    --out out --every 30 --video out/demo.mp4 "$@"
+echo "Pictures and a video: $PWD/out"

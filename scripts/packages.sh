@@ -2,7 +2,7 @@
 
 build_packages=(cmake g++ ninja-build openjdk-17-jdk-headless libgles-dev libegl-dev libegl-mesa0 libgl1-mesa-dri
     libstb-dev libcli11-dev ffmpeg)
-test_packages=(clang clang-format clang-tidy googletest libgtest-dev glslang-tools)
+test_packages=(clang clang-format clang-tidy libgtest-dev glslang-tools binutils git)
 
 install_missing() {
     local missing=()

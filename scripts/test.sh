@@ -8,12 +8,8 @@ install_missing "${build_packages[@]}" "${test_packages[@]}"
 
 git ls-files '*.cpp' '*.h' | xargs clang-format --dry-run --Werror
 for preset in release asan clang; do
-    cmake --preset "$preset" -DTIDEMARK_WERROR=ON >/dev/null
+    cmake --preset "$preset" -DTIDEMARK_TESTS=ON -DTIDEMARK_WERROR=ON >/dev/null
+    cmake --build --preset "$preset"
+    ctest --preset "$preset" -j "$(nproc)"
 done
-cmake --build --preset release
-ctest --preset release
-cmake --build --preset asan
-ctest --preset asan
-cmake --build --preset clang
-ctest --preset clang
 scripts/lint.sh

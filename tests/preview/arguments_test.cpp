@@ -15,19 +15,19 @@ TEST(Arguments, ReadsSizesAndRefusesAllElse) {
     }
 }
 
-TEST(Arguments, ReadsInkColoursThatTheInkCanShow) {
-    const std::optional<InkColour> colour = parseInkColour("#336699");
+TEST(Arguments, ReadsInkColorsThatTheInkCanShow) {
+    const std::optional<InkColor> colour = parseInkColor("#336699");
     ASSERT_TRUE(colour);
     EXPECT_FLOAT_EQ(colour->red, 0.2f);
     EXPECT_FLOAT_EQ(colour->green, 0.4f);
     EXPECT_FLOAT_EQ(colour->blue, 0.6f);
-    const std::optional<InkColour> extremes = parseInkColour("#00FFff");
+    const std::optional<InkColor> extremes = parseInkColor("#00FFff");
     ASSERT_TRUE(extremes);
     EXPECT_GT(extremes->red, 0.0f);
     EXPECT_LE(extremes->green, 0.8f);
     EXPECT_EQ(extremes->green, extremes->blue);
     for (const char* bad :
          {"", "#", "336699", "#33669", "#3366999", "#33669g", "#-13-13", "# 33669", "#+1+1+1", "red"}) {
-        EXPECT_FALSE(parseInkColour(bad)) << bad;
+        EXPECT_FALSE(parseInkColor(bad)) << bad;
     }
 }

@@ -5,8 +5,9 @@
 #include <cstdint>
 
 // Writes x, y, z of the first `vertexCount` vertices: 3 * vertexCount floats, in model units around (0, 0).
-void fillPositions(float* positions, int vertexCount, int meshSizeWidth, int meshSizeHeight, int numDetailsWidth,
-                   int numDetailsHeight);
+void fillPositions(
+    float* positions, int vertexCount, int meshSizeWidth, int meshSizeHeight, int numDetailsWidth,
+    int numDetailsHeight);
 
 // Writes two counter-clockwise triangles a cell: 6 * (N - 1) * (N - 1) vertex numbers, to be read as unsigned.
 void fillIndices(std::int16_t* indices, int numDetailsWidth, int numDetailsHeight);

@@ -15,5 +15,5 @@ struct WaveRegion {
 // One time step, explicit in time: v <- damping * (v + waveSpeed * laplacian(h)); h <- clamp(h + v, -100, 100);
 // h <- h + k * laplacian(h), k being 0.068 for a damping of exactly 0.94f and 0.018 otherwise. With `checkCalm`
 // returns whether every updated speed lies within +-0.009 (a speed that is not a number counts as calm), else true.
-bool stepWaves(float* velocity, float* height, const WaveRegion& region, bool checkCalm, float damping,
-               float waveSpeed);
+bool stepWaves(
+    float* velocity, float* height, const WaveRegion& region, bool checkCalm, float damping, float waveSpeed);

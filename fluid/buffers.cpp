@@ -17,13 +17,16 @@ void release(Texture<T>& texture) {
     texture = {};
 }
 
+// Floats count texels exactly only up to 2^24, and no view comes near a side of this.
+constexpr int kLargestSide = 65536;
+
 template <class T>
 bool renew(Texture<T>& texture, int width, int height) {
     std::free(texture.data);
     // A view smaller than a cell has a grid of no texels; its block is not null all the same, as null means failure.
     const std::uint64_t bytes =
         std::uint64_t{sizeof(T)} * static_cast<std::uint64_t>(width) * static_cast<std::uint64_t>(height);
-    const bool fits = bytes <= SIZE_MAX / 2;
+    const bool fits = width <= kLargestSide && height <= kLargestSide && bytes <= SIZE_MAX / 2;
     texture = {
         fits ? static_cast<T*>(std::malloc(std::max<std::size_t>(static_cast<std::size_t>(bytes), 1))) : nullptr, width,
         height};

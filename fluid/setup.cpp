@@ -2,6 +2,7 @@
 
 #include "fluid/buffers.h"
 #include "fluid/fluid.h"
+#include "gl/deletion.h"
 #include "gl/shader_program.h"
 #include "jni/log.h"
 #include "shaders.h"
@@ -16,12 +17,13 @@ struct Program {
 
 // Deletes what an earlier set-up built, named in the log as `name`, and builds the program anew.
 void rebuild(
-    Program made, const char* name, const char* announcement, const char* vertexSource, const char* fragmentSource) {
+    const Fluid& engine, Program made, const char* name, const char* announcement, const char* vertexSource,
+    const char* fragmentSource) {
     if (made.program) {
         LOG_INFO("glDelete %s = %u", name, made.program);
-        glDeleteShader(made.vertexShader);
-        glDeleteShader(made.fragmentShader);
-        glDeleteProgram(made.program);
+        deleteShader(engine, made.vertexShader);
+        deleteShader(engine, made.fragmentShader);
+        deleteProgram(engine, made.program);
     }
     LOG_INFO("%s zorCreateShaderProgram()", announcement);
     made.vertexShader = zorloadShaderScript(GL_VERTEX_SHADER, vertexSource);
@@ -29,17 +31,12 @@ void rebuild(
     made.program = zorCreateShaderProgram(made.vertexShader, made.fragmentShader);
 }
 
-void renewBuffer(GLuint& buffer, const char* name) {
+void renewBuffer(const Fluid& engine, GLuint& buffer, const char* name) {
     if (buffer) {
         LOG_INFO("glDelete %s = %u", name, buffer);
-        glDeleteBuffers(1, &buffer);
+        deleteBuffer(engine, buffer);
     }
     glGenBuffers(1, &buffer);
-}
-
-void deleteSurface(const Surface_& surface) {
-    glDeleteFramebuffers(1, &surface.FboHandle);
-    glDeleteTextures(1, &surface.TextureHandle);
 }
 
 template <class T>
@@ -76,25 +73,25 @@ void Fluid::InitializeSetting(int width, int height, bool withInk) {
         DragMode = 0;
         BoundaryMargin = 10;
     }
-    renewBuffer(v_buf, "v_buf");
-    renewBuffer(h_buf, "h_buf");
-    renewBuffer(i_buf, "i_buf");
+    renewBuffer(*this, v_buf, "v_buf");
+    renewBuffer(*this, h_buf, "h_buf");
+    renewBuffer(*this, i_buf, "i_buf");
 }
 
 void Fluid::InitializeGPU(bool withInk) {
     LOG_INFO("InitializeGPU");
     if (withInk) LOG_INFO("bInk is true");
     rebuild(
-        {ripple_program, ripple_vertexShader, ripple_fragmentShader}, "ripple_program", "ripple_vertextShader",
+        *this, {ripple_program, ripple_vertexShader, ripple_fragmentShader}, "ripple_program", "ripple_vertextShader",
         kWaterVert, withInk ? kWaterInkFrag : kWaterPlainFrag);
     if (!withInk) return;
 
     rebuild(
-        {advect_density_program, advect_density_vertexShader, advect_density_fragmentShader}, "advect_density_program",
-        "advect_density_program", kQuadVert, kAdvectDensityFrag);
+        *this, {advect_density_program, advect_density_vertexShader, advect_density_fragmentShader},
+        "advect_density_program", "advect_density_program", kQuadVert, kAdvectDensityFrag);
     rebuild(
-        {addInk_program, addInk_vertexShader, addInk_fragmentShader}, "addInk_program", "addInk_program", kQuadVert,
-        kAddInkFrag);
+        *this, {addInk_program, addInk_vertexShader, addInk_fragmentShader}, "addInk_program", "addInk_program",
+        kQuadVert, kAddInkFrag);
 
     setName(AdvectVelocityKernel, "AdvectVelocity");
     setName(AdvectDensityKernel, "AdvectDensity");
@@ -106,13 +103,13 @@ void Fluid::InitializeGPU(bool withInk) {
 
     if (Velocity.Ping.FboHandle) {
         LOG_INFO("glDelete Velocity.Ping.FboHandle = %u", Velocity.Ping.FboHandle);
-        deleteSurface(Velocity.Ping);
+        deleteSurface(*this, Velocity.Ping);
     }
     Velocity.Ping = CreateSurface(GridWidth, GridHeight);
     if (Density.Ping.FboHandle) {
         LOG_INFO("glDelete Density.Ping.FboHandle = %u", Density.Ping.FboHandle);
-        deleteSurface(Density.Ping);
-        deleteSurface(Density.Pong);
+        deleteSurface(*this, Density.Ping);
+        deleteSurface(*this, Density.Pong);
     }
     Density = CreateData(InkWidth, InkHeight);
     allocateBuffers(*this);

@@ -1,12 +1,14 @@
 #include "fluid/fluid.h"
+#include "gl/deletion.h"
 #include "jni/log.h"
 
 namespace {
 
-void replaceTexture(GLuint& texture, const char* name, const AndroidBitmapInfo& info, const void* pixels) {
+void replaceTexture(
+    const Fluid& engine, GLuint& texture, const char* name, const AndroidBitmapInfo& info, const void* pixels) {
     if (texture) {
         LOG_INFO("glDelete %s = %u", name, texture);
-        glDeleteTextures(1, &texture);
+        deleteTexture(engine, texture);
     }
     glGenTextures(1, &texture);
     glBindTexture(GL_TEXTURE_2D, texture);
@@ -24,14 +26,14 @@ void replaceTexture(GLuint& texture, const char* name, const AndroidBitmapInfo& 
 
 void Fluid::LoadPortraitBGTextures(AndroidBitmapInfo info, void* pixels) {
     LOG_INFO("LoadPortraitBGTextures");
-    replaceTexture(portraitBG, "portraitBG", info, pixels);
+    replaceTexture(*this, portraitBG, "portraitBG", info, pixels);
 }
 
 void Fluid::LoadLandscapeBGTextures(AndroidBitmapInfo info, void* pixels) {
     LOG_INFO("LoadLandscapeBGTextures");
-    replaceTexture(landscapeBG, "landscapeBG", info, pixels);
+    replaceTexture(*this, landscapeBG, "landscapeBG", info, pixels);
 }
 
 void Fluid::LoadWaterTextures(AndroidBitmapInfo info, void* pixels) {
-    replaceTexture(environment, "environment", info, pixels);
+    replaceTexture(*this, environment, "environment", info, pixels);
 }

@@ -2,6 +2,7 @@
 #include <cstdint>
 
 #include "fluid/fluid.h"
+#include "gl/deletion.h"
 #include "jni/log.h"
 
 namespace {
@@ -19,7 +20,7 @@ void Fluid::CreateQuad() {
     LOG_INFO("CreateQuad");
     if (quadvbo) {
         LOG_INFO("glDelete quadvbo = %u", quadvbo);
-        glDeleteBuffers(1, &quadvbo);
+        deleteBuffer(*this, quadvbo);
     }
     glGenBuffers(1, &quadvbo);
 }

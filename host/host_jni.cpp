@@ -5,6 +5,7 @@ static Element* JNICALL getElements(JNIEnv*, Reference reference, jboolean* isCo
     if (isCopy) *isCopy = JNI_TRUE;
     auto* const array = static_cast<Array*>(reference);
     array->pinned = array->values;
+    ++array->pins;
     return array->pinned.data();
 }
 
@@ -12,6 +13,7 @@ template <class Array, class Element, class Reference>
 static void JNICALL releaseElements(JNIEnv*, Reference reference, Element*, jint mode) {
     auto* const array = static_cast<Array*>(reference);
     if (mode != JNI_ABORT) array->values = array->pinned;
+    --array->pins;
 }
 
 JNIEnv* hostEnvironment() {

@@ -11,11 +11,12 @@ struct HostArray : Reference {
     explicit HostArray(std::size_t length) : values(length) {}
     std::vector<Element> values;
     std::vector<Element> pinned;  // what the library works on between Get...Elements and Release...Elements
+    int pins = 0;                 // Gets not yet followed by their Release
 };
 
 using FloatArray = HostArray<_jfloatArray, jfloat>;
 using ShortArray = HostArray<_jshortArray, jshort>;
 
 // An environment whose array calls take the arrays above. It hands out copies and copies them back on release, as a
-// virtual machine with a moving collector does, so a missing release shows.
+// virtual machine with a moving collector does.
 JNIEnv* hostEnvironment();

@@ -13,6 +13,15 @@ std::uint8_t* bmp_portrait_bg_Pixels;
 std::uint8_t* bmp_landscapebg_Pixels;
 std::uint8_t* bmp_water_Pixels;
 
+// Frees the copies when the library unloads.
+static const struct CopyOwner {
+    ~CopyOwner() {
+        std::free(bmp_portrait_bg_Pixels);
+        std::free(bmp_landscapebg_Pixels);
+        std::free(bmp_water_Pixels);
+    }
+} copyOwner;
+
 void transferBitmap(JNIEnv* env, jobject bitmap, AndroidBitmapInfo& info, std::uint8_t*& pixels) {
     AndroidBitmapInfo handed = {};
     int result = AndroidBitmap_getInfo(env, bitmap, &handed);
@@ -27,13 +36,14 @@ void transferBitmap(JNIEnv* env, jobject bitmap, AndroidBitmapInfo& info, std::u
         return;
     }
     // Copied, not kept locked: a host that recycles its bitmap early cannot pull the pixels from under us, and
-    // after a lost context the textures are loaded again without another hand-over. Costs one picture of memory.
+    // after a lost context the textures are loaded again without another hand-over. Costs one picture of memory. The
+    // size is stored together with the copy, so that it never belongs to other pixels.
     const std::size_t bytes = std::size_t{handed.width} * handed.height * 4;
-    void* copy = std::realloc(pixels, bytes ? bytes : 1);
+    void* const copy = std::realloc(pixels, bytes ? bytes : 1);
     if (copy) {
         pixels = static_cast<std::uint8_t*>(copy);
         info = handed;
-        if (locked) std::memcpy(pixels, locked, bytes);
+        std::memcpy(pixels, locked, bytes);
     } else {
         LOG_ERROR("no memory for a bitmap of %u x %u", handed.width, handed.height);
     }

@@ -6,10 +6,8 @@
 // More than any screen, and still within what drivers draw.
 static constexpr int kLongestSide = 8192;
 
-// Ink darkens each channel by its distance from 0.8: brighter channels would turn the picture inside out, and 0 would
-// divide by nothing.
-static constexpr float kDarkestChannel = 1.0f / 255.0f;
-static constexpr float kBrightestChannel = 0.8f;
+// Ink of this brightness leaves a channel as it is; brighter ink would light the picture up.
+static constexpr float kBrightestChannel = 0.75f;
 
 static std::optional<int> parseWhole(std::string_view text, int base) {
     int value = 0;
@@ -34,7 +32,7 @@ std::optional<InkColor> parseInkColor(std::string_view text) {
     for (std::size_t i = 0; i < 3; ++i) {
         const std::optional<int> value = parseWhole(text.substr(1 + 2 * i, 2), 16);
         if (!value) return std::nullopt;
-        channels[i] = std::clamp(static_cast<float>(*value) / 255.0f, kDarkestChannel, kBrightestChannel);
+        channels[i] = std::min(static_cast<float>(*value) / 255.0f, kBrightestChannel);
     }
     return InkColor{channels[0], channels[1], channels[2]};
 }

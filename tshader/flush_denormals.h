@@ -37,7 +37,7 @@ private:
         return value;
     }
     static void set(Register value) {
-        __asm__ volatile("msr fpcr, %0" : : "r"(value));
+        __asm__ volatile("msr fpcr, %0" : : "r"(value) : "memory");
     }
 #elif defined(__arm__) && defined(__ARM_FP)
     using Register = std::uint32_t;
@@ -48,7 +48,7 @@ private:
         return value;
     }
     static void set(Register value) {
-        __asm__ volatile("vmsr fpscr, %0" : : "r"(value));
+        __asm__ volatile("vmsr fpscr, %0" : : "r"(value) : "memory");
     }
 #else
     using Register = std::uint32_t;  // WebAssembly has no such mode

@@ -25,8 +25,9 @@ protected:
         engine.GridWidth = engine.InkWidth = kWidth;
         engine.GridHeight = engine.InkHeight = kHeight;
         engine.InitializeGPU(true);
-        POSITION_X = 700;
-        POSITION_Y = 900;
+        // 85 pixels beside the centre of texel (12, 21): just outside the reach of the touch.
+        POSITION_X = 710;
+        POSITION_Y = 925;
         log.take();
     }
 
@@ -162,7 +163,7 @@ TEST_F(InkPasses, advectionCarriesWhatTheKernelCarries) {
     kernel.SourceTexture = {before.data(), kWidth, kHeight};
     kernel.InverseSize = Vec2(1.0f / (kWidth - 1), 1.0f / (kHeight - 1));
     kernel.Scale = Vec2(1200.0f / kWidth, 2000.0f / kHeight);
-    kernel.center = Vec2(700, 1100) - 0.5f * kernel.Scale;
+    kernel.center = Vec2(710, 1075) - 0.5f * kernel.Scale;
     kernel.TimeStep = 0.9f * 0.25f;
     kernel.Dissipation = 0.92f;
     setVelocity(velocity);

@@ -48,6 +48,90 @@ TEST_F(Setup, waterIsSetUpTwiceAndEveryOldObjectIsNamedAndDeleted) {
     EXPECT_TRUE(engine.ripple_vertexShader == shader || engine.ripple_fragmentShader == shader || !glIsShader(shader));
 }
 
+TEST_F(Setup, inkIsSetUpTwiceAndEveryOldObjectIsNamedAndDeleted) {
+    const auto program = [](const char* announcement) {
+        return Lines{
+            std::string("I ") + announcement + " zorCreateShaderProgram()", "E zorloadShaderScript",
+            "E zorloadShaderScript", "I zorCreateShaderProgram"};
+    };
+    const auto expectedLines = [&](bool again, const Fluid& old) {
+        Lines lines = {"I InitializeGPU", "I bInk is true"};
+        const auto add = [&](const char* member, GLuint name, const Lines& made) {
+            if (again) lines.push_back(deleted(member, name));
+            lines.insert(lines.end(), made.begin(), made.end());
+        };
+        add("ripple_program", old.ripple_program, program("ripple_vertextShader"));
+        add("advect_density_program", old.advect_density_program, program("advect_density_program"));
+        add("addInk_program", old.addInk_program, program("addInk_program"));
+        add("Velocity.Ping.FboHandle", old.Velocity.Ping.FboHandle, {"E CreateSurface"});
+        add("Density.Ping.FboHandle", old.Density.Ping.FboHandle, {"E CreateSurface", "E CreateSurface"});
+        lines.push_back("I CreateQuad");
+        if (again) lines.push_back(deleted("quadvbo", old.quadvbo));
+        return lines;
+    };
+    EXPECT_STREQ(engine.JacobiKernel.name, "");
+    engine.InitializeSetting(1085, 1920, true);
+    log.take();
+    engine.InitializeGPU(true);
+    EXPECT_EQ(log.take(), expectedLines(false, engine));
+    EXPECT_STREQ(engine.AdvectVelocityKernel.name, "AdvectVelocity");
+    EXPECT_STREQ(engine.AdvectDensityKernel.name, "AdvectDensity");
+    EXPECT_STREQ(engine.JacobiKernel.name, "Jacobi");
+    EXPECT_STREQ(engine.SubtractGradientKernel.name, "SubtractGradient");
+    EXPECT_STREQ(engine.ComputeDivergenceKernel.name, "ComputeDivergence");
+    EXPECT_STREQ(engine.AddInkKernel.name, "AddInk");
+    EXPECT_STREQ(engine.AddVelocityKernel.name, "AddVelocity");
+    EXPECT_EQ(engine.VelocityTex.width, 90);
+    EXPECT_EQ(engine.DivergenceTex.height, 160);
+    EXPECT_EQ(engine.VelocityTexTemp.row(159)[89].y, 0.0f);
+    EXPECT_EQ(engine.Velocity.Pong.FboHandle, 0u);
+    EXPECT_EQ(binding(GL_FRAMEBUFFER_BINDING), static_cast<int>(engine.Density.Pong.FboHandle));
+    EXPECT_EQ(binding(GL_BLEND_SRC_ALPHA), GL_SRC_ALPHA);
+    EXPECT_EQ(binding(GL_BLEND_DST_ALPHA), GL_ONE_MINUS_SRC_ALPHA);
+    EXPECT_FALSE(glIsEnabled(GL_BLEND));
+
+    engine.ClearSurface(engine.Density.Ping, 1, 1, 1, 1);
+    const GLuint pong = engine.Density.Pong.TextureHandle;
+    const Fluid& old = engine;
+    const Lines expected = expectedLines(true, old);
+    engine.InitializeGPU(true);
+    EXPECT_EQ(log.take(), expected);
+    EXPECT_TRUE(
+        engine.Density.Ping.TextureHandle == pong || engine.Density.Pong.TextureHandle == pong ||
+        engine.Velocity.Ping.TextureHandle == pong || !glIsTexture(pong));
+    glBindFramebuffer(GL_FRAMEBUFFER, engine.Density.Ping.FboHandle);
+    EXPECT_EQ(readPixels(10, 10), std::vector<Rgba>(100, Rgba{0, 0, 0, 0})) << "the density is zero again";
+    glBindFramebuffer(GL_FRAMEBUFFER, 0);
+}
+
+TEST_F(Setup, inkSizesFollowTheViewAndTheParametersHaveTheirValues) {
+    struct Row {
+        int width, height, gridWidth, gridHeight, inkWidth, inkHeight;
+    };
+    for (const Row& row :
+         {Row{1080, 1920, 90, 160, 256, 512},
+          {1920, 1080, 160, 90, 512, 256},
+          {1000, 1000, 83, 83, 256, 512},
+          {11, 25, 0, 2, 256, 512}}) {
+        engine.InitializeSetting(row.width, row.height, true);
+        EXPECT_EQ(engine.GridWidth, row.gridWidth);
+        EXPECT_EQ(engine.GridHeight, row.gridHeight);
+        EXPECT_EQ(engine.InkWidth, row.inkWidth);
+        EXPECT_EQ(engine.InkHeight, row.inkHeight);
+    }
+    const Fluid& f = engine;
+    EXPECT_EQ(
+        (std::array{
+            f.CellSize, f.Radius, f.ImpulseDensity, f.TimeStep, f.GradientScale, f.VelocityDissipation,
+            f.DensityDissipation, f.SourceStrength, f.SourceRadius, f.BackwardStepSize, f.ClearInkValue,
+            f.InkIntensity}),
+        (std::array{2.5f, 2.0f, 200.0f, 0.25f, 0.2f, 0.9f, 0.92f, 50.0f, 40.0f, 1.0f, 1.0f, 0.2f}));
+    EXPECT_EQ(f.NumJacobiIterations, 5);
+    EXPECT_EQ(f.DragMode, 0);
+    EXPECT_EQ(f.BoundaryMargin, 10);
+    EXPECT_EQ(f.InkColorOffset, 0.0f) << "left to the frames";
+}
+
 TEST_F(Setup, texturesAreReplacedAndSampleWithoutMipmaps) {
     AndroidBitmapInfo info = {};
     info.width = 3;

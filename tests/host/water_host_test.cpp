@@ -1,5 +1,6 @@
 #include "host/water_host.h"
 
+#include "tests/support/gesture_state.h"
 #include "tests/support/gl_test.h"
 #include "tests/support/test_pictures.h"
 
@@ -10,11 +11,12 @@ protected:
     static constexpr int kLong = 96;
     static constexpr int kShort = 54;
 
-    WaterHost start(int width, int height, std::uint32_t seed = 1) {
+    WaterHost start(int width, int height, std::uint32_t seed = 1, bool withInk = false) {
         renewContext(width, height);
+        resetGestures();
         WaterHost host(Look{}, width, height, seed);
         host.handOver(portrait, landscape, smoothPicture(16, 16, 3));
-        host.setUp(false);
+        host.setUp(withInk);
         return host;
     }
 
@@ -125,4 +127,67 @@ TEST_F(Host, aResizeTurnsTheViewAndKeepsTheWater) {
     ASSERT_TRUE(host.advance(0.0));
     host.draw();
     expectMiddleOf(readPixels(kLong, kShort), kLong, kShort, landscape);
+}
+
+TEST_F(Host, inkBloomsInItsColorFadesAndIsClearedAtOnce) {
+    constexpr int width = 240;
+    constexpr int height = 320;
+    WaterHost host = start(width, height, 1, true);
+    host.draw();
+    const auto clear = readPixels(width, height);
+    const auto darkening = [&](int x, int y) {
+        const auto i = static_cast<std::size_t>(y * width + x);
+        const Rgba pixel = readPixels(width, height)[i];
+        return std::array{clear[i][0] - pixel[0], clear[i][1] - pixel[1], clear[i][2] - pixel[2]};
+    };
+    // The tap's own ring has left its middle when the blot is still dark.
+    host.touch(TouchAction::down, width / 2, height / 2, 1.0f);
+    host.touch(TouchAction::up, width / 2, height / 2, 1.0f);
+    for (int i = 0; i < 25; ++i) {
+        ASSERT_TRUE(host.advance(1.0 / 60)) << "ink asks for frames";
+        host.draw();
+    }
+    const auto dark = darkening(width / 2 + 12, height / 2);
+    EXPECT_GT(dark[0], dark[1] + 5) << "blue ink takes most of the red";
+    EXPECT_GT(dark[1], dark[2] + 5);
+    EXPECT_GT(dark[2], 0);
+    const auto untouched = darkening(10, 10);
+    EXPECT_NEAR(untouched[0], 0, 3);
+
+    host.clearInk();
+    ASSERT_TRUE(host.advance(0.0));
+    host.draw();
+    EXPECT_NEAR(darkening(width / 2 + 12, height / 2)[0], 0, 6);
+
+    host.touch(TouchAction::down, width / 2, height / 2, 1.0f);
+    host.touch(TouchAction::up, width / 2, height / 2, 1.0f);
+    int frames = 0;
+    for (; host.advance(1.0 / 60) && frames < 1200; ++frames) host.draw();
+    EXPECT_LT(frames, 600) << "calm water and faded ink ask for no more";
+    EXPECT_LE(std::abs(darkening(width / 2, height / 2)[0]), 2);
+}
+
+TEST_F(Host, inkAndWaterSwitchInAnyOrderAcrossLostContexts) {
+    constexpr int width = 240;
+    constexpr int height = 320;
+    const auto inkAfter = [this](std::initializer_list<int> setUps) {
+        // Negative: the context is lost before.
+        WaterHost host = start(width, height, 1, false);
+        for (const int mode : setUps) {
+            if (mode < 0) renewContext(width, height);
+            host.setUp(std::abs(mode) == 2);
+        }
+        srand48(1);
+        host.touch(TouchAction::down, width / 2, height / 2, 1.0f);
+        for (int i = 0; i < 8; ++i) {
+            host.advance(1.0 / 60);
+            host.draw();
+        }
+        return readPixels(width, height);
+    };
+    const auto expected = inkAfter({2});
+    EXPECT_EQ(inkAfter({-2}), expected);
+    EXPECT_EQ(inkAfter({2, -1, 2}), expected);
+    EXPECT_EQ(inkAfter({2, 1, -2}), expected);
+    EXPECT_EQ(inkAfter({2, -1, -2, 1, 2, -2}), expected);
 }

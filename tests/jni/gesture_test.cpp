@@ -106,8 +106,16 @@ TEST(Gesture, measuresMovementsOnlyInsideAGesture) {
     EXPECT_EQ(DRAG_START_X, 50) << "the frame moves the segment, not the touch";
     EXPECT_EQ(count, 7);
     touch(57, 40, kCancel, 1.0f);
+    touch(9, 9, kDown, 1.0f);
+    touch(10, 9, kMove, 1.0f);
+    touch(60, 9, kCancel, 1.0f);
     touch(9, 9, kMove, 1.0f);
-    EXPECT_EQ(DX, 0) << "left by the cancel";
+    EXPECT_EQ(DX, 1) << "a cancelled tap is not measured, nor is a movement without a gesture";
+    touch(9, 9, kDown, 1.0f);
+    touch(20, 30, kDown, 1.0f);
+    EXPECT_EQ(DRAG_START_X, 20) << "a second touch-down starts anew";
+    EXPECT_EQ(DRAG_END_Y, 30);
+    touch(9, 9, kCancel, 1.0f);
     EXPECT_EQ(POSITION_X, 9);
     touch(9, 9, kDown, 1.0f);
     EXPECT_EQ(count, 0);
@@ -121,7 +129,9 @@ TEST(Gesture, weighsThePressureAndTakesAnyValue) {
         return TouchPressure;
     };
     EXPECT_FLOAT_EQ(weightOf(1.0f), 1.2f);
-    EXPECT_EQ(weightOf(0.5f), static_cast<float>(0.25 + static_cast<double>(0.2f)));
+    // The sum is rounded once, from the single-precision 0.2 widened; these two tell it from a double 0.2.
+    EXPECT_EQ(weightOf(0.1f), static_cast<float>(double{0.1f} * double{0.1f} + double{0.2f}));
+    EXPECT_EQ(weightOf(0.0001f), std::nextafter(0.2f, 1.0f));
     for (const float none : {0.0f, -1.0f, -inf, std::nanf("")}) EXPECT_EQ(weightOf(none), 0.0f);
     EXPECT_EQ(weightOf(inf), inf);
 

@@ -11,6 +11,7 @@
 #include "jni/bitmaps.h"
 #include "jni/globals.h"
 #include "platform/desktop_bitmap.h"
+#include "tests/support/gesture_state.h"
 #include "tests/support/gl_test.h"
 #include "tests/support/test_pictures.h"
 
@@ -96,6 +97,7 @@ TEST(MeshNatives, workOnTheHostsArraysInPlace) {
 using Natives = GlTest;
 
 TEST_F(Natives, aWholeRunOfTheWaterLogsTheStatedLinesAndDraws) {
+    resetGestures();
     WaterHost host(Look{}, kSide, kSide, 1);
     host.handOver(smoothPicture(30, 30, 1), smoothPicture(30, 30, 2), smoothPicture(8, 8, 3));
     host.setUp(false);
@@ -121,7 +123,28 @@ TEST_F(Natives, aWholeRunOfTheWaterLogsTheStatedLinesAndDraws) {
     EXPECT_TRUE(log.take().empty()) << "a frame logs nothing";
 }
 
+TEST_F(Natives, aFrameReleasesEveryArrayAndMovesTheInkOnlyWithIt) {
+    resetGestures();
+    FloatArray positions(12);
+    FloatArray heights(12);
+    FloatArray mvp(16);
+    ShortArray indices(6);
+    for (const bool ink : {false, true}) {
+        NATIVE(onInitSetting)(hostEnvironment(), nullptr, kSide, kSide, ink);
+        NATIVE(onInitGPU)(hostEnvironment(), nullptr);
+        NATIVE(onTouch)(hostEnvironment(), nullptr, 30, 30, 0, 1.0f);
+        NATIVE(onDrawFrame)
+        (hostEnvironment(), nullptr, &positions, &heights, &indices, 12, 12, 6, &mvp, 2, 2, 2, 2, 1.3f, 0.5f, 0.5f,
+         1.0f, 0.1f, 0.2f, 0.3f, 1.0f, 1.0f, 1.0f, JNI_FALSE);
+        EXPECT_EQ(positions.pins + heights.pins + mvp.pins + indices.pins, 0);
+        EXPECT_EQ(count, ink ? 1 : 0);
+        EXPECT_EQ(fluid.InkColor.r, ink ? static_cast<float>(double{0.1f} + 0.05) : 1.0f);
+        EXPECT_EQ(fluid.InkColor.b, ink ? static_cast<float>(double{0.3f} + 0.05) : 1.0f);
+    }
+}
+
 TEST_F(Natives, clearingTheInkEndsTheGesture) {
+    resetGestures();
     fluid.ClearInkValue = 1.9f;
     EXPECT_EQ(NATIVE(getClearInkValue)(hostEnvironment(), nullptr), 1) << "truncated";
     state = 2;

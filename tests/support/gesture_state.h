@@ -1,5 +1,7 @@
-// Puts the globals of the gestures back to what a freshly loaded library has.
+// Puts the gestures and the engine back to what a freshly loaded library has.
 #pragma once
+
+#include <new>
 
 #include "fluid/fluid.h"
 #include "jni/globals.h"
@@ -10,5 +12,6 @@ inline void resetGestures() {
     state = step = drag_step = count = TOUCH_ACTION = 0;
     POSITION_X = POSITION_Y = PREV_POSITION_X = PREV_POSITION_Y = DX = DY = 0;
     DRAG_START_X = DRAG_START_Y = DRAG_END_X = DRAG_END_Y = 0;
-    fluid.ClearInkValue = 0.0f;
+    fluid.~Fluid();
+    new (&fluid) Fluid;
 }

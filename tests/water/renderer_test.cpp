@@ -16,8 +16,7 @@ class Renderer : public GlTest {
 protected:
     void SetUp() override {
         GlTest::SetUp();
-        engine.InitializeSetting(kSide, kSide, false);
-        engine.InitializeGPU(false);
+        setUp(false);
         load(&Fluid::LoadPortraitBGTextures, portrait);
         load(&Fluid::LoadLandscapeBGTextures, landscape);
         load(&Fluid::LoadWaterTextures, water);
@@ -26,6 +25,13 @@ protected:
         fillPositions(positions.data(), kVertices * kVertices, 10, 12, kVertices, kVertices);
         fillIndices(indices.data(), kVertices, kVertices);
         log.take();
+    }
+
+    void setUp(bool ink) {
+        withInk = ink;
+        engine.InitializeSetting(kSide, kSide, ink);
+        engine.InitializeGPU(ink);
+        glBindFramebuffer(GL_FRAMEBUFFER, 0);
     }
 
     void load(void (Fluid::*loader)(AndroidBitmapInfo, void*), Picture& picture) {
@@ -51,7 +57,7 @@ protected:
             static_cast<int>(attribs.size()), static_cast<int>(indices.size()), mvp.data(), 10, 12, s.n, s.n,
             static_cast<float>(s.refractiveIndex), 0.5f, static_cast<float>(s.alphaRatio1 * 2), 1.0f,
             static_cast<float>(s.fresnelRatio), static_cast<float>(s.specularRatio), static_cast<float>(s.exponent),
-            false, isLandscape);
+            withInk, isLandscape);
         return readPixels();
     }
 
@@ -63,7 +69,10 @@ protected:
         return s;
     }
 
-    static double largestError(const std::vector<Rgba>& pixels, const reference::Scene& s, int allowedOutliers) {
+    // `divisor` is what the ink of a pixel divides its colour by.
+    template <class Divisor>
+    static double largestError(
+        const std::vector<Rgba>& pixels, const reference::Scene& s, int allowedOutliers, Divisor divisor) {
         std::vector<double> errors;
         for (int y = 0; y < kSide; ++y) {
             for (int x = 0; x < kSide; ++x) {
@@ -71,7 +80,7 @@ protected:
                     s, ((x + 0.5) / kSide * 2 - 1) / s.scaleX, ((y + 0.5) / kSide * 2 - 1) / s.scaleY);
                 double error = 0;
                 for (std::size_t c = 0; c < 3; ++c) {
-                    const double expected = std::min(color[c], 1.0) * 255;
+                    const double expected = std::min(color[c] / divisor(x, y, c), 1.0) * 255;
                     error = std::max(error, std::fabs(expected - pixels[static_cast<std::size_t>(y * kSide + x)][c]));
                 }
                 errors.push_back(error);
@@ -81,7 +90,12 @@ protected:
         return errors[errors.size() - 1 - static_cast<std::size_t>(allowedOutliers)];
     }
 
+    static double largestError(const std::vector<Rgba>& pixels, const reference::Scene& s, int allowedOutliers) {
+        return largestError(pixels, s, allowedOutliers, [](int, int, std::size_t) { return 1.0; });
+    }
+
     Fluid engine;
+    bool withInk = false;
     Picture portrait = smoothPicture(48, 96, 1);
     Picture landscape = smoothPicture(96, 48, 2);
     Picture water = smoothPicture(32, 32, 3);
@@ -138,4 +152,34 @@ TEST_F(Renderer, theDrawLeavesTheStatedStateBehind) {
     }
     EXPECT_TRUE(glIsEnabled(GL_CULL_FACE) && glIsEnabled(GL_DEPTH_TEST));
     EXPECT_TRUE(log.take().empty());
+}
+
+// Fractions alone in the density show whether they are read, a slope down the view whether it is the right way up.
+TEST_F(Renderer, inkDividesEachChannelByItsTint) {
+    setUp(true);
+    engine.InkColor = {0.2f, 0.45f, 0.8f};
+    engine.InkColorOffset = 0.7f;
+    engine.ClearInkValue = 1.0f;
+    // A texel for each pixel, so that the driver's filter takes no part.
+    const auto whole = [](int y) { return y / 6; };
+    std::vector<Rgba> texels;
+    for (int y = 0; y < kSide; ++y)
+        texels.insert(texels.end(), kSide, {static_cast<std::uint8_t>(whole(y)), 128, 77, 99});
+    glBindTexture(GL_TEXTURE_2D, engine.Density.Ping.TextureHandle);
+    glTexImage2D(GL_TEXTURE_2D, 0, GL_RGBA, kSide, kSide, 0, GL_RGBA, GL_UNSIGNED_BYTE, texels.data());
+    reference::Scene s = scene(0.9f);
+    s.specularLimit = 4.5;
+    s.specularRatio = 40;
+    s.exponent = 2;
+    for (const float intensity : {0.3f, 0.0f}) {
+        engine.InkIntensity = intensity;
+        const auto divisor = [&](int, int y, std::size_t c) {
+            return 1 + intensity * (whole(y) + 128 / 255.0) * (0.8 / std::array{0.2, 0.45, 0.8}[c] - 1);
+        };
+        EXPECT_LE(largestError(render(s), s, 60, divisor), 4.0) << "intensity " << intensity;
+    }
+    engine.InkIntensity = 0.3f;
+    engine.ClearInkValue = 0.0f;
+    EXPECT_LE(largestError(render(s), s, 60), 4.0) << "hidden ink does not show";
+    EXPECT_EQ(binding(GL_TEXTURE_BINDING_2D), 0);
 }

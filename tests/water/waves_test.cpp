@@ -116,8 +116,8 @@ TEST(Waves, calmMeansEverySpeedWithinTheBandBothEndsIncluded) {
         };
         EXPECT_TRUE(calmWith(0.009f, true));
         EXPECT_TRUE(calmWith(-0.009f, true));
-        EXPECT_FALSE(calmWith(0.01f, true)) << x;
-        EXPECT_FALSE(calmWith(-0.01f, true)) << x;
+        EXPECT_FALSE(calmWith(std::nextafter(0.009f, 1.0f), true)) << x;
+        EXPECT_FALSE(calmWith(std::nextafter(-0.009f, -1.0f), true)) << x;
         EXPECT_TRUE(calmWith(5.0f, false));
         EXPECT_TRUE(calmWith(kNan, true)) << "a speed that is not a number counts as calm";
 

@@ -1,0 +1,12 @@
+# The tests that need no OpenGL driver; they also run on another processor in an emulator.
+set(TIDEMARK_DRIVERLESS_TESTS
+    fluid/touch_point_test.cpp
+    jni/gesture_test.cpp
+    tshader/density_kernels_test.cpp
+    tshader/flush_denormals_test.cpp
+    tshader/kernels_test.cpp
+    tshader/samplers_test.cpp
+    tshader/velocity_packing_test.cpp
+    water/mesh_test.cpp
+    water/ripples_test.cpp
+    water/waves_test.cpp)

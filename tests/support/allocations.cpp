@@ -3,17 +3,22 @@
 #include <cstdlib>
 #include <new>
 
-void* operator new(std::size_t size, const std::nothrow_t&) noexcept {
+static void* allocate(std::size_t size) {
     ++Allocations::made;
-    return Allocations::fail ? nullptr : std::malloc(size ? size : 1);
+    return std::malloc(size ? size : 1);
+}
+
+void* operator new(std::size_t size, const std::nothrow_t&) noexcept {
+    return Allocations::fail ? nullptr : allocate(size);
 }
 
 void* operator new[](std::size_t size, const std::nothrow_t& tag) noexcept {
     return operator new(size, tag);
 }
 
+// The others are the tests' own; they always succeed.
 void* operator new(std::size_t size) {
-    void* const block = operator new(size, std::nothrow);
+    void* const block = allocate(size);
     if (!block) std::abort();
     return block;
 }

@@ -1,5 +1,4 @@
-// Counts the C++ allocations of this process and fails them on request. The library allocates with new (std::nothrow),
-// so a failure gives it null.
+// Counts the C++ allocations of this process, and fails those with std::nothrow on request: the library's.
 #pragma once
 
 struct Allocations {

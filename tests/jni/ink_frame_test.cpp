@@ -251,19 +251,19 @@ TEST_F(InkFrame, livesWithoutMemory) {
     touch(240, 400, 0, 1.0f);
     frames(3);
     // A view that grows needs a larger staging buffer.
-    start(960, 1600);
+    start(12000, 12000);
     touch(480, 800, 0, 1.0f);
-    Allocations::fail = true;
+    Allocations::failFrom = 1 << 20;
     fluid.Update(0);
-    std::vector<float> height(300 * 300);
-    std::vector<float> speed(300 * 300, 1.0f);
-    const bool calm = stepWaves(speed.data(), height.data(), {1, 1, 299, 299, 300}, true, 1.0f, 0.3f);
-    Allocations::fail = false;
+    std::vector<float> height(600 * 600);
+    std::vector<float> speed(600 * 600, 1.0f);
+    const bool calm = stepWaves(speed.data(), height.data(), {1, 1, 599, 599, 600}, true, 1.0f, 0.3f);
+    Allocations::failFrom = SIZE_MAX;
     EXPECT_EQ(
         log.take(), (std::vector<std::string>{
                         "E no memory for uploading the ink's velocity", "E no memory for smoothing the water"}));
     EXPECT_FALSE(calm);
-    EXPECT_EQ(height[150 * 300 + 150], 1.0f) << "the water still moves";
+    EXPECT_EQ(height[300 * 600 + 300], 1.0f) << "the water still moves";
     frames(4);
     EXPECT_GT(total(), 0);
 

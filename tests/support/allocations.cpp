@@ -9,7 +9,7 @@ static void* allocate(std::size_t size) {
 }
 
 void* operator new(std::size_t size, const std::nothrow_t&) noexcept {
-    return Allocations::fail ? nullptr : allocate(size);
+    return size >= Allocations::failFrom ? nullptr : allocate(size);
 }
 
 void* operator new[](std::size_t size, const std::nothrow_t& tag) noexcept {

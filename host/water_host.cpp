@@ -66,6 +66,8 @@ void WaterHost::handOver(const Picture& portrait, const Picture& landscape, cons
 }
 
 void WaterHost::setUp(bool withInk) {
+    // The library would keep a stroke that the switch interrupts and go on with it at the next touch.
+    if (withInk != withInk_) clearInk();
     withInk_ = withInk;
     inkFrames_ = 0;
     JNIEnv* const env = hostEnvironment();
@@ -82,9 +84,9 @@ void WaterHost::setUp(bool withInk) {
 
 void WaterHost::touch(TouchAction action, int x, int y, float pressure) {
     raiseTouchRipples(action, x, y, look_.touchAmplitude * pressure);
+    fingerDown_ = action == TouchAction::down || action == TouchAction::move;
     if (!withInk_) return;
     NATIVE(onTouch)(hostEnvironment(), nullptr, x, y, static_cast<jint>(action), pressure);
-    fingerDown_ = action == TouchAction::down || action == TouchAction::move;
     inkFrames_ = look_.framesToFade;
 }
 

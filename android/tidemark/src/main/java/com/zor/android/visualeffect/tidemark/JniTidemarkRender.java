@@ -1,0 +1,179 @@
+package com.zor.android.visualeffect.tidemark;
+
+import android.graphics.Bitmap;
+
+/**
+ * The native library's whole interface. Most apps want {@link TidemarkView} or {@link WaterHost}, which make these
+ * calls in the right order.
+ *
+ * <p><b>Threads.</b> The library takes no lock: call every method on the one thread that owns the OpenGL ES 2.0
+ * context, which is the GL thread of a {@code GLSurfaceView}, and forward touches to it with {@code queueEvent}. The
+ * three {@code transfer} methods, {@link #initWaters}, {@link #move}, {@link #ripple}, {@link #onTouch},
+ * {@link #getClearInkValue} and {@link #clearInkValue} make no GL call and may run on another thread, but never at the
+ * same time as any other method of this class. All objects of this class share one effect.
+ *
+ * <p><b>Order.</b>
+ * <ol>
+ * <li>{@link #transferPortraitBGBitmap}, {@link #transferLandscapeBGBitmap}, {@link #transferWaterBitmap}
+ * <li>{@link #onInitSetting}, then {@link #onInitGPU}
+ * <li>{@link #onLoadPortraitBGTextures}, {@link #onLoadLandscapeBGTextures}, {@link #onLoadWaterTextures}
+ * <li>{@link #initWaters} once for the mesh arrays
+ * <li>for every frame {@link #move} and {@link #ripple} as the animation asks, {@link #onTouch} for each touch event,
+ * {@link #onDrawFrame} once
+ * </ol>
+ * After the context was lost, or for another view size or another mode, repeat the second and the third step.
+ *
+ * <p><b>The mesh.</b> N x N vertices in the plane z = 0, N from 2 to 256, stored column by column from the left, each
+ * column from the top: the vertex of column c and row r is number {@code c * N + r}. Model x runs to the right and y
+ * upwards, from minus to plus half the mesh's size. The arrays belong to the caller, who hands them in again with every
+ * call. Lengths and counts are the caller's word: the library compares none of them, and a short array crashes.
+ */
+public final class JniTidemarkRender {
+    static {
+        System.loadLibrary("TidemarkEffect");
+    }
+
+    /**
+     * Takes over the background of an upright view. The pixels are copied: the bitmap may be recycled afterwards.
+     * A failure is logged and leaves the earlier picture in place.
+     *
+     * @param bitmap of the configuration ARGB_8888, without padding between its rows, 1 pixel to the driver's largest
+     *     texture a side; stretched over the view, so best cropped to its proportions before
+     */
+    public native void transferPortraitBGBitmap(Bitmap bitmap);
+
+    /**
+     * Takes over the background of a view held across; otherwise like {@link #transferPortraitBGBitmap}.
+     *
+     * @param bitmap as there
+     */
+    public native void transferLandscapeBGBitmap(Bitmap bitmap);
+
+    /**
+     * Takes over the picture of the light on the waves; otherwise like {@link #transferPortraitBGBitmap}.
+     *
+     * @param bitmap as there, of any proportions
+     */
+    public native void transferWaterBitmap(Bitmap bitmap);
+
+    /**
+     * Fixes the size and the mode; {@link #onInitGPU} must follow. Needs the GL context.
+     *
+     * @param width of the view in pixels, 1 to the driver's largest viewport; with ink at least 12
+     * @param height of the view in pixels, likewise
+     * @param withInk whether touches drop ink into the water; without, ink costs nothing
+     */
+    public native void onInitSetting(int width, int height, boolean withInk);
+
+    /** Makes programs, render targets and buffers of the size and the mode set last. Needs the GL context. */
+    public native void onInitGPU();
+
+    /** Uploads the background of an upright view that was taken over last. Needs the GL context. */
+    public native void onLoadPortraitBGTextures();
+
+    /** Uploads the background of a view held across that was taken over last. Needs the GL context. */
+    public native void onLoadLandscapeBGTextures();
+
+    /** Uploads the picture of the light that was taken over last. Needs the GL context. */
+    public native void onLoadWaterTextures();
+
+    /**
+     * Fills the arrays of a flat mesh.
+     *
+     * @param positions receives x, y, z of every vertex in model units; 3 * vertexCount floats
+     * @param indices receives two triangles a cell, as unsigned vertex numbers; 6 * (N - 1) * (N - 1) shorts
+     * @param vertexCount vertices to fill, N * N
+     * @param meshSizeWidth extent along x in model units, at least 1; the eye is 30 units away
+     * @param meshSizeHeight extent along y in model units, at least 1
+     * @param numDetailsWidth vertices along x, N
+     * @param numDetailsHeight vertices along y, N too
+     */
+    public native void initWaters(float[] positions, short[] indices, int vertexCount, int meshSizeWidth,
+            int meshSizeHeight, int numDetailsWidth, int numDetailsHeight);
+
+    /**
+     * Takes one wave step over a rectangle of the two fields. What lies around it is read and stays: at least one
+     * element on every side. On the mesh x and {@code stride} count down a column, y across the columns.
+     *
+     * @param velocity speeds in model units a step, N * N floats, element {@code y * stride + x}
+     * @param height heights in model units, N * N floats likewise; kept within -100 to 100
+     * @param xStart first x, at least 1
+     * @param yStart first y, at least 1
+     * @param xEnd one past the last x, at most N - 1
+     * @param yEnd one past the last y, at most N - 1
+     * @param stride elements from one y to the next, N
+     * @param rowCount ignored; N
+     * @param checkCalm whether to look for calm
+     * @param damping factor on every speed, 0 to 1, usefully 0.9 to 0.995; 0.94 exactly also smooths the surface more
+     * @param waveSpeed factor on the curvature, 0 to 0.5, above which waves blow up; usefully 0.05 to 0.45
+     * @return true when every speed lies within -0.009 to 0.009 after the step, and always without {@code checkCalm}
+     */
+    public native boolean move(float[] velocity, float[] height, int xStart, int yStart, int xEnd, int yEnd, int stride,
+            int rowCount, boolean checkCalm, float damping, float waveSpeed);
+
+    /**
+     * Adds a cone of three cells' radius to a field. The two outermost elements on the near sides and the outermost one
+     * on the far sides stay as they are. On the mesh a counts down a column and b across the columns.
+     *
+     * @param field heights (or speeds) in model units, countA * countB floats, element {@code b * countA + a}
+     * @param extentA range of posA, in any unit, at least 1
+     * @param extentB range of posB, in any unit, at least 1
+     * @param countA elements along a, N
+     * @param countB elements along b, N
+     * @param posA where, -extentA / 2 to extentA / 2; beyond it, the part of the cone inside the field is added
+     * @param posB where, -extentB / 2 to extentB / 2 likewise
+     * @param amplitude a third of the cone's height; negative for a hollow, usefully -4 to 4
+     */
+    public native void ripple(float[] field, int extentA, int extentB, int countA, int countB, float posA, float posB,
+            float amplitude);
+
+    /**
+     * Takes one touch event of one finger; with ink, the next frame drops it there. Hand in historical positions as
+     * events of their own: the distance between two events decides what kind of stroke is drawn.
+     *
+     * @param x pixels from the left edge of the view; outside of it is allowed
+     * @param y pixels from its top edge, likewise
+     * @param action as in {@code MotionEvent}: 0 down, 1 up, 2 move, 3 cancel; others only move the touch point
+     * @param pressure as the screen reports it, around 1; 0 and less for a slow stroke without ink
+     */
+    public native void onTouch(int x, int y, int action, float pressure);
+
+    /**
+     * Draws one frame into the current framebuffer, over the whole view and without clearing it. In ink mode this is
+     * also one step of the ink: draw at 60 frames a second. Needs the GL context.
+     *
+     * @param positions from {@link #initWaters}, 3 floats a vertex
+     * @param heightAttribs for each vertex its height and those of the vertices to its right and above it, 3 floats
+     * @param indices from {@link #initWaters}, 6 shorts a cell
+     * @param positionFloats floats of {@code positions}, 3 * N * N
+     * @param heightFloats floats of {@code heightAttribs}, 3 * N * N
+     * @param indexCount shorts of {@code indices}, 6 * (N - 1) * (N - 1)
+     * @param mvp from model units to clip space, 16 floats, column by column; it must not turn or tilt the mesh
+     * @param meshSizeWidth extent along x in model units that the picture covers, at least 1
+     * @param meshSizeHeight extent along y, at least 1
+     * @param numDetailsWidth vertices along x, N
+     * @param numDetailsHeight vertices along y, N too
+     * @param refractiveIndex of the water, 1 (no bending) to 2.5
+     * @param alphaMix share of the light's picture on a wave, 0 to 1
+     * @param alphaScale1 factor on that share, 0 to 1
+     * @param alphaScale2 factor on the other share, 0 to 1; not read by the shaders of today
+     * @param inkRed ink colour, red, 0 to 0.75; more brightens instead of darkening
+     * @param inkGreen ink colour, green, likewise
+     * @param inkBlue ink colour, blue, likewise
+     * @param fresnelRatio extra light on slopes that face the light, 0 to 2
+     * @param specularRatio strength of the highlights, 1 to 5.5, with ink to 4.5
+     * @param exponent sharpness of the highlights, 1 (broad) to 200 (pinpoint)
+     * @param landscape whether to show the background for a view held across
+     */
+    public native void onDrawFrame(float[] positions, float[] heightAttribs, short[] indices, int positionFloats,
+            int heightFloats, int indexCount, float[] mvp, int meshSizeWidth, int meshSizeHeight, int numDetailsWidth,
+            int numDetailsHeight, float refractiveIndex, float alphaMix, float alphaScale1, float alphaScale2,
+            float inkRed, float inkGreen, float inkBlue, float fresnelRatio, float specularRatio, float exponent,
+            boolean landscape);
+
+    /** @return 1 after a touch and, with ink, after the set-up; 0 after a cancelled touch or {@link #clearInkValue} */
+    public native int getClearInkValue();
+
+    /** Lets all ink vanish with the next frame, and ends the gesture. */
+    public native void clearInkValue();
+}

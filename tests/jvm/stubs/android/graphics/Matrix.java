@@ -1,0 +1,7 @@
+package android.graphics;
+
+public class Matrix {
+    public boolean postRotate(float degrees) {
+        return true;
+    }
+}

@@ -1,0 +1,69 @@
+package android.view;
+
+/** A touch whose parts a test fills in; [finger][position], the current position last. */
+public final class MotionEvent {
+    public static final int ACTION_DOWN = 0;
+    public static final int ACTION_UP = 1;
+    public static final int ACTION_MOVE = 2;
+    public static final int ACTION_CANCEL = 3;
+    public static final int ACTION_POINTER_UP = 6;
+
+    private final int action;
+    private final int actionIndex;
+    private final int[] ids;
+    private final float[][][] xyPressure;
+
+    public MotionEvent(int action, int actionIndex, int[] ids, float[][][] xyPressure) {
+        this.action = action;
+        this.actionIndex = actionIndex;
+        this.ids = ids;
+        this.xyPressure = xyPressure;
+    }
+
+    public int getActionMasked() {
+        return action;
+    }
+
+    public int getActionIndex() {
+        return actionIndex;
+    }
+
+    public int getPointerId(int index) {
+        return ids[index];
+    }
+
+    public int findPointerIndex(int id) {
+        for (int i = 0; i < ids.length; ++i) {
+            if (ids[i] == id) return i;
+        }
+        return -1;
+    }
+
+    public int getHistorySize() {
+        return xyPressure[0].length - 1;
+    }
+
+    public float getX(int index) {
+        return getHistoricalX(index, getHistorySize());
+    }
+
+    public float getY(int index) {
+        return getHistoricalY(index, getHistorySize());
+    }
+
+    public float getPressure(int index) {
+        return getHistoricalPressure(index, getHistorySize());
+    }
+
+    public float getHistoricalX(int index, int position) {
+        return xyPressure[index][position][0];
+    }
+
+    public float getHistoricalY(int index, int position) {
+        return xyPressure[index][position][1];
+    }
+
+    public float getHistoricalPressure(int index, int position) {
+        return xyPressure[index][position][2];
+    }
+}

@@ -1,0 +1,5 @@
+package android.widget;
+
+import android.view.View;
+
+public class Button extends View {}

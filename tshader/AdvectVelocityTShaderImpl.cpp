@@ -41,21 +41,21 @@ static inline Pair<float> sample(Texture<vec2> source, Pair<float> c) {
     return {s.x, s.y};
 }
 
-// texture2DLinear at four points of a source that is at least two texels wide. One load brings both texels of
-// a row, so the last column is reached from the left with weight 1.
+// texture2DLinear at four points of a source that is at least two texels wide. One load brings both texels of a row, so
+// the last column is reached from the left with weight 1, and the last row of several from below.
 static inline Pair<float4> sample(Texture<vec2> source, Pair<float4> c) {
     const float lastX = static_cast<float>(source.width - 1);
     const float lastY = static_cast<float>(source.height - 1);
+    const bool oneRow = source.height == 1;
     const float4 fx = lastX * clampToUnit(c.x);
     const float4 fy = lastY * clampToUnit(c.y);
     // A lane mask is -1 where it holds.
     const int4 x0 = toInt(fx) + (fx >= lastX);
-    const int4 y0 = toInt(fy);
+    const int4 y0 = toInt(fy) + (fy >= (oneRow ? 1.0f : lastY));
     const int4 at = y0 * source.width + x0;
-    const int4 oneRow = (fy < lastY) & source.width;
     Pair<float4> t00, t10, t01, t11;
     gatherNeighbours(source.data, at, t00, t10);
-    gatherNeighbours(source.data, at + oneRow, t01, t11);
+    gatherNeighbours(source.data + (oneRow ? 0 : source.width), at, t01, t11);
     const float4 tx = fx - toFloat(x0);
     const float4 ty = fy - toFloat(y0);
     return {bilinear(t00.x, t10.x, t01.x, t11.x, tx, ty), bilinear(t00.y, t10.y, t01.y, t11.y, tx, ty)};

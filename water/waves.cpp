@@ -1,5 +1,6 @@
 #include "water/waves.h"
 
+#include <cmath>
 #include <cstddef>
 #include <cstring>
 
@@ -26,32 +27,36 @@ F laplacian(const float* h, std::ptrdiff_t stride) {
 // while it still reads the neighbours' old heights.
 Scratch<float> snapshot("smoothing the water");
 
-void accelerate(
-    float* velocity, const float* height, std::ptrdiff_t stride, int width, float damping, float waveSpeed) {
-    forGroups(0, width, [=](auto lanes, int x) {
-        using F = decltype(lanes);
-        store((laplacian<F>(height + x, stride) * waveSpeed + load<F>(velocity + x)) * damping, velocity + x);
-    });
+bool isFast(float speed) {
+    return std::fabs(speed) > kCalmSpeed;
 }
 
-// A sweep of its own over a finished row: a test inside the speed pass would make each group wait for the last one.
-bool isCalm(const float* velocity, int width) {
-    int4 movingLanes = {};
-    bool moving = false;
-    forGroups(0, width, [&](auto lanes, int x) {
-        using F = decltype(lanes);
-        const F v = load<F>(velocity + x);
-        const auto fast = (v > kCalmSpeed) | (v < -kCalmSpeed);
+int4 isFast(float4 speed) {
+    const int4 magnitude = reinterpret_cast<int4>(speed) & 0x7fffffff;
+    return reinterpret_cast<float4>(magnitude) > kCalmSpeed;
+}
+
+// Accelerates one row; with `test` returns whether all of it stays calm.
+template <bool test>
+bool accelerate(
+    float* velocity, const float* height, std::ptrdiff_t stride, int width, float damping, float waveSpeed) {
+    int4 fastLanes = {};
+    bool fast = false;
+    forGroups(0, width, [=, &fast, &fastLanes]<class F>(F, int x) {
+        const F v = (laplacian<F>(height + x, stride) * waveSpeed + load<F>(velocity + x)) * damping;
+        store(v, velocity + x);
+        if constexpr (!test) return;
         if constexpr (sizeof(F) == sizeof(float4)) {
-            movingLanes |= fast;
+            fastLanes |= isFast(v);
         } else {
-            moving |= fast != 0;
+            fast |= isFast(v);
         }
     });
-    return !moving && !(movingLanes[0] | movingLanes[1] | movingLanes[2] | movingLanes[3]);
+    return !fast && !(fastLanes[0] | fastLanes[1] | fastLanes[2] | fastLanes[3]);
 }
 
-void integrate(float* height, const float* velocity, float* copy, int width) {
+// Writes one row of integrated heights to `integrated`, which may be the row itself.
+void integrate(const float* height, const float* velocity, float* integrated, int width) {
     forGroups(0, width, [=](auto lanes, int x) {
         using F = decltype(lanes);
         const F high = F{} + kHeightLimit;
@@ -59,15 +64,15 @@ void integrate(float* height, const float* velocity, float* copy, int width) {
         F t = load<F>(height + x) + load<F>(velocity + x);
         t = t > high ? high : t;
         t = t < low ? low : t;
-        store(t, height + x);
-        if (copy) store(t, copy + x);
+        store(t, integrated + x);
     });
 }
 
+// The height before smoothing is the copy's own centre: the host's array is only written.
 void smooth(float* height, const float* copy, std::ptrdiff_t copyStride, int width, float k) {
     forGroups(0, width, [=](auto lanes, int x) {
         using F = decltype(lanes);
-        store(laplacian<F>(copy + x, copyStride) * k + load<F>(height + x), height + x);
+        store(laplacian<F>(copy + x, copyStride) * k + load<F>(copy + x), height + x);
     });
 }
 
@@ -88,15 +93,17 @@ bool stepWaves(
 
     bool calm = true;
     for (int row = 0; row < rows; ++row) {
-        accelerate(v + row * stride, h + row * stride, stride, width, damping, waveSpeed);
-        if (checkCalm && calm) calm = isCalm(v + row * stride, width);
+        // One row that moves settles it.
+        const auto pass = checkCalm && calm ? accelerate<true> : accelerate<false>;
+        calm &= pass(v + row * stride, h + row * stride, stride, width, damping, waveSpeed);
     }
 
     const std::ptrdiff_t copyStride = std::ptrdiff_t{width} + 2;
     float* const copies = snapshot.reserve(static_cast<std::size_t>(copyStride) * (static_cast<std::size_t>(rows) + 2));
     float* const s = copies ? copies + copyStride + 1 : nullptr;
     for (int row = 0; row < rows; ++row) {
-        integrate(h + row * stride, v + row * stride, s ? s + row * copyStride : nullptr, width);
+        float* const heights = h + row * stride;
+        integrate(heights, v + row * stride, s ? s + row * copyStride : heights, width);
     }
     if (!s) return calm;
 

@@ -1,0 +1,61 @@
+// The reference host at work, one frame at a time, whatever GL is behind it.
+#pragma once
+
+#include <android/log.h>
+
+#include <cmath>
+
+#include "host/water_host.h"
+#include "tests/support/gesture_state.h"
+#include "tests/support/test_pictures.h"
+
+enum class Scene { water, idleInk, drag };
+
+class FrameScene {
+public:
+    // `warmUp` frames into the scene, so that nothing is done for the first time any more.
+    FrameScene(Scene scene, int vertices, int width, int height, int warmUp)
+        : scene_(scene), width_(width), height_(height), host_(lookWith(vertices), width, height, 1) {
+        __android_log_set_logger([](const __android_log_message*) {});
+        resetGestures();
+        host_.handOver(smoothPicture(64, 64, 1), smoothPicture(64, 64, 2), smoothPicture(64, 64, 3));
+        host_.setUp(scene != Scene::water);
+        host_.rain(true);
+        touch(TouchAction::down);
+        if (scene == Scene::idleInk) touch(TouchAction::up);
+        for (int i = 0; i < warmUp; ++i) next();
+    }
+
+    void next() {
+        ++frame_;
+        if (scene_ == Scene::drag) touch(TouchAction::move);
+        host_.advance(1.0 / 60.0);
+        host_.draw();
+    }
+
+private:
+    static Look lookWith(int vertices) {
+        Look look;
+        look.meshVertices = vertices;
+        return look;
+    }
+
+    // Round the middle of the view, far enough a frame to be a fast drag.
+    void touch(TouchAction action) {
+        const float angle = 0.15f * static_cast<float>(frame_);
+        const float radius = 0.3f * static_cast<float>(width_);
+        host_.touch(
+            action, width_ / 2 + static_cast<int>(radius * std::cos(angle)),
+            height_ / 2 + static_cast<int>(radius * std::sin(angle)), 1.0f);
+    }
+
+    Scene scene_;
+    int width_;
+    int height_;
+    int frame_ = 0;
+    WaterHost host_;
+};
+
+inline const char* nameOf(Scene scene) {
+    return scene == Scene::water ? "water" : scene == Scene::idleInk ? "idle ink" : "fast drag";
+}

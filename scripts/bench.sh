@@ -1,0 +1,25 @@
+#!/usr/bin/env bash
+# Builds the benchmarks with both compilers, runs them in turn, and writes docs/bench.md and docs/bench.svg.
+set -euo pipefail
+cd "$(dirname "$0")/.."
+source scripts/packages.sh
+install_missing "${build_packages[@]}" "${bench_packages[@]}"
+
+declare -A compilers=([gcc]=g++ [clang]=clang++)
+for name in gcc clang; do
+    cmake --preset release -B "build/bench-$name" -DCMAKE_CXX_COMPILER="${compilers[$name]}" \
+        -DTIDEMARK_BENCH=ON -DTIDEMARK_TESTS=OFF >/dev/null
+    cmake --build "build/bench-$name" --target tidemark_bench tidemark_bench_driver
+done
+
+out=build/bench-results
+rm -rf "$out"
+mkdir -p "$out"
+options=(--benchmark_format=json --benchmark_repetitions=7 --benchmark_enable_random_interleaving=true)
+for round in 1 2 3; do
+    for name in gcc clang; do
+        "build/bench-$name/bench/tidemark_bench" "${options[@]}" --benchmark_min_time=0.02 >"$out/$name-$round.json"
+    done
+done
+build/bench-gcc/bench/tidemark_bench_driver "${options[@]}" --benchmark_repetitions=3 --benchmark_min_time=0.1 >"$out/driver.json"
+python3 bench/report.py "$out" docs

@@ -84,7 +84,7 @@ protected:
     }
 
     LogRecorder log;
-    const Look look;
+    const Look look = {};
     WaterHost host = WaterHost(look, kWidth, kHeight, 1);
 };
 

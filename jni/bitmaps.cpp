@@ -39,13 +39,13 @@ void transferBitmap(JNIEnv* env, jobject bitmap, AndroidBitmapInfo& info, std::u
     // after a lost context the textures are loaded again without another hand-over. Costs one picture of memory. The
     // size is stored together with the copy, so that it never belongs to other pixels.
     const std::size_t bytes = std::size_t{handed.width} * handed.height * 4;
-    void* const copy = std::realloc(pixels, bytes ? bytes : 1);
+    void* const copy = locked ? std::realloc(pixels, bytes ? bytes : 1) : nullptr;
     if (copy) {
         pixels = static_cast<std::uint8_t*>(copy);
         info = handed;
         std::memcpy(pixels, locked, bytes);
     } else {
-        LOG_ERROR("no memory for a bitmap of %u x %u", handed.width, handed.height);
+        LOG_ERROR("cannot copy a bitmap of %u x %u", handed.width, handed.height);
     }
     AndroidBitmap_unlockPixels(env, bitmap);
 }

@@ -7,6 +7,10 @@
 #include <cmath>
 #include <cstring>
 
+#if defined(__SSE__)
+#include <xmmintrin.h>
+#endif
+
 #include "tshader/vec.h"
 
 typedef float float4 __attribute__((vector_size(16)));
@@ -29,6 +33,32 @@ inline F load(const float* from) {
 template <class F>
 inline void store(F value, float* to) {
     std::memcpy(to, &value, sizeof value);
+}
+
+// a < b ? a : b and a > b ? a : b; where either is not a number, b. SSE has one instruction for each, which g++ does
+// not find behind the ternary.
+inline float lesser(float a, float b) {
+    return a < b ? a : b;
+}
+
+inline float greater(float a, float b) {
+    return a > b ? a : b;
+}
+
+inline float4 lesser(float4 a, float4 b) {
+#if defined(__SSE__)
+    return _mm_min_ps(a, b);
+#else
+    return a < b ? a : b;
+#endif
+}
+
+inline float4 greater(float4 a, float4 b) {
+#if defined(__SSE__)
+    return _mm_max_ps(a, b);
+#else
+    return a > b ? a : b;
+#endif
 }
 
 inline float4 evenLanes(float4 a, float4 b) {

@@ -3,6 +3,7 @@
 #include <cmath>
 #include <cstddef>
 #include <cstring>
+#include <type_traits>
 
 #include "tshader/flush_denormals.h"
 #include "tshader/groups.h"
@@ -61,10 +62,8 @@ void integrate(const float* height, const float* velocity, float* integrated, in
         using F = decltype(lanes);
         const F high = F{} + kHeightLimit;
         const F low = F{} - kHeightLimit;
-        F t = load<F>(height + x) + load<F>(velocity + x);
-        t = t > high ? high : t;
-        t = t < low ? low : t;
-        store(t, integrated + x);
+        const F t = load<F>(height + x) + load<F>(velocity + x);
+        store(greater(low, lesser(high, t)), integrated + x);
     });
 }
 
@@ -91,17 +90,19 @@ bool stepWaves(
     float* const v = velocity + start;
     float* const h = height + start;
 
+    const auto pass = [=]<bool test>(std::bool_constant<test>, int row) {
+        return accelerate<test>(v + row * stride, h + row * stride, stride, width, damping, waveSpeed);
+    };
     bool calm = true;
-    for (int row = 0; row < rows; ++row) {
-        // One row that moves settles it.
-        const auto pass = checkCalm && calm ? accelerate<true> : accelerate<false>;
-        calm &= pass(v + row * stride, h + row * stride, stride, width, damping, waveSpeed);
-    }
+    int row = 0;
+    // One row that moves settles it.
+    while (checkCalm && calm && row < rows) calm = pass(std::true_type{}, row++);
+    while (row < rows) pass(std::false_type{}, row++);
 
     const std::ptrdiff_t copyStride = std::ptrdiff_t{width} + 2;
     float* const copies = snapshot.reserve(static_cast<std::size_t>(copyStride) * (static_cast<std::size_t>(rows) + 2));
     float* const s = copies ? copies + copyStride + 1 : nullptr;
-    for (int row = 0; row < rows; ++row) {
+    for (row = 0; row < rows; ++row) {
         float* const heights = h + row * stride;
         integrate(heights, v + row * stride, s ? s + row * copyStride : heights, width);
     }
@@ -110,13 +111,13 @@ bool stepWaves(
     const std::size_t rowBytes = static_cast<std::size_t>(width) * sizeof(float);
     std::memcpy(s - copyStride, h - stride, rowBytes);
     std::memcpy(s + rows * copyStride, h + rows * stride, rowBytes);
-    for (int row = 0; row < rows; ++row) {
+    for (row = 0; row < rows; ++row) {
         s[row * copyStride - 1] = h[row * stride - 1];
         s[row * copyStride + width] = h[row * stride + width];
     }
 
     const float k = damping == 0.94f ? 0.068f : 0.018f;
-    for (int row = 0; row < rows; ++row) {
+    for (row = 0; row < rows; ++row) {
         smooth(h + row * stride, s + row * copyStride, copyStride, width, k);
     }
     return calm;

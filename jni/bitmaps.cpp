@@ -29,6 +29,11 @@ void transferBitmap(JNIEnv* env, jobject bitmap, AndroidBitmapInfo& info, std::u
         LOG_ERROR("AndroidBitmap_getInfo () failed! error = % d", result);
         return;
     }
+    // Formats of fewer than 32 bits have shorter rows, beyond which we would read.
+    if (handed.stride && handed.stride / 4 < handed.width) {
+        LOG_ERROR("not a 32-bit bitmap: %u bytes for %u pixels", handed.stride, handed.width);
+        return;
+    }
     void* locked = nullptr;
     result = AndroidBitmap_lockPixels(env, bitmap, &locked);
     if (result < 0) {

@@ -7,6 +7,7 @@
 #include "jni/ink_frame.h"
 #include "jni/log.h"
 #include "jni/natives.h"
+#include "jni/pinned_arrays.h"
 #include "water/mesh.h"
 #include "water/ripples.h"
 #include "water/waves.h"
@@ -61,31 +62,31 @@ Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onLoadWaterTextures
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_initWaters(
     JNIEnv* env, jobject, jfloatArray positions, jshortArray indices, jint vertexCount, jint meshSizeWidth,
     jint meshSizeHeight, jint numDetailsWidth, jint numDetailsHeight) {
-    jfloat* const p = env->GetFloatArrayElements(positions, nullptr);
-    jshort* const i = env->GetShortArrayElements(indices, nullptr);
-    fillPositions(p, vertexCount, meshSizeWidth, meshSizeHeight, numDetailsWidth, numDetailsHeight);
-    fillIndices(i, numDetailsWidth, numDetailsHeight);
-    env->ReleaseFloatArrayElements(positions, p, 0);
-    env->ReleaseShortArrayElements(indices, i, 0);
+    const auto fill = [=](jfloat* p, jshort* i) {
+        fillPositions(p, vertexCount, meshSizeWidth, meshSizeHeight, numDetailsWidth, numDetailsHeight);
+        fillIndices(i, numDetailsWidth, numDetailsHeight);
+    };
+    withPinned(env, "initWaters", fill, positions, indices);
 }
 
 JNIEXPORT jboolean JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_move(
     JNIEnv* env, jobject, jfloatArray velocity, jfloatArray height, jint xStart, jint yStart, jint xEnd, jint yEnd,
     jint stride, jint, jboolean checkCalm, jfloat damping, jfloat waveSpeed) {
-    jfloat* const v = env->GetFloatArrayElements(velocity, nullptr);
-    jfloat* const h = env->GetFloatArrayElements(height, nullptr);
-    const bool calm = stepWaves(v, h, {xStart, yStart, xEnd, yEnd, stride}, checkCalm, damping, waveSpeed);
-    env->ReleaseFloatArrayElements(velocity, v, 0);
-    env->ReleaseFloatArrayElements(height, h, 0);
+    bool calm = true;
+    const auto advance = [=, &calm](jfloat* v, jfloat* h) {
+        calm = stepWaves(v, h, {xStart, yStart, xEnd, yEnd, stride}, checkCalm, damping, waveSpeed);
+    };
+    withPinned(env, "move", advance, velocity, height);
     return calm;
 }
 
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_ripple(
     JNIEnv* env, jobject, jfloatArray field, jint extentA, jint extentB, jint countA, jint countB, jfloat posA,
     jfloat posB, jfloat amplitude) {
-    jfloat* const values = env->GetFloatArrayElements(field, nullptr);
-    addRipple({values, extentA, extentB, countA, countB}, posA, posB, amplitude);
-    env->ReleaseFloatArrayElements(field, values, 0);
+    const auto add = [=](jfloat* values) {
+        addRipple({values, extentA, extentB, countA, countB}, posA, posB, amplitude);
+    };
+    withPinned(env, "ripple", add, field);
 }
 
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onTouch(
@@ -100,19 +101,14 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
     jfloat inkRed, jfloat inkGreen, jfloat inkBlue, jfloat fresnelRatio, jfloat specularRatio, jfloat exponent,
     jboolean landscape) {
     glViewport(0, 0, SCREEN_WIDTH, SCREEN_HEIGHT);
-    jfloat* const p = env->GetFloatArrayElements(positions, nullptr);
-    jfloat* const h = env->GetFloatArrayElements(heightAttribs, nullptr);
-    jfloat* const m = env->GetFloatArrayElements(mvp, nullptr);
-    jshort* const i = env->GetShortArrayElements(indices, nullptr);
-    if (bWithInk) stepInk({inkRed, inkGreen, inkBlue});
-    fluid.Ripple_Render(
-        p, h, i, positionFloats, heightFloats, indexCount, m, meshSizeWidth, meshSizeHeight, numDetailsWidth,
-        numDetailsHeight, refractiveIndex, alphaMix, alphaScale1, alphaScale2, fresnelRatio, specularRatio, exponent,
-        bWithInk, landscape);
-    env->ReleaseFloatArrayElements(positions, p, 0);
-    env->ReleaseFloatArrayElements(heightAttribs, h, 0);
-    env->ReleaseFloatArrayElements(mvp, m, 0);
-    env->ReleaseShortArrayElements(indices, i, 0);
+    const auto draw = [=](const jfloat* p, const jfloat* h, const jfloat* m, const jshort* i) {
+        if (bWithInk) stepInk({inkRed, inkGreen, inkBlue});
+        fluid.Ripple_Render(
+            p, h, i, positionFloats, heightFloats, indexCount, m, meshSizeWidth, meshSizeHeight, numDetailsWidth,
+            numDetailsHeight, refractiveIndex, alphaMix, alphaScale1, alphaScale2, fresnelRatio, specularRatio,
+            exponent, bWithInk, landscape);
+    };
+    withPinned(env, "onDrawFrame", draw, positions, heightAttribs, mvp, indices);
 }
 
 JNIEXPORT jint JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_getClearInkValue(JNIEnv*, jobject) {

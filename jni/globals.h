@@ -2,6 +2,8 @@
 // the top left, y downwards. There is one thread of control, so nothing is locked.
 #pragma once
 
+#include <limits>
+
 // Tunable.
 extern float TouchPressure;    // weight of the latest touch: pressure^2 + 0.2, or 0 without pressure
 extern int Andante_threshold;  // pixels between two touches above which a movement is medium and a tap a drag
@@ -36,4 +38,9 @@ extern int SCREEN_HEIGHT;
 // a - b as Java's int computes it: a host may report any coordinate, and an overflow of ours would be undefined.
 inline int wrappingDifference(int a, int b) {
     return static_cast<int>(static_cast<unsigned>(a) - static_cast<unsigned>(b));
+}
+
+// Counts a frame of a gesture, which may be held for as long as a finger has patience.
+inline void countFrame(int& frames) {
+    if (frames < std::numeric_limits<int>::max()) ++frames;
 }

@@ -1,8 +1,13 @@
 #include "jni/ink_frame.h"
 
+#include <algorithm>
+
 #include "jni/globals.h"
 
 namespace {
+
+// Far beyond any digitizer. An infinite source would leave a flow of which nothing is a number.
+constexpr float kHeaviestTouch = 1.0e6f;
 
 // The renderer divides by the colour, which must not be 0.
 Color_ offsetColor(Color_ color) {
@@ -27,7 +32,7 @@ void stepTap(Color_ color) {
             static_cast<float>(POSITION_Y), color);
         fluid.BackwardStepSize = static_cast<float>(0.1 * step);
     }
-    ++step;
+    countFrame(step);
     if (step > max_step && TOUCH_ACTION != 2) {
         state = 0;
         step = 0;
@@ -67,10 +72,11 @@ void stepDrag(Color_ color) {
     } else if (isMovingEvent == 1) {
         apply({1, 25.0f, 150.0f, 10.0f, 20.0f, 0.94f, 0.92f});
     } else if (isMovingEvent == 0) {
-        apply({0, 40.0f * TouchPressure, 100.0f, 45.0f * TouchPressure, 20.0f, 0.8f, 0.94f});
+        const float weight = std::min(TouchPressure, kHeaviestTouch);
+        apply({0, 40.0f * weight, 100.0f, 45.0f * weight, 20.0f, 0.8f, 0.94f});
     }
     fluid.Inject(fluid.DragMode, startX, startY, endX, endY, color);
-    ++drag_step;
+    countFrame(drag_step);
     // The next frame's segment starts where this one ended.
     DRAG_START_X = DRAG_END_X;
     DRAG_START_Y = DRAG_END_Y;

@@ -8,7 +8,13 @@
 //   5. for every frame: move and ripple as the animation asks, onTouch for each touch event, onDrawFrame once
 // After the context was lost, or for another view size or another mode, repeat 2 and 3.
 //
-// Array lengths and counts are the caller's word: the library does not compare them.
+// What the caller must guarantee, as the library cannot see it: the thread and the order above while a context is
+// current; arrays at least as long as the counts and regions passed with them ask for; indices that name vertices which
+// exist; bitmaps that stay valid during their hand-over.
+//
+// Everything else may be wrong without harm. A null array, or one that the virtual machine cannot pin, makes its call
+// do nothing; so does drawing before a set-up, or after one whose shaders failed. Both are logged once. Coordinates,
+// pressures, sizes and lighting values may be anything; what is not a number in the mesh arrays stays in them.
 #pragma once
 
 #include <jni.h>
@@ -16,7 +22,8 @@
 extern "C" {
 
 // Take over a picture: 32-bit RGBA, rows from the top, without padding between rows. The pixels are copied; the
-// bitmap may be recycled afterwards. A failure is logged and leaves the earlier picture in place.
+// bitmap may be recycled afterwards. A failure, or rows of fewer than 32 bits a pixel, is logged and leaves the earlier
+// picture in place.
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferPortraitBGBitmap(
     JNIEnv* env, jobject, jobject bitmap);
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferLandscapeBGBitmap(

@@ -6,7 +6,7 @@
 void fillPositions(
     float* positions, int vertexCount, int meshSizeWidth, int meshSizeHeight, int numDetailsWidth,
     int numDetailsHeight) {
-    if (numDetailsHeight < 1) return;
+    if (numDetailsWidth < 1 || numDetailsHeight < 1) return;
     const float stepX = static_cast<float>(meshSizeWidth) / static_cast<float>(numDetailsWidth - 1);
     const float stepY = static_cast<float>(meshSizeHeight) / static_cast<float>(numDetailsHeight - 1);
     const float halfW = static_cast<float>(meshSizeWidth) * 0.5f;

@@ -3,6 +3,7 @@
 #include "fluid/fluid.h"
 #include "gl/texture_units.h"
 #include "gl/uniforms.h"
+#include "jni/log.h"
 
 namespace {
 
@@ -26,6 +27,13 @@ void Fluid::Ripple_Render(
     float refractiveIndex, float alphaMix, float alphaScale1, float alphaScale2, float fresnelRatio,
     float specularRatio, float exponent, bool withInk, bool landscape) {
     const GLuint program = ripple_program;
+    if (!program) {
+        // Without a program there is no picture, and drawing without the buffers of a set-up would read address 0.
+        static bool reported = false;
+        if (!reported) LOG_ERROR("Ripple_Render() without ripple_program");
+        reported = true;
+        return;
+    }
     glViewport(0, 0, ScreenWidth, ScreenHeight);
     glUseProgram(program);
     setUniform(program, "uMESH_SIZE_WIDTH", static_cast<float>(meshSizeWidth));

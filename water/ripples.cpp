@@ -31,6 +31,7 @@ Range boxAround(float centre, int count) {
 }  // namespace
 
 void addRipple(const RippleField& field, float posA, float posB, float amplitude) {
+    if (field.countA < 1 || field.countB < 1) return;
     const float centreA = (posA / static_cast<float>(field.extentA) + 0.5f) * static_cast<float>(field.countA);
     const float centreB = static_cast<float>(field.countB) * (0.5f + posB / static_cast<float>(field.extentB));
     const Range a = boxAround(centreA, field.countA);

@@ -79,9 +79,9 @@ void smooth(float* height, const float* copy, std::ptrdiff_t copyStride, int wid
 
 bool stepWaves(
     float* velocity, float* height, const WaveRegion& region, bool checkCalm, float damping, float waveSpeed) {
+    if (region.yStart >= region.yEnd || region.xStart >= region.xEnd) return true;
     const int width = region.xEnd - region.xStart;
     const int rows = region.yEnd - region.yStart;
-    if (rows <= 0 || width <= 0) return true;
 
     // A surface that comes to rest ends in denormals and stays there.
     const FlushDenormals flush;

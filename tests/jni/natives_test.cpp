@@ -68,6 +68,10 @@ TEST(BitmapHandOver, aFailureIsLoggedAndLeavesTheSlotAlone) {
         slot.transfer(hostEnvironment(), nullptr, &unlockable);
         EXPECT_EQ(log.take(), std::vector<std::string>{"E AndroidBitmap_lockPixels () failed! error = -3"});
         EXPECT_EQ(unlockable.locks, 0);
+        DesktopBitmap narrow = bitmapOf(pixels, 8, 4);
+        narrow.info.stride = 2 * 8;
+        slot.transfer(hostEnvironment(), nullptr, &narrow);
+        EXPECT_EQ(log.take(), std::vector<std::string>{"E not a 32-bit bitmap: 16 bytes for 8 pixels"});
         EXPECT_EQ(slot.pixels, stored);
         EXPECT_EQ(slot.info.width, 4u) << "the size always belongs to the pixels";
     }

@@ -1,0 +1,49 @@
+// The host's arrays for the length of one native call.
+#pragma once
+
+#include <jni.h>
+
+#include <tuple>
+
+#include "jni/log.h"
+
+inline jfloat* pin(JNIEnv* env, jfloatArray array) {
+    return env->GetFloatArrayElements(array, nullptr);
+}
+
+inline jshort* pin(JNIEnv* env, jshortArray array) {
+    return env->GetShortArrayElements(array, nullptr);
+}
+
+inline void release(JNIEnv* env, jfloatArray array, jfloat* elements) {
+    env->ReleaseFloatArrayElements(array, elements, 0);
+}
+
+inline void release(JNIEnv* env, jshortArray array, jshort* elements) {
+    env->ReleaseShortArrayElements(array, elements, 0);
+}
+
+inline void reportMissingArray(const char* method) {
+    static bool reported = false;
+    if (!reported) LOG_ERROR("%s() without an array", method);
+    reported = true;
+}
+
+// Pins the arrays, calls `use` with their elements, and copies them back, all in the order given. Where an array is
+// null or the virtual machine has no memory for its copy, no further one is asked for, `use` is not called, and the log
+// names `method` the first time.
+template <class Use, class... Arrays>
+void withPinned(JNIEnv* env, const char* method, Use use, Arrays... arrays) {
+    std::tuple<decltype(pin(env, arrays))...> pinned;
+    std::apply(
+        [&](auto*&... elements) {
+            ((elements = nullptr), ...);
+            if ((... && (arrays && (elements = pin(env, arrays))))) {
+                use(elements...);
+            } else {
+                reportMissingArray(method);
+            }
+            ((elements ? release(env, arrays, elements) : void()), ...);
+        },
+        pinned);
+}

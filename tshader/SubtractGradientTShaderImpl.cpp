@@ -5,8 +5,8 @@
 #include "tshader/groups.h"
 
 template <class F>
-static Pair<F> lessGradient(Pair<F> velocity, F left, F right, F below, F above, float scale) {
-    return {velocity.x - (right - left) * scale, velocity.y - (above - below) * scale};
+static Pair<F> gradient(F left, F right, F below, F above, float scale) {
+    return {(right - left) * scale, (above - below) * scale};
 }
 
 void SubtractGradientTShaderImpl::shaderMain(const vec4& fragCoord, vec2& out) {
@@ -29,11 +29,10 @@ void SubtractGradientTShaderImpl::run() {
         const vec2* velocity = Velocity.row(j);
         vec2* out = output.row(j);
         const auto border = [&](int i) {
-            storePairs(
-                lessGradient(
-                    loadPairs<float>(velocity + i), Pressure.clamped(i - 1, j), Pressure.clamped(i + 1, j),
-                    Pressure.clamped(i, j - 1), Pressure.clamped(i, j + 1), scale),
-                out + i);
+            const auto slope = gradient(
+                Pressure.clamped(i - 1, j), Pressure.clamped(i + 1, j), Pressure.clamped(i, j - 1),
+                Pressure.clamped(i, j + 1), scale);
+            subtractPairs(velocity + i, slope, out + i);
         };
         int i = 0;
         if (j > 0 && j < height - 1) {
@@ -42,11 +41,10 @@ void SubtractGradientTShaderImpl::run() {
             const float* above = Pressure.row(j + 1);
             border(i++);
             forGroups(1, width - 1, [=]<class F>(F, int x) {
-                storePairs(
-                    lessGradient(
-                        loadPairs<F>(velocity + x), load<F>(pressure + x - 1), load<F>(pressure + x + 1),
-                        load<F>(below + x), load<F>(above + x), scale),
-                    out + x);
+                const auto slope = gradient(
+                    load<F>(pressure + x - 1), load<F>(pressure + x + 1), load<F>(below + x), load<F>(above + x),
+                    scale);
+                subtractPairs(velocity + x, slope, out + x);
             });
             i = std::max(i, width - 1);
         }

@@ -84,13 +84,31 @@ inline Pair<float4> loadPairs<float4>(const vec2* from) {
     return {evenLanes(first, second), oddLanes(first, second)};
 }
 
+inline float4 firstTwo(Pair<float4> value) {
+    return __builtin_shufflevector(value.x, value.y, 0, 4, 1, 5);
+}
+
+inline float4 lastTwo(Pair<float4> value) {
+    return __builtin_shufflevector(value.x, value.y, 2, 6, 3, 7);
+}
+
 inline void storePairs(Pair<float> value, vec2* to) {
     *to = vec2{value.x, value.y};
 }
 
 inline void storePairs(Pair<float4> value, vec2* to) {
-    store(__builtin_shufflevector(value.x, value.y, 0, 4, 1, 5), &to[0].x);
-    store(__builtin_shufflevector(value.x, value.y, 2, 6, 3, 7), &to[2].x);
+    store(firstTwo(value), &to[0].x);
+    store(lastTwo(value), &to[2].x);
+}
+
+// to = from - value, without taking `from` apart.
+inline void subtractPairs(const vec2* from, Pair<float> value, vec2* to) {
+    *to = vec2{from->x - value.x, from->y - value.y};
+}
+
+inline void subtractPairs(const vec2* from, Pair<float4> value, vec2* to) {
+    store(load<float4>(&from[0].x) - firstTwo(value), &to[0].x);
+    store(load<float4>(&from[2].x) - lastTwo(value), &to[2].x);
 }
 
 // first, first + 1, ... in the lanes: exact while the numbers stay below 2^24.

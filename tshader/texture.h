@@ -3,7 +3,7 @@
 
 #include <cstddef>
 
-#include "tshader/vec.h"
+#include "tshader/float4.h"
 
 template <class T>
 struct Texture {
@@ -23,10 +23,10 @@ struct Texture {
     bool empty() const { return data == nullptr || width <= 0 || height <= 0; }
 };
 
-// NaN fails both comparisons and ends at 0, so that it never becomes an index.
+// What is not a number fails the first comparison and ends at 0, so that it never becomes an index.
 template <class F>
 inline F clampToUnit(F c) {
-    return c > 0.0f ? (c < 1.0f ? c : 1.0f) : 0.0f;
+    return lesser(greater(c, F{}), F{} + 1.0f);
 }
 
 // The bilinear blend of four neighbouring texels, for one sample or for four at once.

@@ -20,10 +20,6 @@
 
 namespace {
 
-struct Pictures {
-    Picture portrait, landscape, water;
-};
-
 // The video is closed, or taken back, before the directory of the pictures that may hold it.
 struct Outputs {
     std::unique_ptr<FrameSink> pictures, video;

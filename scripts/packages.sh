@@ -4,6 +4,8 @@ build_packages=(cmake g++ ninja-build openjdk-17-jdk-headless libgles-dev libegl
     libstb-dev libcli11-dev ffmpeg)
 test_packages=(clang clang-format clang-tidy libgtest-dev glslang-tools binutils git)
 arm64_packages=(g++-aarch64-linux-gnu qemu-user googletest)
+web_packages=(cmake ninja-build openjdk-17-jdk-headless emscripten)
+web_test_packages=(chromium)
 bench_packages=(clang libbenchmark-dev libeigen3-dev python3)
 
 install_missing() {

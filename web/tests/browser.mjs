@@ -50,4 +50,15 @@ export async function open(context, address) {
     return page;
 }
 
-export const calm = (page) => page.waitForSelector('.status.calm', { state: 'attached', timeout: 60_000 });
+export async function calm(page) {
+    // What has just been asked for shows in the next frame.
+    await page.evaluate(() => new Promise((resolve) => requestAnimationFrame(() => requestAnimationFrame(resolve))));
+    await page.waitForSelector('.status.calm', { state: 'attached', timeout: 60_000 });
+}
+
+// Puts `text` into the panel's field of that name, as a visitor would.
+export async function setValue(page, name, text) {
+    const field = page.locator('.lil-number', { has: page.getByText(name, { exact: true }) }).locator('input');
+    await field.fill(String(text));
+    await field.press('Enter');
+}

@@ -32,6 +32,9 @@ public:
     void clearInk() { host_.clearInk(); }
     void touch(TouchAction action, int x, int y, float pressure) { host_.touch(action, x, y, pressure); }
 
+    // Where the framebuffer has lost the last frame.
+    void redraw() { host_.setLook(look_); }
+
     // After a lost context.
     void renewContext() { setUpDue_ = true; }
 

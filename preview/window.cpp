@@ -6,10 +6,10 @@
 #include <algorithm>
 #include <cmath>
 #include <cstdlib>
-#include <memory>
 #include <utility>
 
 #include "host/live_water.h"
+#include "platform/keep_driver.h"
 #include "preview/scene.h"
 
 namespace {
@@ -120,6 +120,7 @@ bool runWindow(const PreviewOptions& options, std::string& error) {
     if (!window) return fail("cannot open a window", error);
     glfwMakeContextCurrent(window);
     glfwSwapInterval(1);
+    keepDriverLoaded();
     fitToDriver(options, pictures);
 
     // The ink draws from this generator as well.

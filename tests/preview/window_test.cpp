@@ -30,7 +30,7 @@ protected:
     void SetUp() override {
         start({"--size", std::to_string(kWidth) + "x" + std::to_string(kHeight)});
         send("search --sync --name Tidemark");
-        ASSERT_TRUE(waitUntil([this] { return brightness(grab(kWidth, kHeight)) > 20; })) << "no picture";
+        ASSERT_TRUE(waitUntil([] { return brightness(grab(kWidth, kHeight)) > 20; })) << "no picture";
     }
     void TearDown() override {
         if (process_ > 0) kill(process_, SIGKILL);

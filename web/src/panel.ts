@@ -76,7 +76,7 @@ export function makePanel(settings: Settings, changed: () => void) {
             status.classList.toggle('calm', calm);
             const rate = frameMs ? `${frameMs.toFixed(1)} ms a frame, ` : '';
             status.lastElementChild!.textContent =
-                calm ? 'Calm: no frames are drawn' : `Moving: ${rate}${workMs.toFixed(1)} ms of work`;
+                calm ? 'Calm: no frames are drawn' : `Moving: ${rate}${workMs.toFixed(1)} ms busy`;
         },
     };
 }

@@ -12,7 +12,7 @@ const presets: Record<string, Preset> = {
     'Summer rain': { look: { rainDropsPerSecond: 14, rainAmplitude: 0.7, damping: 0.975 }, ink: false, rain: true },
     'Heavy glass': { look: { refractiveIndex: 2.4, damping: 0.96, waveSpeed: 0.18, exponent: 120, specularRatio: 8 }, ink: false },
     'Quick silver': {
-        look: { alphaMix: 1, alphaScale1: 1, fresnelRatio: 1.6, specularRatio: 10, exponent: 18, touchAmplitude: 3, damping: 0.99 },
+        look: { alphaMix: 0.8, alphaScale1: 0.8, fresnelRatio: 1.2, specularRatio: 6, exponent: 60, touchAmplitude: 3, damping: 0.99 },
         ink: false,
     },
     Honey: { look: { damping: 0.94, waveSpeed: 0.12, touchAmplitude: 3.4, alphaMix: 0.8, inkRed: 0.6, inkGreen: 0.3, inkBlue: 0.02 } },

@@ -30,12 +30,13 @@ class Window : public testing::Test {
 protected:
     void SetUp() override {
         start({"--size", std::to_string(kWidth) + "x" + std::to_string(kHeight)});
-        send("search --sync --name Tidemark");
         ASSERT_TRUE(waitUntil([] { return brightness(grab(kWidth, kHeight)) > 20; })) << "no picture";
+        send("mousemove 20 20");  // keys go where the mouse is
     }
     void TearDown() override {
         if (process_ > 0) kill(process_, SIGKILL);
         if (process_ > 0) waitpid(process_, nullptr, 0);
+        ASSERT_TRUE(waitUntil([] { return brightness(grab(kWidth, kHeight)) < 1; })) << "the window is still there";
     }
 
     void start(std::vector<std::string> arguments) {

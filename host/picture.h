@@ -10,5 +10,10 @@ struct Picture {
     std::vector<std::uint8_t> rgba;  // 4 * width * height bytes
 };
 
+// What the water lies over in a view held upright and in one held across, and the light that its waves throw back.
+struct Pictures {
+    Picture portrait, landscape, water;
+};
+
 // The largest middle part of `picture` that has the proportions aspectWidth : aspectHeight.
 Picture cropToAspect(const Picture& picture, double aspectWidth, double aspectHeight);

@@ -73,12 +73,23 @@ void WaterHost::setUp(bool withInk) {
     JNIEnv* const env = hostEnvironment();
     NATIVE(onInitSetting)(env, nullptr, width_, height_, withInk);
     NATIVE(onInitGPU)(env, nullptr);
-    NATIVE(onLoadPortraitBGTextures)(env, nullptr);
-    NATIVE(onLoadLandscapeBGTextures)(env, nullptr);
-    NATIVE(onLoadWaterTextures)(env, nullptr);
+    showPictures();
     NATIVE(initWaters)
     (env, nullptr, &positions_, &indices_, look_.meshVertices * look_.meshVertices, look_.meshExtent, look_.meshExtent,
      look_.meshVertices, look_.meshVertices);
+    changed_ = true;
+}
+
+void WaterHost::showPictures() {
+    JNIEnv* const env = hostEnvironment();
+    NATIVE(onLoadPortraitBGTextures)(env, nullptr);
+    NATIVE(onLoadLandscapeBGTextures)(env, nullptr);
+    NATIVE(onLoadWaterTextures)(env, nullptr);
+    changed_ = true;
+}
+
+void WaterHost::setLook(const Look& look) {
+    look_ = look;
     changed_ = true;
 }
 
@@ -123,7 +134,11 @@ bool WaterHost::advance(double seconds) {
         if (raining_) dropRain();
         if (calmSteps_ < look_.stepsToRest) stepWater();
     }
-    return changed_ || (withInk_ && fingerDown_) || inkFrames_ > 0;
+    return changed_ || inkMoves();
+}
+
+bool WaterHost::isResting() const {
+    return !changed_ && !raining_ && calmSteps_ >= look_.stepsToRest && !inkMoves();
 }
 
 void WaterHost::stepWater() {

@@ -28,6 +28,12 @@ public:
     void setUp(bool withInk);
     void resize(int width, int height);
 
+    // Shows the pictures handed over since setUp; the water and the ink stay as they are.
+    void showPictures();
+
+    // Takes over all values but those of the mesh, which must be the same.
+    void setLook(const Look& look);
+
     // One touch event; x and y in pixels from the top left corner of the view, pressure around 1.
     void touch(TouchAction action, int x, int y, float pressure);
 
@@ -36,6 +42,9 @@ public:
 
     // Advances the water by `seconds` and says whether the picture has changed since the last draw.
     bool advance(double seconds);
+
+    // Whether the picture stays as it is, however much time passes, until the next call that changes something.
+    bool isResting() const;
 
     // Draws one frame into the current framebuffer. With ink, this is also one step of the ink.
     void draw();
@@ -49,6 +58,7 @@ private:
     void dropRain();
     void raiseRipple(float x, float y, float amplitude);  // position in model units
     void gatherHeights();
+    bool inkMoves() const { return (withInk_ && fingerDown_) || inkFrames_ > 0; }
 
     Look look_;
     int width_ = 0;  // view size, pixels

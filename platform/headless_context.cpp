@@ -3,23 +3,8 @@
 #define EGL_EGLEXT_PROTOTYPES
 #include <EGL/egl.h>
 #include <EGL/eglext.h>
-#include <dlfcn.h>
-#include <link.h>
 
-#include <string_view>
-
-// Keeps Mesa's libraries in memory after their last use: reports made at the exit of the process, such as those of a
-// leak checker, can then name the code that they are about, and the next context starts sooner.
-static void keepDriverLoaded() {
-    const auto keep = [](dl_phdr_info* info, std::size_t, void*) {
-        const std::string_view name = info->dlpi_name;
-        for (const char* part : {"libEGL", "libgl", "_dri.so"}) {
-            if (name.find(part) != name.npos) dlopen(info->dlpi_name, RTLD_LAZY | RTLD_NOLOAD | RTLD_NODELETE);
-        }
-        return 0;
-    };
-    dl_iterate_phdr(keep, nullptr);
-}
+#include "platform/keep_driver.h"
 
 std::unique_ptr<HeadlessContext> HeadlessContext::create(int width, int height, std::string& error) {
     const char* missing = "no OpenGL ES 2.0 driver: install Debian's packages libegl-mesa0 and libgl1-mesa-dri";

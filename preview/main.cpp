@@ -6,6 +6,7 @@
 
 #include "preview/log_filter.h"
 #include "preview/preview.h"
+#include "preview/window.h"
 
 static int fail(const std::string& reason) {
     std::fprintf(stderr, "tidemark-preview: %s\n", reason.c_str());
@@ -18,8 +19,9 @@ int main(int argc, char** argv) {
     std::string ink;
     bool noInk = false;
     bool verbose = false;
+    bool inWindow = false;
 
-    CLI::App app("Draws rippling water over pictures, without a window, into PNG files and a video.");
+    CLI::App app("Draws rippling water over pictures into PNG files and a video, or in a window.");
     app.get_formatter()->column_width(24);
     const auto file = [&](const char* name, std::string& path, const char* help) {
         app.add_option(name, path, help)->type_name("FILE");
@@ -39,6 +41,10 @@ int main(int argc, char** argv) {
     app.add_option("--seed", options.seed, "Number that chance springs from")->capture_default_str();
     CLI::Option* inkOption = app.add_option("--ink", ink, "Colour of the ink that touches drop")->type_name("#rrggbb");
     app.add_flag("--no-ink", noInk, "Clear water only")->excludes(inkOption);
+    CLI::Option* window = app.add_flag("--window", inWindow, "Open a window instead, to touch with the mouse");
+    for (const char* recorded : {"--script", "--seconds", "--fps", "--out", "--every", "--video"}) {
+        window->excludes(app.get_option(recorded));
+    }
     app.add_flag("--verbose", verbose, "Show the library's log");
     try {
         app.parse(argc, argv);
@@ -58,10 +64,11 @@ int main(int argc, char** argv) {
     if (options.framesPerSecond < 4 || options.framesPerSecond > 240) return fail("--fps must be 4 to 240");
     if (*inkOption && !(options.inkColor = parseInkColor(ink))) return fail("--ink " + ink + " is not #rrggbb");
     options.withInk = !noInk;
-    if (options.script.empty()) options.rain = true;
-    if (options.out.empty() && options.video.empty()) options.out = "out";
     if (!verbose) quietenLog();
 
     std::string error;
+    if (inWindow) return runWindow(options, error) ? 0 : fail(error);
+    if (options.script.empty()) options.rain = true;
+    if (options.out.empty() && options.video.empty()) options.out = "out";
     return runPreview(options, error) ? 0 : fail(error);
 }

@@ -1,5 +1,7 @@
 #include "preview/noise.h"
 
+#include <cstdint>
+
 static float smooth(float t) {
     return t * t * (3.0f - 2.0f * t);
 }
@@ -23,6 +25,13 @@ static void addOctave(std::vector<float>& values, int cell, float amplitude, Ran
             values[static_cast<std::size_t>(y * side + x)] += upper + (lower - upper) * fy;
         }
     }
+}
+
+float grainAt(int column, int row) {
+    std::uint32_t bits =
+        static_cast<std::uint32_t>(column) * 0x9E3779B1U ^ static_cast<std::uint32_t>(row) * 0x85EBCA77U;
+    bits = (bits ^ (bits >> 15U)) * 0x2C1B3C6DU;
+    return static_cast<float>(bits >> 8U) * 0x1p-24f;
 }
 
 CloudTile::CloudTile(unsigned seed) : values_(std::size_t{kSide} * kSide, 0.5f) {

@@ -17,6 +17,9 @@ private:
     std::mt19937 engine_;
 };
 
+// Rough as a broken stone: 0 to 1, another value at every place.
+float grainAt(int column, int row);
+
 // A square of clouds, about 0 to 1 and 0.5 on average, that repeats seamlessly.
 class CloudTile {
 public:

@@ -4,7 +4,6 @@
 #include <array>
 #include <cmath>
 #include <cstddef>
-#include <cstdint>
 #include <iterator>
 #include <numbers>
 
@@ -71,23 +70,6 @@ Pebble makePebble(float x, float y, float radius, Random& random) {
     return pebble;
 }
 
-Rgb mix(Rgb a, Rgb b, float t) {
-    return {a.r + (b.r - a.r) * t, a.g + (b.g - a.g) * t, a.b + (b.b - a.b) * t};
-}
-
-// Calls paint(pixel, column, row) for the pixels of the canvas within `reach` of (x, y).
-template <class Paint>
-void forPixelsAround(Canvas& canvas, float x, float y, float reach, Paint paint) {
-    const int left = std::max(0, static_cast<int>(x - reach));
-    const int right = std::min(canvas.width, static_cast<int>(x + reach) + 2);
-    const int top = std::max(0, static_cast<int>(y - reach));
-    const int bottom = std::min(canvas.height, static_cast<int>(y + reach) + 2);
-    for (int row = top; row < bottom; ++row) {
-        Rgb* pixels = &canvas.pixels[static_cast<std::size_t>(row) * static_cast<std::size_t>(canvas.width)];
-        for (int column = left; column < right; ++column) paint(pixels[column], column, row);
-    }
-}
-
 void castShadow(Canvas& canvas, const Pebble& pebble) {
     const float radius = std::sqrt(pebble.along * pebble.across);
     const float x = pebble.x + 0.16f * radius;
@@ -99,16 +81,8 @@ void castShadow(Canvas& canvas, const Pebble& pebble) {
         const float v = (dy * pebble.cosine - dx * pebble.sine) / pebble.across;
         const float depth = std::clamp((1.69f - (u * u + v * v)) / 0.9f, 0.0f, 1.0f);
         const float light = 1.0f - 0.82f * depth * depth * (3.0f - 2.0f * depth);
-        pixel = {pixel.r * light, pixel.g * light, pixel.b * light};
+        pixel = pixel * light;
     });
-}
-
-// Rough as a broken stone: 0 to 1, another value in every pixel.
-float grainAt(int column, int row) {
-    std::uint32_t bits =
-        static_cast<std::uint32_t>(column) * 0x9E3779B1U ^ static_cast<std::uint32_t>(row) * 0x85EBCA77U;
-    bits = (bits ^ (bits >> 15U)) * 0x2C1B3C6DU;
-    return static_cast<float>(bits >> 8U) * 0x1p-24f;
 }
 
 // The colour of the stone at (u, v), which run from -1 to 1 across it.
@@ -117,7 +91,7 @@ Rgb stoneColour(const Pebble& pebble, const CloudTile& clouds, float u, float v,
     const float grain = grainAt(column, row);
     Rgb colour = mix(pebble.mineral.mottle, pebble.mineral.base, std::clamp(cloud * 2.2f - 0.6f, 0.0f, 1.0f));
     const float shade = pebble.shade * (0.86f + 0.28f * grain);
-    colour = {colour.r * shade, colour.g * shade, colour.b * shade};
+    colour = colour * shade;
     if (pebble.veined) {
         const float wander = (cloud - 0.5f) * 0.35f;
         const float away = std::abs(u * pebble.veinX + v * pebble.veinY + wander - pebble.veinOffset);
@@ -166,12 +140,10 @@ void drawPebble(Canvas& canvas, const Pebble& pebble, const CloudTile& clouds) {
 }
 
 void spreadSand(Canvas& canvas, const CloudTile& clouds) {
-    canvas.pixels.resize(static_cast<std::size_t>(canvas.width) * static_cast<std::size_t>(canvas.height));
-    forPixelsAround(
-        canvas, 0.0f, 0.0f, static_cast<float>(canvas.width + canvas.height), [&](Rgb& pixel, int column, int row) {
-            const float light = 0.4f + 0.6f * clouds.at(column, row) + 0.5f * grainAt(column, row);
-            pixel = {0.22f * light, 0.17f * light, 0.115f * light};
-        });
+    forAllPixels(canvas, [&](Rgb& pixel, int column, int row) {
+        const float light = 0.4f + 0.6f * clouds.at(column, row) + 0.5f * grainAt(column, row);
+        pixel = {0.22f * light, 0.17f * light, 0.115f * light};
+    });
 }
 
 void scatter(Canvas& canvas, float smallest, float largest, float layers, Random& random, const CloudTile& clouds) {

@@ -6,23 +6,17 @@
 #include <cmath>
 #include <cstdio>
 #include <cstdlib>
-#include <functional>
 #include <memory>
 #include <vector>
 
 #include "host/water_host.h"
 #include "platform/headless_context.h"
 #include "preview/frame_sink.h"
-#include "preview/picture_file.h"
-#include "preview/procedural_pictures.h"
 #include "preview/progress.h"
+#include "preview/scene.h"
 #include "preview/touch_script.h"
 
 namespace {
-
-struct Pictures {
-    Picture portrait, landscape, water;
-};
 
 // The video is closed, or taken back, before the directory of the pictures that may hold it.
 struct Outputs {
@@ -42,44 +36,6 @@ struct Outputs {
         return (!video || video->finish(error)) && (!pictures || pictures->finish(error));
     }
 };
-
-// The picture of `file`, or the built-in one where there is no file.
-bool choosePicture(
-    const std::string& file, const std::function<Picture()>& builtIn, Picture& picture, std::string& error) {
-    if (file.empty()) {
-        picture = builtIn();
-        return true;
-    }
-    std::optional<Picture> loaded = loadPicture(file, error);
-    if (loaded) picture = std::move(*loaded);
-    return loaded.has_value();
-}
-
-bool choosePictures(const PreviewOptions& options, Pictures& pictures, std::string& error) {
-    // The built-in pictures stay as sharp as the view up to a size where they take too long to make.
-    const auto [width, height] = options.size;
-    const double shrink = std::min(1.0, 2048.0 / std::max(width, height));
-    const int shorter = std::max(1, static_cast<int>(std::min(width, height) * shrink));
-    const int longer = std::max(1, static_cast<int>(std::max(width, height) * shrink));
-    return choosePicture(
-               options.portrait, [&] { return riverBed(shorter, longer); }, pictures.portrait, error) &&
-           choosePicture(
-               options.landscape, [&] { return riverBed(longer, shorter); }, pictures.landscape, error) &&
-           choosePicture(
-               options.water, [] { return waterLight(512); }, pictures.water, error);
-}
-
-void fitToDriver(const std::string& file, Picture& picture) {
-    GLint limit = 0;
-    glGetIntegerv(GL_MAX_TEXTURE_SIZE, &limit);
-    const int width = picture.width;
-    const int height = picture.height;
-    if (std::max(width, height) <= limit) return;
-    picture = fitPicture(std::move(picture), limit);
-    std::fprintf(
-        stderr, "tidemark-preview: %s: scaled from %dx%d to %dx%d pixels, the most that the driver takes\n",
-        file.c_str(), width, height, picture.width, picture.height);
-}
 
 // GL's rows come from the bottom.
 void readFrame(Picture& frame) {
@@ -114,16 +70,6 @@ bool drawFrames(
     return outputs.finish(error);
 }
 
-Look lookFor(const PreviewOptions& options) {
-    Look look;
-    if (options.inkColor) {
-        look.inkRed = options.inkColor->red;
-        look.inkGreen = options.inkColor->green;
-        look.inkBlue = options.inkColor->blue;
-    }
-    return look;
-}
-
 }  // namespace
 
 bool runPreview(const PreviewOptions& options, std::string& error) {
@@ -138,9 +84,7 @@ bool runPreview(const PreviewOptions& options, std::string& error) {
     if (!choosePictures(options, pictures, error)) return false;
     const std::unique_ptr<HeadlessContext> context = HeadlessContext::create(width, height, error);
     if (!context) return false;
-    fitToDriver(options.portrait, pictures.portrait);
-    fitToDriver(options.landscape, pictures.landscape);
-    fitToDriver(options.water, pictures.water);
+    fitToDriver(options, pictures);
     Outputs outputs;
     if (!outputs.open(options, error)) return false;
 

@@ -9,6 +9,15 @@
 #include "preview/caustics.h"
 #include "preview/noise.h"
 #include "preview/pebbles.h"
+#include "preview/pool_tiles.h"
+#include "preview/sea_sand.h"
+
+// The net of light is cast while the ground is painted; a browser gives its programs one thread.
+#ifdef __EMSCRIPTEN__
+static constexpr auto kBeside = std::launch::deferred;
+#else
+static constexpr auto kBeside = std::launch::async;
+#endif
 
 static std::uint8_t toByte(float linear) {
     return static_cast<std::uint8_t>(std::sqrt(std::clamp(linear, 0.0f, 1.0f)) * 255.0f + 0.5f);
@@ -55,14 +64,15 @@ static Rgb underWater(Rgb stone, float depth, float caustic) {
         expose(stone.b * sun * (0.92f + 0.06f * depth) + 0.004f + 0.026f * depth)};
 }
 
-Picture riverBed(int width, int height) {
+// The ground that paintGround(canvas, unit) leaves, under water of depthAt(x, y) in the sun; x and y run from 0 to 1.
+template <class PaintGround, class DepthAt>
+static Picture flood(int width, int height, float netCell, PaintGround paintGround, DepthAt depthAt) {
     const float unit = 0.045f * std::sqrt(static_cast<float>(width) * static_cast<float>(height));
     const int netWidth = (width + 1) / 2;
     const int netHeight = (height + 1) / 2;
-    auto futureNet = std::async(std::launch::async, causticNet, netWidth, netHeight, unit * 0.85f, 3U);
-    Canvas bed{width, height, {}};
-    Random random(5);
-    scatterPebbles(bed, unit, random, CloudTile(11));
+    auto futureNet = std::async(kBeside, causticNet, netWidth, netHeight, unit * netCell, 3U);
+    Canvas bed(width, height);
+    paintGround(bed, unit);
 
     const std::vector<float> net = futureNet.get();
     Picture picture = blank(width, height);
@@ -71,12 +81,33 @@ Picture riverBed(int width, int height) {
         for (int column = 0; column < width; ++column, ++pixel) {
             const float x = static_cast<float>(column) / static_cast<float>(width);
             const float y = static_cast<float>(row) / static_cast<float>(height);
-            const float depth = std::clamp(0.40f * x + 0.80f * y - 0.10f, 0.0f, 1.0f);
+            const float depth = std::clamp(depthAt(x, y), 0.0f, 1.0f);
             const float caustic = sampleHalf(net, netWidth, netHeight, column, row);
             put(picture, pixel, underWater(bed.pixels[pixel], depth, caustic));
         }
     }
     return picture;
+}
+
+Picture riverBed(int width, int height) {
+    const auto pebbles = [](Canvas& bed, float unit) {
+        Random random(5);
+        scatterPebbles(bed, unit, random, CloudTile(11));
+    };
+    return flood(width, height, 0.85f, pebbles, [](float x, float y) { return 0.40f * x + 0.80f * y - 0.10f; });
+}
+
+Picture tiledPool(int width, int height) {
+    const auto tiles = [](Canvas& bed, float unit) { layTiles(bed, unit, CloudTile(41)); };
+    return flood(width, height, 1.5f, tiles, [](float, float y) { return 0.15f + 0.35f * y; });
+}
+
+Picture sandyShore(int width, int height) {
+    const auto sand = [](Canvas& bed, float unit) {
+        Random random(8);
+        rakeSand(bed, unit, random, CloudTile(31));
+    };
+    return flood(width, height, 1.2f, sand, [](float x, float y) { return 0.75f - 0.25f * x - 0.70f * y; });
 }
 
 // A flat surface shows the very middle, slopes lead outwards from there: sky, with the sun's glitter on it.

@@ -1,8 +1,10 @@
-// The pictures that the preview shows when it is given none: a sunlit river bed, upright and across, and the
-// light that the water throws back. Always the same pixels.
+// Pictures for water without a photo: what lies below it, sunlit, in any size and proportions, and the light that the
+// water throws back. Always the same pixels.
 #pragma once
 
 #include "host/picture.h"
 
-Picture riverBed(int width, int height);
+Picture riverBed(int width, int height);    // pebbles
+Picture tiledPool(int width, int height);   // glazed scales in blue and green
+Picture sandyShore(int width, int height);  // ribbed sand with starfish
 Picture waterLight(int side);

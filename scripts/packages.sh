@@ -1,9 +1,11 @@
 # Sourced by the scripts beside it: installs the Debian packages that are missing, as root or through sudo.
 
 build_packages=(cmake g++ ninja-build openjdk-17-jdk-headless libgles-dev libegl-dev libegl-mesa0 libgl1-mesa-dri
-    libstb-dev libcli11-dev ffmpeg)
-test_packages=(clang clang-format clang-tidy libgtest-dev glslang-tools binutils git valgrind)
+    libstb-dev libcli11-dev libglfw3-dev ffmpeg)
+test_packages=(clang clang-format clang-tidy libgtest-dev glslang-tools binutils git valgrind xvfb xauth xdotool)
 arm64_packages=(g++-aarch64-linux-gnu qemu-user googletest)
+web_packages=(cmake ninja-build openjdk-17-jdk-headless emscripten)
+web_test_packages=(chromium)
 bench_packages=(clang libbenchmark-dev libeigen3-dev python3)
 
 install_missing() {

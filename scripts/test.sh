@@ -2,7 +2,7 @@
 # Builds everything with both compilers, warnings being errors, and passes every test, once as shipped and once under
 # the address and undefined behaviour sanitizers. With --arm64: builds for 64-bit Arm instead, passes in an emulator
 # what needs no OpenGL driver, looks for vector arithmetic in the machine code, and compares the results with this
-# machine's bit for bit.
+# machine's bit for bit. With --web: builds the web page instead and tries it in Chromium.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/packages.sh
@@ -18,6 +18,15 @@ if [ "${1-}" = --arm64 ]; then
     cmake --build build/arm64-reference --target results
     diff <(build/arm64-reference/results) <(qemu-aarch64 -L /usr/aarch64-linux-gnu build/arm64-tests/results)
     echo "The results are those of this machine, bit for bit."
+    exit
+fi
+
+if [ "${1-}" = --web ]; then
+    install_missing "${build_packages[@]}" "${web_test_packages[@]}"
+    [ -f build/release/build.ninja ] || cmake --preset release -DTIDEMARK_TESTS=OFF >/dev/null
+    cmake --build --preset release --target tidemark-preview
+    scripts/web.sh --build
+    npm --prefix web test
     exit
 fi
 

@@ -17,21 +17,23 @@ static int contrast(const Picture& picture, int left, int top, int width, int he
     return brightest - darkest;
 }
 
-TEST(ProceduralPictures, RiverBedsAreRepeatableAndShowDetailEverywhere) {
-    for (const auto& [width, height] : {std::pair{216, 384}, std::pair{384, 216}}) {
-        const Picture bed = riverBed(width, height);
-        ASSERT_EQ(bed.rgba.size(), static_cast<std::size_t>(width * height) * 4);
-        EXPECT_EQ(bed.rgba, riverBed(width, height).rgba);
-        const int side = 54;
-        for (int top = 0; top + side <= height; top += side) {
-            for (int left = 0; left + side <= width; left += side) {
-                EXPECT_GT(contrast(bed, left, top, side, side), 40) << left << ", " << top;
+TEST(ProceduralPictures, GroundsAreRepeatableAndShowDetailEverywhere) {
+    for (Picture (*const ground)(int, int) : {riverBed, tiledPool, sandyShore}) {
+        for (const auto& [width, height] : {std::pair{216, 384}, std::pair{384, 216}}) {
+            const Picture picture = ground(width, height);
+            ASSERT_EQ(picture.rgba.size(), static_cast<std::size_t>(width * height) * 4);
+            EXPECT_EQ(picture.rgba, ground(width, height).rgba);
+            const int side = 54;
+            for (int top = 0; top + side <= height; top += side) {
+                for (int left = 0; left + side <= width; left += side) {
+                    EXPECT_GT(contrast(picture, left, top, side, side), 40) << left << ", " << top;
+                }
             }
+            for (std::size_t alpha = 3; alpha < picture.rgba.size(); alpha += 4) ASSERT_EQ(picture.rgba[alpha], 255);
         }
-        for (std::size_t alpha = 3; alpha < bed.rgba.size(); alpha += 4) ASSERT_EQ(bed.rgba[alpha], 255);
-    }
-    for (const auto& [width, height] : {std::pair{1, 1}, std::pair{3, 200}, std::pair{200, 1}}) {
-        EXPECT_EQ(riverBed(width, height).rgba.size(), static_cast<std::size_t>(width * height) * 4);
+        for (const auto& [width, height] : {std::pair{1, 1}, std::pair{3, 200}, std::pair{200, 1}}) {
+            EXPECT_EQ(ground(width, height).rgba.size(), static_cast<std::size_t>(width * height) * 4);
+        }
     }
 }
 

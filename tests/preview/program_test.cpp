@@ -215,6 +215,8 @@ TEST_F(PreviewProgram, RefusesBadInputInOneLineAndLeavesNothing) {
         {{"--colour"}, "--colour"},
     };
     for (const auto& bad : cases) expectFailure(run(small(bad.arguments)), bad.reason);
+    expectFailure(run({"--window", "--video", "water.mp4"}), "excludes --window");
+    expectFailure(run({"--window"}, "DISPLAY="), "no screen for a window");
     for (const char* size : {"0x0", "10", "10x-1", "100000x100000"}) expectFailure(run({"--size", size}), size);
     for (const char* seconds : {"0", "-1", "nan", "inf", "1e9", "x"}) {
         expectFailure(run({"--size", "48x80", "--seconds", seconds}), "--seconds");

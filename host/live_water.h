@@ -1,0 +1,58 @@
+// Water on a screen that is looked at: takes what happens (touches, another size, other pictures, another look) and
+// draws a frame when something has changed. The page in the browser and the window on the desktop are both around it.
+//
+// Call everything on the one thread that owns the OpenGL ES 2.0 context; the context itself is needed by frame() only.
+#pragma once
+
+#include <cstdint>
+
+#include "host/frame_clock.h"
+#include "host/look.h"
+#include "host/picture.h"
+#include "host/water_host.h"
+
+class LiveWater {
+public:
+    enum class Frame {
+        resting,  // nothing to draw until the next call that changes something
+        waiting,  // nothing to draw yet
+        drawn,
+    };
+
+    // `seed` fixes where the rain falls.
+    LiveWater(const Look& look, std::uint32_t seed);
+
+    // Nothing is drawn before the first pictures. Sizes are in pixels, each at least 1.
+    void setPictures(Pictures pictures);
+    void resize(int width, int height);
+
+    void setLook(const Look& look);
+    void setInk(bool withInk);
+    void setRain(bool falling);
+    void clearInk() { host_.clearInk(); }
+    void touch(TouchAction action, int x, int y, float pressure) { host_.touch(action, x, y, pressure); }
+
+    // Where the framebuffer has lost the last frame.
+    void redraw() { host_.setLook(look_); }
+
+    // After a lost context.
+    void renewContext() { setUpDue_ = true; }
+
+    // Brings the water to the time `now`, in seconds, and draws it into the current framebuffer where it has changed.
+    Frame frame(double now);
+
+private:
+    void prepare();
+
+    Look look_;
+    std::uint32_t seed_;
+    WaterHost host_;
+    FrameClock clock_;
+    Pictures pictures_;
+    int width_ = 1;
+    int height_ = 1;
+    bool withInk_ = false;
+    bool raining_ = false;
+    bool setUpDue_ = true;  // at the next frame, where the context is current
+    bool picturesDue_ = false;
+};

@@ -1,0 +1,44 @@
+// What the pictures of the ground below the water are painted on.
+#pragma once
+
+#include <algorithm>
+#include <cstddef>
+#include <vector>
+
+struct Rgb {
+    float r, g, b;  // linear light, 1 is white
+};
+
+inline Rgb mix(Rgb a, Rgb b, float t) {
+    return {a.r + (b.r - a.r) * t, a.g + (b.g - a.g) * t, a.b + (b.b - a.b) * t};
+}
+
+inline Rgb operator*(Rgb colour, float light) {
+    return {colour.r * light, colour.g * light, colour.b * light};
+}
+
+// Rows from the top.
+struct Canvas {
+    Canvas(int w, int h) : width(w), height(h), pixels(static_cast<std::size_t>(w) * static_cast<std::size_t>(h)) {}
+
+    int width, height;
+    std::vector<Rgb> pixels;
+};
+
+// Calls paint(pixel, column, row) for the pixels of the canvas within `reach` of (x, y).
+template <class Paint>
+void forPixelsAround(Canvas& canvas, float x, float y, float reach, Paint paint) {
+    const int left = std::max(0, static_cast<int>(x - reach));
+    const int right = std::min(canvas.width, static_cast<int>(x + reach) + 2);
+    const int top = std::max(0, static_cast<int>(y - reach));
+    const int bottom = std::min(canvas.height, static_cast<int>(y + reach) + 2);
+    for (int row = top; row < bottom; ++row) {
+        Rgb* pixels = &canvas.pixels[static_cast<std::size_t>(row) * static_cast<std::size_t>(canvas.width)];
+        for (int column = left; column < right; ++column) paint(pixels[column], column, row);
+    }
+}
+
+template <class Paint>
+void forAllPixels(Canvas& canvas, Paint paint) {
+    forPixelsAround(canvas, 0.0f, 0.0f, static_cast<float>(canvas.width + canvas.height), paint);
+}

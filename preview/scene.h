@@ -1,0 +1,16 @@
+// What the options of a run ask for, made ready.
+#pragma once
+
+#include <string>
+
+#include "host/look.h"
+#include "host/picture.h"
+#include "preview/preview.h"
+
+// On failure says why in `error`.
+bool choosePictures(const PreviewOptions& options, Pictures& pictures, std::string& error);
+
+// Makes what is larger than the current context's driver takes smaller, and says so on standard error.
+void fitToDriver(const PreviewOptions& options, Pictures& pictures);
+
+Look lookFor(const PreviewOptions& options);

@@ -1,0 +1,134 @@
+#include "preview/window.h"
+
+#define GLFW_INCLUDE_NONE
+#include <GLFW/glfw3.h>
+
+#include <algorithm>
+#include <cmath>
+#include <cstdlib>
+#include <utility>
+
+#include "host/live_water.h"
+#include "platform/keep_driver.h"
+#include "preview/scene.h"
+
+namespace {
+
+struct Stage {
+    LiveWater water;
+    bool withInk, raining;
+    bool pressed = false;
+};
+
+Stage& stageOf(GLFWwindow* window) {
+    return *static_cast<Stage*>(glfwGetWindowUserPointer(window));
+}
+
+void touch(GLFWwindow* window, TouchAction action) {
+    // The cursor's unit is a pixel of the framebuffer on some systems only.
+    double x = 0, y = 0;
+    int width = 0, height = 0, columns = 0, rows = 0;
+    glfwGetCursorPos(window, &x, &y);
+    glfwGetWindowSize(window, &width, &height);
+    glfwGetFramebufferSize(window, &columns, &rows);
+    const auto scale = [](double position, int pixels, int extent) {
+        return static_cast<int>(std::lround(position * pixels / std::max(extent, 1)));
+    };
+    stageOf(window).water.touch(action, scale(x, columns, width), scale(y, rows, height), 1.0f);
+}
+
+void onButton(GLFWwindow* window, int button, int action, int) {
+    if (button != GLFW_MOUSE_BUTTON_LEFT) return;
+    stageOf(window).pressed = action == GLFW_PRESS;
+    touch(window, action == GLFW_PRESS ? TouchAction::down : TouchAction::up);
+}
+
+void onMove(GLFWwindow* window, double, double) {
+    if (stageOf(window).pressed) touch(window, TouchAction::move);
+}
+
+void onKey(GLFWwindow* window, int key, int, int action, int) {
+    if (action != GLFW_PRESS) return;
+    Stage& stage = stageOf(window);
+    if (key == GLFW_KEY_ESCAPE) glfwSetWindowShouldClose(window, GLFW_TRUE);
+    if (key == GLFW_KEY_I) stage.water.setInk(stage.withInk = !stage.withInk);
+    if (key == GLFW_KEY_R) stage.water.setRain(stage.raining = !stage.raining);
+    if (key == GLFW_KEY_C) stage.water.clearInk();
+}
+
+// A window that is put away has no pixels.
+void onResize(GLFWwindow* window, int width, int height) {
+    if (width > 0 && height > 0) stageOf(window).water.resize(width, height);
+}
+
+void onExpose(GLFWwindow* window) {
+    stageOf(window).water.redraw();
+}
+
+void run(GLFWwindow* window, Stage& stage) {
+    glfwSetWindowUserPointer(window, &stage);
+    glfwSetMouseButtonCallback(window, onButton);
+    glfwSetCursorPosCallback(window, onMove);
+    glfwSetKeyCallback(window, onKey);
+    glfwSetFramebufferSizeCallback(window, onResize);
+    glfwSetWindowRefreshCallback(window, onExpose);
+    int width = 0, height = 0;
+    glfwGetFramebufferSize(window, &width, &height);
+    onResize(window, width, height);
+    while (!glfwWindowShouldClose(window)) {
+        switch (stage.water.frame(glfwGetTime())) {
+            case LiveWater::Frame::drawn:
+                glfwSwapBuffers(window);
+                glfwPollEvents();
+                break;
+            case LiveWater::Frame::waiting:
+                glfwWaitEventsTimeout(0.001);
+                break;
+            case LiveWater::Frame::resting:
+                glfwWaitEvents();
+                break;
+        }
+    }
+}
+
+bool fail(const std::string& what, std::string& error) {
+    const char* reason = nullptr;
+    glfwGetError(&reason);
+    error = what + (reason ? std::string(": ") + reason : "");
+    return false;
+}
+
+}  // namespace
+
+bool runWindow(const PreviewOptions& options, std::string& error) {
+    Pictures pictures;
+    if (!choosePictures(options, pictures, error)) return false;
+    if (!glfwInit()) return fail("no screen for a window", error);
+    struct Ended {
+        ~Ended() { glfwTerminate(); }
+    } ended;
+    const std::pair<int, int> hints[] = {
+        {GLFW_CLIENT_API, GLFW_OPENGL_ES_API},
+        {GLFW_CONTEXT_CREATION_API, GLFW_EGL_CONTEXT_API},
+        {GLFW_CONTEXT_VERSION_MAJOR, 2},
+        {GLFW_CONTEXT_VERSION_MINOR, 0},
+        {GLFW_ALPHA_BITS, 0},
+        {GLFW_DEPTH_BITS, 0},
+        {GLFW_STENCIL_BITS, 0}};
+    for (const auto& [hint, value] : hints) glfwWindowHint(hint, value);
+    GLFWwindow* const window = glfwCreateWindow(options.size.width, options.size.height, "Tidemark", nullptr, nullptr);
+    if (!window) return fail("cannot open a window", error);
+    glfwMakeContextCurrent(window);
+    glfwSwapInterval(1);
+    keepDriverLoaded();
+    fitToDriver(options, pictures);
+
+    // The ink draws from this generator as well.
+    srand48(static_cast<long>(options.seed));
+    Stage stage{LiveWater(lookFor(options), options.seed), options.withInk, options.rain};
+    stage.water.setPictures(std::move(pictures));
+    stage.water.setInk(stage.withInk);
+    stage.water.setRain(stage.raining);
+    run(window, stage);
+    return true;
+}

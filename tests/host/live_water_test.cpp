@@ -1,0 +1,138 @@
+#include "host/live_water.h"
+
+#include "tests/support/gesture_state.h"
+#include "tests/support/gl_test.h"
+#include "tests/support/test_pictures.h"
+
+namespace {
+
+using Frame = LiveWater::Frame;
+
+class Live : public GlTest {
+protected:
+    static constexpr int kWidth = 54;
+    static constexpr int kHeight = 96;
+
+    void SetUp() override {
+        GlTest::SetUp();
+        renewContext(kWidth, kHeight);
+        resetGestures();
+        water.resize(kWidth, kHeight);
+        water.setPictures(pictures(1));
+    }
+
+    static Pictures pictures(int variant) {
+        return {smoothPicture(54, 96, variant), smoothPicture(96, 54, variant + 1), smoothPicture(16, 16, variant + 2)};
+    }
+
+    // The frame one sixtieth of a second later.
+    Frame next() { return water.frame(now += 1.0 / 60); }
+
+    int framesToRest() {
+        int frames = 0;
+        while (next() != Frame::resting && frames < 1000) ++frames;
+        return frames;
+    }
+
+    std::vector<Rgba> seen() const { return readPixels(kWidth, kHeight); }
+
+    LiveWater water{Look{}, 1};
+    double now = 100.0;
+};
+
+}  // namespace
+
+TEST_F(Live, drawsWhatHasChangedAndRestsOtherwise) {
+    LiveWater without(Look{}, 1);
+    EXPECT_EQ(without.frame(0.0), Frame::resting) << "there is no picture yet";
+
+    EXPECT_EQ(next(), Frame::drawn);
+    EXPECT_EQ(next(), Frame::resting);
+    water.touch(TouchAction::down, 20, 30, 1.0f);
+    EXPECT_EQ(next(), Frame::drawn);
+    EXPECT_EQ(water.frame(now + 0.004), Frame::waiting) << "one step a frame is enough";
+    EXPECT_EQ(next(), Frame::drawn);
+    const int frames = framesToRest();
+    EXPECT_GT(frames, 60);
+    EXPECT_LT(frames, 600);
+
+    water.redraw();
+    EXPECT_EQ(next(), Frame::drawn);
+    water.setRain(true);
+    EXPECT_NE(next(), Frame::resting);
+    water.setRain(false);
+    EXPECT_LT(framesToRest(), 600);
+}
+
+TEST_F(Live, aPauseIsNotMadeUpFor) {
+    const auto ringAfter = [this](double pause) {
+        water.setLook([] {
+            Look other;
+            other.meshVertices = 32;
+            return other;
+        }());
+        water.setLook(Look{});
+        next();
+        next();
+        now += pause;
+        water.touch(TouchAction::down, 20, 30, 1.0f);
+        for (int i = 0; i < 6; ++i) next();
+        return seen();
+    };
+    EXPECT_EQ(ringAfter(0.0), ringAfter(60.0));
+}
+
+TEST_F(Live, aLookChangesOnWavingWaterAndOnAnotherMeshStartsFlat) {
+    next();
+    const auto flat = seen();
+    water.touch(TouchAction::down, 20, 30, 1.0f);
+    for (int i = 0; i < 6; ++i) next();
+    const auto ring = seen();
+    Look look;
+    look.refractiveIndex = 1.2f;
+    water.setLook(look);
+    EXPECT_EQ(next(), Frame::drawn);
+    const auto lessBent = seen();
+    EXPECT_NE(lessBent, ring);
+    EXPECT_NE(lessBent, flat) << "the waves live on";
+    look.meshVertices = 64;
+    water.setLook(look);
+    EXPECT_EQ(next(), Frame::drawn);
+    EXPECT_EQ(next(), Frame::resting);
+    water.setLook(Look{});
+    next();
+    EXPECT_EQ(seen(), flat);
+}
+
+TEST_F(Live, picturesAreExchangedUnderTheInk) {
+    constexpr int width = 240;
+    constexpr int height = 320;
+    renewContext(width, height);
+    water.resize(width, height);
+    water.setInk(true);
+    next();
+    const auto redBesideTouch = [] { return readPixels(width, height)[height / 2 * width + width / 2 + 12][0]; };
+    const int clear = redBesideTouch();
+    water.touch(TouchAction::down, width / 2, height / 2, 1.0f);
+    water.touch(TouchAction::up, width / 2, height / 2, 1.0f);
+    for (int i = 0; i < 24; ++i) next();
+    water.setPictures(pictures(1));
+    next();
+    EXPECT_LT(redBesideTouch(), clear - 20) << "the ink is still there";
+    water.clearInk();
+    next();
+    EXPECT_NEAR(redBesideTouch(), clear, 6);
+}
+
+TEST_F(Live, aLostContextBringsTheLastPicturesBack) {
+    next();
+    const auto first = seen();
+    water.setPictures(pictures(3));
+    next();
+    const auto second = seen();
+    ASSERT_NE(first, second);
+    renewContext(kWidth, kHeight);
+    water.renewContext();
+    EXPECT_EQ(next(), Frame::drawn);
+    EXPECT_EQ(seen(), second);
+}

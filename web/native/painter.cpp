@@ -1,0 +1,29 @@
+// What the page's worker calls: the built-in pictures. web/src/painter.ts gives them names.
+#include <emscripten.h>
+
+#include "preview/procedural_pictures.h"
+
+static Picture painted;
+
+static const std::uint8_t* keep(Picture picture) {
+    painted = std::move(picture);
+    return painted.rgba.data();
+}
+
+extern "C" {
+
+// Rows from the top, four bytes a pixel, until the next is painted.
+EMSCRIPTEN_KEEPALIVE const std::uint8_t* paintRiverBed(int width, int height) {
+    return keep(riverBed(width, height));
+}
+EMSCRIPTEN_KEEPALIVE const std::uint8_t* paintTiledPool(int width, int height) {
+    return keep(tiledPool(width, height));
+}
+EMSCRIPTEN_KEEPALIVE const std::uint8_t* paintSandyShore(int width, int height) {
+    return keep(sandyShore(width, height));
+}
+EMSCRIPTEN_KEEPALIVE const std::uint8_t* paintWaterLight(int side) {
+    return keep(waterLight(side));
+}
+
+}  // extern "C"

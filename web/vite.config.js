@@ -1,0 +1,34 @@
+import { createHash } from 'node:crypto';
+import { readdirSync, readFileSync, statSync, writeFileSync } from 'node:fs';
+import { join } from 'node:path';
+import { defineConfig } from 'vite';
+
+const out = new URL('dist', import.meta.url).pathname;
+const largestSite = 1_000_000;  // bytes before compression
+
+// Writes the service worker, which has to know every file of the site and to change with each.
+function offline() {
+    return {
+        name: 'offline',
+        apply: 'build',
+        closeBundle() {
+            const paths = readdirSync(out, { recursive: true }).filter((path) => statSync(join(out, path)).isFile()).sort();
+            const hash = createHash('sha256');
+            for (const path of paths) hash.update(path).update(readFileSync(join(out, path)));
+            const code = readFileSync(new URL('src/service_worker.js', import.meta.url), 'utf8')
+                .replace("'VERSION'", JSON.stringify(hash.digest('hex').slice(0, 16)))
+                .replace("['FILES']", JSON.stringify(['./', ...paths]));
+            writeFileSync(join(out, 'service_worker.js'), code);
+            const bytes = [...paths, 'service_worker.js'].reduce((sum, path) => sum + statSync(join(out, path)).size, 0);
+            if (bytes >= largestSite) throw new Error(`the site has ${bytes} bytes, more than ${largestSite}`);
+            console.log(`${bytes} bytes in all`);
+        },
+    };
+}
+
+export default defineConfig({
+    base: './',  // any folder of any server
+    worker: { format: 'es' },
+    server: { fs: { allow: ['..'] } },  // host/look.properties and build/web
+    plugins: [offline()],
+});

@@ -1,4 +1,6 @@
 // A context that is lost in the middle of a gesture, over and over.
+#include <unistd.h>
+
 #include <fstream>
 #include <functional>
 #include <iostream>
@@ -41,13 +43,11 @@ GlObjects liveObjects() {
     return live;
 }
 
-constexpr int kPage = 4096;
-
 long residentKib() {
     long total = 0;
     long resident = 0;
     std::ifstream("/proc/self/statm") >> total >> resident;
-    return resident * (kPage / 1024);
+    return resident * (sysconf(_SC_PAGESIZE) / 1024);
 }
 
 struct View {
@@ -191,4 +191,24 @@ TEST_F(LostContexts, everySetUpMakesTheSameObjectsAndTheWaterGoesOn) {
     EXPECT_EQ(LibraryBlocks::live, blocks);
     std::cout << losses << " contexts lost: " << blocks << " blocks, resident " << resident << " KiB half-way, "
               << residentKib() << " KiB at the end\n";
+}
+
+TEST_F(LostContexts, settingUpAgainInOneContextLeavesNothingBehind) {
+    const int setUps = isFullLength() ? 1000 : 20;
+    const GlObjects water = firstSetUp(false);
+    WaterHost host = start();
+    for (int i = 0; i < 3; ++i) {
+        host.setUp(false);
+        host.draw();
+        ASSERT_EQ(liveObjects(), water) << i;
+    }
+    const GlObjects withInk = firstSetUp(true);
+    const int blocks = LibraryBlocks::live;
+    for (int i = 0; i < setUps; ++i) {
+        // The water alone leaves the objects of the ink as they are.
+        host.setUp(i % 3 != 0);
+        host.draw();
+        ASSERT_EQ(liveObjects(), withInk) << i;
+        ASSERT_EQ(LibraryBlocks::live, blocks);
+    }
 }

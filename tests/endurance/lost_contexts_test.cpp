@@ -24,6 +24,12 @@ struct GlObjects {
     int programs = 0;
     int shaders = 0;
     bool operator==(const GlObjects&) const = default;
+
+    // Of every kind.
+    bool operator<=(const GlObjects& o) const {
+        return buffers <= o.buffers && textures <= o.textures && framebuffers <= o.framebuffers &&
+               programs <= o.programs && shaders <= o.shaders;
+    }
 };
 
 std::ostream& operator<<(std::ostream& out, const GlObjects& o) {
@@ -210,22 +216,36 @@ TEST_F(LostContexts, everySetUpMakesTheSameObjectsAndTheWaterGoesOn) {
     }
 }
 
-TEST_F(LostContexts, settingUpAgainInOneContextLeavesNothingBehind) {
-    const int setUps = isFullLength() ? 1000 : 20;
+TEST_F(LostContexts, noSequenceOfSetUpsPilesObjectsUpOrTakesAnotherOnesAway) {
+    const int setUps = isFullLength() ? 1000 : 100;
     const GlObjects water = firstSetUp(false);
-    WaterHost host = start();
-    for (int i = 0; i < 3; ++i) {
-        host.setUp(false);
-        host.draw();
-        ASSERT_EQ(liveObjects(), water) << i;
-    }
-    const GlObjects withInk = firstSetUp(true);
+    const std::size_t waterPicture = picture(kUpright);
+    const GlObjects all = firstSetUp(true);
+    const std::size_t inkPicture = picture(kUpright);
     const int blocks = LibraryBlocks::live;
+    WaterHost host = start();
+    std::mt19937 random(3);
+    bool hadInk = false;
+    int spared = 0;
     for (int i = 0; i < setUps; ++i) {
-        // The water alone leaves the objects of the ink as they are.
-        host.setUp(i % 3 != 0);
+        SCOPED_TRACE(i);
+        if (random() % 2 == 0) {
+            renewContext(kTarget, kTarget);
+            hadInk = false;
+        }
+        const bool withInk = random() % 2 == 0;
+        host.setUp(withInk);
         host.draw();
-        ASSERT_EQ(liveObjects(), withInk) << i;
-        ASSERT_EQ(LibraryBlocks::live, blocks);
+        EXPECT_EQ(picture(kUpright), withInk ? inkPicture : waterPicture);
+        // The water alone leaves the objects of the ink as they are. Where it follows a lost context with ink, an
+        // object whose name a member of the ink still holds from there is spared: one for each such member, at the
+        // most.
+        hadInk = hadInk || withInk;
+        const GlObjects live = liveObjects();
+        ASSERT_TRUE(live == all || (!hadInk && water <= live && live <= all)) << live;
+        spared += !hadInk && live != water;
+        ASSERT_LE(LibraryBlocks::live, blocks);
+        log.take();
     }
+    std::cout << setUps << " set-ups, objects spared after " << spared << '\n';
 }

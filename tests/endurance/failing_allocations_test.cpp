@@ -1,7 +1,6 @@
 // Each of the library's allocations fails once. A buffer that only grows is allocated once in a process, so every
 // failure gets a process of its own, made before there is a GL context.
 #include <GLES2/gl2.h>
-#include <gmock/gmock.h>
 #include <gtest/gtest.h>
 #include <sys/mman.h>
 #include <sys/wait.h>
@@ -11,9 +10,10 @@
 #include <array>
 #include <cstdio>
 #include <cstdlib>
-#include <cstring>
 #include <memory>
+#include <string>
 #include <string_view>
+#include <vector>
 
 #include "gl/shader_program.h"
 #include "host/native_names.h"
@@ -180,6 +180,7 @@ Shared sessionFailing(int request) {
     return sessionOf(request, request, -1);
 }
 
+// Spares a failure's message two whole frames.
 bool same(const Frame& a, const Frame& b) {
     return a == b;
 }
@@ -199,13 +200,13 @@ TEST(FailingAllocations, costWhatTheyAreForAndTheNextSetUpRecovers) {
     for (int stage = 0; stage < kStages; ++stage) {
         ASSERT_FALSE(same(undisturbed->inked[stage], undisturbed->cleared[stage])) << "ink is seen";
     }
-    int seen[5] = {};
+    std::array<int, 5> seen = {};
     for (int request = 1; request <= undisturbed->requests; ++request) {
         SCOPED_TRACE(request);
         const Shared outcome = sessionFailing(request);
         SCOPED_TRACE(outcome->complaint);
         const Complaint complaint = kindOf(*outcome);
-        ++seen[static_cast<int>(complaint)];
+        ++seen[static_cast<std::size_t>(complaint)];
         EXPECT_EQ(outcome->complaints, complaint != Complaint::none);
         EXPECT_EQ(outcome->shaderErrors, complaint == Complaint::none ? 1 : 2);
         EXPECT_TRUE(same(outcome->inked[kRecovered], undisturbed->inked[kRecovered]));
@@ -237,7 +238,7 @@ TEST(FailingAllocations, costWhatTheyAreForAndTheNextSetUpRecovers) {
         "%d requests failed in turn: %d for pictures, %d for grids, %d for uploads, %d for smoothing, %d for texts\n",
         undisturbed->requests, seen[1], seen[2], seen[3], seen[4], seen[0]);
     // Three pictures and five fields, both twice; both buffers begun and grown; two texts.
-    EXPECT_THAT(seen, testing::ElementsAre(2, 6, 10, 2, 2));
+    EXPECT_EQ(seen, (std::array{2, 6, 10, 2, 2}));
 }
 
 TEST(FailingAllocations, aTimeWithoutAnyMemoryIsSurvived) {

@@ -141,6 +141,14 @@ protected:
         for (int i = 0; i < length && !HasFailure(); ++i) frame();
     }
 
+    // Its going down or up, as the platform codes them, with a place that may be anywhere.
+    void secondFinger() {
+        const int action = (oneIn(2) ? 5 : 6) | 1 << 8;
+        const int x = pick(0, view->width);
+        const int y = pick(0, view->height);
+        touch(action, x, y);
+    }
+
     // A finger goes down, moves by up to `fastest` pixels a frame and goes up, unless the platform takes it away.
     void stroke(int slowest, int fastest, int length) {
         int x = pick(-5, view->width + 5);
@@ -155,7 +163,7 @@ protected:
             y += signY * pick(0, way);
             touch(2, x, y);
             if (!oneIn(10)) frame();
-            if (oneIn(100)) touch((oneIn(2) ? 5 : 6) | 1 << 8, pick(0, view->width), pick(0, view->height));
+            if (oneIn(100)) secondFinger();
         }
         touch(oneIn(15) ? 3 : 1, x, y);
     }

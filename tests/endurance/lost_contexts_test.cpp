@@ -80,7 +80,10 @@ struct Stroke {
     View view = kUpright;
     bool withInk = false;
     bool rain = false;
-    int x, y, dx, dy;
+    int x = 0;
+    int y = 0;
+    int dx = 0;  // a frame
+    int dy = 0;
 };
 
 std::vector<Stroke> strokes(int number) {

@@ -57,8 +57,8 @@ public:
     void DrawQuad();
 
     // One step of the ink simulation, with the parameters that the last frame left: moves the velocity field on the
-    // CPU, uploads it, and carries the ink along it on the GPU. `frame` is not read. Does nothing without the CPU
-    // buffers. Leaves the viewport at the ink's size.
+    // CPU, uploads it, and carries the ink along it on the GPU. `frame` is not read. Without the CPU
+    // buffers only resets the state. Leaves the viewport at the ink's size.
     void Update(int frame);
     // Adds ink along the segment (x1, y1) to (x2, y2), screen pixels with y downwards: mode 2 a band, any other a disc
     // at its end. Only records the stroke while the touch lies within BoundaryMargin of an edge.

@@ -64,7 +64,8 @@ void upload(const Texture<vec2>& velocity, const Surface_& surface) {
 }  // namespace
 
 void Fluid::Update(int) {
-    if (!VelocityTex.data) return;
+    // A set-up leaves the ink's framebuffer bound, which the water must not draw into.
+    if (!VelocityTex.data) return ResetState();
     {
         // A field that fades away ends in denormals.
         const FlushDenormals flush;

@@ -1,0 +1,17 @@
+#!/usr/bin/env bash
+# Runs the endurance tests at their full lengths: a day of simulated use, a thousand lost contexts. As shipped, or with
+# --asan under the sanitizers. Takes minutes.
+set -euo pipefail
+cd "$(dirname "$0")/.."
+source scripts/packages.sh
+install_missing "${build_packages[@]}" "${test_packages[@]}"
+
+preset=release
+[ "${1-}" != --asan ] || preset=asan
+programs=(tidemark_lost_contexts tidemark_failing_allocations tidemark_long_run)
+cmake --preset "$preset" -DTIDEMARK_TESTS=ON -DTIDEMARK_WERROR=ON >/dev/null
+cmake --build --preset "$preset" --target "${programs[@]}"
+export TIDEMARK_ENDURANCE=full ASAN_OPTIONS=allocator_may_return_null=1
+for program in "${programs[@]}"; do
+    "build/$preset/tests/endurance/$program"
+done

@@ -178,21 +178,3 @@ TEST_F(Misuse, noPressureBreaksTheFlow) {
         }
     }
 }
-
-TEST_F(Misuse, aFingerThatNeverLiftsCountsNoFurtherThanAnIntHolds) {
-    constexpr int kMax = std::numeric_limits<int>::max();
-    resetGestures();
-    fluid.InitializeSetting(240, 240, true);
-    fluid.InitializeGPU(true);
-    touch(120, 120, 0, 1.0f);
-    touch(121, 120, 2, 1.0f);
-    step = count = kMax;
-    stepInk({});
-    EXPECT_EQ(step, kMax);
-    EXPECT_EQ(count, std::numeric_limits<int>::min()) << "wraps; nothing reads it";
-    touch(121, 120, 2, 1.0f);
-    ASSERT_EQ(state, 2);
-    drag_step = kMax;
-    stepInk({});
-    EXPECT_EQ(drag_step, kMax);
-}

@@ -14,13 +14,20 @@ static std::size_t byteCount(int width, int height) {
     return 4 * static_cast<std::size_t>(width) * static_cast<std::size_t>(height);
 }
 
-std::optional<Picture> loadPicture(const std::string& path, std::string& error) {
+std::optional<Picture> loadPicture(const std::string& path, std::string& error, int mostPixels) {
     const std::unique_ptr<std::FILE, int (*)(std::FILE*)> file(std::fopen(path.c_str(), "rb"), std::fclose);
     if (!file) {
         error = "cannot read the picture " + path + ": " + std::strerror(errno);
         return std::nullopt;
     }
     Picture picture;
+    // The size is read first: a few bytes can claim a picture that no memory holds.
+    if (stbi_info_from_file(file.get(), &picture.width, &picture.height, nullptr) &&
+        picture.height > mostPixels / std::max(picture.width, 1)) {
+        error = path + " has " + std::to_string(picture.width) + "x" + std::to_string(picture.height) +
+                " pixels, more than the " + std::to_string(mostPixels) + " that are read";
+        return std::nullopt;
+    }
     const std::unique_ptr<stbi_uc, void (*)(void*)> pixels(
         stbi_load_from_file(file.get(), &picture.width, &picture.height, nullptr, STBI_rgb_alpha), stbi_image_free);
     if (!pixels) {

@@ -20,7 +20,7 @@ using Wide = std::int64_t;
 
 constexpr Wide kLongestArray = 1 << 18;   // elements
 constexpr Wide kLargestBitmap = 1 << 20;  // bytes
-constexpr Wide kSessionWork = 4'000'000;  // texels that the ink may compute in one session
+constexpr Wide kSessionWork = 2'200'000;  // texels that the ink may compute in one session
 constexpr int kMostCalls = 100;
 
 Wide product(Wide a, Wide b) {
@@ -30,9 +30,9 @@ Wide product(Wide a, Wide b) {
 JNIEnv* const env = checkedEnvironment();
 Wide workLeft = 0;
 
-// Whether a session has room for one more pass over the grids; a view of 16384 x 16384 has it a few times.
-bool mayCompute() {
-    workLeft -= 1 + product(fluid.GridWidth, fluid.GridHeight);
+// Whether a session has room for one more frame on the grids; with a view of 16384 x 16384 it has it once.
+bool mayCompute(Wide share = 1) {
+    workLeft -= 1 + product(fluid.GridWidth, fluid.GridHeight) / share;
     return workLeft > 0;
 }
 
@@ -86,8 +86,8 @@ void transfer(Values& values) {
     bitmap.info.stride = strideOf(values, bitmap.info.width);
     bitmap.info.format = values.number(1, 8);
     const int failure = values.below(16);
-    if (failure == 13) bitmap.infoResult = values.number(-3, -1);
-    if (failure == 14) bitmap.lockResult = values.number(-3, -1);
+    if (failure == 13) bitmap.infoResult = ANDROID_BITMAP_RESULT_JNI_EXCEPTION;
+    if (failure == 14) bitmap.lockResult = ANDROID_BITMAP_RESULT_JNI_EXCEPTION;
     // A stride of 0 says that the rows are packed.
     const Wide rowBytes = bitmap.info.stride ? Wide{bitmap.info.stride} : Wide{bitmap.info.width} * 4;
     const bool fits = bitmap.info.height == 0 || rowBytes <= kLargestBitmap / Wide{bitmap.info.height};
@@ -106,7 +106,7 @@ void setUp(Values& values) {
 }
 
 void setUpGpu(Values&) {
-    if (!mayCompute()) return;
+    if (!mayCompute(8)) return;
     NATIVE(onInitGPU)(env, nullptr);
 }
 

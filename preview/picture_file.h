@@ -6,7 +6,7 @@
 
 #include "host/picture.h"
 
-// More than any camera takes in one exposure of one sensor; decoding needs a few times four bytes for each.
+// What the largest phone cameras take. Reading one needs a few times four bytes for each pixel.
 constexpr int kMostPixels = 200'000'000;
 
 // On failure, or for a picture of more than `mostPixels` pixels, says why in `error`.

@@ -6,25 +6,52 @@
 #include <algorithm>
 #include <cerrno>
 #include <cmath>
-#include <cstdio>
 #include <cstring>
+#include <fstream>
+#include <iterator>
+#include <limits>
 #include <memory>
+
+#include "preview/jpeg_tables.h"
 
 static std::size_t byteCount(int width, int height) {
     return 4 * static_cast<std::size_t>(width) * static_cast<std::size_t>(height);
 }
 
-std::optional<Picture> loadPicture(const std::string& path, std::string& error) {
-    const std::unique_ptr<std::FILE, int (*)(std::FILE*)> file(std::fopen(path.c_str(), "rb"), std::fclose);
+// The reader's reason quotes bytes of the file, which may be anything.
+static std::string failureReason() {
+    std::string reason = stbi_failure_reason();
+    std::replace_if(
+        reason.begin(), reason.end(), [](char c) { return c < ' ' || c > '~'; }, '?');
+    return reason;
+}
+
+std::optional<Picture> loadPicture(const std::string& path, std::string& error, int mostPixels) {
+    std::ifstream file(path, std::ios::binary);
     if (!file) {
         error = "cannot read the picture " + path + ": " + std::strerror(errno);
         return std::nullopt;
     }
+    const std::string content{std::istreambuf_iterator<char>(file), {}};
+    const auto* const bytes = reinterpret_cast<const stbi_uc*>(content.data());
+    const int size = static_cast<int>(std::min<std::size_t>(content.size(), std::numeric_limits<int>::max()));
+
+    if (!haveSoundTables({bytes, content.size()})) {
+        error = path + " is not a JPEG picture that can be read: its Huffman tables are corrupt";
+        return std::nullopt;
+    }
     Picture picture;
+    // Before anything is decoded: a few bytes can claim a picture that no memory holds.
+    if (stbi_info_from_memory(bytes, size, &picture.width, &picture.height, nullptr) &&
+        picture.height > mostPixels / std::max(picture.width, 1)) {
+        error = path + " has " + std::to_string(picture.width) + "x" + std::to_string(picture.height) +
+                " pixels, more than the " + std::to_string(mostPixels) + " that can be read";
+        return std::nullopt;
+    }
     const std::unique_ptr<stbi_uc, void (*)(void*)> pixels(
-        stbi_load_from_file(file.get(), &picture.width, &picture.height, nullptr, STBI_rgb_alpha), stbi_image_free);
+        stbi_load_from_memory(bytes, size, &picture.width, &picture.height, nullptr, STBI_rgb_alpha), stbi_image_free);
     if (!pixels) {
-        error = path + " is not a PNG or JPEG picture that can be read: " + stbi_failure_reason();
+        error = path + " is not a PNG or JPEG picture that can be read: " + failureReason();
         return std::nullopt;
     }
     picture.rgba.assign(pixels.get(), pixels.get() + byteCount(picture.width, picture.height));

@@ -1,8 +1,9 @@
 #!/usr/bin/env bash
 # Builds everything with both compilers, warnings being errors, and passes every test, once as shipped and once under
-# the address and undefined behaviour sanitizers. With --arm64: builds for 64-bit Arm instead, passes in an emulator
-# what needs no OpenGL driver, looks for vector arithmetic in the machine code, and compares the results with this
-# machine's bit for bit. With --web: builds the web page instead and tries it in Chromium.
+# the address and undefined behaviour sanitizers; then fuzzes for some seconds. With --arm64: builds for 64-bit Arm
+# instead, passes in an emulator what needs no OpenGL driver, looks for vector arithmetic in the machine code, and
+# compares the results with this machine's bit for bit. With --web: builds the web page instead and tries it in
+# Chromium.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/packages.sh
@@ -30,14 +31,17 @@ if [ "${1-}" = --web ]; then
     exit
 fi
 
-install_missing "${build_packages[@]}" "${test_packages[@]}"
+install_missing "${build_packages[@]}" "${test_packages[@]}" "${fuzz_packages[@]}"
 git ls-files '*.cpp' '*.h' | xargs clang-format --dry-run --Werror
 for preset in release asan clang; do
     cmake --preset "$preset" -DTIDEMARK_TESTS=ON -DTIDEMARK_WERROR=ON >/dev/null
     cmake --build --preset "$preset"
 done
+cmake --preset fuzz -DTIDEMARK_WERROR=ON >/dev/null
+cmake --build --preset fuzz
 ctest --preset release -j "$(nproc)"
 ctest --preset asan -j "$(nproc)"
-# The long run in the virtual machine is about the contract with Java, which no compiler changes.
-ctest --preset clang -j "$(nproc)" --exclude-regex '^jvm'
+ctest --preset fuzz -j "$(nproc)"
+# Java, the screen and long sessions are about contracts which no compiler changes.
+ctest --preset clang -j "$(nproc)" --exclude-regex "^(jvm|window|LostContexts|FailingAllocations|LongRun)"
 scripts/lint.sh

@@ -8,9 +8,10 @@
 #include <cmath>
 #include <cstring>
 #include <fstream>
-#include <iterator>
 #include <limits>
 #include <memory>
+#include <sstream>
+#include <utility>
 
 #include "preview/jpeg_tables.h"
 
@@ -32,7 +33,9 @@ std::optional<Picture> loadPicture(const std::string& path, std::string& error, 
         error = "cannot read the picture " + path + ": " + std::strerror(errno);
         return std::nullopt;
     }
-    const std::string content{std::istreambuf_iterator<char>(file), {}};
+    std::ostringstream stream;
+    stream << file.rdbuf();  // a directory reads as nothing
+    const std::string content = std::move(stream).str();
     const auto* const bytes = reinterpret_cast<const stbi_uc*>(content.data());
     const int size = static_cast<int>(std::min<std::size_t>(content.size(), std::numeric_limits<int>::max()));
 

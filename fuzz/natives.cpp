@@ -100,8 +100,8 @@ void transfer(Values& values) {
 }
 
 void setUp(Values& values) {
-    const int width = values.number(-12, 400);
-    const int height = values.number(-12, 400);
+    const int width = values.number(-12, 243);
+    const int height = values.number(-12, 243);
     NATIVE(onInitSetting)(env, nullptr, width, height, static_cast<jboolean>(values.below(4) > 0));
 }
 
@@ -186,8 +186,8 @@ void ripple(Values& values) {
 }
 
 void touch(Values& values) {
-    const int x = values.number(-20, 420);
-    const int y = values.number(-20, 420);
+    const int x = values.number(-10, 245);
+    const int y = values.number(-10, 245);
     const int action = values.number(0, 3);
     NATIVE(onTouch)(env, nullptr, x, y, action, values.real());
 }

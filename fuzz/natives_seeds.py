@@ -54,8 +54,8 @@ class Session:
     def set_up(self, width, height, ink):
         self.call("setUp")
         for side in (width, height):
-            if side <= 400:
-                self.number(-12, 400, side)
+            if side <= 243:
+                self.number(-12, 243, side)
             else:
                 self.absurd(side)
         self.below(4, int(ink))
@@ -94,8 +94,8 @@ class Session:
 
     def touch(self, x, y, action, pressure=1.0):
         self.call("touch")
-        self.number(-20, 420, x)
-        self.number(-20, 420, y)
+        self.number(-10, 245, x)
+        self.number(-10, 245, y)
         self.number(0, 3, action)
         self.real(pressure)
 
@@ -133,47 +133,47 @@ def started(width, height, ink):
 
 
 def stroke(session, pixels_a_frame, pressure=1.0):
-    x = 120
-    session.touch(x, 200, DOWN, pressure)
+    x = 70
+    session.touch(x, 80, DOWN, pressure)
     session.draw(1)
-    for _ in range(8):
+    for _ in range(7):
         x += pixels_a_frame
-        session.touch(x, 200, MOVE, pressure)
+        session.touch(x, 80, MOVE, pressure)
         session.draw(2)
-    session.touch(x, 200, UP, pressure)
+    session.touch(x, 80, UP, pressure)
     session.draw(4)
 
 
-water = started(240, 400, False)
+water = started(160, 240, False)
 for x, y in ((0, 0), (10, -5), (-15.9, 15.9)):
     water.ripple(16, x, y)
     water.move(16)
     water.draw(1)
 water.save("water")
 
-tap = started(240, 400, True)
-tap.touch(120, 200, DOWN)
+tap = started(160, 240, True)
+tap.touch(80, 120, DOWN)
 tap.draw(14)
-tap.touch(120, 200, UP)
+tap.touch(80, 120, UP)
 tap.ask()
 tap.draw(4)
 tap.clear()
-tap.touch(2, 200, DOWN)
+tap.touch(2, 120, DOWN)
 tap.draw(3)
-tap.touch(2, 200, CANCEL)
+tap.touch(2, 120, CANCEL)
 tap.draw(1)
 tap.save("taps")
 
 for name, pixels in (("slow", 1), ("medium", 6), ("fast", 20)):
-    drag = started(400, 240, True)
+    drag = started(240, 160, True)
     stroke(drag, pixels)
     drag.save(name + "_stroke")
 
-renewed = started(200, 300, True)
+renewed = started(150, 200, True)
 stroke(renewed, 20)
-renewed.set_up(300, 200, True)
+renewed.set_up(200, 150, True)
 stroke(renewed, 1)
-renewed.set_up(300, 200, False)
+renewed.set_up(200, 150, False)
 renewed.draw(1)
 renewed.set_up(8, 8, True)
 renewed.touch(4, 4, DOWN)
@@ -181,7 +181,7 @@ renewed.draw(2)
 renewed.save("renewed_set_up")
 
 large = started(4096, 2160, True)
-large.touch(400, 400, DOWN)
+large.touch(240, 240, DOWN)
 large.draw(3)
 large.set_up(2**31 - 1, 2**31 - 1, True)
 large.draw(1)

@@ -16,15 +16,15 @@ public:
 
     int number(int least, int most) {
         const auto kind = ConsumeIntegral<std::uint8_t>();
-        if (kind < 224) return ConsumeIntegralInRange(least, most);
-        if (kind < 240) return PickValueInArray(kEdges);
+        if (kind < 208) return ConsumeIntegralInRange(least, most);
+        if (kind < 236) return PickValueInArray(kEdges);
         return ConsumeIntegral<int>();
     }
 
     float real() {
         const auto kind = ConsumeIntegral<std::uint8_t>();
-        if (kind < 224) return static_cast<float>(ConsumeIntegralInRange(-32768, 32767)) / 256.0f;
-        if (kind < 240) return PickValueInArray(kRealEdges);
+        if (kind < 208) return static_cast<float>(ConsumeIntegralInRange(-32768, 32767)) / 256.0f;
+        if (kind < 236) return PickValueInArray(kRealEdges);
         return std::bit_cast<float>(ConsumeIntegral<std::uint32_t>());
     }
 

@@ -4,6 +4,7 @@
 #include <stb/stb_image_write.h>
 
 #include <filesystem>
+#include <fstream>
 
 static std::string scratch(const char* name) {
     return (std::filesystem::path(testing::TempDir()) / name).string();
@@ -36,6 +37,34 @@ TEST(PictureFile, ReadsPngAndJpegOfAnyKindAsOpaqueRgba) {
     std::filesystem::resize_file(png, std::filesystem::file_size(png) / 2);
     EXPECT_FALSE(loadPicture(png, error));
     EXPECT_NE(error.find(png), std::string::npos) << error;
+}
+
+static std::string reasonAgainst(const std::string& content) {
+    const std::string path = scratch("bad");
+    std::ofstream(path, std::ios::binary) << content;
+    std::string error;
+    EXPECT_FALSE(loadPicture(path, error));
+    return error;
+}
+
+TEST(PictureFile, RefusesWhatWouldHarmTheProcess) {
+    using namespace std::string_literals;
+    const auto png = "\x89PNG\r\n\x1a\n\0\0\0\rIHDR"s;
+    const auto huge = "\0\0\x75\x30\0\0\x75\x30\x08\6\0\0\0crc?"s;
+    EXPECT_NE(reasonAgainst(png + huge).find("30000x30000"), std::string::npos);
+
+    const auto small = "\0\0\0\1\0\0\0\1\x08\6\0\0\0crc?"s;
+    const std::string reason = reasonAgainst(png + small + "\0\0\0\0\x1b[7mcrc?"s);
+    EXPECT_EQ(reason.find('\x1b'), std::string::npos) << "bytes of the file that a terminal would obey";
+
+    // Tables of one code too many, where the file's parts are still told apart and after that.
+    const std::string codes(257, 'c');
+    const auto counts = "\0\0\0\0\0\0\0\1\xff\1\0\0\0\0\0\0"s;
+    const auto table = "\xff\xc4\1\x14\0"s + counts + codes;
+    EXPECT_NE(reasonAgainst("\xff\xd8\xff\xe0\0\4ab"s + table).find("Huffman"), std::string::npos);
+    EXPECT_NE(reasonAgainst("\xff\xd8\xff\xda\0\4abscan"s + table).find("Huffman"), std::string::npos);
+    // Inside a comment, where nobody reads it as a table.
+    EXPECT_EQ(reasonAgainst("\xff\xd8\xff\xfe\1\x20"s + table + "........"s).find("Huffman"), std::string::npos);
 }
 
 TEST(PictureFile, FitsLargePicturesInTheirOwnProportions) {

@@ -233,9 +233,11 @@ constexpr Call kCalls[] = {transfer, setUp, setUpGpu, loadTextures, makeMesh, mo
 
 }  // namespace
 
-// Grids that a phone has no memory for are refused at once instead of filling this machine's.
+// Grids that a phone has no memory for are refused at once instead of filling this machine's. What nobody has written
+// is not a number.
 extern "C" const char* __asan_default_options() {
-    return "allocator_may_return_null=1:max_allocation_size_mb=64:quarantine_size_mb=16";
+    return "allocator_may_return_null=1:max_allocation_size_mb=64:quarantine_size_mb=16"
+           ":max_malloc_fill_size=1048576:malloc_fill_byte=255";
 }
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {

@@ -136,7 +136,7 @@ def stroke(session, pixels_a_frame, pressure=1.0):
     x = 70
     session.touch(x, 80, DOWN, pressure)
     session.draw(1)
-    for _ in range(7):
+    for _ in range(10):
         x += pixels_a_frame
         session.touch(x, 80, MOVE, pressure)
         session.draw(2)
@@ -164,13 +164,13 @@ tap.touch(2, 120, CANCEL)
 tap.draw(1)
 tap.save("taps")
 
-for name, pixels in (("slow", 1), ("medium", 6), ("fast", 20)):
+for name, pixels in (("slow", 1), ("medium", 6), ("fast", 15)):
     drag = started(240, 160, True)
     stroke(drag, pixels)
     drag.save(name + "_stroke")
 
 renewed = started(150, 200, True)
-stroke(renewed, 20)
+stroke(renewed, 15)
 renewed.set_up(200, 150, True)
 stroke(renewed, 1)
 renewed.set_up(200, 150, False)

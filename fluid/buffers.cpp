@@ -17,8 +17,8 @@ void release(Texture<T>& texture) {
     texture = {};
 }
 
-// Floats count texels exactly only up to 2^24, and no view comes near a side of this.
-constexpr int kLargestSide = 65536;
+// Of a view of 65,536 pixels: no GPU has larger textures, and the memory for a larger grid would be half the device's.
+constexpr int kLargestSide = 65536 / 12;
 
 template <class T>
 bool renew(Texture<T>& texture, int width, int height) {

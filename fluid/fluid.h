@@ -58,7 +58,7 @@ public:
 
     // One step of the ink simulation, with the parameters that the last frame left: moves the velocity field on the
     // CPU, uploads it, and carries the ink along it on the GPU. `frame` is not read. Without the CPU
-    // buffers only resets the state. Leaves the viewport at the ink's size.
+    // buffers it only resets the state. Leaves the viewport at the ink's size.
     void Update(int frame);
     // Adds ink along the segment (x1, y1) to (x2, y2), screen pixels with y downwards: mode 2 a band, any other a disc
     // at its end. Only records the stroke while the touch lies within BoundaryMargin of an edge.
@@ -146,6 +146,7 @@ public:
     Texture<float> PressureTex;
     Texture<float> PressureTexTemp;
     Texture<float> DivergenceTex;
+    bool inkTargetBound = false;  // since the set-up, which the first ink frame undoes
 };
 
 extern Fluid fluid;

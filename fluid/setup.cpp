@@ -84,7 +84,12 @@ void Fluid::InitializeGPU(bool withInk) {
     rebuild(
         *this, {ripple_program, ripple_vertexShader, ripple_fragmentShader}, "ripple_program", "ripple_vertextShader",
         kWaterVert, withInk ? kWaterInkFrag : kWaterPlainFrag);
-    if (!withInk) return;
+    if (!withInk) {
+        // A set-up for ink that no frame followed has left its target bound, which the water would draw into.
+        if (inkTargetBound) glBindFramebuffer(GL_FRAMEBUFFER, 0);
+        inkTargetBound = false;
+        return;
+    }
 
     rebuild(
         *this, {advect_density_program, advect_density_vertexShader, advect_density_fragmentShader},
@@ -119,4 +124,5 @@ void Fluid::InitializeGPU(bool withInk) {
     glViewport(0, 0, InkWidth, InkHeight);
     ClearSurface(Density.Ping, 0.0f, 0.0f, 0.0f, 0.0f);
     ClearSurface(Density.Pong, 0.0f, 0.0f, 0.0f, 0.0f);
+    inkTargetBound = true;
 }

@@ -52,5 +52,6 @@ void Fluid::ClearSurface(Surface_ surface, float red, float green, float blue, f
 void Fluid::ResetState() {
     unbindTextureUnits();
     glBindFramebuffer(GL_FRAMEBUFFER, 0);
+    inkTargetBound = false;
     glDisable(GL_BLEND);
 }

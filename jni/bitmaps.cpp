@@ -29,7 +29,8 @@ void transferBitmap(JNIEnv* env, jobject bitmap, AndroidBitmapInfo& info, std::u
         LOG_ERROR("AndroidBitmap_getInfo () failed! error = % d", result);
         return;
     }
-    // Formats of fewer than 32 bits have shorter rows, beyond which we would read.
+    // Formats of fewer than 32 bits have shorter rows, beyond which we would read. A platform that does not tell is
+    // trusted.
     if (handed.stride && handed.stride / 4 < handed.width) {
         LOG_ERROR("not a 32-bit bitmap: %u bytes for %u pixels", handed.stride, handed.width);
         return;
@@ -43,8 +44,9 @@ void transferBitmap(JNIEnv* env, jobject bitmap, AndroidBitmapInfo& info, std::u
     // Copied, not kept locked: a host that recycles its bitmap early cannot pull the pixels from under us, and
     // after a lost context the textures are loaded again without another hand-over. Costs one picture of memory. The
     // size is stored together with the copy, so that it never belongs to other pixels.
-    const std::size_t bytes = std::size_t{handed.width} * handed.height * 4;
-    void* const copy = locked ? std::realloc(pixels, bytes ? bytes : 1) : nullptr;
+    const std::uint64_t wanted = std::uint64_t{handed.width} * handed.height * 4;
+    const auto bytes = static_cast<std::size_t>(wanted);
+    void* const copy = locked && wanted == bytes ? std::realloc(pixels, bytes ? bytes : 1) : nullptr;
     if (copy) {
         pixels = static_cast<std::uint8_t*>(copy);
         info = handed;

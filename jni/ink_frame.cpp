@@ -6,8 +6,8 @@
 
 namespace {
 
-// Far beyond any digitizer. An infinite source would leave a flow of which nothing is a number.
-constexpr float kHeaviestTouch = 1.0e6f;
+// Far beyond any digitizer. A source near the end of a float's range would leave a flow of which nothing is a number.
+constexpr float kHeaviestTouch = 1.0e30f;
 
 // The renderer divides by the colour, which must not be 0.
 Color_ offsetColor(Color_ color) {

@@ -12,9 +12,11 @@
 // current; arrays at least as long as the counts and regions passed with them ask for; indices that name vertices which
 // exist; bitmaps that stay valid during their hand-over.
 //
-// Everything else may be wrong without harm. A null array, or one that the virtual machine cannot pin, makes its call
-// do nothing; so does drawing before a set-up, or after one whose shaders failed. Both are logged once. Coordinates,
-// pressures, sizes and lighting values may be anything; what is not a number in the mesh arrays stays in them.
+// Everything else may be wrong without harm. A null array, or one that the virtual machine cannot pin (its
+// OutOfMemoryError is then pending), makes its call change nothing but, in onDrawFrame, the viewport; move answers
+// true. Drawing before a set-up, or after one whose shaders failed, draws no water. Both are logged once. Coordinates,
+// pressures, sizes and lighting values may be anything: the ink of a view of more than 65,536 pixels a side is left
+// out, and what is not a number in the mesh arrays stays in them.
 #pragma once
 
 #include <jni.h>

@@ -23,17 +23,12 @@ inline void release(JNIEnv* env, jshortArray array, jshort* elements) {
     env->ReleaseShortArrayElements(array, elements, 0);
 }
 
-inline void reportMissingArray(const char* method) {
-    static bool reported = false;
-    if (!reported) LOG_ERROR("%s() without an array", method);
-    reported = true;
-}
-
 // Pins the arrays, calls `use` with their elements, and copies them back, all in the order given. Where an array is
 // null or the virtual machine has no memory for its copy, no further one is asked for, `use` is not called, and the log
 // names `method` the first time.
 template <class Use, class... Arrays>
 void withPinned(JNIEnv* env, const char* method, Use use, Arrays... arrays) {
+    static bool reported = false;
     std::tuple<decltype(pin(env, arrays))...> pinned;
     std::apply(
         [&](auto*&... elements) {
@@ -41,7 +36,8 @@ void withPinned(JNIEnv* env, const char* method, Use use, Arrays... arrays) {
             if ((... && (arrays && (elements = pin(env, arrays))))) {
                 use(elements...);
             } else {
-                reportMissingArray(method);
+                if (!reported) LOG_ERROR("%s() without an array", method);
+                reported = true;
             }
             ((elements ? release(env, arrays, elements) : void()), ...);
         },

@@ -22,7 +22,7 @@ void fillPositions(
 }
 
 void fillIndices(std::int16_t* indices, int numDetailsWidth, int numDetailsHeight) {
-    if (numDetailsHeight < 2) return;
+    if (numDetailsHeight < 2) return;  // no cells, however many columns there are
     for (int p = 1; p < numDetailsWidth; ++p) {
         for (int q = 1; q < numDetailsHeight; ++q) {
             // Row p, column q: the bottom right corner of the cell, in the 16 bits that an index has.

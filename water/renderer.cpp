@@ -27,10 +27,10 @@ void Fluid::Ripple_Render(
     float refractiveIndex, float alphaMix, float alphaScale1, float alphaScale2, float fresnelRatio,
     float specularRatio, float exponent, bool withInk, bool landscape) {
     const GLuint program = ripple_program;
-    if (!program) {
-        // Without a program there is no picture, and drawing without the buffers of a set-up would read address 0.
+    if (!program || !v_buf) {
+        // Drawing without the buffers of a set-up would read address 0.
         static bool reported = false;
-        if (!reported) LOG_ERROR("Ripple_Render() without ripple_program");
+        if (!reported) LOG_ERROR("Ripple_Render() without a set-up");
         reported = true;
         return;
     }

@@ -3,6 +3,9 @@
 #include <gtest/gtest.h>
 
 #include <cstring>
+#include <initializer_list>
+#include <utility>
+#include <vector>
 
 #include "fluid/fluid.h"
 #include "host/host_jni.h"
@@ -161,4 +164,44 @@ TEST_F(Natives, clearingTheInkEndsTheGesture) {
     EXPECT_EQ(fluid.DensityDissipation, 0.0f);
     EXPECT_EQ(fluid.DragMode, 0);
     EXPECT_EQ(NATIVE(getClearInkValue)(hostEnvironment(), nullptr), 0);
+}
+
+TEST_F(Natives, everyArrayIsPinnedAndCopiedBackInTheOrderOfTheContract) {
+    static std::vector<std::pair<const void*, int>> calls;  // the array, and the mode of its release or -1 for its pin
+    static JNINativeInterface_ table = *hostEnvironment()->functions;
+    table.GetFloatArrayElements = [](JNIEnv*, jfloatArray array, jboolean* isCopy) {
+        calls.emplace_back(array, isCopy ? -2 : -1);
+        return hostEnvironment()->GetFloatArrayElements(array, nullptr);
+    };
+    table.GetShortArrayElements = [](JNIEnv*, jshortArray array, jboolean* isCopy) {
+        calls.emplace_back(array, isCopy ? -2 : -1);
+        return hostEnvironment()->GetShortArrayElements(array, nullptr);
+    };
+    table.ReleaseFloatArrayElements = [](JNIEnv*, jfloatArray array, jfloat* elements, jint mode) {
+        calls.emplace_back(array, mode);
+        hostEnvironment()->ReleaseFloatArrayElements(array, elements, mode);
+    };
+    table.ReleaseShortArrayElements = [](JNIEnv*, jshortArray array, jshort* elements, jint mode) {
+        calls.emplace_back(array, mode);
+        hostEnvironment()->ReleaseShortArrayElements(array, elements, mode);
+    };
+    JNIEnv env = {&table};
+    FloatArray positions(12), heights(4), attribs(12), mvp(16), velocity(4);
+    ShortArray indices(6);
+    const auto expectOrder = [](std::initializer_list<const void*> arrays) {
+        decltype(calls) expected;
+        for (const int what : {-1, 0}) {
+            for (const void* array : arrays) expected.emplace_back(array, what);
+        }
+        EXPECT_EQ(calls, expected);
+        calls.clear();
+    };
+    NATIVE(initWaters)(&env, nullptr, &positions, &indices, 4, 1, 1, 2, 2);
+    expectOrder({&positions, &indices});
+    NATIVE(move)(&env, nullptr, &velocity, &heights, 0, 0, 0, 0, 2, 2, true, 0.9f, 0.3f);
+    expectOrder({&velocity, &heights});
+    NATIVE(onDrawFrame)
+    (&env, nullptr, &positions, &attribs, &indices, 12, 12, 6, &mvp, 1, 1, 2, 2, 1.33f, 0.5f, 0.5f, 1.0f, 0.0f, 0.0f,
+     0.0f, 1.0f, 1.0f, 40.0f, false);
+    expectOrder({&positions, &attribs, &mvp, &indices});
 }

@@ -107,6 +107,24 @@ TEST(Waves, heightsAreLimitedBeforeTheyAreSmoothed) {
 }
 
 // Every vertex of a row in turn, so that grouped and single ones are both asked.
+TEST(Waves, onlyHeightsThatAreNumbersAreLimited) {
+    for (int x = 1; x <= 7; ++x) {
+        SCOPED_TRACE(x);
+        Surface s(9, 4);
+        s.h[s.at(x, 1)] = kNan;
+        stepWaves(s.v.data(), s.h.data(), {x, 1, x + 1, 2, 9}, false, 1.0f, 0.0f);
+        EXPECT_TRUE(std::isnan(s.h[s.at(x, 1)]));
+        Surface row(9, 4);
+        row.h[row.at(x, 1)] = kNan;
+        row.step();
+        EXPECT_TRUE(std::isnan(row.h[row.at(x, 1)]));
+        Surface high(9, 4);
+        high.v[high.at(x, 1)] = std::numeric_limits<float>::infinity();
+        stepWaves(high.v.data(), high.h.data(), {1, 1, 8, 2, 9}, false, 1.0f, 0.0f);
+        EXPECT_FLOAT_EQ(high.h[high.at(x, 1)], 100.0f * (1.0f - 4.0f * 0.018f));
+    }
+}
+
 TEST(Waves, calmMeansEverySpeedWithinTheBandBothEndsIncluded) {
     for (int x = 1; x <= 7; ++x) {
         const auto calmWith = [x](float speed, bool check) {

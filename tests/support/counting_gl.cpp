@@ -2,6 +2,7 @@
 
 #include <GLES2/gl2.h>
 
+#include <cstdlib>
 #include <cstring>
 
 namespace {
@@ -16,6 +17,8 @@ struct Counter {
 
 std::size_t uploaded = 0;
 GLuint lastName = 0;
+GLuint arrayBuffer = 0;
+GLuint elementBuffer = 0;
 
 void makeNames(GLsizei count, GLuint* names) {
     for (GLsizei i = 0; i < count; ++i) names[i] = ++lastName;
@@ -28,6 +31,11 @@ void take(const void* data, std::size_t bytes) {
     static_cast<void>(block[0]);
     static_cast<void>(block[bytes - 1]);
     uploaded += bytes;
+}
+
+// Without a buffer the offset is an address, and a driver reads there.
+void requireBuffer(GLuint buffer, const void* offset) {
+    if (!buffer && !offset) std::abort();
 }
 
 // Compiled and linked, with nothing to say about it.
@@ -63,8 +71,9 @@ void GL_APIENTRY glAttachShader(GLuint, GLuint) {
 void GL_APIENTRY glBindAttribLocation(GLuint, GLuint, const GLchar*) {
     COUNT_THIS_CALL;
 }
-void GL_APIENTRY glBindBuffer(GLenum, GLuint) {
+void GL_APIENTRY glBindBuffer(GLenum target, GLuint buffer) {
     COUNT_THIS_CALL;
+    (target == GL_ARRAY_BUFFER ? arrayBuffer : elementBuffer) = buffer;
 }
 void GL_APIENTRY glBindFramebuffer(GLenum, GLuint) {
     COUNT_THIS_CALL;
@@ -124,8 +133,9 @@ void GL_APIENTRY glDisableVertexAttribArray(GLuint) {
 void GL_APIENTRY glDrawArrays(GLenum, GLint, GLsizei) {
     COUNT_THIS_CALL;
 }
-void GL_APIENTRY glDrawElements(GLenum, GLsizei, GLenum, const void*) {
+void GL_APIENTRY glDrawElements(GLenum, GLsizei, GLenum, const void* offset) {
     COUNT_THIS_CALL;
+    requireBuffer(elementBuffer, offset);
 }
 void GL_APIENTRY glEnableVertexAttribArray(GLuint) {
     COUNT_THIS_CALL;
@@ -203,8 +213,9 @@ void GL_APIENTRY glUniformMatrix4fv(GLint, GLsizei, GLboolean, const GLfloat*) {
 void GL_APIENTRY glUseProgram(GLuint) {
     COUNT_THIS_CALL;
 }
-void GL_APIENTRY glVertexAttribPointer(GLuint, GLint, GLenum, GLboolean, GLsizei, const void*) {
+void GL_APIENTRY glVertexAttribPointer(GLuint, GLint, GLenum, GLboolean, GLsizei, const void* offset) {
     COUNT_THIS_CALL;
+    requireBuffer(arrayBuffer, offset);
 }
 void GL_APIENTRY glViewport(GLint, GLint, GLsizei, GLsizei) {
     COUNT_THIS_CALL;

@@ -99,9 +99,11 @@ bool stepWaves(
     while (checkCalm && calm && row < rows) calm = pass(std::true_type{}, row++);
     while (row < rows) pass(std::false_type{}, row++);
 
-    const std::ptrdiff_t copyStride = std::ptrdiff_t{width} + 2;
+    // Whole groups a row, so that three of the four neighbours and every store lie on the borders of groups: a load
+    // across two cache lines costs two.
+    const std::ptrdiff_t copyStride = (std::ptrdiff_t{width} + 2 + 3) / 4 * 4;
     float* const copies = snapshot.reserve(static_cast<std::size_t>(copyStride) * (static_cast<std::size_t>(rows) + 2));
-    float* const s = copies ? copies + copyStride + 1 : nullptr;
+    float* const s = copies ? copies + copyStride : nullptr;
     for (row = 0; row < rows; ++row) {
         float* const heights = h + row * stride;
         integrate(heights, v + row * stride, s ? s + row * copyStride : heights, width);

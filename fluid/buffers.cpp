@@ -17,8 +17,8 @@ void release(Texture<T>& texture) {
     texture = {};
 }
 
-// Of a view of 65,536 pixels: no GPU has larger textures, and the memory for a larger grid would be half the device's.
-constexpr int kLargestSide = 65536 / 12;
+// The memory for the grid of a larger view would be half the device's.
+constexpr int kLargestGrid = kLargestSide / 12;
 
 template <class T>
 bool renew(Texture<T>& texture, int width, int height) {
@@ -26,7 +26,7 @@ bool renew(Texture<T>& texture, int width, int height) {
     // A view smaller than a cell has a grid of no texels; its block is not null all the same, as null means failure.
     const std::uint64_t bytes =
         std::uint64_t{sizeof(T)} * static_cast<std::uint64_t>(width) * static_cast<std::uint64_t>(height);
-    const bool fits = width <= kLargestSide && height <= kLargestSide && bytes <= SIZE_MAX / 2;
+    const bool fits = width <= kLargestGrid && height <= kLargestGrid && bytes <= SIZE_MAX / 2;
     texture = {
         fits ? static_cast<T*>(std::malloc(std::max<std::size_t>(static_cast<std::size_t>(bytes), 1))) : nullptr, width,
         height};

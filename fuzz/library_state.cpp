@@ -51,8 +51,6 @@ void requireSoundGrid(const Texture<T>& grid) {
 void resetLibrary() {
     __android_log_set_logger([](const __android_log_message*) {});
     resetGestures();
-    bWithInk = false;
-    SCREEN_WIDTH = SCREEN_HEIGHT = 0;
     dropPicture(bmp_portrait_bg_info, bmp_portrait_bg_Pixels);
     dropPicture(bmp_landscape_bg_info, bmp_landscapebg_Pixels);
     dropPicture(bmp_water_Info, bmp_water_Pixels);

@@ -4,9 +4,6 @@
 #include "gl/texture_units.h"
 #include "jni/log.h"
 
-// No GPU has larger textures, and a driver is known to crash on sizes far beyond its limit instead of refusing them.
-static constexpr int kLargestSide = 65536;
-
 Surface_ Fluid::CreateSurface(int width, int height) {
     LOG_ERROR("CreateSurface");
     Surface_ surface;

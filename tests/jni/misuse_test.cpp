@@ -37,7 +37,6 @@ protected:
     void SetUp() override {
         GlTest::SetUp();
         resetGestures();
-        bWithInk = false;
     }
 };
 

@@ -53,6 +53,7 @@ void project(Fluid& f) {
 }
 
 void upload(const Texture<vec2>& velocity, const Surface_& surface) {
+    if (velocity.empty()) return;  // a view smaller than a cell
     const auto texels = static_cast<std::size_t>(velocity.width) * static_cast<std::size_t>(velocity.height);
     unsigned char* const bytes = staging.reserve(4 * texels);
     if (!bytes) return;

@@ -62,14 +62,23 @@ Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onLoadWaterTextures
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_initWaters(
     JNIEnv* env, jobject, jfloatArray positions, jshortArray indices, jint vertexCount, jint meshSizeWidth,
     jint meshSizeHeight, jint numDetailsWidth, jint numDetailsHeight) {
-    const auto fill = [=](jfloat* p, jshort* i) {
-        fillPositions(p, vertexCount, meshSizeWidth, meshSizeHeight, numDetailsWidth, numDetailsHeight);
-        fillIndices(i, numDetailsWidth, numDetailsHeight);
-    };
-    withPinned(env, "initWaters", fill, positions, indices);
+    // A virtual machine may have no address for an array without elements, which the other fill must not miss.
+    const bool noVertices = vertexCount < 1;
+    const bool noCells = numDetailsWidth < 2 || numDetailsHeight < 2;
+    jfloat* const p = pin(env, positions);
+    jshort* const i = p || noVertices ? pin(env, indices) : nullptr;
+    if ((p || noVertices) && (i || noCells)) {
+        if (p) fillPositions(p, vertexCount, meshSizeWidth, meshSizeHeight, numDetailsWidth, numDetailsHeight);
+        if (i) fillIndices(i, numDetailsWidth, numDetailsHeight);
+    } else {
+        static bool reported = false;
+        reportMissingArray("initWaters", reported);
+    }
+    if (p) release(env, positions, p);
+    if (i) release(env, indices, i);
 }
 
-JNIEXPORT jboolean JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_move(
+JNIEXPORT jint JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_move(
     JNIEnv* env, jobject, jfloatArray velocity, jfloatArray height, jint xStart, jint yStart, jint xEnd, jint yEnd,
     jint stride, jint, jboolean checkCalm, jfloat damping, jfloat waveSpeed) {
     bool calm = true;

@@ -30,7 +30,7 @@ void stepTap(Color_ color) {
             -1, static_cast<float>(wrappingDifference(POSITION_X, DX)),
             static_cast<float>(wrappingDifference(POSITION_Y, DY)), static_cast<float>(POSITION_X),
             static_cast<float>(POSITION_Y), color);
-        fluid.BackwardStepSize = static_cast<float>(0.1 * step);
+        fluid.BackwardStepSize = 0.1f * frame;
     }
     countFrame(step);
     if (step > max_step && TOUCH_ACTION != 2) {

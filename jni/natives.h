@@ -54,8 +54,8 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
 
 // One wave step over x in [xStart, xEnd), y in [yStart, yEnd) of the two fields, element y * stride + x. The fields
 // must reach one element beyond the region on each side. rowCount is ignored. True when every updated speed lies
-// within +-0.009, or when checkCalm is false.
-JNIEXPORT jboolean JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_move(
+// within +-0.009, or when checkCalm is false: a whole 1 or 0, so that Java may declare boolean or int.
+JNIEXPORT jint JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_move(
     JNIEnv* env, jobject, jfloatArray velocity, jfloatArray height, jint xStart, jint yStart, jint xEnd, jint yEnd,
     jint stride, jint rowCount, jboolean checkCalm, jfloat damping, jfloat waveSpeed);
 

@@ -7,12 +7,13 @@
 
 #include "jni/log.h"
 
+// The elements of an array; null for a null array, or when the virtual machine has no memory for its copy.
 inline jfloat* pin(JNIEnv* env, jfloatArray array) {
-    return env->GetFloatArrayElements(array, nullptr);
+    return array ? env->GetFloatArrayElements(array, nullptr) : nullptr;
 }
 
 inline jshort* pin(JNIEnv* env, jshortArray array) {
-    return env->GetShortArrayElements(array, nullptr);
+    return array ? env->GetShortArrayElements(array, nullptr) : nullptr;
 }
 
 inline void release(JNIEnv* env, jfloatArray array, jfloat* elements) {
@@ -21,6 +22,12 @@ inline void release(JNIEnv* env, jfloatArray array, jfloat* elements) {
 
 inline void release(JNIEnv* env, jshortArray array, jshort* elements) {
     env->ReleaseShortArrayElements(array, elements, 0);
+}
+
+// Names in the log, the first time, a method that could not work.
+inline void reportMissingArray(const char* method, bool& reported) {
+    if (!reported) LOG_ERROR("%s() without an array", method);
+    reported = true;
 }
 
 // Pins the arrays, calls `use` with their elements, and copies them back, all in the order given. Where an array is
@@ -33,11 +40,10 @@ void withPinned(JNIEnv* env, const char* method, Use use, Arrays... arrays) {
     std::apply(
         [&](auto*&... elements) {
             ((elements = nullptr), ...);
-            if ((... && (arrays && (elements = pin(env, arrays))))) {
+            if ((... && (elements = pin(env, arrays)))) {
                 use(elements...);
             } else {
-                if (!reported) LOG_ERROR("%s() without an array", method);
-                reported = true;
+                reportMissingArray(method, reported);
             }
             ((elements ? release(env, arrays, elements) : void()), ...);
         },

@@ -42,7 +42,8 @@ static inline Pair<float> sample(Texture<vec2> source, Pair<float> c) {
 }
 
 // texture2DLinear at four points of a source that is at least two texels wide. One load brings both texels of a row, so
-// the last column is reached from the left with weight 1, and the last row of several from below.
+// the last column is reached from the left with weight 1, and the last row of several from below. The other texel
+// counts 0 times there, and only one that is not finite would still be seen; no valid frame leaves one.
 static inline Pair<float4> sample(Texture<vec2> source, Pair<float4> c) {
     const float lastX = static_cast<float>(source.width - 1);
     const float lastY = static_cast<float>(source.height - 1);

@@ -13,6 +13,10 @@
 
 #include "tshader/vec.h"
 
+#if defined(__FINITE_MATH_ONLY__) && __FINITE_MATH_ONLY__
+#error "The kernels rely on comparisons that NaN fails: a compiler that assumes none makes it an index."
+#endif
+
 typedef float float4 __attribute__((vector_size(16)));
 typedef int int4 __attribute__((vector_size(16)));
 

@@ -1,8 +1,11 @@
 #include "tshader/velocity_packing.h"
 
+#include <bit>
 #include <cstring>
 
 #include "tshader/float4.h"
+
+static_assert(std::endian::native == std::endian::little, "four bytes of a texel are stored as one int");
 
 // The two bytes in the low half of an int, whole part first in memory. NaN packs like 127.
 // A raised component is a multiple of 2^-18, and no such fraction times 255 lies close enough below a whole

@@ -89,6 +89,10 @@ TEST_F(Setup, inkIsSetUpTwiceAndEveryOldObjectIsNamedAndDeleted) {
     EXPECT_EQ(binding(GL_BLEND_SRC_ALPHA), GL_SRC_ALPHA);
     EXPECT_EQ(binding(GL_BLEND_DST_ALPHA), GL_ONE_MINUS_SRC_ALPHA);
     EXPECT_FALSE(glIsEnabled(GL_BLEND));
+    GLint viewport[4];
+    glGetIntegerv(GL_VIEWPORT, viewport);
+    EXPECT_EQ(viewport[2], 256);
+    EXPECT_EQ(viewport[3], 512);
 
     engine.ClearSurface(engine.Density.Ping, 1, 1, 1, 1);
     const GLuint pong = engine.Density.Pong.TextureHandle;
@@ -159,9 +163,11 @@ TEST_F(Setup, texturesAreReplacedAndSampleWithoutMipmaps) {
         glGetTexParameteriv(GL_TEXTURE_2D, name, &value);
         EXPECT_EQ(value, GL_CLAMP_TO_EDGE);
     }
-    GLint filter = 0;
-    glGetTexParameteriv(GL_TEXTURE_2D, GL_TEXTURE_MIN_FILTER, &filter);
-    EXPECT_EQ(filter, GL_LINEAR);
+    for (const GLenum name : {GLenum{GL_TEXTURE_MIN_FILTER}, GLenum{GL_TEXTURE_MAG_FILTER}}) {
+        GLint value = 0;
+        glGetTexParameteriv(GL_TEXTURE_2D, name, &value);
+        EXPECT_EQ(value, GL_LINEAR);
+    }
 }
 
 TEST_F(Setup, everythingIsMadeAnewInAContextThatReplacesALostOne) {

@@ -225,6 +225,7 @@ TEST_F(Update, uploadsThePackedFieldAndLeavesTheStatedState) {
     const vec2 speeds[] = {{300, -300}, {0, 0.25f}, {-126.99f, 126.5f}, {std::nanf(""), 1}};
     for (const vec2 speed : speeds) {
         std::fill(fluid.VelocityTex.row(0), fluid.VelocityTex.row(fluid.GridHeight), speed);
+        glViewport(0, 0, 1, 1);
         fluid.Update(0);
         glBindFramebuffer(GL_FRAMEBUFFER, fluid.Velocity.Ping.FboHandle);
         const auto texels = readPixels(fluid.GridWidth, fluid.GridHeight);
@@ -244,3 +245,24 @@ TEST_F(Update, uploadsThePackedFieldAndLeavesTheStatedState) {
     EXPECT_EQ(binding(GL_FRAMEBUFFER_BINDING), 0);
     EXPECT_EQ(binding(GL_ACTIVE_TEXTURE), GL_TEXTURE0);
 }
+
+#ifdef __SSE2__
+// The processor notes whether it met a denormal that it was not told to take for zero.
+TEST_F(Update, noPassIsSlowedDownByDenormals) {
+    setUp(480, 800);
+    const auto meetsDenormals = [](const auto& pass) {
+        std::fill(fluid.VelocityTex.row(0), fluid.VelocityTex.row(fluid.GridHeight), vec2{1e-40f, 1e-40f});
+        _mm_setcsr(_mm_getcsr() & ~_MM_EXCEPT_MASK);
+        pass();
+        return (_mm_getcsr() & _MM_EXCEPT_DENORM) != 0;
+    };
+    POSITION_X = 240;
+    POSITION_Y = 400;
+    fluid.Radius = 30;
+    EXPECT_TRUE(meetsDenormals([] {
+        fluid.AddVelocity(fluid.VelocityTex, fluid.VelocityTexTemp, {200, 400}, {280, 400});
+    }));
+    EXPECT_FALSE(meetsDenormals([] { fluid.Perturb(200, 400, 280, 400); }));
+    EXPECT_FALSE(meetsDenormals([] { fluid.Update(0); }));
+}
+#endif

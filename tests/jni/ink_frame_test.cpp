@@ -75,7 +75,7 @@ TEST_F(InkFrame, aTapGrowsForTenFramesAndEndsAfterThirteen) {
         EXPECT_EQ(fluid.SourceRadius, 40.0f);
         EXPECT_EQ(fluid.VelocityDissipation, 0.94f);
         EXPECT_EQ(fluid.DensityDissipation, 0.92f);
-        EXPECT_FLOAT_EQ(fluid.BackwardStepSize, i < 10 ? 0.1f * static_cast<float>(i) : 1.0f);
+        EXPECT_EQ(fluid.BackwardStepSize, i < 10 ? 0.1f * static_cast<float>(i) : 1.0f) << "in single precision";
         EXPECT_EQ(fluid.Density.Ping.TextureHandle == ping, i < 10) << "an injection swaps once more";
         EXPECT_EQ(total() > 0, i > 0) << "a radius of 0 adds nothing";
     }

@@ -88,6 +88,21 @@ TEST(MeshNatives, workOnTheHostsArraysInPlace) {
     EXPECT_EQ(positions.values, (std::vector<float>{-1, 1, 0, -1, -1, 0, 1, 1, 0, 1, -1, 0}));
     EXPECT_EQ(indices.values, (std::vector<jshort>{0, 1, 3, 0, 3, 2}));
 
+    // A virtual machine may have no address for an array without elements.
+    JNINativeInterface_ functions = *env->functions;
+    functions.GetFloatArrayElements = [](JNIEnv*, jfloatArray, jboolean*) -> jfloat* { return nullptr; };
+    JNIEnv sparing = {&functions};
+    FloatArray none(0);
+    ShortArray cells(6);
+    NATIVE(initWaters)(&sparing, nullptr, &none, &cells, 0, 2, 2, 2, 2);
+    EXPECT_EQ(cells.values, indices.values);
+    functions = *env->functions;
+    functions.GetShortArrayElements = [](JNIEnv*, jshortArray, jboolean*) -> jshort* { return nullptr; };
+    FloatArray one(3);
+    ShortArray noCells(0);
+    NATIVE(initWaters)(&sparing, nullptr, &one, &noCells, 1, 2, 2, 3, 1);
+    EXPECT_EQ(one.values[0], -1.0f);
+
     FloatArray velocity(8 * 8);
     FloatArray height(8 * 8);
     NATIVE(ripple)(env, nullptr, &velocity, 8, 8, 8, 8, 0.0f, 0.0f, 0.5f);

@@ -7,13 +7,13 @@
 #include <string>
 #include <vector>
 
-#include "bench/allocation_count.h"
 #include "bench/frame_scene.h"
 #include "fluid/fluid.h"
 #include "jni/globals.h"
 #include "jni/ink_frame.h"
 #include "tests/support/counting_gl.h"
 #include "tests/support/gesture_state.h"
+#include "tests/support/library_blocks.h"
 
 namespace {
 
@@ -23,9 +23,9 @@ void frames(benchmark::State& run, Scene kind, int vertices, int width, int heig
 
     constexpr int kCounted = 60;
     takeGlUse();
-    const long before = allocationCount();
+    const int before = LibraryBlocks::requested;
     for (int i = 0; i < kCounted; ++i) scene.next();
-    const long allocations = allocationCount() - before;
+    const int allocations = LibraryBlocks::requested - before;
     const GlUse use = takeGlUse();
     double calls = 0;
     for (const auto& [name, count] : use.calls) calls += count;

@@ -1,11 +1,22 @@
-# Turns GLSL files into a header of string constants: water/water.vert becomes kWaterVert.
+# Joins GLSL files with the chunks that they include, by paths from the project's root, and turns them into a header of
+# string constants: water/water.vert becomes kWaterVert. The joined sources, which are what a driver gets, also stand
+# beside the header as files.
 # embed_shaders(<header> <source>...)
 function(embed_shaders header)
+    cmake_path(GET header PARENT_PATH directory)
     set(text "#pragma once\n\n")
     foreach(source IN LISTS ARGN)
         set_property(DIRECTORY APPEND PROPERTY CMAKE_CONFIGURE_DEPENDS ${source})
         file(READ ${source} glsl)
+        while(glsl MATCHES "#include \"([^\"]+)\"\n")
+            set(line "${CMAKE_MATCH_0}")
+            set(chunk ${PROJECT_SOURCE_DIR}/${CMAKE_MATCH_1})
+            set_property(DIRECTORY APPEND PROPERTY CMAKE_CONFIGURE_DEPENDS ${chunk})
+            file(READ ${chunk} included)
+            string(REPLACE "${line}" "${included}" glsl "${glsl}")
+        endwhile()
         cmake_path(GET source FILENAME name)
+        file(CONFIGURE OUTPUT ${directory}/${name} CONTENT "${glsl}" @ONLY)
         string(REGEX REPLACE "[._]" ";" words ${name})
         set(constant k)
         foreach(word IN LISTS words)

@@ -1,11 +1,7 @@
-precision mediump float;
+#include "gl/precision.glsl"
+#include "gl/density_texel.glsl"
 // Adds ink along the segment from previous to current (mode 2) or around current. Positions are screen pixels, y
-// upwards. Density texel: R holds the whole part, G the fraction.
-#ifdef GL_FRAGMENT_PRECISION_HIGH
-#define FULL highp
-#else
-#define FULL mediump
-#endif
+// upwards.
 uniform FULL sampler2D Source;
 uniform FULL vec2 Scale;
 uniform FULL vec2 current;
@@ -17,7 +13,6 @@ uniform FULL float ImpulseDensity;
 uniform FULL float Radius;
 varying FULL vec2 v_texCoord;
 
-// Half precision has 11 bits, and two bytes of ink need 15.
 FULL vec2 encode(FULL float value) {
     value = clamp(value, -127.0, 127.0);
     FULL vec2 packed2 = vec2(fract(value / 255.0), fract(value));
@@ -26,8 +21,7 @@ FULL vec2 encode(FULL float value) {
 }
 
 void main() {
-    FULL vec4 buf = texture2D(Source, v_texCoord);
-    FULL float ink = 255.0 * buf.x + buf.y;
+    FULL float ink = decodeDensity(texture2D(Source, v_texCoord));
     FULL vec2 p = Scale * v_texCoord;
     if (mode == 2) {
         FULL float t = dot(normal, p - previous);

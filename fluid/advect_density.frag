@@ -1,11 +1,7 @@
-precision mediump float;
+#include "gl/precision.glsl"
+#include "gl/density_texel.glsl"
 // Carries the ink back along the velocity and fades it. Velocity texel: R + G/255 and B + A/255 are x and y, raised by
-// 127. Density texel: R holds the whole part, G the fraction.
-#ifdef GL_FRAGMENT_PRECISION_HIGH
-#define FULL highp
-#else
-#define FULL mediump
-#endif
+// 127.
 uniform FULL sampler2D VelocityTexture;
 uniform FULL sampler2D SourceTexture;
 uniform FULL vec2 TimeStep;
@@ -16,7 +12,6 @@ uniform FULL vec2 center;
 uniform int drag;
 varying FULL vec2 v_texCoord;
 
-// Half precision has 11 bits, and two bytes of ink need 15.
 FULL vec2 encode(FULL float value) {
     value = clamp(value, -127.0, 127.0);
     FULL vec2 packed2 = fract(value * vec2(0.00392157, 1.0));
@@ -33,6 +28,5 @@ void main() {
         if (d < 80.0) backStep = 0.0075 * d;
     }
     FULL vec2 coord = v_texCoord - backStep * TimeStep * u;
-    buf = texture2D(SourceTexture, coord);
-    gl_FragColor = vec4(encode(Dissipation * (255.0 * buf.x + buf.y)), 0.0, 0.0);
+    gl_FragColor = vec4(encode(Dissipation * decodeDensity(texture2D(SourceTexture, coord))), 0.0, 0.0);
 }

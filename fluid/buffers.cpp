@@ -6,8 +6,10 @@
 #include <cstdlib>
 #include <cstring>
 
+#include "base/log.h"
 #include "fluid/fluid.h"
-#include "jni/log.h"
+#include "fluid/ink_presets.h"
+#include "gl/targets.h"
 
 namespace {
 
@@ -18,7 +20,7 @@ void release(Texture<T>& texture) {
 }
 
 // The memory for the grid of a larger view would be half the device's.
-constexpr int kLargestGrid = kLargestSide / 12;
+constexpr int kLargestGrid = kLargestSide / kCellPixels;
 
 template <class T>
 bool renew(Texture<T>& texture, int width, int height) {

@@ -7,7 +7,10 @@
 #include <GLES2/gl2.h>
 #include <android/bitmap.h>
 
-#include "gl/surface.h"
+#include <array>
+
+#include "gl/objects.h"
+#include "gl/targets.h"
 #include "tshader/AddInkTShaderImpl.h"
 #include "tshader/AddVelocityTShaderImpl.h"
 #include "tshader/AdvectDensityTShaderImpl.h"
@@ -23,6 +26,8 @@ struct Vector_ {
     float y = 0.0f;
 };
 
+struct InkPreset;
+
 struct Color_ {
     float r = 0.0f;
     float g = 0.0f;
@@ -31,6 +36,9 @@ struct Color_ {
 
 class Fluid {
 public:
+    Fluid() = default;
+    Fluid(const Fluid&) = delete;
+    Fluid& operator=(const Fluid&) = delete;
     // Frees the CPU buffers. The GL objects are not deleted: when the library unloads, their context may be gone.
     ~Fluid();
 
@@ -79,6 +87,9 @@ public:
     void ComputeDivergence(Texture<vec2> velocity, Texture<float> dest, Vector_ point);
     void Jacobi(Texture<float> pressure, Texture<float> divergence, Texture<float> dest);
     void SubtractGradient(Texture<vec2> velocity, Texture<float> pressure, Texture<vec2> dest);
+
+    // Takes over what a gesture of one kind writes.
+    void apply(const InkPreset& preset);
 
     // Draws the water into the current framebuffer. `positions` and `heightAttribs` hold 3 floats a vertex, `indices`
     // unsigned vertex numbers, `mvp` 16 floats by columns. With ink, the density in Density.Ping divides the colours.
@@ -146,7 +157,32 @@ public:
     Texture<float> PressureTex;
     Texture<float> PressureTexTemp;
     Texture<float> DivergenceTex;
-    bool inkTargetBound = false;  // since the set-up, which the first ink frame undoes
-};
 
-extern Fluid fluid;
+    // Every GL object that a member names, in groups that are deleted together.
+    std::array<GlObject, 22> glObjects() {
+        using enum GlKind;
+        return {
+            {{"ripple_program", shader, &ripple_vertexShader},
+             {"ripple_program", shader, &ripple_fragmentShader},
+             {"ripple_program", program, &ripple_program},
+             {"advect_density_program", shader, &advect_density_vertexShader},
+             {"advect_density_program", shader, &advect_density_fragmentShader},
+             {"advect_density_program", program, &advect_density_program},
+             {"addInk_program", shader, &addInk_vertexShader},
+             {"addInk_program", shader, &addInk_fragmentShader},
+             {"addInk_program", program, &addInk_program},
+             {"Velocity.Ping.FboHandle", framebuffer, &Velocity.Ping.FboHandle},
+             {"Velocity.Ping.FboHandle", texture, &Velocity.Ping.TextureHandle},
+             {"Density.Ping.FboHandle", framebuffer, &Density.Ping.FboHandle},
+             {"Density.Ping.FboHandle", texture, &Density.Ping.TextureHandle},
+             {"Density.Ping.FboHandle", framebuffer, &Density.Pong.FboHandle},
+             {"Density.Ping.FboHandle", texture, &Density.Pong.TextureHandle},
+             {"quadvbo", buffer, &quadvbo},
+             {"v_buf", buffer, &v_buf},
+             {"h_buf", buffer, &h_buf},
+             {"i_buf", buffer, &i_buf},
+             {"portraitBG", texture, &portraitBG},
+             {"landscapeBG", texture, &landscapeBG},
+             {"environment", texture, &environment}}};
+    }
+};

@@ -1,11 +1,11 @@
 #include "fluid/fluid.h"
-#include "fluid/touch_point.h"
+#include "fluid/touch.h"
 #include "gl/texture_units.h"
 #include "gl/uniforms.h"
-#include "jni/globals.h"
 
 void Fluid::AdvectDensity(Surface_ velocitySurface, Surface_ source, Surface_ destination, float dissipation) {
     const GLuint program = advect_density_program;
+    const Touch touch = latestTouch(*this);
     const double texelsPerSpeed = 0.9 * double{TimeStep};
     glUseProgram(program);
     setUniform(program, "Scale", static_cast<float>(ScreenWidth), static_cast<float>(ScreenHeight));
@@ -14,7 +14,7 @@ void Fluid::AdvectDensity(Surface_ velocitySurface, Surface_ source, Surface_ de
         static_cast<float>(texelsPerSpeed / GridHeight));
     setUniform(program, "Dissipation", dissipation);
     setUniform(program, "BackwardStepSize", BackwardStepSize);
-    setUniform(program, "center", static_cast<float>(POSITION_X), static_cast<float>(flippedTouchY(*this)));
+    setUniform(program, "center", static_cast<float>(touch.x), static_cast<float>(touch.y));
     setUniform(program, "drag", DragMode);
     setUniform(program, "SourceTexture", 1);
     glBindFramebuffer(GL_FRAMEBUFFER, destination.FboHandle);
@@ -47,8 +47,9 @@ void Fluid::AddInk(Surface_ source, Surface_ destination, int mode, Vector_ prev
 void Fluid::Inject(int mode, float x1, float y1, float x2, float y2, Color_ color) {
     recordStroke(*this, x1, y1, x2, y2);
     InkColor = color;
+    const Touch touch = latestTouch(*this);
     // Without the buffers nothing would ever carry this ink away.
-    if (isBoundary(POSITION_X, POSITION_Y) || !VelocityTex.data) return;
+    if (!isInside(*this, touch.x, touch.y, BoundaryMargin) || !VelocityTex.data) return;
     AddInk(Density.Ping, Density.Pong, mode, Previous, Current, ImpulseDensity);
     SwapSurfaces(&Density);
 }

@@ -1,8 +1,7 @@
 #include <utility>
 
 #include "fluid/fluid.h"
-#include "fluid/touch_point.h"
-#include "jni/globals.h"
+#include "fluid/touch.h"
 #include "tshader/flush_denormals.h"
 
 // Each wrapper hands its kernel the fields and uniforms of this call and runs it.
@@ -24,6 +23,7 @@ vec2 inverseSize(const Fluid& f) {
 }  // namespace
 
 void Fluid::AdvectVelocity(Texture<vec2> velocity, Texture<vec2> source, Texture<vec2> dest, float dissipation) {
+    const Touch touch = latestTouch(*this);
     AdvectVelocityTShaderImpl& kernel = AdvectVelocityKernel;
     kernel.VelocityTexture = velocity;
     kernel.SourceTexture = source;
@@ -32,8 +32,8 @@ void Fluid::AdvectVelocity(Texture<vec2> velocity, Texture<vec2> source, Texture
     kernel.Scale = cellSize(*this);
     kernel.TimeStep = TimeStep;
     kernel.Dissipation = dissipation;
-    kernel.center = Vec2(static_cast<float>(POSITION_X), static_cast<float>(flippedTouchY(*this)));
-    kernel.delta = Vec2(static_cast<float>(DX), static_cast<float>(wrappingDifference(0, DY)));
+    kernel.center = Vec2(static_cast<float>(touch.x), static_cast<float>(touch.y));
+    kernel.delta = Vec2(static_cast<float>(touch.dx), static_cast<float>(touch.dy));
     kernel.drag = DragMode;
     kernel.run();
 }
@@ -89,7 +89,8 @@ void Fluid::SubtractGradient(Texture<vec2> velocity, Texture<float> pressure, Te
 
 void Fluid::Perturb(float x0, float y0, float x1, float y1) {
     recordStroke(*this, x0, y0, x1, y1);
-    if (isBoundary(POSITION_X, POSITION_Y) || !VelocityTex.data) return;
+    const Touch touch = latestTouch(*this);
+    if (!isInside(*this, touch.x, touch.y, BoundaryMargin) || !VelocityTex.data) return;
     const FlushDenormals flush;
     AddVelocity(VelocityTex, VelocityTexTemp, Previous, Current);
     std::swap(VelocityTex, VelocityTexTemp);

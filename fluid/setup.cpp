@@ -1,11 +1,12 @@
-#include <cstring>
+#include <algorithm>
+#include <cstddef>
 
+#include "base/log.h"
 #include "fluid/buffers.h"
 #include "fluid/fluid.h"
-#include "gl/deletion.h"
+#include "fluid/ink_presets.h"
 #include "gl/shader_program.h"
-#include "jni/log.h"
-#include "shaders.h"
+#include "shaders/shaders.h"
 
 namespace {
 
@@ -15,33 +16,17 @@ struct Program {
     GLuint& fragmentShader;
 };
 
-// Deletes what an earlier set-up built, named in the log as `name`, and builds the program anew.
-void rebuild(
-    const Fluid& engine, Program made, const char* name, const char* announcement, const char* vertexSource,
-    const char* fragmentSource) {
-    if (made.program) {
-        LOG_INFO("glDelete %s = %u", name, made.program);
-        deleteShader(engine, made.vertexShader);
-        deleteShader(engine, made.fragmentShader);
-        deleteProgram(engine, made.program);
-    }
+void build(Program made, const char* announcement, const char* vertexSource, const char* fragmentSource) {
     LOG_INFO("%s zorCreateShaderProgram()", announcement);
     made.vertexShader = zorloadShaderScript(GL_VERTEX_SHADER, vertexSource);
     made.fragmentShader = zorloadShaderScript(GL_FRAGMENT_SHADER, fragmentSource);
     made.program = zorCreateShaderProgram(made.vertexShader, made.fragmentShader);
 }
 
-void renewBuffer(const Fluid& engine, GLuint& buffer, const char* name) {
-    if (buffer) {
-        LOG_INFO("glDelete %s = %u", name, buffer);
-        deleteBuffer(engine, buffer);
-    }
-    glGenBuffers(1, &buffer);
-}
-
-template <class T>
-void setName(TShaderCore<T>& kernel, const char* name) {
-    std::strncpy(kernel.name, name, sizeof kernel.name - 1);
+template <class T, std::size_t size>
+void setName(TShaderCore<T>& kernel, const char (&name)[size]) {
+    static_assert(size <= sizeof kernel.name);
+    std::copy_n(name, size, kernel.name);
 }
 
 }  // namespace
@@ -52,51 +37,50 @@ void Fluid::InitializeSetting(int width, int height, bool withInk) {
     ScreenWidth = width;
     ScreenHeight = height;
     if (withInk) {
-        CellSize = 2.5f;
-        GridWidth = ScreenWidth / 12;
-        GridHeight = ScreenHeight / 12;
         const bool landscape = width > height;
-        InkWidth = landscape ? 512 : 256;
-        InkHeight = landscape ? 256 : 512;
-        Radius = 2.0f;
-        ImpulseDensity = 200.0f;
-        NumJacobiIterations = 5;
-        TimeStep = 0.25f;
-        GradientScale = 0.2f;
-        VelocityDissipation = 0.9f;
-        DensityDissipation = 0.92f;
-        SourceStrength = 50.0f;
-        SourceRadius = 40.0f;
-        BackwardStepSize = 1.0f;
+        GridWidth = ScreenWidth / kCellPixels;
+        GridHeight = ScreenHeight / kCellPixels;
+        InkWidth = landscape ? kLongInkSide : kShortInkSide;
+        InkHeight = landscape ? kShortInkSide : kLongInkSide;
+        apply(kSetUpPreset);
+        CellSize = kCellSize;
+        NumJacobiIterations = kJacobiIterations;
+        TimeStep = kTimeStep;
+        GradientScale = kGradientScale;
+        BackwardStepSize = kBackwardStep;
         ClearInkValue = 1.0f;
-        InkIntensity = 0.2f;
-        DragMode = 0;
-        BoundaryMargin = 10;
+        InkIntensity = kSetUpInkIntensity;
+        BoundaryMargin = kSetUpMargin;
     }
-    renewBuffer(*this, v_buf, "v_buf");
-    renewBuffer(*this, h_buf, "h_buf");
-    renewBuffer(*this, i_buf, "i_buf");
+    const auto objects = glObjects();
+    deleteGroup(objects, "v_buf");
+    glGenBuffers(1, &v_buf);
+    deleteGroup(objects, "h_buf");
+    glGenBuffers(1, &h_buf);
+    deleteGroup(objects, "i_buf");
+    glGenBuffers(1, &i_buf);
 }
 
 void Fluid::InitializeGPU(bool withInk) {
     LOG_INFO("InitializeGPU");
     if (withInk) LOG_INFO("bInk is true");
-    rebuild(
-        *this, {ripple_program, ripple_vertexShader, ripple_fragmentShader}, "ripple_program", "ripple_vertextShader",
-        kWaterVert, withInk ? kWaterInkFrag : kWaterPlainFrag);
+    const auto objects = glObjects();
+    deleteGroup(objects, "ripple_program");
+    build(
+        {ripple_program, ripple_vertexShader, ripple_fragmentShader}, "ripple_vertextShader", kWaterVert,
+        withInk ? kWaterInkFrag : kWaterPlainFrag);
     if (!withInk) {
-        // A set-up for ink that no frame followed has left its target bound, which the water would draw into.
-        if (inkTargetBound) glBindFramebuffer(GL_FRAMEBUFFER, 0);
-        inkTargetBound = false;
+        // A set-up for ink leaves its target bound, which the water would draw into if no ink frame has followed.
+        if (Density.Pong.FboHandle) glBindFramebuffer(GL_FRAMEBUFFER, 0);
         return;
     }
 
-    rebuild(
-        *this, {advect_density_program, advect_density_vertexShader, advect_density_fragmentShader},
-        "advect_density_program", "advect_density_program", kQuadVert, kAdvectDensityFrag);
-    rebuild(
-        *this, {addInk_program, addInk_vertexShader, addInk_fragmentShader}, "addInk_program", "addInk_program",
-        kQuadVert, kAddInkFrag);
+    deleteGroup(objects, "advect_density_program");
+    build(
+        {advect_density_program, advect_density_vertexShader, advect_density_fragmentShader}, "advect_density_program",
+        kQuadVert, kAdvectDensityFrag);
+    deleteGroup(objects, "addInk_program");
+    build({addInk_program, addInk_vertexShader, addInk_fragmentShader}, "addInk_program", kQuadVert, kAddInkFrag);
 
     setName(AdvectVelocityKernel, "AdvectVelocity");
     setName(AdvectDensityKernel, "AdvectDensity");
@@ -106,16 +90,9 @@ void Fluid::InitializeGPU(bool withInk) {
     setName(AddInkKernel, "AddInk");
     setName(AddVelocityKernel, "AddVelocity");
 
-    if (Velocity.Ping.FboHandle) {
-        LOG_INFO("glDelete Velocity.Ping.FboHandle = %u", Velocity.Ping.FboHandle);
-        deleteSurface(*this, Velocity.Ping);
-    }
+    deleteGroup(objects, "Velocity.Ping.FboHandle");
     Velocity.Ping = CreateSurface(GridWidth, GridHeight);
-    if (Density.Ping.FboHandle) {
-        LOG_INFO("glDelete Density.Ping.FboHandle = %u", Density.Ping.FboHandle);
-        deleteSurface(*this, Density.Ping);
-        deleteSurface(*this, Density.Pong);
-    }
+    deleteGroup(objects, "Density.Ping.FboHandle");
     Density = CreateData(InkWidth, InkHeight);
     allocateBuffers(*this);
     CreateQuad();
@@ -124,5 +101,4 @@ void Fluid::InitializeGPU(bool withInk) {
     glViewport(0, 0, InkWidth, InkHeight);
     ClearSurface(Density.Ping, 0.0f, 0.0f, 0.0f, 0.0f);
     ClearSurface(Density.Pong, 0.0f, 0.0f, 0.0f, 0.0f);
-    inkTargetBound = true;
 }

@@ -2,11 +2,12 @@
 #include <cstdlib>
 #include <utility>
 
+#include "base/scratch.h"
 #include "fluid/fluid.h"
-#include "fluid/touch_point.h"
-#include "jni/globals.h"
+#include "fluid/ink_presets.h"
+#include "fluid/touch.h"
+#include "gl/targets.h"
 #include "tshader/flush_denormals.h"
-#include "tshader/scratch.h"
 #include "tshader/velocity_packing.h"
 
 namespace {
@@ -15,20 +16,21 @@ Scratch<unsigned char> staging("uploading the ink's velocity");
 
 // Chooses how far from the edges a touch must be for its source to act, weakens the source of a slow or medium drag
 // that comes closer, and says whether the touch is far enough.
-bool chooseMargin(Fluid& f) {
-    f.BoundaryMargin = 60;
-    if (f.DragMode == 0 && !isTouchInside(f, 60)) {
-        f.SourceRadius = 4.0f;
-        f.SourceStrength = 40.0f;
-        f.BoundaryMargin = 12;
-    } else if (f.DragMode == 1 && !isTouchInside(f, 60)) {
-        f.BoundaryMargin = 10;
-        if (!isTouchInside(f, 10)) {
-            f.SourceRadius = 2.0f;
-            f.SourceStrength = 2.0f;
+bool chooseMargin(Fluid& f, const Touch& touch) {
+    const auto isTouchInside = [&](int margin) { return isInside(f, touch.x, touch.y, margin); };
+    f.BoundaryMargin = kMargin;
+    if (f.DragMode == kSlowDrag && !isTouchInside(kMargin)) {
+        f.SourceRadius = kSlowEdgeRadius;
+        f.SourceStrength = kSlowEdgeStrength;
+        f.BoundaryMargin = kSlowMargin;
+    } else if (f.DragMode == kMediumDrag && !isTouchInside(kMargin)) {
+        f.BoundaryMargin = kMediumMargin;
+        if (!isTouchInside(kMediumMargin)) {
+            f.SourceRadius = kMediumEdgeRadius;
+            f.SourceStrength = kMediumEdgeStrength;
         }
     }
-    return isTouchInside(f, f.BoundaryMargin);
+    return isTouchInside(f.BoundaryMargin);
 }
 
 // Up to 5 pixels to either side, so that a resting finger does not stir the same cells forever.
@@ -39,9 +41,9 @@ float jittered(int position) {
 }
 
 // Takes out of the field what the source at the touch and the field itself pile up (Stam, Stable Fluids, 1999).
-void project(Fluid& f) {
-    const float x = jittered(POSITION_X);
-    const float y = jittered(flippedTouchY(f));
+void project(Fluid& f, const Touch& touch) {
+    const float x = jittered(touch.x);
+    const float y = jittered(touch.y);
     f.ComputeDivergence(f.VelocityTex, f.DivergenceTex, {x, y});
     std::fill(f.PressureTex.row(0), f.PressureTex.row(f.PressureTex.height), 0.0f);
     for (int i = 0; i < f.NumJacobiIterations; ++i) {
@@ -67,12 +69,13 @@ void upload(const Texture<vec2>& velocity, const Surface_& surface) {
 void Fluid::Update(int) {
     // A set-up leaves the ink's framebuffer bound, which the water must not draw into.
     if (!VelocityTex.data) return ResetState();
+    const Touch touch = latestTouch(*this);
     {
         // A field that fades away ends in denormals.
         const FlushDenormals flush;
         AdvectVelocity(VelocityTex, VelocityTex, VelocityTexTemp, VelocityDissipation);
         std::swap(VelocityTex, VelocityTexTemp);
-        if (chooseMargin(*this)) project(*this);
+        if (chooseMargin(*this, touch)) project(*this, touch);
     }
     upload(VelocityTex, Velocity.Ping);
     glViewport(0, 0, InkWidth, InkHeight);

@@ -1,9 +1,7 @@
+#include "gl/quad.h"
+
 #include <cstddef>
 #include <cstdint>
-
-#include "fluid/fluid.h"
-#include "gl/deletion.h"
-#include "jni/log.h"
 
 namespace {
 
@@ -16,17 +14,8 @@ constexpr Corner kQuad[4] = {{-1, -1, 0, 0}, {1, -1, 1, 0}, {-1, 1, 0, 1}, {1, 1
 
 }  // namespace
 
-void Fluid::CreateQuad() {
-    LOG_INFO("CreateQuad");
-    if (quadvbo) {
-        LOG_INFO("glDelete quadvbo = %u", quadvbo);
-        deleteBuffer(*this, quadvbo);
-    }
-    glGenBuffers(1, &quadvbo);
-}
-
-void Fluid::DrawQuad() {
-    glBindBuffer(GL_ARRAY_BUFFER, quadvbo);
+void drawQuad(GLuint buffer) {
+    glBindBuffer(GL_ARRAY_BUFFER, buffer);
     glBufferData(GL_ARRAY_BUFFER, sizeof kQuad, kQuad, GL_STATIC_DRAW);
     glEnableVertexAttribArray(0);
     glEnableVertexAttribArray(1);

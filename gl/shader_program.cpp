@@ -1,19 +1,25 @@
 #include "gl/shader_program.h"
 
 #include <cstddef>
+#include <cstdlib>
 #include <memory>
-#include <new>
 
-#include "jni/log.h"
+#include "base/log.h"
 
 namespace {
 
+struct Free {
+    void operator()(char* text) const { std::free(text); }
+};
+
 // Reads a text of at most `length` bytes with `get`; without memory for it the text is lost, which is all it is for.
 template <class Get>
-std::unique_ptr<char[]> readInfoLog(GLint length, Get get) {
+std::unique_ptr<char, Free> readInfoLog(GLint length, Get get) {
     if (length <= 1) return nullptr;
-    std::unique_ptr<char[]> text(new (std::nothrow) char[static_cast<std::size_t>(length)]);
-    if (text) get(length, text.get());
+    std::unique_ptr<char, Free> text(static_cast<char*>(std::malloc(static_cast<std::size_t>(length))));
+    if (!text) return nullptr;
+    *text = '\0';  // a driver may write nothing
+    get(length, text.get());
     return text;
 }
 

@@ -1,10 +1,9 @@
-#include <utility>
+#include "gl/targets.h"
 
-#include "fluid/fluid.h"
+#include "base/log.h"
 #include "gl/texture_units.h"
-#include "jni/log.h"
 
-Surface_ Fluid::CreateSurface(int width, int height) {
+Surface_ createSurface(int width, int height) {
     LOG_ERROR("CreateSurface");
     Surface_ surface;
     surface.Width = width;
@@ -29,26 +28,14 @@ Surface_ Fluid::CreateSurface(int width, int height) {
     return surface;
 }
 
-Data_ Fluid::CreateData(int width, int height) {
-    Data_ data;
-    data.Ping = CreateSurface(width, height);
-    data.Pong = CreateSurface(width, height);
-    return data;
-}
-
-void Fluid::SwapSurfaces(Data_* data) {
-    std::swap(data->Ping, data->Pong);
-}
-
-void Fluid::ClearSurface(Surface_ surface, float red, float green, float blue, float alpha) {
+void clearSurface(const Surface_& surface, float red, float green, float blue, float alpha) {
     glBindFramebuffer(GL_FRAMEBUFFER, surface.FboHandle);
     glClearColor(red, green, blue, alpha);
     glClear(GL_COLOR_BUFFER_BIT);
 }
 
-void Fluid::ResetState() {
+void resetState() {
     unbindTextureUnits();
     glBindFramebuffer(GL_FRAMEBUFFER, 0);
-    inkTargetBound = false;
     glDisable(GL_BLEND);
 }

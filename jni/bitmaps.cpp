@@ -4,7 +4,7 @@
 #include <cstdlib>
 #include <cstring>
 
-#include "jni/log.h"
+#include "base/log.h"
 
 AndroidBitmapInfo bmp_portrait_bg_info;
 AndroidBitmapInfo bmp_landscape_bg_info;

@@ -1,11 +1,11 @@
 #include <GLES2/gl2.h>
 
-#include "fluid/fluid.h"
+#include "base/log.h"
+#include "fluid/ink_presets.h"
 #include "jni/bitmaps.h"
 #include "jni/gesture.h"
 #include "jni/globals.h"
 #include "jni/ink_frame.h"
-#include "jni/log.h"
 #include "jni/natives.h"
 #include "jni/pinned_arrays.h"
 #include "water/mesh.h"
@@ -125,11 +125,11 @@ JNIEXPORT jint JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
 }
 
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_clearInkValue(JNIEnv*, jobject) {
-    state = 0;
+    state = kIdle;
     step = 0;
     fluid.ClearInkValue = 0.0f;
     fluid.DensityDissipation = 0.0f;
-    fluid.DragMode = 0;
+    fluid.DragMode = kSlowDrag;
 }
 
 }  // extern "C"

@@ -2,12 +2,11 @@
 
 #include <cmath>
 
-#include "fluid/fluid.h"
+#include "base/wrapping.h"
+#include "fluid/ink_presets.h"
 #include "jni/globals.h"
 
 namespace {
-
-enum Action { kDown = 0, kUp = 1, kMove = 2, kCancel = 3 };
 
 // Measures the movement since the last touch and returns its length in pixels. The squares wrap around like Java's
 // int; a movement too long for them counts as slow or is sorted by what is left, and either is harmless.
@@ -21,7 +20,7 @@ float measureMovement(int x, int y) {
 
 void reset() {
     fluid.ClearInkValue = 0.0f;
-    state = 0;
+    state = kIdle;
     step = 0;
 }
 
@@ -31,47 +30,47 @@ void startSegment(int x, int y) {
 }
 
 void touchWhileIdle(int x, int y, int action) {
-    if (action != kDown) return;
+    if (action != kActionDown) return;
     startSegment(x, y);
-    state = 1;
+    state = kTapping;
 }
 
 void touchWhileTapping(int x, int y, int action) {
-    if (action == kDown) {
+    if (action == kActionDown) {
         step = 1;
         startSegment(x, y);
-    } else if (action == kMove) {
+    } else if (action == kActionMove) {
         const float distance = measureMovement(x, y);
         if (step >= max_step || distance > static_cast<float>(Andante_threshold)) {
             drag_step = 0;
-            state = 2;
+            state = kDragging;
         }
     }
 }
 
 void touchWhileDragging(int x, int y, int action) {
     const float distance = measureMovement(x, y);
-    isMovingEvent = distance > static_cast<float>(Allegro_threshold)   ? 2
-                    : distance > static_cast<float>(Andante_threshold) ? 1
-                                                                       : 0;
-    if (action != kUp) return;
+    isMovingEvent = distance > static_cast<float>(Allegro_threshold)   ? kFast
+                    : distance > static_cast<float>(Andante_threshold) ? kMedium
+                                                                       : kSlow;
+    if (action != kActionUp) return;
     if (step < max_step && drag_step <= 9) {
         // Hardly a drag: it goes on as the tap that it came from.
-        state = 1;
+        state = kTapping;
         return;
     }
     step = 0;
     drag_step = 0;
     fluid.SourceStrength = 0.0f;
-    fluid.VelocityDissipation = 0.9f;
-    fluid.DensityDissipation = 0.9f;
-    state = 0;
+    fluid.VelocityDissipation = kReleasedVelocityDissipation;
+    fluid.DensityDissipation = kReleasedDensityDissipation;
+    state = kIdle;
 }
 
 }  // namespace
 
 void touch(int x, int y, int action, float pressure) {
-    if (action == kDown) count = 0;
+    if (action == kActionDown) count = 0;
     const double p = pressure;
     TouchPressure = p > 0.0 ? static_cast<float>(p * p + static_cast<double>(0.2f)) : 0.0f;
     POSITION_X = x;
@@ -80,10 +79,10 @@ void touch(int x, int y, int action, float pressure) {
     TOUCH_ACTION = action;
 
     const int entryState = state;
-    if (entryState == 0) touchWhileIdle(x, y, action);
-    if (entryState == 1) touchWhileTapping(x, y, action);
-    if (entryState == 2) touchWhileDragging(x, y, action);
-    if (action == kCancel) reset();
+    if (entryState == kIdle) touchWhileIdle(x, y, action);
+    if (entryState == kTapping) touchWhileTapping(x, y, action);
+    if (entryState == kDragging) touchWhileDragging(x, y, action);
+    if (action == kActionCancel) reset();
 
     PREV_POSITION_X = x;
     PREV_POSITION_Y = y;

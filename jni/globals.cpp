@@ -6,9 +6,9 @@ int Allegro_threshold = 10;
 int acc_step = 5;
 int sim_step = 10;
 int max_step = 12;
-int isMovingEvent = -1;
+int isMovingEvent = kUnmeasured;
 
-int state = 0;
+int state = kIdle;
 int step = 0;
 int drag_step = 0;
 int count = 0;
@@ -27,3 +27,5 @@ int TOUCH_ACTION = 0;
 bool bWithInk = false;
 int SCREEN_WIDTH = 0;
 int SCREEN_HEIGHT = 0;
+
+Fluid fluid;

@@ -1,8 +1,19 @@
-// State that the native methods share between calls. Positions are screen pixels as the host reports them, origin at
-// the top left, y downwards. There is one thread of control, so nothing is locked.
+// State that the native methods share between calls, with what the engine reads in base/touch_state.h. Positions are
+// screen pixels as the host reports them, origin at the top left, y downwards. There is one thread of control, so
+// nothing is locked.
 #pragma once
 
-#include <limits>
+#include "base/touch_state.h"
+#include "fluid/fluid.h"
+
+enum GestureState { kIdle = 0, kTapping = 1, kDragging = 2 };
+enum SpeedClass { kUnmeasured = -1, kSlow = 0, kMedium = 1, kFast = 2 };
+enum MotionAction {
+    kActionDown = 0,
+    kActionUp = 1,
+    kActionMove = 2,
+    kActionCancel = 3
+};  // the codes of android.view.MotionEvent
 
 // Tunable.
 extern float TouchPressure;    // weight of the latest touch: pressure^2 + 0.2, or 0 without pressure
@@ -11,19 +22,15 @@ extern int Allegro_threshold;  // pixels above which it is fast
 extern int acc_step;           // tap frames in which the divergence source grows
 extern int sim_step;           // tap frames in which ink is injected
 extern int max_step;           // length of a tap, frames
-extern int isMovingEvent;      // class of the latest drag movement: 0 slow, 1 medium, 2 fast; -1 before the first
+extern int isMovingEvent;      // SpeedClass of the latest drag movement
 
 // Gesture and frame.
-extern int state;       // 0 idle, 1 tap, 2 drag
-extern int step;        // frames of the current tap
-extern int drag_step;   // frames of the current drag
-extern int count;       // ink frames since the last touch-down
-extern int POSITION_X;  // latest touch
-extern int POSITION_Y;
-extern int PREV_POSITION_X;  // touch before that
+extern int state;            // GestureState
+extern int step;             // frames of the current tap
+extern int drag_step;        // frames of the current drag
+extern int count;            // ink frames since the last touch-down
+extern int PREV_POSITION_X;  // touch before the latest
 extern int PREV_POSITION_Y;
-extern int DX;  // from there to here, measured while tapping or dragging
-extern int DY;
 extern int DRAG_START_X;  // current drag segment
 extern int DRAG_START_Y;
 extern int DRAG_END_X;
@@ -35,12 +42,5 @@ extern bool bWithInk;     // fixed by onInitSetting; without ink only the water 
 extern int SCREEN_WIDTH;  // view size given to onInitSetting, the viewport of every frame
 extern int SCREEN_HEIGHT;
 
-// a - b as Java's int computes it: a host may report any coordinate, and an overflow of ours would be undefined.
-inline int wrappingDifference(int a, int b) {
-    return static_cast<int>(static_cast<unsigned>(a) - static_cast<unsigned>(b));
-}
-
-// Counts a frame of a gesture, which may be held for as long as a finger has patience.
-inline void countFrame(int& frames) {
-    if (frames < std::numeric_limits<int>::max()) ++frames;
-}
+// The one engine, constructed when the library loads and destroyed when it unloads.
+extern Fluid fluid;

@@ -5,7 +5,7 @@
 
 #include <tuple>
 
-#include "jni/log.h"
+#include "base/log.h"
 
 // The elements of an array; null for a null array, or when the virtual machine has no memory for its copy.
 inline jfloat* pin(JNIEnv* env, jfloatArray array) {

@@ -1,6 +1,6 @@
 # The tests that need no OpenGL driver; they also run on another processor in an emulator.
 set(TIDEMARK_DRIVERLESS_TESTS
-    fluid/touch_point_test.cpp
+    fluid/touch_test.cpp
     jni/gesture_test.cpp
     tshader/density_kernels_test.cpp
     tshader/flush_denormals_test.cpp

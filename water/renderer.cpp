@@ -1,9 +1,10 @@
+#include "water/renderer.h"
+
 #include <cstddef>
 
-#include "fluid/fluid.h"
+#include "base/log.h"
 #include "gl/texture_units.h"
 #include "gl/uniforms.h"
-#include "jni/log.h"
 
 namespace {
 
@@ -21,60 +22,56 @@ void enableVec3(GLuint attribute, GLuint buffer) {
 
 }  // namespace
 
-void Fluid::Ripple_Render(
-    const float* positions, const float* heightAttribs, const short* indices, int positionFloats, int heightFloats,
-    int indexCount, const float* mvp, int meshSizeWidth, int meshSizeHeight, int numDetailsWidth, int numDetailsHeight,
-    float refractiveIndex, float alphaMix, float alphaScale1, float alphaScale2, float fresnelRatio,
-    float specularRatio, float exponent, bool withInk, bool landscape) {
-    const GLuint program = ripple_program;
-    if (!program || !v_buf) {
+void drawWater(
+    const WaterObjects& objects, int viewWidth, int viewHeight, const WaterMesh& mesh, const WaterLight& light,
+    const WaterInk* ink) {
+    const GLuint program = objects.program;
+    if (!program || !objects.positions) {
         // Drawing without the buffers of a set-up would read address 0.
         static bool reported = false;
         if (!reported) LOG_ERROR("Ripple_Render() without a set-up");
         reported = true;
         return;
     }
-    glViewport(0, 0, ScreenWidth, ScreenHeight);
+    glViewport(0, 0, viewWidth, viewHeight);
     glUseProgram(program);
-    setUniform(program, "uMESH_SIZE_WIDTH", static_cast<float>(meshSizeWidth));
-    setUniform(program, "uMESH_SIZE_HEIGHT", static_cast<float>(meshSizeHeight));
-    setUniform(program, "uNUM_DETAILS_WIDTH", static_cast<float>(numDetailsWidth));
-    setUniform(program, "uNUM_DETAILS_HEIGHT", static_cast<float>(numDetailsHeight));
-    setUniform(program, "uRefractiveIndex", refractiveIndex);
+    setUniform(program, "uMESH_SIZE_WIDTH", static_cast<float>(mesh.sizeWidth));
+    setUniform(program, "uMESH_SIZE_HEIGHT", static_cast<float>(mesh.sizeHeight));
+    setUniform(program, "uNUM_DETAILS_WIDTH", static_cast<float>(mesh.detailsWidth));
+    setUniform(program, "uNUM_DETAILS_HEIGHT", static_cast<float>(mesh.detailsHeight));
+    setUniform(program, "uRefractiveIndex", light.refractiveIndex);
     const auto aPosition = static_cast<GLuint>(glGetAttribLocation(program, "aPosition"));
     const auto aHeights = static_cast<GLuint>(glGetAttribLocation(program, "aHeights"));
-    glUniformMatrix4fv(glGetUniformLocation(program, "uMVPMatrix"), 1, GL_FALSE, mvp);
+    glUniformMatrix4fv(glGetUniformLocation(program, "uMVPMatrix"), 1, GL_FALSE, mesh.mvp);
 
     glBindBuffer(GL_ARRAY_BUFFER, 0);
-    upload(GL_ARRAY_BUFFER, v_buf, std::ptrdiff_t{positionFloats} * 4, positions);
-    upload(GL_ARRAY_BUFFER, h_buf, std::ptrdiff_t{heightFloats} * 4, heightAttribs);
-    upload(GL_ELEMENT_ARRAY_BUFFER, i_buf, std::ptrdiff_t{indexCount} * 2, indices);
-    enableVec3(aHeights, h_buf);
-    enableVec3(aPosition, v_buf);
+    upload(GL_ARRAY_BUFFER, objects.positions, std::ptrdiff_t{mesh.positionFloats} * 4, mesh.positions);
+    upload(GL_ARRAY_BUFFER, objects.heights, std::ptrdiff_t{mesh.heightFloats} * 4, mesh.heightAttribs);
+    upload(GL_ELEMENT_ARRAY_BUFFER, objects.indices, std::ptrdiff_t{mesh.indexCount} * 2, mesh.indices);
+    enableVec3(aHeights, objects.heights);
+    enableVec3(aPosition, objects.positions);
 
-    if (withInk) {
-        const double a = 1.5 - double{InkColorOffset};
-        const auto tint = [a](float channel) { return static_cast<float>(a / double{channel} - 1.0); };
-        setUniform(program, "Scale", 1.0f / static_cast<float>(ScreenWidth), 1.0f / static_cast<float>(ScreenHeight));
-        setUniform(program, "ink_color", tint(InkColor.r), tint(InkColor.g), tint(InkColor.b));
-        setUniform(program, "intensity", InkIntensity * ClearInkValue);
-        bindTextureUnit(GL_TEXTURE2, Density.Ping.TextureHandle);
+    if (ink) {
+        setUniform(program, "Scale", 1.0f / static_cast<float>(viewWidth), 1.0f / static_cast<float>(viewHeight));
+        setUniform(program, "ink_color", ink->tint[0], ink->tint[1], ink->tint[2]);
+        setUniform(program, "intensity", ink->intensity);
+        bindTextureUnit(GL_TEXTURE2, ink->density);
         setUniform(program, "Density", 2);
     }
 
-    setUniform(program, "alphaRatio1", alphaMix * alphaScale1);
-    setUniform(program, "alphaRatio2", static_cast<float>(double{alphaScale2} * (1.0 - double{alphaMix})));
-    setUniform(program, "fresnelRatio", fresnelRatio);
-    setUniform(program, "specularRatio", specularRatio);
-    setUniform(program, "exponent", exponent);
-    setUniform(program, "viewportHeight", static_cast<float>(ScreenHeight));
-    bindTextureUnit(GL_TEXTURE0, landscape ? landscapeBG : portraitBG);
+    setUniform(program, "alphaRatio1", light.alphaMix * light.alphaScale1);
+    setUniform(program, "alphaRatio2", static_cast<float>(double{light.alphaScale2} * (1.0 - double{light.alphaMix})));
+    setUniform(program, "fresnelRatio", light.fresnelRatio);
+    setUniform(program, "specularRatio", light.specularRatio);
+    setUniform(program, "exponent", light.exponent);
+    setUniform(program, "viewportHeight", static_cast<float>(viewHeight));
+    bindTextureUnit(GL_TEXTURE0, objects.background);
     setUniform(program, "sBGTexture", 0);
-    bindTextureUnit(GL_TEXTURE1, environment);
+    bindTextureUnit(GL_TEXTURE1, objects.light);
     setUniform(program, "sWaterTexture", 1);
 
-    glBindBuffer(GL_ELEMENT_ARRAY_BUFFER, i_buf);
-    glDrawElements(GL_TRIANGLES, indexCount, GL_UNSIGNED_SHORT, nullptr);
+    glBindBuffer(GL_ELEMENT_ARRAY_BUFFER, objects.indices);
+    glDrawElements(GL_TRIANGLES, mesh.indexCount, GL_UNSIGNED_SHORT, nullptr);
     glDisableVertexAttribArray(aPosition);
     glDisableVertexAttribArray(aHeights);
     unbindTextureUnits();

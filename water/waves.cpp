@@ -5,9 +5,9 @@
 #include <cstring>
 #include <type_traits>
 
+#include "base/scratch.h"
 #include "tshader/flush_denormals.h"
 #include "tshader/groups.h"
-#include "tshader/scratch.h"
 
 namespace {
 

@@ -20,7 +20,7 @@
 #include "host/water_host.h"
 #include "platform/desktop_bitmap.h"
 #include "platform/headless_context.h"
-#include "tests/endurance/library_blocks.h"
+#include "tests/support/library_blocks.h"
 #include "tests/support/log_recorder.h"
 #include "tests/support/test_pictures.h"
 

@@ -14,9 +14,9 @@
 #include "host/water_host.h"
 #include "jni/globals.h"
 #include "tests/endurance/lengths.h"
-#include "tests/endurance/library_blocks.h"
 #include "tests/support/counting_gl.h"
 #include "tests/support/gesture_state.h"
+#include "tests/support/library_blocks.h"
 #include "tests/support/log_recorder.h"
 #include "tests/support/test_pictures.h"
 

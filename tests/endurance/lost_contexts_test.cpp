@@ -10,9 +10,9 @@
 
 #include "host/water_host.h"
 #include "tests/endurance/lengths.h"
-#include "tests/endurance/library_blocks.h"
 #include "tests/support/gesture_state.h"
 #include "tests/support/gl_test.h"
+#include "tests/support/library_blocks.h"
 #include "tests/support/test_pictures.h"
 
 namespace {

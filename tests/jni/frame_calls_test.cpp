@@ -4,9 +4,9 @@
 #include "fluid/fluid.h"
 #include "host/water_host.h"
 #include "jni/globals.h"
-#include "tests/support/allocations.h"
 #include "tests/support/counting_gl.h"
 #include "tests/support/gesture_state.h"
+#include "tests/support/library_blocks.h"
 #include "tests/support/log_recorder.h"
 #include "tests/support/test_pictures.h"
 
@@ -137,9 +137,9 @@ TEST_F(FrameCalls, aFastDragPushesTheFlowWithoutTheGpuAndAllocatesNothing) {
     for (int i = 1; i <= 6; ++i) {
         host.touch(TouchAction::move, 130 + 30 * i, 400, 1.0f);
         host.advance(1.0 / 60);
-        const int before = Allocations::made;
+        const int before = LibraryBlocks::requested;
         host.draw();
-        EXPECT_EQ(Allocations::made, before);
+        EXPECT_EQ(LibraryBlocks::requested, before);
         EXPECT_EQ(takeGlUse().calls, kInkFrame + kAddedInk) << i;
         ASSERT_EQ(fluid.DragMode, 2);
     }

@@ -5,7 +5,6 @@
 #include "host/host_jni.h"
 #include "host/native_names.h"
 #include "jni/gesture.h"
-#include "tests/support/allocations.h"
 #include "tests/support/gesture_state.h"
 #include "tests/support/gl_test.h"
 #include "water/waves.h"
@@ -232,41 +231,7 @@ TEST_F(InkFrame, anyViewIsSafeAndTheInkMaySwitchOnAndOff) {
     EXPECT_GT(total(), 0);
 }
 
-TEST_F(InkFrame, allocatesNothingOnceWarm) {
-    std::vector<float> water(2 * 64 * 64);
-    const auto stroke = [&water] {
-        for (int i = 0; i < 20; ++i) {
-            touch(150 + 11 * i, 300 + 9 * i, i == 0 ? 0 : 2, 0.7f);
-            stepWaves(water.data(), water.data() + 64 * 64, {1, 1, 63, 63, 64}, true, 0.98f, 0.3f);
-            frame();
-        }
-    };
-    stroke();
-    const int before = Allocations::made;
-    stroke();
-    EXPECT_EQ(Allocations::made, before);
-}
-
-TEST_F(InkFrame, livesWithoutMemory) {
-    touch(240, 400, 0, 1.0f);
-    frames(3);
-    // A view that grows needs a larger staging buffer.
-    start(12000, 12000);
-    touch(480, 800, 0, 1.0f);
-    Allocations::failFrom = 1 << 20;
-    fluid.Update(0);
-    std::vector<float> height(600 * 600);
-    std::vector<float> speed(600 * 600, 1.0f);
-    const bool calm = stepWaves(speed.data(), height.data(), {1, 1, 599, 599, 600}, true, 1.0f, 0.3f);
-    Allocations::failFrom = SIZE_MAX;
-    EXPECT_EQ(
-        log.take(), (std::vector<std::string>{
-                        "E no memory for uploading the ink's velocity", "E no memory for smoothing the water"}));
-    EXPECT_FALSE(calm);
-    EXPECT_EQ(height[300 * 600 + 300], 1.0f) << "the water still moves";
-    frames(4);
-    EXPECT_GT(total(), 0);
-
+TEST_F(InkFrame, theWaterGoesOnWithoutAGrid) {
     // More texels than any machine has memory for; and a grid longer than floats can count.
     for (const auto& [width, height_] : {std::pair{2000000000, 2000000000}, {2147483647, 12}}) {
         fluid.InitializeSetting(width, height_, true);

@@ -1,4 +1,4 @@
-// Off-screen render targets.
+// Off-screen render targets. Needs the GL context current.
 #pragma once
 
 #include <GLES2/gl2.h>
@@ -19,3 +19,13 @@ struct Data_ {
     Surface_ Ping;
     Surface_ Pong;
 };
+
+// A target cleared to zero. Leaves framebuffer 0 and the texture bound. An incomplete one is logged and returned all
+// the same.
+Surface_ createSurface(int width, int height);
+
+// Leaves the framebuffer of `surface` bound.
+void clearSurface(const Surface_& surface, float red, float green, float blue, float alpha);
+
+// Ends an off-screen pass: texture units 3 to 0 unbound, unit 0 active, framebuffer 0 bound, blending off.
+void resetState();

@@ -3,11 +3,16 @@
 
 #include "fluid/fluid.h"
 
-// y of the latest touch.
-int flippedTouchY(const Fluid& engine);
+struct Touch {
+    int x, y;
+    int dx, dy;  // latest movement
+};
 
-// Whether the touch lies more than `margin` pixels away from every edge.
-bool isTouchInside(const Fluid& engine, int margin);
+// The one place where the engine reads the touch that the native methods store.
+Touch latestTouch(const Fluid& engine);
+
+// Whether the point lies more than `margin` pixels away from every edge.
+bool isInside(const Fluid& engine, int x, int y, int margin);
 
 // Stores the segment (x0, y0) to (x1, y1), y downwards, as Previous to Current.
 void recordStroke(Fluid& engine, float x0, float y0, float x1, float y1);

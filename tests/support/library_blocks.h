@@ -1,5 +1,5 @@
 // The memory that the library itself asks for, counted and failed on request. The linker puts these functions between
-// the program's objects and the allocators; see CMakeLists.txt.
+// the program's objects and the allocators; see CMakeLists.txt beside this file.
 #pragma once
 
 struct LibraryBlocks {

@@ -1,10 +1,10 @@
-#include "fluid/touch_point.h"
+#include "fluid/touch.h"
 
 #include <gtest/gtest.h>
 
 #include "tests/support/gesture_state.h"
 
-TEST(TouchPoint, marginsBelongToTheEdge) {
+TEST(Touch, marginsBelongToTheEdge) {
     Fluid engine;
     engine.ScreenWidth = 480;
     engine.ScreenHeight = 800;
@@ -18,7 +18,7 @@ TEST(TouchPoint, marginsBelongToTheEdge) {
     for (int p = -1; p < 3; ++p) EXPECT_TRUE(engine.isBoundary(p, p)) << "a tiny view is all margin";
 }
 
-TEST(TouchPoint, strokesAreFlippedAndHaveADirectionIfTheyHaveALength) {
+TEST(Touch, strokesAreFlippedAndHaveADirectionIfTheyHaveALength) {
     Fluid engine;
     engine.ScreenHeight = 1920;
     recordStroke(engine, 100, 1000, 200, 1000);

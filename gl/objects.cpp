@@ -1,0 +1,50 @@
+#include "gl/objects.h"
+
+#include <algorithm>
+#include <string_view>
+
+#include "base/log.h"
+
+namespace {
+
+// Shaders and programs share their names.
+bool shareNames(GlKind a, GlKind b) {
+    const auto space = [](GlKind kind) { return kind == GlKind::shader ? GlKind::program : kind; };
+    return space(a) == space(b);
+}
+
+bool isHeldOnce(std::span<const GlObject> all, const GlObject& object) {
+    return std::ranges::count_if(all, [&object](const GlObject& other) {
+               return shareNames(other.kind, object.kind) && *other.name == *object.name;
+           }) == 1;
+}
+
+void deleteObject(GlKind kind, GLuint name) {
+    switch (kind) {
+        case GlKind::program:
+            return glDeleteProgram(name);
+        case GlKind::shader:
+            return glDeleteShader(name);
+        case GlKind::buffer:
+            return glDeleteBuffers(1, &name);
+        case GlKind::framebuffer:
+            return glDeleteFramebuffers(1, &name);
+        case GlKind::texture:
+            return glDeleteTextures(1, &name);
+    }
+}
+
+}  // namespace
+
+void deleteGroup(std::span<const GlObject> all, const char* group) {
+    const auto isInGroup = [group](const GlObject& object) { return std::string_view(object.group) == group; };
+    const auto first = std::ranges::find_if(
+        all, [&](const GlObject& object) { return isInGroup(object) && object.kind != GlKind::shader; });
+    if (first == all.end() || !*first->name) return;
+    LOG_INFO("glDelete %s = %u", group, *first->name);
+    for (const GlObject& object : all) {
+        if (!isInGroup(object)) continue;
+        if (*object.name && isHeldOnce(all, object)) deleteObject(object.kind, *object.name);
+        *object.name = 0;
+    }
+}

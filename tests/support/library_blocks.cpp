@@ -1,0 +1,36 @@
+#include "tests/support/library_blocks.h"
+
+#include <cstddef>
+
+// The names are the linker's.
+extern "C" {
+void* __real_malloc(std::size_t size);
+void* __real_realloc(void* block, std::size_t size);
+void __real_free(void* block);
+void* __wrap_malloc(std::size_t size);
+void* __wrap_realloc(void* block, std::size_t size);
+void __wrap_free(void* block);
+}
+
+static bool fails() {
+    const int number = ++LibraryBlocks::requested;
+    return number >= LibraryBlocks::failFirst && number <= LibraryBlocks::failLast;
+}
+
+void* __wrap_malloc(std::size_t size) {
+    void* const block = fails() ? nullptr : __real_malloc(size);
+    if (block) ++LibraryBlocks::live;
+    return block;
+}
+
+void* __wrap_realloc(void* block, std::size_t size) {
+    if (fails()) return nullptr;
+    void* const grown = __real_realloc(block, size);
+    if (grown && !block) ++LibraryBlocks::live;
+    return grown;
+}
+
+void __wrap_free(void* block) {
+    if (block) --LibraryBlocks::live;
+    __real_free(block);
+}

@@ -3,6 +3,9 @@
 // A kernel owns nothing; output must be another buffer than every input.
 #pragma once
 
+#include <cstddef>
+#include <cstdlib>
+
 #include "tshader/texture.h"
 #include "tshader/vec.h"
 
@@ -10,6 +13,10 @@ template <class T>
 class TShaderCore {
 public:
     virtual ~TShaderCore() = default;
+
+    // The C allocator: where the C++ runtime is linked statically, its own would bring the unwinder along.
+    static void* operator new(std::size_t size) noexcept { return std::malloc(size); }
+    static void operator delete(void* kernel) { std::free(kernel); }
 
     // fragCoord.xy is the fragment in output pixels; texel (i, j) has its centre at (i + 0.5, j + 0.5).
     virtual void shaderMain(const vec4& fragCoord, T& out) = 0;

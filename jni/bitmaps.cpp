@@ -13,14 +13,18 @@ std::uint8_t* bmp_portrait_bg_Pixels;
 std::uint8_t* bmp_landscapebg_Pixels;
 std::uint8_t* bmp_water_Pixels;
 
+namespace {
+
 // Frees the copies when the library unloads.
-static const struct CopyOwner {
+const struct CopyOwner {
     ~CopyOwner() {
         std::free(bmp_portrait_bg_Pixels);
         std::free(bmp_landscapebg_Pixels);
         std::free(bmp_water_Pixels);
     }
 } copyOwner;
+
+}  // namespace
 
 void transferBitmap(JNIEnv* env, jobject bitmap, AndroidBitmapInfo& info, std::uint8_t*& pixels) {
     AndroidBitmapInfo handed = {};

@@ -15,11 +15,9 @@ struct Range {
     int first, end;
 };
 
-}  // namespace
-
 // The velocity at the point p, which is pushed if its foot on the segment lies strictly inside.
 template <class F>
-static Pair<F> push(Pair<F> velocity, F px, F py, const Segment& segment) {
+Pair<F> push(Pair<F> velocity, F px, F py, const Segment& segment) {
     const F t = segment.normal.x * (px - segment.previous.x) + segment.normal.y * (py - segment.previous.y);
     const F footX = segment.previous.x + t * segment.normal.x;
     const F footY = segment.previous.y + t * segment.normal.y;
@@ -34,7 +32,7 @@ static Pair<F> push(Pair<F> velocity, F px, F py, const Segment& segment) {
 
 // The texels of an axis that lie within `radius` of a stretch of the screen, and one more on either side to
 // make up for rounding. The comparisons are such that NaN gives the whole axis.
-static Range reach(float from, float to, float radius, float scale, int size) {
+Range reach(float from, float to, float radius, float scale, int size) {
     const float first = (std::min(from, to) - radius) / scale - 1.5f;
     const float last = (std::max(from, to) + radius) / scale + 1.5f;
     const float limit = static_cast<float>(size);
@@ -42,6 +40,8 @@ static Range reach(float from, float to, float radius, float scale, int size) {
         first > 0.0f ? (first < limit ? static_cast<int>(first) : size) : 0,
         last < limit ? (last > 0.0f ? static_cast<int>(last) + 1 : 0) : size};
 }
+
+}  // namespace
 
 void AddVelocityTShaderImpl::shaderMain(const vec4& fragCoord, vec2& out) {
     const vec2 fragment = Vec2(fragCoord.x, fragCoord.y);

@@ -2,26 +2,19 @@
 
 #include "tshader/groups.h"
 
+namespace {
+
 // Touches drag the velocity along within this distance, in screen pixels.
-static constexpr float kDragRadius = 25.0f;
+constexpr float kDragRadius = 25.0f;
 
 // What a drag of this class adds to the velocity near the touch: a medium one takes off half of its movement
 // and a fast one adds half.
-static vec2 dragPush(int drag, const vec2& delta) {
+vec2 dragPush(int drag, const vec2& delta) {
     return (static_cast<float>(drag) - 1.5f) * delta;
 }
 
-void AdvectVelocityTShaderImpl::shaderMain(const vec4& fragCoord, vec2& out) {
-    const vec2 fragment = Vec2(fragCoord.x, fragCoord.y);
-    const vec2 u = texture2D(VelocityTexture, InverseSize * fragment);
-    vec2 s = texture2DLinear(SourceTexture, InverseSize * (fragment - u * TimeStep));
-    vec2 p = Scale * fragment;
-    if (drag > 0 && distance(center, p) < kDragRadius) s = s + dragPush(drag, delta);
-    out = s * Dissipation;
-}
-
 // Texels texels[at] and texels[at + 1] for each lane of `at`.
-static inline void gatherNeighbours(const vec2* texels, int4 at, Pair<float4>& left, Pair<float4>& right) {
+void gatherNeighbours(const vec2* texels, int4 at, Pair<float4>& left, Pair<float4>& right) {
     const float4 a = load<float4>(&texels[at[0]].x);
     const float4 b = load<float4>(&texels[at[1]].x);
     const float4 c = load<float4>(&texels[at[2]].x);
@@ -36,7 +29,7 @@ static inline void gatherNeighbours(const vec2* texels, int4 at, Pair<float4>& l
     right.y = __builtin_shufflevector(rightAB, rightCD, 2, 3, 6, 7);
 }
 
-static inline Pair<float> sample(Texture<vec2> source, Pair<float> c) {
+Pair<float> sample(Texture<vec2> source, Pair<float> c) {
     const vec2 s = texture2DLinear(source, Vec2(c.x, c.y));
     return {s.x, s.y};
 }
@@ -44,7 +37,7 @@ static inline Pair<float> sample(Texture<vec2> source, Pair<float> c) {
 // texture2DLinear at four points of a source that is at least two texels wide. One load brings both texels of a row, so
 // the last column is reached from the left with weight 1, and the last row of several from below. The other texel
 // counts 0 times there, and only one that is not finite would still be seen; no valid frame leaves one.
-static inline Pair<float4> sample(Texture<vec2> source, Pair<float4> c) {
+Pair<float4> sample(Texture<vec2> source, Pair<float4> c) {
     const float lastX = static_cast<float>(source.width - 1);
     const float lastY = static_cast<float>(source.height - 1);
     const bool oneRow = source.height == 1;
@@ -60,6 +53,17 @@ static inline Pair<float4> sample(Texture<vec2> source, Pair<float4> c) {
     const float4 tx = fx - toFloat(x0);
     const float4 ty = fy - toFloat(y0);
     return {bilinear(t00.x, t10.x, t01.x, t11.x, tx, ty), bilinear(t00.y, t10.y, t01.y, t11.y, tx, ty)};
+}
+
+}  // namespace
+
+void AdvectVelocityTShaderImpl::shaderMain(const vec4& fragCoord, vec2& out) {
+    const vec2 fragment = Vec2(fragCoord.x, fragCoord.y);
+    const vec2 u = texture2D(VelocityTexture, InverseSize * fragment);
+    vec2 s = texture2DLinear(SourceTexture, InverseSize * (fragment - u * TimeStep));
+    vec2 p = Scale * fragment;
+    if (drag > 0 && distance(center, p) < kDragRadius) s = s + dragPush(drag, delta);
+    out = s * Dissipation;
 }
 
 void AdvectVelocityTShaderImpl::run() {

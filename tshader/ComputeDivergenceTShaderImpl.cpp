@@ -4,10 +4,14 @@
 
 #include "tshader/groups.h"
 
+namespace {
+
 template <class F>
-static F centralDifferences(F left, F right, F below, F above, float halfInvCellSize) {
+F centralDifferences(F left, F right, F below, F above, float halfInvCellSize) {
     return (((right - left) + above) - below) * halfInvCellSize;
 }
+
+}  // namespace
 
 void ComputeDivergenceTShaderImpl::shaderMain(const vec4& fragCoord, float& out) {
     const vec2 fragment = Vec2(fragCoord.x, fragCoord.y);

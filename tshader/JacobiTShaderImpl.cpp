@@ -4,11 +4,15 @@
 
 #include "tshader/groups.h"
 
+namespace {
+
 // One relaxation from the four neighbours, for one texel or for four in a row.
 template <class F>
-static F relax(F left, F right, F below, F above, F divergence, float alpha, float inverseBeta) {
+F relax(F left, F right, F below, F above, F divergence, float alpha, float inverseBeta) {
     return ((((left + right) + below) + above) + alpha * divergence) * inverseBeta;
 }
+
+}  // namespace
 
 void JacobiTShaderImpl::shaderMain(const vec4& fragCoord, float& out) {
     const vec2 uv = Vec2(fragCoord.x, fragCoord.y) * InverseSize;

@@ -4,10 +4,14 @@
 
 #include "tshader/groups.h"
 
+namespace {
+
 template <class F>
-static Pair<F> gradient(F left, F right, F below, F above, float scale) {
+Pair<F> gradient(F left, F right, F below, F above, float scale) {
     return {(right - left) * scale, (above - below) * scale};
 }
+
+}  // namespace
 
 void SubtractGradientTShaderImpl::shaderMain(const vec4& fragCoord, vec2& out) {
     const vec2 uv = Vec2(fragCoord.x, fragCoord.y) * InverseSize;

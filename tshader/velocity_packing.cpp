@@ -7,11 +7,13 @@
 
 static_assert(std::endian::native == std::endian::little, "four bytes of a texel are stored as one int");
 
+namespace {
+
 // The two bytes in the low half of an int, whole part first in memory. NaN packs like 127.
 // A raised component is a multiple of 2^-18, and no such fraction times 255 lies close enough below a whole
 // number to be rounded up to it: single precision yields the same bytes as double precision would.
 template <class I, class F>
-static I packComponent(F c) {
+I packComponent(F c) {
     const F raised = c < -127.0f ? 0.0f : (c < 127.0f ? c + 127.0f : 254.0f);
     const I whole = toInt(raised);
     const I fraction = toInt((raised - toFloat(whole)) * 255.0f);
@@ -19,9 +21,11 @@ static I packComponent(F c) {
 }
 
 template <class I, class F>
-static I packTexel(Pair<F> u) {
+I packTexel(Pair<F> u) {
     return packComponent<I>(u.x) | (packComponent<I>(u.y) << 16);
 }
+
+}  // namespace
 
 void packVelocity(const vec2* velocity, std::size_t count, unsigned char* rgba) {
     std::size_t i = 0;

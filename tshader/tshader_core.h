@@ -1,6 +1,10 @@
 // The base of the CPU kernels. A kernel is a fragment shader over float textures: its fields are the textures
 // and uniforms, shaderMain computes one fragment, and `run`, where a kernel has one, fills the output.
 // A kernel owns nothing; output must be another buffer than every input.
+//
+// The library calls `run` only. It computes what shaderMain does, but for rounding and for two deviations that are part
+// of the look: velocity advection and divergence lay the disc around the touch over the texels' corners, not their
+// centres, and Jacobi sets the border of its output to 0.
 #pragma once
 
 #include "tshader/texture.h"

@@ -92,7 +92,7 @@ public:
         int numDetailsHeight, float refractiveIndex, float alphaMix, float alphaScale1, float alphaScale2,
         float fresnelRatio, float specularRatio, float exponent, bool withInk, bool landscape);
 
-    Data_ Velocity;  // only Ping is made: the CPU's velocity, packed anew in every frame
+    Data_ Velocity;  // by contract only Ping is made: the CPU's velocity, packed anew in every frame
     Data_ Density;   // the ink, two bytes a value
     GLuint ripple_program = 0;
     GLuint ripple_vertexShader = 0;

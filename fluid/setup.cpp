@@ -69,7 +69,7 @@ void Fluid::InitializeSetting(int width, int height, bool withInk) {
         SourceRadius = 40.0f;
         BackwardStepSize = 1.0f;
         ClearInkValue = 1.0f;
-        InkIntensity = 0.2f;
+        InkIntensity = 0.2f;  // By contract; no frame shows it.
         DragMode = 0;
         BoundaryMargin = 10;
     }
@@ -81,6 +81,7 @@ void Fluid::InitializeSetting(int width, int height, bool withInk) {
 void Fluid::InitializeGPU(bool withInk) {
     LOG_INFO("InitializeGPU");
     if (withInk) LOG_INFO("bInk is true");
+    // By contract "ripple_vertextShader".
     rebuild(
         *this, {ripple_program, ripple_vertexShader, ripple_fragmentShader}, "ripple_program", "ripple_vertextShader",
         kWaterVert, withInk ? kWaterInkFrag : kWaterPlainFrag);
@@ -119,10 +120,10 @@ void Fluid::InitializeGPU(bool withInk) {
     Density = CreateData(InkWidth, InkHeight);
     allocateBuffers(*this);
     CreateQuad();
-    // For the host's own blending; the library never enables it.
+    // By contract, for the host's own blending; the library never enables it.
     glBlendFunc(GL_SRC_ALPHA, GL_ONE_MINUS_SRC_ALPHA);
     glViewport(0, 0, InkWidth, InkHeight);
     ClearSurface(Density.Ping, 0.0f, 0.0f, 0.0f, 0.0f);
     ClearSurface(Density.Pong, 0.0f, 0.0f, 0.0f, 0.0f);
-    inkTargetBound = true;
+    inkTargetBound = true;  // By contract left so.
 }

@@ -34,6 +34,7 @@ void Fluid::LoadLandscapeBGTextures(AndroidBitmapInfo info, void* pixels) {
     replaceTexture(*this, landscapeBG, "landscapeBG", info, pixels);
 }
 
+// By contract without a line of its own.
 void Fluid::LoadWaterTextures(AndroidBitmapInfo info, void* pixels) {
     replaceTexture(*this, environment, "environment", info, pixels);
 }

@@ -26,6 +26,7 @@ void Fluid::CreateQuad() {
 }
 
 void Fluid::DrawQuad() {
+    // By contract uploaded at every pass.
     glBindBuffer(GL_ARRAY_BUFFER, quadvbo);
     glBufferData(GL_ARRAY_BUFFER, sizeof kQuad, kQuad, GL_STATIC_DRAW);
     glEnableVertexAttribArray(0);
@@ -33,6 +34,6 @@ void Fluid::DrawQuad() {
     glVertexAttribPointer(0, 2, GL_SHORT, GL_FALSE, sizeof(Corner), nullptr);
     glVertexAttribPointer(1, 2, GL_SHORT, GL_FALSE, sizeof(Corner), reinterpret_cast<const void*>(offsetof(Corner, s)));
     glDrawArrays(GL_TRIANGLE_STRIP, 0, 4);
-    // Attribute 1 stays enabled: the next pass draws the same quad.
+    // By contract attribute 1 stays enabled: the next pass draws the same quad.
     glDisableVertexAttribArray(0);
 }

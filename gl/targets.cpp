@@ -5,7 +5,7 @@
 #include "jni/log.h"
 
 Surface_ Fluid::CreateSurface(int width, int height) {
-    LOG_ERROR("CreateSurface");
+    LOG_ERROR("CreateSurface");  // By contract an error.
     Surface_ surface;
     surface.Width = width;
     surface.Height = height;
@@ -22,6 +22,7 @@ Surface_ Fluid::CreateSurface(int width, int height) {
     }
     glFramebufferTexture2D(GL_FRAMEBUFFER, GL_COLOR_ATTACHMENT0, GL_TEXTURE_2D, surface.TextureHandle, 0);
     const GLenum status = glCheckFramebufferStatus(GL_FRAMEBUFFER);
+    // By contract no error.
     if (status != GL_FRAMEBUFFER_COMPLETE) LOG_INFO("FRAMEBUFFER_ERROR - %d", static_cast<int>(status));
     glClearColor(0.0f, 0.0f, 0.0f, 0.0f);
     glClear(GL_COLOR_BUFFER_BIT);

@@ -69,6 +69,7 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
     withPinned(env, "initWaters", fill, positions, indices);
 }
 
+// By contract rowCount is not read.
 JNIEXPORT jboolean JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_move(
     JNIEnv* env, jobject, jfloatArray velocity, jfloatArray height, jint xStart, jint yStart, jint xEnd, jint yEnd,
     jint stride, jint, jboolean checkCalm, jfloat damping, jfloat waveSpeed) {
@@ -119,7 +120,7 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
     state = 0;
     step = 0;
     fluid.ClearInkValue = 0.0f;
-    fluid.DensityDissipation = 0.0f;
+    fluid.DensityDissipation = 0.0f;  // By contract until the next gesture.
     fluid.DragMode = 0;
 }
 

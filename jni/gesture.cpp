@@ -44,7 +44,7 @@ void touchWhileTapping(int x, int y, int action) {
         const float distance = measureMovement(x, y);
         if (step >= max_step || distance > static_cast<float>(Andante_threshold)) {
             drag_step = 0;
-            state = 2;
+            state = 2;  // By contract its first frame is of the speed class of the drag before.
         }
     }
 }
@@ -73,6 +73,7 @@ void touchWhileDragging(int x, int y, int action) {
 void touch(int x, int y, int action, float pressure) {
     if (action == kDown) count = 0;
     const double p = pressure;
+    // By contract no pressure makes a slow drag without ink.
     TouchPressure = p > 0.0 ? static_cast<float>(p * p + static_cast<double>(0.2f)) : 0.0f;
     POSITION_X = x;
     POSITION_Y = y;

@@ -2,8 +2,8 @@
 // and uniforms, shaderMain computes one fragment, and `run`, where a kernel has one, fills the output.
 // A kernel owns nothing; output must be another buffer than every input.
 //
-// The library calls `run` only. It computes what shaderMain does, but for rounding and for two deviations that are part
-// of the look: velocity advection and divergence lay the disc around the touch over the texels' corners, not their
+// The library calls `run` only. It computes what shaderMain does, but for rounding and for two differences that stand
+// by contract: velocity advection and divergence lay the disc around the touch over the texels' corners, not their
 // centres, and Jacobi sets the border of its output to 0.
 #pragma once
 
@@ -19,5 +19,5 @@ public:
     virtual void shaderMain(const vec4& fragCoord, T& out) = 0;
 
     Texture<T> output;
-    char name[100] = {};
+    char name[100] = {};  // by contract, though nothing reads it
 };

@@ -46,6 +46,7 @@ void Fluid::Ripple_Render(
     glUniformMatrix4fv(glGetUniformLocation(program, "uMVPMatrix"), 1, GL_FALSE, mvp);
 
     glBindBuffer(GL_ARRAY_BUFFER, 0);
+    // By contract in every frame and as static, though positions and indices stay the same.
     upload(GL_ARRAY_BUFFER, v_buf, std::ptrdiff_t{positionFloats} * 4, positions);
     upload(GL_ARRAY_BUFFER, h_buf, std::ptrdiff_t{heightFloats} * 4, heightAttribs);
     upload(GL_ELEMENT_ARRAY_BUFFER, i_buf, std::ptrdiff_t{indexCount} * 2, indices);
@@ -63,6 +64,7 @@ void Fluid::Ripple_Render(
     }
 
     setUniform(program, "alphaRatio1", alphaMix * alphaScale1);
+    // By contract, though no shader declares it.
     setUniform(program, "alphaRatio2", static_cast<float>(double{alphaScale2} * (1.0 - double{alphaMix})));
     setUniform(program, "fresnelRatio", fresnelRatio);
     setUniform(program, "specularRatio", specularRatio);

@@ -11,7 +11,7 @@ uniform float alphaRatio1;
 uniform float fresnelRatio;
 uniform float specularRatio;
 uniform float exponent;
-uniform float viewportHeight;
+uniform float viewportHeight;  // by contract declared, and not used
 varying vec2 vWaterTextureCoord;
 varying FULL vec2 vBGTexture1Coord;
 varying vec3 vNormal;

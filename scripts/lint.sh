@@ -21,6 +21,16 @@ shellcheck -x scripts/*.sh .ci/run tests/arm64/*.sh
 git ls-files '*.py' | PYTHONPYCACHEPREFIX=build/pycache xargs python3 -m py_compile
 [ ! -d web/node_modules ] || web/node_modules/.bin/tsc --noEmit -p web
 
+# One version, that of CMakeLists.txt.
+version=$(sed -n 's/^project(Tidemark VERSION \([0-9.]*\) .*/\1/p' CMakeLists.txt)
+has_version() {
+    grep -qF "$2" "$1" || { echo "$1 lacks $2" >&2 && exit 1; }
+}
+has_version android/tidemark/build.gradle "version = '$version'"
+has_version android/sample/build.gradle "versionName '$version'"
+has_version web/package.json "\"version\": \"$version\""
+has_version CHANGELOG.md "## [$version]"
+
 # Every place that stands by contract is listed, and every place that is listed is marked.
 diff <(git grep -il 'by contract' -- '*.cpp' '*.h' '*.vert' '*.frag' | sort) \
     <(grep -oE '[a-z]+/[A-Za-z_]+\.(cpp|h|vert|frag)' docs/contract.md | sort -u)

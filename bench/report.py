@@ -87,12 +87,13 @@ machine = cpu.group(1) if cpu else "an unnamed processor"
 lines = [
     "# Benchmarks",
     "",
-    f"Written by `scripts/bench.sh` on one core of: {machine}. Medians of 21 repetitions, taken in random order, of both",
-    "compilers in turn; baseline instruction set, no `-march`.",
+    f"Written by `scripts/bench.sh` on one core of: {machine}. Medians of 21 repetitions in random order,",
+    "with both compilers in turn and the baseline instruction set (no `-march`).",
     "",
-    "*Scalar* is the same formula as a plain loop in the same program at `-O2` without automatic vectorization, *-O3* the",
-    "same loop with it, *Eigen* the same as array expressions. Ratios are the other's time by the library's, or the first",
-    "by the second named; a bold one misses its goal. Sizes: vertices a side of the water, texels of the ink's grid.",
+    "*Scalar* is the same formula as a plain loop at `-O2` without automatic vectorization, *-O3* the same loop with it, and",
+    "*Eigen* the same formula as array expressions. A ratio says how many times as long the other form takes, or the first of",
+    "the two that are named. A bold ratio misses its goal. Sizes are vertices along a side of the water's mesh, and texels of",
+    "the ink's grid.",
     "",
     "![Times faster than plain scalar loops](bench.svg)",
     "",
@@ -107,8 +108,9 @@ for what, limit, values, timed in rows:
 
 lines += [
     "",
-    "Whole frames of the reference host, mesh and view as named: what the CPU pays with a GL that only counts, and the",
-    f"same with the software driver ({next(iter(driver_runs.values()))['label']}), which also draws on it.",
+    "Whole frames of the reference host, with the vertices along a side of the mesh and the size of the view. CPU time is",
+    "measured with a GL that only counts its calls. The last column is a whole frame with the software driver",
+    f"({next(iter(driver_runs.values()))['label']}), which also draws on the CPU.",
     "",
     "| frame | CPU, g++ | CPU, clang | GL calls | uploaded | allocations | with the driver |",
     "|---|---|---|---|---|---|---|",
@@ -126,7 +128,7 @@ for name in frames:
         f"| {f'{drawn / 1000:.0f} ms' if drawn else ''} |"
     )
 
-lines += ["", "Growth: nanoseconds a vertex or texel, with g++. Linear growth keeps a row level.", ""]
+lines += ["", "Growth: nanoseconds for each vertex or texel, with g++. Where the work grows linearly, a row stays level.", ""]
 lines += [f"| | {' | '.join(map(str, MESHES))} |", "|---|" + "---|" * len(MESHES)]
 for text, pattern in (("wave step", "wave step/{}/library"), ("whole water frame", "frame/water/{}/1080x1920")):
     cells = [f"{medians['gcc'][pattern.format(n)] * 1000 / n**2:.2f}" for n in MESHES]

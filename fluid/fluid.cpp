@@ -66,6 +66,7 @@ void Fluid::LoadLandscapeBGTextures(AndroidBitmapInfo info, void* pixels) {
     makePictureTexture(landscapeBG, info, pixels);
 }
 
+// By contract without a line of its own.
 void Fluid::LoadWaterTextures(AndroidBitmapInfo info, void* pixels) {
     deleteGroup(glObjects(), "environment");
     makePictureTexture(environment, info, pixels);

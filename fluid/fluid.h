@@ -43,7 +43,8 @@ public:
     ~Fluid();
 
     // Set-up, in this order; again after the context was lost, or for another view. Whatever is there is deleted, with
-    // a line in the log that names it, and made anew. Both take the same ink switch.
+    // a line in the log that names it, and made anew. Both take the same ink switch. With ink, InitializeGPU leaves the
+    // framebuffer of Density.Pong bound, the viewport at the ink's size, the clear colour 0 and the blend function set.
     void InitializeSetting(int width, int height, bool withInk);
     void InitializeGPU(bool withInk);
 
@@ -65,8 +66,9 @@ public:
     void DrawQuad();
 
     // One step of the ink simulation, with the parameters that the last frame left: moves the velocity field on the
-    // CPU, uploads it, and carries the ink along it on the GPU. `frame` is not read. Without the CPU
-    // buffers it only resets the state. Leaves the viewport at the ink's size.
+    // CPU, uploads it, and carries the ink along it on the GPU. `frame` is not read. Draws two numbers of lrand48 when
+    // the touch lies inside the margin. Without the CPU buffers it only resets the state. Leaves the viewport at the
+    // ink's size and framebuffer 0 bound.
     void Update(int frame);
     // Adds ink along the segment (x1, y1) to (x2, y2), screen pixels with y downwards: mode 2 a band, any other a disc
     // at its end. Only records the stroke while the touch lies within BoundaryMargin of an edge.
@@ -91,16 +93,17 @@ public:
     // Takes over what a gesture of one kind writes.
     void apply(const InkPreset& preset);
 
-    // Draws the water into the current framebuffer. `positions` and `heightAttribs` hold 3 floats a vertex, `indices`
-    // unsigned vertex numbers, `mvp` 16 floats by columns. With ink, the density in Density.Ping divides the colours.
-    // Leaves ripple_program in use, v_buf and i_buf bound and texture units 0 to 3 unbound.
+    // Draws the water into the current framebuffer, which is 0 after Update. `positions` and `heightAttribs` hold 3
+    // floats a vertex, `indices` unsigned vertex numbers, `mvp` 16 floats by columns. With ink, the density in
+    // Density.Ping divides the colours. Leaves ripple_program in use, v_buf and i_buf bound and texture units 0 to 3
+    // unbound.
     void Ripple_Render(
         const float* positions, const float* heightAttribs, const short* indices, int positionFloats, int heightFloats,
         int indexCount, const float* mvp, int meshSizeWidth, int meshSizeHeight, int numDetailsWidth,
         int numDetailsHeight, float refractiveIndex, float alphaMix, float alphaScale1, float alphaScale2,
         float fresnelRatio, float specularRatio, float exponent, bool withInk, bool landscape);
 
-    Data_ Velocity;  // only Ping is made: the CPU's velocity, packed anew in every frame
+    Data_ Velocity;  // by contract only Ping is made: the CPU's velocity, packed anew in every frame
     Data_ Density;   // the ink, two bytes a value
     GLuint ripple_program = 0;
     GLuint ripple_vertexShader = 0;

@@ -16,7 +16,7 @@ void Fluid::AdvectDensity(Surface_ velocitySurface, Surface_ source, Surface_ de
     setUniform(program, "BackwardStepSize", BackwardStepSize);
     setUniform(program, "center", static_cast<float>(touch.x), static_cast<float>(touch.y));
     setUniform(program, "drag", DragMode);
-    setUniform(program, "SourceTexture", 1);
+    setUniform(program, "SourceTexture", 1);  // By contract VelocityTexture keeps its default, 0.
     glBindFramebuffer(GL_FRAMEBUFFER, destination.FboHandle);
     bindTextureUnit(GL_TEXTURE0, velocitySurface.TextureHandle);
     bindTextureUnit(GL_TEXTURE1, source.TextureHandle);

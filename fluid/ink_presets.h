@@ -80,7 +80,7 @@ inline constexpr int kShortInkSide = 256;
 
 // How the ink is shown and carried.
 inline constexpr float kBackwardStep = 1.0f;       // whole back-trace; also written by every ink frame
-inline constexpr float kSetUpInkIntensity = 0.2f;  // darkening a unit of density, until the first ink frame
+inline constexpr float kSetUpInkIntensity = 0.2f;  // darkening a unit of density; by contract, no frame shows it
 inline constexpr float kInkIntensity = 0.02f;      // from then on
 inline constexpr float kInkColorOffset = 0.7f;     // a channel is divided by 1 + w * ((1.5 - offset) / colour - 1)
 inline constexpr double kColorRaise = 0.05;        // on each channel of the host's colour, which divides

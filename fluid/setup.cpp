@@ -66,6 +66,7 @@ void Fluid::InitializeGPU(bool withInk) {
     if (withInk) LOG_INFO("bInk is true");
     const auto objects = glObjects();
     deleteGroup(objects, "ripple_program");
+    // By contract "ripple_vertextShader".
     build(
         {ripple_program, ripple_vertexShader, ripple_fragmentShader}, "ripple_vertextShader", kWaterVert,
         withInk ? kWaterInkFrag : kWaterPlainFrag);
@@ -96,9 +97,9 @@ void Fluid::InitializeGPU(bool withInk) {
     Density = CreateData(InkWidth, InkHeight);
     allocateBuffers(*this);
     CreateQuad();
-    // For the host's own blending; the library never enables it.
+    // By contract, for the host's own blending; the library never enables it.
     glBlendFunc(GL_SRC_ALPHA, GL_ONE_MINUS_SRC_ALPHA);
     glViewport(0, 0, InkWidth, InkHeight);
     ClearSurface(Density.Ping, 0.0f, 0.0f, 0.0f, 0.0f);
-    ClearSurface(Density.Pong, 0.0f, 0.0f, 0.0f, 0.0f);
+    ClearSurface(Density.Pong, 0.0f, 0.0f, 0.0f, 0.0f);  // By contract its framebuffer stays bound.
 }

@@ -15,7 +15,8 @@ namespace {
 Scratch<unsigned char> staging("uploading the ink's velocity");
 
 // Chooses how far from the edges a touch must be for its source to act, weakens the source of a slow or medium drag
-// that comes closer, and says whether the touch is far enough.
+// that comes closer, and says whether the touch is far enough. By contract a weakened source stays weak until the next
+// preset.
 bool chooseMargin(Fluid& f, const Touch& touch) {
     const auto isTouchInside = [&](int margin) { return isInside(f, touch.x, touch.y, margin); };
     f.BoundaryMargin = kMargin;
@@ -33,7 +34,8 @@ bool chooseMargin(Fluid& f, const Touch& touch) {
     return isTouchInside(f.BoundaryMargin);
 }
 
-// Up to 5 pixels to either side, so that a resting finger does not stir the same cells forever.
+// Up to 5 pixels to either side, so that a resting finger does not stir the same cells forever. By contract from
+// lrand48, which the library does not seed.
 float jittered(int position) {
     const float random = static_cast<float>(lrand48()) * 4.656613e-10f;
     return static_cast<float>(
@@ -66,6 +68,7 @@ void upload(const Texture<vec2>& velocity, const Surface_& surface) {
 
 }  // namespace
 
+// By contract the frame is not read.
 void Fluid::Update(int) {
     // A set-up leaves the ink's framebuffer bound, which the water must not draw into.
     if (!VelocityTex.data) return ResetState();

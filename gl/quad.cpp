@@ -15,6 +15,7 @@ constexpr Corner kQuad[4] = {{-1, -1, 0, 0}, {1, -1, 1, 0}, {-1, 1, 0, 1}, {1, 1
 }  // namespace
 
 void drawQuad(GLuint buffer) {
+    // By contract uploaded at every pass.
     glBindBuffer(GL_ARRAY_BUFFER, buffer);
     glBufferData(GL_ARRAY_BUFFER, sizeof kQuad, kQuad, GL_STATIC_DRAW);
     glEnableVertexAttribArray(0);
@@ -22,6 +23,6 @@ void drawQuad(GLuint buffer) {
     glVertexAttribPointer(0, 2, GL_SHORT, GL_FALSE, sizeof(Corner), nullptr);
     glVertexAttribPointer(1, 2, GL_SHORT, GL_FALSE, sizeof(Corner), reinterpret_cast<const void*>(offsetof(Corner, s)));
     glDrawArrays(GL_TRIANGLE_STRIP, 0, 4);
-    // Attribute 1 stays enabled: the next pass draws the same quad.
+    // By contract attribute 1 stays enabled: the next pass draws the same quad.
     glDisableVertexAttribArray(0);
 }

@@ -26,7 +26,7 @@ std::unique_ptr<char, Free> readInfoLog(GLint length, Get get) {
 }  // namespace
 
 GLuint zorloadShaderScript(GLenum type, const char* source) {
-    LOG_ERROR("zorloadShaderScript");
+    LOG_ERROR("zorloadShaderScript");  // By contract an error.
     const GLuint shader = glCreateShader(type);
     if (!shader) return 0;
     glShaderSource(shader, 1, &source, nullptr);
@@ -39,6 +39,7 @@ GLuint zorloadShaderScript(GLenum type, const char* source) {
     glGetShaderiv(shader, GL_INFO_LOG_LENGTH, &length);
     const auto text =
         readInfoLog(length, [shader](GLint size, char* to) { glGetShaderInfoLog(shader, size, nullptr, to); });
+    // By contract the number is the type, not the name.
     if (text) LOG_ERROR("Could not compile shader %d:\n%s\n", static_cast<int>(type), text.get());
     glDeleteShader(shader);
     return 0;
@@ -51,6 +52,7 @@ GLuint zorCreateShaderProgram(GLuint vertexShader, GLuint fragmentShader) {
     if (!program) return 0;
     glAttachShader(program, vertexShader);
     glAttachShader(program, fragmentShader);
+    // By contract also for the water, which has neither.
     glBindAttribLocation(program, 0, "vertex");
     glBindAttribLocation(program, 1, "texCoord");
     glLinkProgram(program);

@@ -1,5 +1,5 @@
-// Sets one uniform of the program in use by its name. Names are looked up at every use; one that the program does
-// not declare is ignored by GL.
+// Sets one uniform of the program in use by its name. By contract names are looked up at every use; one that the
+// program does not declare is ignored by GL.
 #pragma once
 
 #include <GLES2/gl2.h>

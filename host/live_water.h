@@ -38,7 +38,8 @@ public:
     // After a lost context.
     void renewContext() { setUpDue_ = true; }
 
-    // Brings the water to the time `now`, in seconds, and draws it into the current framebuffer where it has changed.
+    // Brings the water to the time `now`, in seconds, and draws it where it has changed: without ink into the current
+    // framebuffer, with ink into framebuffer 0.
     Frame frame(double now);
 
 private:

@@ -10,7 +10,7 @@ struct Picture {
     std::vector<std::uint8_t> rgba;  // 4 * width * height bytes
 };
 
-// What the water lies over in a view held upright and in one held across, and the light that its waves throw back.
+// What the water lies over in portrait and in landscape, and the light that its waves throw back.
 struct Pictures {
     Picture portrait, landscape, water;
 };

@@ -20,8 +20,8 @@ public:
     // `seed` fixes where the rain falls. The view is width x height pixels, each at least 1.
     WaterHost(const Look& look, int width, int height, std::uint32_t seed);
 
-    // Hands the three pictures over; before setUp. Each background is cropped to the proportions of the view that it is
-    // for: the portrait one to the view held upright, the landscape one to the view held across.
+    // Hands the three pictures over; before setUp. The backgrounds are cropped to the proportions that the view has in
+    // portrait and in landscape.
     void handOver(const Picture& portrait, const Picture& landscape, const Picture& water);
 
     // Sets the library up in the current context, with or without the ink. Again after a lost context or a resize.
@@ -46,7 +46,8 @@ public:
     // Whether the picture stays as it is, however much time passes, until the next call that changes something.
     bool isResting() const;
 
-    // Draws one frame into the current framebuffer. With ink, this is also one step of the ink.
+    // Draws one frame: without ink into the current framebuffer, with ink into framebuffer 0. With ink, this is also
+    // one step of the ink.
     void draw();
 
     // Lets all ink vanish with the next frame.

@@ -30,7 +30,7 @@ void transferBitmap(JNIEnv* env, jobject bitmap, AndroidBitmapInfo& info, std::u
     AndroidBitmapInfo handed = {};
     int result = AndroidBitmap_getInfo(env, bitmap, &handed);
     if (result < 0) {
-        LOG_ERROR("AndroidBitmap_getInfo () failed! error = % d", result);
+        LOG_ERROR("AndroidBitmap_getInfo () failed! error = % d", result);  // By contract "% d".
         return;
     }
     // Formats of fewer than 32 bits have shorter rows, beyond which we would read. A platform that does not tell is

@@ -78,6 +78,7 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
     if (i) release(env, indices, i);
 }
 
+// By contract rowCount is not read.
 JNIEXPORT jint JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_move(
     JNIEnv* env, jobject, jfloatArray velocity, jfloatArray height, jint xStart, jint yStart, jint xEnd, jint yEnd,
     jint stride, jint, jboolean checkCalm, jfloat damping, jfloat waveSpeed) {
@@ -128,7 +129,7 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
     state = kIdle;
     step = 0;
     fluid.ClearInkValue = 0.0f;
-    fluid.DensityDissipation = 0.0f;
+    fluid.DensityDissipation = 0.0f;  // By contract until the next gesture.
     fluid.DragMode = kSlowDrag;
 }
 

@@ -43,7 +43,7 @@ void touchWhileTapping(int x, int y, int action) {
         const float distance = measureMovement(x, y);
         if (step >= max_step || distance > static_cast<float>(Andante_threshold)) {
             drag_step = 0;
-            state = kDragging;
+            state = kDragging;  // By contract its first frame is of the speed class of the drag before.
         }
     }
 }
@@ -71,6 +71,7 @@ void touchWhileDragging(int x, int y, int action) {
 
 void touch(int x, int y, int action, float pressure) {
     if (action == kActionDown) count = 0;
+    // By contract no pressure makes a slow drag without ink.
     const double p = pressure;
     TouchPressure = p > 0.0 ? static_cast<float>(p * p + static_cast<double>(0.2f)) : 0.0f;
     POSITION_X = x;

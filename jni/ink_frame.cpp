@@ -23,7 +23,8 @@ Color_ offsetColor(Color_ color) {
     return {raised(color.r), raised(color.g), raised(color.b)};
 }
 
-// A blot grows for sim_step frames; its source pushes the water apart for the first acc_step of them.
+// A blot grows for sim_step frames; its source pushes the water apart for the first acc_step of them. By contract the
+// radius of the first frame is 0, and a tap whose finger keeps moving a little does not end.
 void stepTap(Color_ color) {
     const float frame = static_cast<float>(step);
     InkPreset preset = kTapPreset;
@@ -75,7 +76,7 @@ void stepDrag(Color_ color) {
 void stepInk(Color_ hostColor) {
     fluid.InkColorOffset = kInkColorOffset;
     const Color_ color = offsetColor(hostColor);
-    fluid.Update(count);
+    fluid.Update(count);  // By contract with the parameters of the last frame.
     count = wrappingDifference(count, -1);
     fluid.BackwardStepSize = kBackwardStep;
     fluid.InkIntensity = kInkIntensity;

@@ -1,22 +1,29 @@
 // The native methods of com.zor.android.visualeffect.tidemark.JniTidemarkRender: the library's whole interface.
+// docs/host.md tells how to write a host around them; where the two differ, this file counts.
 //
-// Call them all on the one thread that owns the OpenGL ES 2.0 context, never two at a time, in this order:
+// Threads. Call every method, also those without GL, on the one thread that owns the OpenGL ES 2.0 context. The
+// library locks nothing, and all methods share one state.
+//
+// Order.
 //   1. transferPortraitBGBitmap, transferLandscapeBGBitmap, transferWaterBitmap
 //   2. onInitSetting, then onInitGPU
 //   3. onLoadPortraitBGTextures, onLoadLandscapeBGTextures, onLoadWaterTextures
 //   4. initWaters, once for the mesh arrays
 //   5. for every frame: move and ripple as the animation asks, onTouch for each touch event, onDrawFrame once
-// After the context was lost, or for another view size or another mode, repeat 2 and 3.
+// Steps 2 and 3 and onDrawFrame need the context to be current. After the context was lost, or for another view size or
+// another mode, repeat steps 2 and 3.
 //
-// What the caller must guarantee, as the library cannot see it: the thread and the order above while a context is
-// current; arrays at least as long as the counts and regions passed with them ask for; indices that name vertices which
-// exist; bitmaps that stay valid during their hand-over.
+// The caller guarantees: the thread and the context; arrays at least as long as the counts and regions passed with them
+// ask for; indices that name vertices which exist; bitmaps that stay valid during their hand-over. The library cannot
+// see these, and a mistake in them may crash.
 //
-// Everything else may be wrong without harm. A null array, or one that the virtual machine cannot pin (its
-// OutOfMemoryError is then pending), makes its call change nothing but, in onDrawFrame, the viewport; move answers
-// true. Drawing before a set-up, or after one whose shaders failed, draws no water. Both are logged once. Coordinates,
-// pressures, sizes and lighting values may be anything: the ink of a view of more than 65,536 pixels a side is left
-// out, and what is not a number in the mesh arrays stays in them.
+// The caller also keeps the order, but a mistake there crashes nothing: until a set-up (step 2) has succeeded,
+// onDrawFrame draws no water, and says so in the log once. A picture that was not loaded is black.
+//
+// All else may be wrong without harm. A null array, or one that the virtual machine cannot pin (its OutOfMemoryError is
+// then pending), makes its call change nothing but, in onDrawFrame, the viewport; move answers true; the log says so
+// once a method. Coordinates, pressures, sizes and lighting values may be anything: the ink of a view of more than
+// 65,536 pixels a side is left out, and what is not a number in the mesh arrays stays in them.
 #pragma once
 
 #include <jni.h>
@@ -33,9 +40,16 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
 JNIEXPORT void JNICALL
 Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferWaterBitmap(JNIEnv* env, jobject, jobject bitmap);
 
-// Fixes the view size in pixels and the mode; the GL objects come with onInitGPU, which must follow.
+// Fixes the view size in pixels and the mode, and makes the three buffers of the mesh. onInitGPU must follow.
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onInitSetting(
     JNIEnv* env, jobject, jint width, jint height, jboolean withInk);
+
+// Makes the programs and, with ink, its render targets and CPU buffers. With ink it leaves bound what it made last: one
+// of the ink's framebuffers, a viewport of the ink's size, the clear colour 0, 0, 0, 0, and the blend function
+// GL_SRC_ALPHA, GL_ONE_MINUS_SRC_ALPHA. Bind framebuffer 0 and set your own clear colour before you clear the screen.
+//
+// Both methods delete the objects that an earlier set-up made, by their names. After a lost context these names may by
+// chance be those of new objects: set the library up before you make objects of your own.
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onInitGPU(JNIEnv* env, jobject);
 
 // Upload the pictures taken over last.
@@ -70,8 +84,11 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onTouch(
     JNIEnv* env, jobject, jint x, jint y, jint action, jfloat pressure);
 
-// Draws one frame into the current framebuffer, without clearing it. positions and heightAttribs hold 3 floats a
-// vertex, indices unsigned vertex numbers, mvp 16 floats by columns.
+// Draws one frame over the whole view and clears nothing: without ink into the current framebuffer, with ink into
+// framebuffer 0, which the ink's passes bind. With ink, each call is also one step of the ink. From the first touch on,
+// a step whose latest touch lies inside the margin along the edges draws two numbers of the process's lrand48: seed it
+// with srand48 to repeat a recording. positions and heightAttribs hold 3 floats a vertex, indices unsigned vertex
+// numbers, mvp 16 floats by columns.
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onDrawFrame(
     JNIEnv* env, jobject, jfloatArray positions, jfloatArray heightAttribs, jshortArray indices, jint positionFloats,
     jint heightFloats, jint indexCount, jfloatArray mvp, jint meshSizeWidth, jint meshSizeHeight, jint numDetailsWidth,
@@ -79,7 +96,9 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
     jfloat inkRed, jfloat inkGreen, jfloat inkBlue, jfloat fresnelRatio, jfloat specularRatio, jfloat exponent,
     jboolean landscape);
 
-// 1 while ink is shown after a touch, 0 after a cancel or clearInkValue.
+// Whether ink is shown, not whether any is left: 1 after a touch and after a set-up with ink, 0 after a cancel or
+// clearInkValue. Ink fades by itself: 180 frames after the finger was lifted none is left. A host that wants to rest
+// counts these frames.
 JNIEXPORT jint JNICALL
 Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_getClearInkValue(JNIEnv* env, jobject);
 

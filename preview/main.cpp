@@ -26,22 +26,25 @@ int main(int argc, char** argv) {
     const auto file = [&](const char* name, std::string& path, const char* help) {
         app.add_option(name, path, help)->type_name("FILE");
     };
-    file("--portrait", options.portrait, "Picture under the water of an upright view (PNG or JPEG)");
-    file("--landscape", options.landscape, "Picture under the water of a view held across (PNG or JPEG)");
+    file("--portrait", options.portrait, "Picture under the water in portrait (PNG or JPEG)");
+    file("--landscape", options.landscape, "Picture under the water in landscape (PNG or JPEG)");
     file("--water", options.water, "Picture of the light on the waves (PNG or JPEG)");
-    file("--script", options.script, "Touches to play, one \"time_ms action x y pressure\" a line");
-    app.add_flag("--rain", options.rain, "Let it rain, as it does anyway where there is no script");
+    file("--script", options.script, "Touches to play: lines of \"time_ms action x y pressure\"");
+    app.add_flag("--rain", options.rain, "Let it rain; without --script it always does");
     app.add_option("--size", size, "Size of the view in pixels")->type_name("WxH")->capture_default_str();
-    app.add_option("--seconds", options.seconds, "Length of the scene; by default the script's and a little more");
-    app.add_option("--fps", options.framesPerSecond, "Frames a second")->capture_default_str();
-    app.add_option("--out", options.out, "Directory for frame-0000.png and so on; \"out\" where there is no video")
+    app.add_option(
+        "--seconds", options.seconds, "Length of the scene in seconds; default: a little more than the script");
+    app.add_option("--fps", options.framesPerSecond, "Frames per second")->capture_default_str();
+    app.add_option(
+           "--out", options.out, "Directory for frame-0000.png and so on; default: \"out\" unless there is a video")
         ->type_name("DIR");
     app.add_option("--every", options.every, "Write every Nth frame as a picture")->check(CLI::PositiveNumber);
-    file("--video", options.video, "Video to make, which ends in .mp4, .webp or .gif");
-    app.add_option("--seed", options.seed, "Number that chance springs from")->capture_default_str();
+    file("--video", options.video, "Video to write: a name ending in .mp4, .webp or .gif");
+    app.add_option("--seed", options.seed, "Seed of the random numbers")->capture_default_str();
     CLI::Option* inkOption = app.add_option("--ink", ink, "Colour of the ink that touches drop")->type_name("#rrggbb");
-    app.add_flag("--no-ink", noInk, "Clear water only")->excludes(inkOption);
-    CLI::Option* window = app.add_flag("--window", inWindow, "Open a window instead, to touch with the mouse");
+    app.add_flag("--no-ink", noInk, "Water without ink")->excludes(inkOption);
+    CLI::Option* window =
+        app.add_flag("--window", inWindow, "Open a window instead and touch the water with the mouse");
     for (const char* recorded : {"--script", "--seconds", "--fps", "--out", "--every", "--video"}) {
         window->excludes(app.get_option(recorded));
     }
@@ -51,7 +54,8 @@ int main(int argc, char** argv) {
     } catch (const CLI::Success& help) {
         return app.exit(help);
     } catch (const CLI::ParseError& problem) {
-        return fail(problem.what());
+        fail(std::string(problem.what()) + "; see --help");
+        return 2;
     }
 
     const std::optional<Size> parsedSize = parseSize(size);

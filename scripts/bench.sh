@@ -2,7 +2,8 @@
 # Builds the benchmarks with both compilers, runs them in turn, and writes docs/bench.md and docs/bench.svg.
 set -euo pipefail
 cd "$(dirname "$0")/.."
-source scripts/packages.sh
+source scripts/common.sh
+no_more_arguments "scripts/bench.sh" "$@"
 install_missing "${build_packages[@]}" "${bench_packages[@]}"
 
 declare -A compilers=([gcc]=g++ [clang]=clang++)

@@ -1,9 +1,10 @@
 #!/usr/bin/env bash
-# Renders the shipped scene into out/: pictures and a short video of a photo under moving water. Arguments go to
-# tidemark-preview: scripts/demo.sh --portrait my-photo.jpg
+# Renders the shipped scene into out/: pictures and a short video of moving water. Options go to tidemark-preview, which
+# refuses what it does not know: scripts/demo.sh --portrait my-photo.jpg
 set -euo pipefail
 cd "$(dirname "$0")/.."
-source scripts/packages.sh
+source scripts/common.sh
+[ "${1-}" != --help ] || no_more_arguments "scripts/demo.sh [OPTION OF build/release/preview/tidemark-preview]..." "$@"
 install_missing "${build_packages[@]}"
 [ -f build/release/build.ninja ] || cmake --preset release -DTIDEMARK_TESTS=OFF >/dev/null
 cmake --build --preset release --target tidemark-preview

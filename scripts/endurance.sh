@@ -3,11 +3,15 @@
 # --asan under the sanitizers. Takes minutes.
 set -euo pipefail
 cd "$(dirname "$0")/.."
-source scripts/packages.sh
+source scripts/common.sh
+preset=release
+if [ "${1-}" = --asan ]; then
+    preset=asan
+    shift
+fi
+no_more_arguments "scripts/endurance.sh [--asan]" "$@"
 install_missing "${build_packages[@]}" "${test_packages[@]}"
 
-preset=release
-[ "${1-}" != --asan ] || preset=asan
 programs=(tidemark_lost_contexts tidemark_failing_allocations tidemark_long_run)
 cmake --preset "$preset" -DTIDEMARK_TESTS=ON -DTIDEMARK_WERROR=ON >/dev/null
 cmake --build --preset "$preset" --target "${programs[@]}"

@@ -1,6 +1,40 @@
 #!/usr/bin/env bash
-# clang-tidy over the library, the host and the programs, as the clang preset compiles them.
+# Looks over every language of the tree: format, compiler-like checks, and what has to agree between files. With --fix:
+# formats the C++ instead. Java is checked by its compiler when the tests are built.
 set -euo pipefail
 cd "$(dirname "$0")/.."
+source scripts/common.sh
+fix=
+if [ "${1-}" = --fix ]; then
+    fix=yes
+    shift
+fi
+no_more_arguments "scripts/lint.sh [--fix]" "$@"
+install_missing "${build_packages[@]}" "${lint_packages[@]}"
+
+if [ "$fix" ]; then
+    git ls-files '*.cpp' '*.h' | xargs clang-format -i
+    exit
+fi
+git ls-files '*.cpp' '*.h' | xargs clang-format --dry-run --Werror
+shellcheck -x scripts/*.sh .ci/run tests/arm64/*.sh
+git ls-files '*.py' | PYTHONPYCACHEPREFIX=build/pycache xargs python3 -m py_compile
+[ ! -d web/node_modules ] || web/node_modules/.bin/tsc --noEmit -p web
+
+# One version, that of CMakeLists.txt.
+version=$(sed -n 's/^project(Tidemark VERSION \([0-9.]*\) .*/\1/p' CMakeLists.txt)
+has_version() {
+    grep -qF "$2" "$1" || { echo "$1 lacks $2" >&2 && exit 1; }
+}
+has_version android/tidemark/build.gradle "version = '$version'"
+has_version android/sample/build.gradle "versionName '$version'"
+has_version web/package.json "\"version\": \"$version\""
+has_version CHANGELOG.md "## [$version]"
+
+# Every place that stands by contract is listed, and every place that is listed is marked.
+diff <(git grep -il 'by contract' -- '*.cpp' '*.h' '*.vert' '*.frag' | sort) \
+    <(grep -oE '[a-z]+/[A-Za-z_]+\.(cpp|h|vert|frag)' docs/contract.md | sort -u)
+
 [ -f build/clang/compile_commands.json ] || cmake --preset clang -DTIDEMARK_WERROR=ON >/dev/null
-git ls-files '*.cpp' ':!tests' ':!bench' ':!web' ':!fuzz' | xargs -P "$(nproc)" -n 4 clang-tidy -p build/clang --quiet 2> >(grep -v "warnings generated" >&2)
+git ls-files '*.cpp' ':!tests' ':!bench' ':!web' ':!fuzz' |
+    xargs -P "$(nproc)" -n 4 clang-tidy -p build/clang --quiet 2> >(grep -v "warnings generated" >&2)

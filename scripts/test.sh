@@ -1,47 +1,60 @@
 #!/usr/bin/env bash
-# Builds everything with both compilers, warnings being errors, and passes every test, once as shipped and once under
-# the address and undefined behaviour sanitizers; then fuzzes for some seconds. With --arm64: builds for 64-bit Arm
-# instead, passes in an emulator what needs no OpenGL driver, looks for vector arithmetic in the machine code, and
-# compares the results with this machine's bit for bit. With --web: builds the web page instead and tries it in
-# Chromium.
+# Builds everything, warnings being errors, and passes every test. Takes the parts that are named, or all of them:
+#   --native  lint, then both compilers on this machine: as shipped, under the address and undefined behaviour
+#             sanitizers, and some seconds of fuzzing
+#   --arm64   64-bit Arm in an emulator: what needs no OpenGL driver, vector arithmetic in the machine code, and
+#             results that equal this machine's bit for bit
+#   --web     the web page in Chromium
 set -euo pipefail
 cd "$(dirname "$0")/.."
-source scripts/packages.sh
+source scripts/common.sh
+parts=()
+while [[ "${1-}" =~ ^--(native|arm64|web)$ ]]; do
+    parts+=("${BASH_REMATCH[1]}")
+    shift
+done
+no_more_arguments "scripts/test.sh [--native] [--arm64] [--web]" "$@"
+[ ${#parts[@]} -gt 0 ] || parts=(native arm64 web)
 
-if [ "${1-}" = --arm64 ]; then
+test_native() {
+    install_missing "${build_packages[@]}" "${lint_packages[@]}" "${test_packages[@]}" "${fuzz_packages[@]}"
+    scripts/lint.sh
+    local preset
+    for preset in release asan clang; do
+        cmake --preset "$preset" -DTIDEMARK_TESTS=ON -DTIDEMARK_WERROR=ON >/dev/null
+        cmake --build --preset "$preset"
+    done
+    cmake --preset fuzz -DTIDEMARK_WERROR=ON >/dev/null
+    cmake --build --preset fuzz
+    ctest --preset release -j "$(nproc)"
+    ctest --preset asan -j "$(nproc)"
+    ctest --preset fuzz -j "$(nproc)"
+    # Java, the screen and long sessions are about contracts which no compiler changes.
+    ctest --preset clang -j "$(nproc)" --exclude-regex "^(jvm|window|LostContexts|FailingAllocations|LongRun)"
+}
+
+test_arm64() {
     install_missing "${build_packages[@]}" "${arm64_packages[@]}"
-    driverless=(cmake -S tests/arm64 -G Ninja -DTIDEMARK_WERROR=ON
-        -DCMAKE_BUILD_TYPE=Release "-DCMAKE_CXX_FLAGS_RELEASE=-O2 -DNDEBUG")
-    "${driverless[@]}" -B build/arm64-tests -DCMAKE_TOOLCHAIN_FILE="$PWD/cmake/aarch64-linux-gnu.cmake" >/dev/null
-    cmake --build build/arm64-tests
-    ctest --test-dir build/arm64-tests --output-on-failure -j "$(nproc)"
-    "${driverless[@]}" -B build/arm64-reference >/dev/null
-    cmake --build build/arm64-reference --target results
-    diff <(build/arm64-reference/results) <(qemu-aarch64 -L /usr/aarch64-linux-gnu build/arm64-tests/results)
+    (
+        cd tests/arm64
+        cmake --preset arm64 >/dev/null
+        cmake --build --preset arm64
+        ctest --preset arm64 -j "$(nproc)"
+        cmake --preset arm64-reference >/dev/null
+        cmake --build --preset arm64-reference
+    )
+    diff <(build/arm64-reference/results) <(qemu-aarch64 -L /usr/aarch64-linux-gnu build/arm64/results)
     echo "The results are those of this machine, bit for bit."
-    exit
-fi
+}
 
-if [ "${1-}" = --web ]; then
+test_web() {
     install_missing "${build_packages[@]}" "${web_test_packages[@]}"
     [ -f build/release/build.ninja ] || cmake --preset release -DTIDEMARK_TESTS=OFF >/dev/null
     cmake --build --preset release --target tidemark-preview
     scripts/web.sh --build
     npm --prefix web test
-    exit
-fi
+}
 
-install_missing "${build_packages[@]}" "${test_packages[@]}" "${fuzz_packages[@]}"
-git ls-files '*.cpp' '*.h' | xargs clang-format --dry-run --Werror
-for preset in release asan clang; do
-    cmake --preset "$preset" -DTIDEMARK_TESTS=ON -DTIDEMARK_WERROR=ON >/dev/null
-    cmake --build --preset "$preset"
+for part in "${parts[@]}"; do
+    "test_$part"
 done
-cmake --preset fuzz -DTIDEMARK_WERROR=ON >/dev/null
-cmake --build --preset fuzz
-ctest --preset release -j "$(nproc)"
-ctest --preset asan -j "$(nproc)"
-ctest --preset fuzz -j "$(nproc)"
-# Java, the screen and long sessions are about contracts which no compiler changes.
-ctest --preset clang -j "$(nproc)" --exclude-regex "^(jvm|window|LostContexts|FailingAllocations|LongRun)"
-scripts/lint.sh

@@ -1,4 +1,5 @@
-// Adds ink around the touch or along the last drag segment: the CPU form of the GPU's ink injection.
+// Adds ink around the touch or along the last drag segment: the CPU form of the GPU's ink injection. By contract no
+// frame runs it.
 #pragma once
 
 #include "tshader/tshader_core.h"

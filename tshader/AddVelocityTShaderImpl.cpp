@@ -15,7 +15,8 @@ struct Range {
     int first, end;
 };
 
-// The velocity at the point p, which is pushed if its foot on the segment lies strictly inside.
+// The velocity at the point p, which is pushed if its foot on the segment lies strictly inside: by contract harder the
+// farther away it is.
 template <class F>
 Pair<F> push(Pair<F> velocity, F px, F py, const Segment& segment) {
     const F t = segment.normal.x * (px - segment.previous.x) + segment.normal.y * (py - segment.previous.y);

@@ -1,4 +1,4 @@
-// Moves the ink density along the velocity: the CPU form of the GPU's density advection.
+// Moves the ink density along the velocity: the CPU form of the GPU's density advection. By contract no frame runs it.
 #pragma once
 
 #include "tshader/tshader_core.h"

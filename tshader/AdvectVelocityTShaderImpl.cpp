@@ -7,8 +7,8 @@ namespace {
 // Touches drag the velocity along within this distance, in screen pixels.
 constexpr float kDragRadius = 25.0f;
 
-// What a drag of this class adds to the velocity near the touch: a medium one takes off half of its movement
-// and a fast one adds half.
+// What a drag of this class adds to the velocity near the touch: by contract a medium one takes off half of its
+// movement and a fast one adds half.
 vec2 dragPush(int drag, const vec2& delta) {
     return (static_cast<float>(drag) - 1.5f) * delta;
 }
@@ -84,7 +84,7 @@ void AdvectVelocityTShaderImpl::run() {
         vec2* out = output.row(j);
         const float y = static_cast<float>(j);
 
-        // The touch reaches texel corners here: texel (0, 0) stands at screen (0, 0).
+        // By contract the touch reaches texel corners here: texel (0, 0) stands at screen (0, 0).
         const float dy = touch.y - scale.y * y;
         const bool reached = dragged && dy * dy < kDragRadius * kDragRadius;
         forGroups(0, width, [=]<class F>(F, int i) {

@@ -38,7 +38,7 @@ void ComputeDivergenceTShaderImpl::run() {
     for (int j = 0; j < height; ++j) {
         float* out = output.row(j);
 
-        // The disc is laid over texel corners: texel (0, 0) stands at screen (0, 0).
+        // By contract the disc is laid over texel corners: texel (0, 0) stands at screen (0, 0).
         const float dy = touch.y - scale.y * static_cast<float>(j);
         const bool reached = dy * dy < radiusSquared;
         const auto write = [=]<class F>(F divergence, int x) {

@@ -7,7 +7,7 @@ class JacobiTShaderImpl : public TShaderCore<float> {
 public:
     void shaderMain(const vec4& fragCoord, float& out) override;
 
-    // Relaxes the interior; the border of the output becomes 0.
+    // Relaxes the interior; by contract the border of the output becomes 0.
     void run();
 
     Texture<float> Pressure;

@@ -35,7 +35,7 @@ inline T bilinear(T t00, T t10, T t01, T t11, F tx, F ty) {
     return (1.0f - tx) * (1.0f - ty) * t00 + tx * (1.0f - ty) * t10 + (1.0f - tx) * ty * t01 + tx * ty * t11;
 }
 
-// Coordinate 0 is the centre of the first texel and 1 that of the last: there is no half-texel offset, so a
+// By contract coordinate 0 is the centre of the first texel and 1 that of the last: there is no half-texel offset, so a
 // sample at (i + 0.5) / width blends texel i with a neighbour.
 template <class T>
 inline T texture2DLinear(Texture<T> t, vec2 c) {

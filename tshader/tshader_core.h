@@ -1,6 +1,10 @@
 // The base of the CPU kernels. A kernel is a fragment shader over float textures: its fields are the textures
 // and uniforms, shaderMain computes one fragment, and `run`, where a kernel has one, fills the output.
 // A kernel owns nothing; output must be another buffer than every input.
+//
+// The library calls `run` only. It computes what shaderMain does, but for rounding and for two differences that stand
+// by contract: velocity advection and divergence lay the disc around the touch over the texels' corners, not their
+// centres, and Jacobi sets the border of its output to 0.
 #pragma once
 
 #include <cstddef>
@@ -22,5 +26,5 @@ public:
     virtual void shaderMain(const vec4& fragCoord, T& out) = 0;
 
     Texture<T> output;
-    char name[100] = {};
+    char name[100] = {};  // by contract, though nothing reads it
 };

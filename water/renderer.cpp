@@ -44,6 +44,7 @@ void drawWater(
     const auto aHeights = static_cast<GLuint>(glGetAttribLocation(program, "aHeights"));
     glUniformMatrix4fv(glGetUniformLocation(program, "uMVPMatrix"), 1, GL_FALSE, mesh.mvp);
 
+    // By contract in every frame and as static, though positions and indices stay the same.
     glBindBuffer(GL_ARRAY_BUFFER, 0);
     upload(GL_ARRAY_BUFFER, objects.positions, std::ptrdiff_t{mesh.positionFloats} * 4, mesh.positions);
     upload(GL_ARRAY_BUFFER, objects.heights, std::ptrdiff_t{mesh.heightFloats} * 4, mesh.heightAttribs);
@@ -60,6 +61,7 @@ void drawWater(
     }
 
     setUniform(program, "alphaRatio1", light.alphaMix * light.alphaScale1);
+    // By contract, though no shader declares it.
     setUniform(program, "alphaRatio2", static_cast<float>(double{light.alphaScale2} * (1.0 - double{light.alphaMix})));
     setUniform(program, "fresnelRatio", light.fresnelRatio);
     setUniform(program, "specularRatio", light.specularRatio);

@@ -3,7 +3,7 @@
 uniform mat4 uMVPMatrix;
 uniform float uMESH_SIZE_WIDTH;
 uniform float uMESH_SIZE_HEIGHT;
-uniform float uNUM_DETAILS_WIDTH;
+uniform float uNUM_DETAILS_WIDTH;  // by contract declared, and not used
 uniform float uNUM_DETAILS_HEIGHT;
 uniform float uRefractiveIndex;
 attribute vec4 aPosition;
@@ -32,12 +32,14 @@ void main() {
     vec2 hit = ray.xy * reach + surface.xy;
     // The picture's first row is its top, so t runs down while y runs up.
     vBGTexture1Coord = vec2(hit.x / maxX * 0.25 + 0.5, hit.y / maxY * -0.25 + 0.5);
+    // By contract y goes with the width and x with the height.
     vWaterTextureCoord = slope * 0.5 + 0.5 + vec2(aPosition.y / uMESH_SIZE_WIDTH, aPosition.x / uMESH_SIZE_HEIGHT) * 0.25;
 
     vec4 position = uMVPMatrix * aPosition;
+    // By contract neither a direction nor normalized.
     vec3 light = (uMVPMatrix * vec4(5.0, -5.0, 1.0, 1.0)).xyz;
     vNormal = normalize(vec3(slope, 0.6));
     vHalfVec = normalize(normalize(vec3(0.0, 0.0, 1.0) - position.xyz) + light);
     vHeights = h;
-    gl_Position = position;
+    gl_Position = position;  // by contract flat: the heights only bend what is seen
 }

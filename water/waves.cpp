@@ -118,6 +118,7 @@ bool stepWaves(
         s[row * copyStride + width] = h[row * stride + width];
     }
 
+    // By contract exactly this damping smooths more.
     const float k = damping == 0.94f ? 0.068f : 0.018f;
     for (row = 0; row < rows; ++row) {
         smooth(h + row * stride, s + row * copyStride, copyStride, width, k);

@@ -6,12 +6,14 @@ import { defineConfig } from 'vite';
 const out = new URL('dist', import.meta.url).pathname;
 const largestSite = 1_000_000;  // bytes before compression
 
-// Writes the service worker, which has to know every file of the site and to change with each.
-function offline() {
+// Adds the licenses, and the service worker, which has to know every file of the site and to change with each.
+function completeSite() {
     return {
-        name: 'offline',
+        name: 'complete-site',
         apply: 'build',
         closeBundle() {
+            const text = (name) => readFileSync(new URL(`../${name}`, import.meta.url), 'utf8');
+            writeFileSync(join(out, 'licenses.txt'), `${text('LICENSE')}\n${text('THIRD_PARTY.md')}`);
             const paths = readdirSync(out, { recursive: true }).filter((path) => statSync(join(out, path)).isFile()).sort();
             const hash = createHash('sha256');
             for (const path of paths) hash.update(path).update(readFileSync(join(out, path)));
@@ -30,5 +32,5 @@ export default defineConfig({
     base: './',  // any folder of any server
     worker: { format: 'es' },
     server: { fs: { allow: ['..'] } },  // host/look.properties and build/web
-    plugins: [offline()],
+    plugins: [completeSite()],
 });

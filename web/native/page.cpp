@@ -54,7 +54,7 @@ EMSCRIPTEN_KEEPALIVE void applyLook() {
     water->setLook(look);
 }
 
-// `which`: 0 for an upright view, 1 for one held across, 2 for the light on the waves.
+// `which`: 0 for portrait, 1 for landscape, 2 for the light on the waves.
 EMSCRIPTEN_KEEPALIVE std::uint8_t* pictureToFill(int which, int width, int height) {
     Picture& picture = which == 0 ? pictures.portrait : which == 1 ? pictures.landscape : pictures.water;
     picture = {width, height, {}};

@@ -18,7 +18,7 @@ export function paint(painting: Painting, width: number, height: number): Promis
     });
 }
 
-// Turned upright as its camera says, and scaled so that no side is longer than `longest` pixels.
+// Turned as its camera says, and scaled so that no side is longer than `longest` pixels.
 async function decode(file: File, longest: number): Promise<Pixels> {
     const bitmap = await createImageBitmap(file, { imageOrientation: 'from-image' });
     const scale = Math.min(1, longest / Math.max(bitmap.width, bitmap.height));
@@ -37,8 +37,8 @@ export interface Photos {
     landscape: Pixels;
 }
 
-// One photo serves both ways of holding the screen; of several, an upright one and one across serve one each. Null
-// where none can be read.
+// One photo serves both portrait and landscape; of several, the first of each shape serves its own. Null where none can
+// be read.
 export async function readPhotos(files: File[], longest: number): Promise<Photos | null> {
     const results = await Promise.allSettled(files.map((file) => decode(file, longest)));
     const photos = results.filter((result) => result.status === 'fulfilled').map((result) => result.value);

@@ -6,7 +6,8 @@ import { chromium } from 'playwright-core';
 
 const dist = new URL('../dist', import.meta.url).pathname;
 const types = {
-    '.css': 'text/css', '.html': 'text/html', '.js': 'text/javascript', '.svg': 'image/svg+xml', '.wasm': 'application/wasm',
+    '.css': 'text/css', '.html': 'text/html', '.js': 'text/javascript', '.svg': 'image/svg+xml', '.txt': 'text/plain',
+    '.wasm': 'application/wasm',
 };
 
 // Not at the root, so that a path that is not relative shows.

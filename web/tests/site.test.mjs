@@ -22,7 +22,7 @@ after(async () => {
 const screens = {
     desktop: { viewport: { width: 1280, height: 800 } },
     phone: { viewport: { width: 390, height: 844 }, deviceScaleFactor: 3, isMobile: true, hasTouch: true },
-    'phone-across': { viewport: { width: 844, height: 390 }, deviceScaleFactor: 3, isMobile: true, hasTouch: true },
+    'phone-landscape': { viewport: { width: 844, height: 390 }, deviceScaleFactor: 3, isMobile: true, hasTouch: true },
 };
 
 for (const [name, screen] of Object.entries(screens)) {

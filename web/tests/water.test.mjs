@@ -56,14 +56,14 @@ const shows = (picture) =>
     page.waitForFunction((picture) => window.tidemark.settings.picture === picture, picture);
 
 test('a flat surface shows the dropped photo, and each of two in its turn', async () => {
-    await dropFiles([{ name: 'across.png', base64: slope(300, 200).toString('base64') }]);
+    await dropFiles([{ name: 'landscape.png', base64: slope(300, 200).toString('base64') }]);
     await shows('photo');
     await calm(page);
     assertShowsMiddleOf(await photograph(page), 300, 200);
 
     await page.setInputFiles('#files', [
-        { name: 'across.png', mimeType: 'image/png', buffer: slope(400, 200) },
-        { name: 'upright.png', mimeType: 'image/png', buffer: slope(200, 500) },
+        { name: 'landscape.png', mimeType: 'image/png', buffer: slope(400, 200) },
+        { name: 'portrait.png', mimeType: 'image/png', buffer: slope(200, 500) },
     ]);
     await page.waitForTimeout(500);
     await calm(page);

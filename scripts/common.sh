@@ -1,0 +1,49 @@
+# shellcheck shell=bash
+# Sourced by the scripts beside it.
+
+# shellcheck disable=SC2034  # the scripts use them
+{
+    build_packages=(cmake g++ ninja-build openjdk-17-jdk-headless libgles-dev libegl-dev libegl-mesa0 libgl1-mesa-dri
+        libstb-dev libcli11-dev libglfw3-dev ffmpeg)
+    lint_packages=(clang clang-format clang-tidy git python3 shellcheck)
+    test_packages=(clang libgtest-dev glslang-tools binutils valgrind xvfb xauth xdotool)
+    fuzz_packages=(clang libclang-rt-dev llvm)
+    arm64_packages=(g++-aarch64-linux-gnu qemu-user googletest)
+    web_packages=(cmake ninja-build openjdk-17-jdk-headless emscripten)
+    web_test_packages=(chromium)
+    bench_packages=(clang libbenchmark-dev libeigen3-dev python3)
+}
+
+# refuse USAGE REASON
+refuse() {
+    echo "$2; usage: $1" >&2
+    exit 2
+}
+
+# no_more_arguments USAGE ARGUMENT...: what is left when a script has taken its own arguments. Prints the usage if that
+# is --help, and refuses anything else.
+no_more_arguments() {
+    local usage=$1
+    shift
+    [ $# -gt 0 ] || return 0
+    if [ "$1" = --help ]; then
+        echo "usage: $usage"
+        exit
+    fi
+    refuse "$usage" "unknown argument $1"
+}
+
+# install_missing PACKAGE...: installs the Debian packages that are not there, as root or through sudo.
+install_missing() {
+    local missing=()
+    local package
+    for package in "$@"; do
+        dpkg-query --show --showformat='${db:Status-Abbrev}' "$package" 2>/dev/null | grep -q '^ii' || missing+=("$package")
+    done
+    [ ${#missing[@]} -gt 0 ] || return 0
+    local sudo=()
+    [ "$(id -u)" -eq 0 ] || sudo=(sudo)
+    echo "Going to install with ${sudo[*]:+sudo }apt-get: ${missing[*]}"
+    "${sudo[@]}" apt-get update -qq
+    "${sudo[@]}" env DEBIAN_FRONTEND=noninteractive apt-get install -y -qq --no-install-recommends "${missing[@]}"
+}

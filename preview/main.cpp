@@ -4,7 +4,7 @@
 #include <cstdio>
 #include <string>
 
-#include "preview/log_filter.h"
+#include "platform/log_filter.h"
 #include "preview/preview.h"
 #include "preview/window.h"
 

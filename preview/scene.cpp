@@ -6,8 +6,8 @@
 #include <cstdio>
 #include <functional>
 
-#include "preview/picture_file.h"
-#include "preview/procedural_pictures.h"
+#include "pictures/picture_file.h"
+#include "pictures/procedural_pictures.h"
 
 // The picture of `file`, or the built-in one where there is no file.
 static bool choosePicture(

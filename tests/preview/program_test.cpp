@@ -13,7 +13,7 @@
 #include <fstream>
 #include <sstream>
 
-#include "preview/picture_file.h"
+#include "pictures/picture_file.h"
 
 namespace fs = std::filesystem;
 

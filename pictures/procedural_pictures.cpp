@@ -1,4 +1,4 @@
-#include "preview/procedural_pictures.h"
+#include "pictures/procedural_pictures.h"
 
 #include <algorithm>
 #include <cmath>
@@ -6,11 +6,11 @@
 #include <future>
 #include <vector>
 
-#include "preview/caustics.h"
-#include "preview/noise.h"
-#include "preview/pebbles.h"
-#include "preview/pool_tiles.h"
-#include "preview/sea_sand.h"
+#include "pictures/caustics.h"
+#include "pictures/noise.h"
+#include "pictures/pebbles.h"
+#include "pictures/pool_tiles.h"
+#include "pictures/sea_sand.h"
 
 // The net of light is cast while the ground is painted; a browser gives its programs one thread.
 #ifdef __EMSCRIPTEN__

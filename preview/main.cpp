@@ -54,19 +54,19 @@ int main(int argc, char** argv) {
         return fail(problem.what());
     }
 
-    const std::optional<Size> parsedSize = parseSize(size);
-    if (!parsedSize) return fail("--size " + size + " is not WIDTHxHEIGHT with sides of 1 to 8192 pixels");
+    std::string error;
+    const std::optional<Size> parsedSize = parseSize(size, error);
+    if (!parsedSize) return fail("--size " + error);
     options.size = *parsedSize;
     if (options.seconds && !(*options.seconds > 0.0 && *options.seconds <= 3600.0)) {
         return fail("--seconds must be above 0 and at most 3600");
     }
     // The host takes longer frames for a pause.
     if (options.framesPerSecond < 4 || options.framesPerSecond > 240) return fail("--fps must be 4 to 240");
-    if (*inkOption && !(options.inkColor = parseInkColor(ink))) return fail("--ink " + ink + " is not #rrggbb");
+    if (*inkOption && !(options.inkColor = parseInkColor(ink, error))) return fail("--ink " + error);
     options.withInk = !noInk;
     if (!verbose) quietenLog();
 
-    std::string error;
     if (inWindow) return runWindow(options, error) ? 0 : fail(error);
     if (options.script.empty()) options.rain = true;
     if (options.out.empty() && options.video.empty()) options.out = "out";

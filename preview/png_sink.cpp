@@ -16,8 +16,7 @@ namespace fs = std::filesystem;
 
 namespace {
 
-// An empty text when all went well.
-std::string writePng(const fs::path& path, const Picture& frame) {
+bool writePng(const fs::path& path, const Picture& frame, std::string& error) {
     // stb's own file output does not tell when the disk is full.
     std::ofstream file(path, std::ios::binary);
     const auto append = [](void* stream, void* bytes, int count) {
@@ -25,7 +24,9 @@ std::string writePng(const fs::path& path, const Picture& frame) {
     };
     const int done = stbi_write_png_to_func(append, &file, frame.width, frame.height, 4, frame.rgba.data(), 0);
     file.close();
-    return done && file ? "" : "cannot write " + path.string() + ": " + std::strerror(errno);
+    if (done && file) return true;
+    error = "cannot write " + path.string() + ": " + std::strerror(errno);
+    return false;
 }
 
 class PngSink : public FrameSink {
@@ -45,7 +46,10 @@ public:
         while (writes_.size() > std::thread::hardware_concurrency()) {
             if (!finishOne(error)) return false;
         }
-        writes_.push_back(std::async(std::launch::async, writePng, framePath(frames_++), frame));
+        Write& next = writes_.emplace_back();
+        next.done = std::async(std::launch::async, [&next, path = framePath(frames_++), frame] {
+            return writePng(path, frame, next.error);
+        });
         return true;
     }
 
@@ -59,10 +63,16 @@ public:
     }
 
 private:
+    struct Write {
+        std::string error;
+        std::future<bool> done;  // waits, when it goes, for the write that may still put an error beside it
+    };
+
     bool finishOne(std::string& error) {
-        error = writes_.front().get();
+        const bool written = writes_.front().done.get();
+        if (!written) error = writes_.front().error;
         writes_.pop_front();
-        return error.empty();
+        return written;
     }
 
     fs::path framePath(int frame) const {
@@ -74,7 +84,7 @@ private:
     NewDirectories newDirectories_;
     fs::path directory_;
     int frames_ = 0;  // begun and not kept yet
-    std::deque<std::future<std::string>> writes_;
+    std::deque<Write> writes_;
 };
 
 }  // namespace

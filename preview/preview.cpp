@@ -80,18 +80,18 @@ bool runPreview(const PreviewOptions& options, std::string& error) {
         if (!loaded) return false;
         events = std::move(*loaded);
     }
-    Pictures pictures;
-    if (!choosePictures(options, pictures, error)) return false;
+    std::optional<Pictures> pictures = choosePictures(options, error);
+    if (!pictures) return false;
     const std::unique_ptr<HeadlessContext> context = HeadlessContext::create(width, height, error);
     if (!context) return false;
-    fitToDriver(options, pictures);
+    fitToDriver(options, *pictures);
     Outputs outputs;
     if (!outputs.open(options, error)) return false;
 
     // The ink draws from this generator as well.
     srand48(static_cast<long>(options.seed));
     WaterHost host(lookFor(options), width, height, options.seed);
-    host.handOver(pictures.portrait, pictures.landscape, pictures.water);
+    host.handOver(pictures->portrait, pictures->landscape, pictures->water);
     host.setUp(options.withInk);
     host.rain(options.rain);
     const int frames = countFrames(options, events);

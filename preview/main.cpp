@@ -34,15 +34,19 @@ int main(int argc, char** argv) {
     app.add_option("--size", size, "Size of the view in pixels")->type_name("WxH")->capture_default_str();
     app.add_option("--seconds", options.seconds, "Length of the scene; by default the script's and a little more");
     app.add_option("--fps", options.framesPerSecond, "Frames a second")->capture_default_str();
-    app.add_option("--out", options.out, "Directory for frame-0000.png and so on; \"out\" where there is no video")
+    app.add_option("--out", options.out, "Directory for frame-0000.png and so on; \"out\" where nothing else is written")
         ->type_name("DIR");
     app.add_option("--every", options.every, "Write every Nth frame as a picture")->check(CLI::PositiveNumber);
     file("--video", options.video, "Video to make, which ends in .mp4, .webp or .gif");
+    CLI::Option* inside = app.add_option(
+                                 "--inside", options.inside,
+                                 "Directory for pictures of the heights, the flow and the ink behind the last frame")
+                              ->type_name("DIR");
     app.add_option("--seed", options.seed, "Number that chance springs from")->capture_default_str();
     CLI::Option* inkOption = app.add_option("--ink", ink, "Colour of the ink that touches drop")->type_name("#rrggbb");
-    app.add_flag("--no-ink", noInk, "Clear water only")->excludes(inkOption);
+    app.add_flag("--no-ink", noInk, "Clear water only")->excludes(inkOption)->excludes(inside);
     CLI::Option* window = app.add_flag("--window", inWindow, "Open a window instead, to touch with the mouse");
-    for (const char* recorded : {"--script", "--seconds", "--fps", "--out", "--every", "--video"}) {
+    for (const char* recorded : {"--script", "--seconds", "--fps", "--out", "--every", "--video", "--inside"}) {
         window->excludes(app.get_option(recorded));
     }
     app.add_flag("--verbose", verbose, "Show the library's log");
@@ -69,6 +73,6 @@ int main(int argc, char** argv) {
 
     if (inWindow) return runWindow(options, error) ? 0 : fail(error);
     if (options.script.empty()) options.rain = true;
-    if (options.out.empty() && options.video.empty()) options.out = "out";
+    if (options.out.empty() && options.video.empty() && options.inside.empty()) options.out = "out";
     return runPreview(options, error) ? 0 : fail(error);
 }

@@ -1,7 +1,6 @@
 #include <stb/stb_image_write.h>
 
 #include <cerrno>
-#include <cstdio>
 #include <cstring>
 #include <deque>
 #include <filesystem>
@@ -31,7 +30,7 @@ bool writePng(const fs::path& path, const Picture& frame, std::string& error) {
 
 class PngSink : public FrameSink {
 public:
-    explicit PngSink(fs::path directory) : directory_(std::move(directory)) {}
+    PngSink(fs::path directory, std::string (*nameOf)(int)) : directory_(std::move(directory)), nameOf_(nameOf) {}
 
     ~PngSink() override {
         writes_.clear();  // waits for them
@@ -75,22 +74,19 @@ private:
         return written;
     }
 
-    fs::path framePath(int frame) const {
-        char name[32];
-        std::snprintf(name, sizeof name, "frame-%04d.png", frame);
-        return directory_ / name;
-    }
+    fs::path framePath(int frame) const { return directory_ / nameOf_(frame); }
 
     NewDirectories newDirectories_;
     fs::path directory_;
+    std::string (*nameOf_)(int frame);
     int frames_ = 0;  // begun and not kept yet
     std::deque<Write> writes_;
 };
 
 }  // namespace
 
-std::unique_ptr<FrameSink> openPngSink(const std::string& directory, std::string& error) {
-    auto sink = std::make_unique<PngSink>(directory);
+std::unique_ptr<FrameSink> openPngSink(const std::string& directory, std::string (*nameOf)(int), std::string& error) {
+    auto sink = std::make_unique<PngSink>(directory, nameOf);
     if (!sink->open(error)) return nullptr;
     return sink;
 }

@@ -12,7 +12,7 @@
 
 #include "fuzz/library_state.h"
 #include "fuzz/require.h"
-#include "preview/picture_file.h"
+#include "pictures/picture_file.h"
 #include "preview/touch_script.h"
 
 namespace {

@@ -7,6 +7,7 @@
 
 #include <cstdint>
 #include <random>
+#include <vector>
 
 #include "host/host_jni.h"
 #include "host/look.h"
@@ -52,6 +53,9 @@ public:
 
     // Lets all ink vanish with the next frame.
     void clearInk();
+
+    // One height a vertex: column by column from the left, each from the top.
+    const std::vector<float>& heights() const { return heights_.values; }
 
 private:
     void raiseTouchRipples(TouchAction action, int x, int y, float amplitude);

@@ -16,23 +16,29 @@ static std::optional<int> parseWhole(std::string_view text, int base) {
     return value;
 }
 
-std::optional<Size> parseSize(std::string_view text) {
-    const std::size_t cross = text.find('x');
-    if (cross == std::string_view::npos) return std::nullopt;
-    const std::optional<int> width = parseWhole(text.substr(0, cross), 10);
-    const std::optional<int> height = parseWhole(text.substr(cross + 1), 10);
-    if (!width || !height) return std::nullopt;
-    if (*width < 1 || *height < 1 || *width > kLongestSide || *height > kLongestSide) return std::nullopt;
-    return Size{*width, *height};
+// A side of the view in pixels, 0 for what is none.
+static int parseSide(std::string_view text) {
+    const int side = parseWhole(text, 10).value_or(0);
+    return side <= kLongestSide ? side : 0;
 }
 
-std::optional<InkColor> parseInkColor(std::string_view text) {
-    if (text.size() != 7 || text[0] != '#') return std::nullopt;
+std::optional<Size> parseSize(std::string_view text, std::string& error) {
+    const std::size_t cross = std::min(text.find('x'), text.size());
+    const Size size = {parseSide(text.substr(0, cross)), parseSide(text.substr(std::min(cross + 1, text.size())))};
+    if (size.width > 0 && size.height > 0) return size;
+    error = std::string(text) + " is not WIDTHxHEIGHT with sides of 1 to " + std::to_string(kLongestSide) + " pixels";
+    return std::nullopt;
+}
+
+std::optional<InkColor> parseInkColor(std::string_view text, std::string& error) {
     float channels[3];
-    for (std::size_t i = 0; i < 3; ++i) {
+    bool sound = text.size() == 7 && text[0] == '#';
+    for (std::size_t i = 0; sound && i < 3; ++i) {
         const std::optional<int> value = parseWhole(text.substr(1 + 2 * i, 2), 16);
-        if (!value) return std::nullopt;
-        channels[i] = std::min(static_cast<float>(*value) / 255.0f, kBrightestChannel);
+        channels[i] = std::min(static_cast<float>(value.value_or(0)) / 255.0f, kBrightestChannel);
+        sound = value.has_value();
     }
-    return InkColor{channels[0], channels[1], channels[2]};
+    if (sound) return InkColor{channels[0], channels[1], channels[2]};
+    error = std::string(text) + " is not #rrggbb";
+    return std::nullopt;
 }

@@ -15,9 +15,10 @@ public:
     virtual bool finish(std::string& error) = 0;
 };
 
-// Writes frame-0000.png and so on into a directory, which it makes if need be. Null, with the reason in `error`, when
-// the directory cannot be written.
-std::unique_ptr<FrameSink> openPngSink(const std::string& directory, std::string& error);
+// Writes PNG files into a directory, which it makes if need be; `nameOf` gives the name of each frame, counted from 0.
+// Null, with the reason in `error`, when the directory cannot be written.
+std::unique_ptr<FrameSink> openPngSink(
+    const std::string& directory, std::string (*nameOf)(int frame), std::string& error);
 
 // Writes an MP4, WebP or GIF, as the file's ending says, through ffmpeg. The file appears once it is whole.
 std::unique_ptr<FrameSink> openVideoSink(

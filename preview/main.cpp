@@ -4,7 +4,7 @@
 #include <cstdio>
 #include <string>
 
-#include "preview/log_filter.h"
+#include "platform/log_filter.h"
 #include "preview/preview.h"
 #include "preview/window.h"
 
@@ -36,16 +36,21 @@ int main(int argc, char** argv) {
         "--seconds", options.seconds, "Length of the scene in seconds; default: a little more than the script");
     app.add_option("--fps", options.framesPerSecond, "Frames per second")->capture_default_str();
     app.add_option(
-           "--out", options.out, "Directory for frame-0000.png and so on; default: \"out\" unless there is a video")
+           "--out", options.out,
+           "Directory for frame-0000.png and so on; default: \"out\" where nothing else is written")
         ->type_name("DIR");
     app.add_option("--every", options.every, "Write every Nth frame as a picture")->check(CLI::PositiveNumber);
     file("--video", options.video, "Video to write: a name ending in .mp4, .webp or .gif");
+    CLI::Option* inside = app.add_option(
+                                 "--inside", options.inside,
+                                 "Directory for pictures of the heights, the flow and the ink behind the last frame")
+                              ->type_name("DIR");
     app.add_option("--seed", options.seed, "Seed of the random numbers")->capture_default_str();
     CLI::Option* inkOption = app.add_option("--ink", ink, "Colour of the ink that touches drop")->type_name("#rrggbb");
-    app.add_flag("--no-ink", noInk, "Water without ink")->excludes(inkOption);
+    app.add_flag("--no-ink", noInk, "Water without ink")->excludes(inkOption)->excludes(inside);
     CLI::Option* window =
         app.add_flag("--window", inWindow, "Open a window instead and touch the water with the mouse");
-    for (const char* recorded : {"--script", "--seconds", "--fps", "--out", "--every", "--video"}) {
+    for (const char* recorded : {"--script", "--seconds", "--fps", "--out", "--every", "--video", "--inside"}) {
         window->excludes(app.get_option(recorded));
     }
     app.add_flag("--verbose", verbose, "Show the library's log");
@@ -58,21 +63,21 @@ int main(int argc, char** argv) {
         return 2;
     }
 
-    const std::optional<Size> parsedSize = parseSize(size);
-    if (!parsedSize) return fail("--size " + size + " is not WIDTHxHEIGHT with sides of 1 to 8192 pixels");
+    std::string error;
+    const std::optional<Size> parsedSize = parseSize(size, error);
+    if (!parsedSize) return fail("--size " + error);
     options.size = *parsedSize;
     if (options.seconds && !(*options.seconds > 0.0 && *options.seconds <= 3600.0)) {
         return fail("--seconds must be above 0 and at most 3600");
     }
     // The host takes longer frames for a pause.
     if (options.framesPerSecond < 4 || options.framesPerSecond > 240) return fail("--fps must be 4 to 240");
-    if (*inkOption && !(options.inkColor = parseInkColor(ink))) return fail("--ink " + ink + " is not #rrggbb");
+    if (*inkOption && !(options.inkColor = parseInkColor(ink, error))) return fail("--ink " + error);
     options.withInk = !noInk;
     if (!verbose) quietenLog();
 
-    std::string error;
     if (inWindow) return runWindow(options, error) ? 0 : fail(error);
     if (options.script.empty()) options.rain = true;
-    if (options.out.empty() && options.video.empty()) options.out = "out";
+    if (options.out.empty() && options.video.empty() && options.inside.empty()) options.out = "out";
     return runPreview(options, error) ? 0 : fail(error);
 }

@@ -1,7 +1,6 @@
 #include <stb/stb_image_write.h>
 
 #include <cerrno>
-#include <cstdio>
 #include <cstring>
 #include <deque>
 #include <filesystem>
@@ -16,8 +15,7 @@ namespace fs = std::filesystem;
 
 namespace {
 
-// An empty text when all went well.
-std::string writePng(const fs::path& path, const Picture& frame) {
+bool writePng(const fs::path& path, const Picture& frame, std::string& error) {
     // stb's own file output does not tell when the disk is full.
     std::ofstream file(path, std::ios::binary);
     const auto append = [](void* stream, void* bytes, int count) {
@@ -25,12 +23,14 @@ std::string writePng(const fs::path& path, const Picture& frame) {
     };
     const int done = stbi_write_png_to_func(append, &file, frame.width, frame.height, 4, frame.rgba.data(), 0);
     file.close();
-    return done && file ? "" : "cannot write " + path.string() + ": " + std::strerror(errno);
+    if (done && file) return true;
+    error = "cannot write " + path.string() + ": " + std::strerror(errno);
+    return false;
 }
 
 class PngSink : public FrameSink {
 public:
-    explicit PngSink(fs::path directory) : directory_(std::move(directory)) {}
+    PngSink(fs::path directory, std::string (*nameOf)(int)) : directory_(std::move(directory)), nameOf_(nameOf) {}
 
     ~PngSink() override {
         writes_.clear();  // waits for them
@@ -45,7 +45,10 @@ public:
         while (writes_.size() > std::thread::hardware_concurrency()) {
             if (!finishOne(error)) return false;
         }
-        writes_.push_back(std::async(std::launch::async, writePng, framePath(frames_++), frame));
+        Write& next = writes_.emplace_back();
+        next.done = std::async(std::launch::async, [&next, path = framePath(frames_++), frame] {
+            return writePng(path, frame, next.error);
+        });
         return true;
     }
 
@@ -59,28 +62,31 @@ public:
     }
 
 private:
+    struct Write {
+        std::string error;
+        std::future<bool> done;  // waits, when it goes, for the write that may still put an error beside it
+    };
+
     bool finishOne(std::string& error) {
-        error = writes_.front().get();
+        const bool written = writes_.front().done.get();
+        if (!written) error = writes_.front().error;
         writes_.pop_front();
-        return error.empty();
+        return written;
     }
 
-    fs::path framePath(int frame) const {
-        char name[32];
-        std::snprintf(name, sizeof name, "frame-%04d.png", frame);
-        return directory_ / name;
-    }
+    fs::path framePath(int frame) const { return directory_ / nameOf_(frame); }
 
     NewDirectories newDirectories_;
     fs::path directory_;
+    std::string (*nameOf_)(int frame);
     int frames_ = 0;  // begun and not kept yet
-    std::deque<std::future<std::string>> writes_;
+    std::deque<Write> writes_;
 };
 
 }  // namespace
 
-std::unique_ptr<FrameSink> openPngSink(const std::string& directory, std::string& error) {
-    auto sink = std::make_unique<PngSink>(directory);
+std::unique_ptr<FrameSink> openPngSink(const std::string& directory, std::string (*nameOf)(int), std::string& error) {
+    auto sink = std::make_unique<PngSink>(directory, nameOf);
     if (!sink->open(error)) return nullptr;
     return sink;
 }

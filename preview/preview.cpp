@@ -12,19 +12,27 @@
 #include "host/water_host.h"
 #include "platform/headless_context.h"
 #include "preview/frame_sink.h"
+#include "preview/inside.h"
 #include "preview/progress.h"
 #include "preview/scene.h"
 #include "preview/touch_script.h"
 
 namespace {
 
-// The video is closed, or taken back, before the directory of the pictures that may hold it.
+std::string frameName(int frame) {
+    char name[32];
+    std::snprintf(name, sizeof name, "frame-%04d.png", frame);
+    return name;
+}
+
+// In the order of opening: what comes later may lie in a directory that was made for one before, and goes first.
 struct Outputs {
-    std::unique_ptr<FrameSink> pictures, video;
+    std::unique_ptr<FrameSink> pictures, inside, video;
 
     bool open(const PreviewOptions& options, std::string& error) {
         const auto [width, height] = options.size;
-        if (!options.out.empty() && !(pictures = openPngSink(options.out, error))) return false;
+        if (!options.out.empty() && !(pictures = openPngSink(options.out, frameName, error))) return false;
+        if (!options.inside.empty() && !(inside = openPngSink(options.inside, insideName, error))) return false;
         if (options.video.empty()) return true;
         video = openVideoSink(options.video, width, height, options.framesPerSecond, error);
         return video != nullptr;
@@ -33,7 +41,8 @@ struct Outputs {
         return (!pictures || !asPicture || pictures->write(frame, error)) && (!video || video->write(frame, error));
     }
     bool finish(std::string& error) {
-        return (!video || video->finish(error)) && (!pictures || pictures->finish(error));
+        return (!video || video->finish(error)) && (!inside || inside->finish(error)) &&
+               (!pictures || pictures->finish(error));
     }
 };
 
@@ -67,6 +76,11 @@ bool drawFrames(
         if (!outputs.write(frame, i % options.every == 0, error)) return false;
         progress.show(i + 1);
     }
+    if (outputs.inside) {
+        for (const Picture& picture : drawInside(host, lookFor(options), frame)) {
+            if (!outputs.inside->write(picture, error)) return false;
+        }
+    }
     return outputs.finish(error);
 }
 
@@ -80,18 +94,18 @@ bool runPreview(const PreviewOptions& options, std::string& error) {
         if (!loaded) return false;
         events = std::move(*loaded);
     }
-    Pictures pictures;
-    if (!choosePictures(options, pictures, error)) return false;
+    std::optional<Pictures> pictures = choosePictures(options, error);
+    if (!pictures) return false;
     const std::unique_ptr<HeadlessContext> context = HeadlessContext::create(width, height, error);
     if (!context) return false;
-    fitToDriver(options, pictures);
+    fitToDriver(options, *pictures);
     Outputs outputs;
     if (!outputs.open(options, error)) return false;
 
     // The ink draws from this generator as well.
     srand48(static_cast<long>(options.seed));
     WaterHost host(lookFor(options), width, height, options.seed);
-    host.handOver(pictures.portrait, pictures.landscape, pictures.water);
+    host.handOver(pictures->portrait, pictures->landscape, pictures->water);
     host.setUp(options.withInk);
     host.rain(options.rain);
     const int frames = countFrames(options, events);

@@ -15,9 +15,10 @@ struct PreviewOptions {
     Size size = {540, 960};
     std::optional<double> seconds;  // or the script's length and a little for the water to calm
     int framesPerSecond = 60;
-    std::string out;    // directory
-    int every = 1;      // frames from one picture in it to the next
-    std::string video;  // file
+    std::string out;     // directory
+    int every = 1;       // frames from one picture in it to the next
+    std::string video;   // file
+    std::string inside;  // directory, for what lies behind the last frame; with ink only
     std::uint32_t seed = 1;
     bool withInk = false;
     std::optional<InkColor> inkColor;  // instead of the look's own

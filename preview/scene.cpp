@@ -6,33 +6,31 @@
 #include <cstdio>
 #include <functional>
 
-#include "preview/picture_file.h"
-#include "preview/procedural_pictures.h"
+#include "pictures/picture_file.h"
+#include "pictures/procedural_pictures.h"
 
 // The picture of `file`, or the built-in one where there is no file.
-static bool choosePicture(
-    const std::string& file, const std::function<Picture()>& builtIn, Picture& picture, std::string& error) {
-    if (file.empty()) {
-        picture = builtIn();
-        return true;
-    }
-    std::optional<Picture> loaded = loadPicture(file, error);
-    if (loaded) picture = std::move(*loaded);
-    return loaded.has_value();
+static std::optional<Picture> choosePicture(
+    const std::string& file, const std::function<Picture()>& builtIn, std::string& error) {
+    return file.empty() ? builtIn() : loadPicture(file, error);
 }
 
-bool choosePictures(const PreviewOptions& options, Pictures& pictures, std::string& error) {
+std::optional<Pictures> choosePictures(const PreviewOptions& options, std::string& error) {
     // The built-in pictures stay as sharp as the view up to a size where they take too long to make.
     const auto [width, height] = options.size;
     const double shrink = std::min(1.0, 2048.0 / std::max(width, height));
     const int shorter = std::max(1, static_cast<int>(std::min(width, height) * shrink));
     const int longer = std::max(1, static_cast<int>(std::max(width, height) * shrink));
-    return choosePicture(
-               options.portrait, [&] { return riverBed(shorter, longer); }, pictures.portrait, error) &&
-           choosePicture(
-               options.landscape, [&] { return riverBed(longer, shorter); }, pictures.landscape, error) &&
-           choosePicture(
-               options.water, [] { return waterLight(512); }, pictures.water, error);
+    std::optional<Picture> portrait = choosePicture(
+        options.portrait, [&] { return riverBed(shorter, longer); }, error);
+    if (!portrait) return std::nullopt;
+    std::optional<Picture> landscape = choosePicture(
+        options.landscape, [&] { return riverBed(longer, shorter); }, error);
+    if (!landscape) return std::nullopt;
+    std::optional<Picture> water = choosePicture(
+        options.water, [] { return waterLight(512); }, error);
+    if (!water) return std::nullopt;
+    return Pictures{std::move(*portrait), std::move(*landscape), std::move(*water)};
 }
 
 static void fitToDriver(const std::string& file, Picture& picture) {

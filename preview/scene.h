@@ -1,6 +1,7 @@
 // What the options of a run ask for, made ready.
 #pragma once
 
+#include <optional>
 #include <string>
 
 #include "host/look.h"
@@ -8,7 +9,7 @@
 #include "preview/preview.h"
 
 // On failure says why in `error`.
-bool choosePictures(const PreviewOptions& options, Pictures& pictures, std::string& error);
+std::optional<Pictures> choosePictures(const PreviewOptions& options, std::string& error);
 
 // Makes what is larger than the current context's driver takes smaller, and says so on standard error.
 void fitToDriver(const PreviewOptions& options, Pictures& pictures);

@@ -15,55 +15,57 @@ constexpr std::int64_t kLongestTimeMs = 3600 * 1000;
 constexpr double kFarthest = 1.0e6;
 
 template <class Number>
-bool parseNumber(std::string_view text, Number& value) {
+std::optional<Number> parseNumber(std::string_view text) {
+    Number value{};
     const auto [end, problem] = std::from_chars(text.data(), text.data() + text.size(), value);
-    return problem == std::errc() && end == text.data() + text.size();
+    if (problem != std::errc() || end != text.data() + text.size()) return std::nullopt;
+    return value;
 }
 
-bool parseAction(const std::string& text, TouchAction& action) {
-    if (text == "down")
-        action = TouchAction::down;
-    else if (text == "move")
-        action = TouchAction::move;
-    else if (text == "up")
-        action = TouchAction::up;
-    else if (text == "cancel")
-        action = TouchAction::cancel;
-    else
-        return false;
-    return true;
+std::optional<TouchAction> parseAction(std::string_view text) {
+    if (text == "down") return TouchAction::down;
+    if (text == "move") return TouchAction::move;
+    if (text == "up") return TouchAction::up;
+    if (text == "cancel") return TouchAction::cancel;
+    return std::nullopt;
 }
 
-bool parseCoordinate(std::string_view text, TouchCoordinate& coordinate) {
-    coordinate.percent = text.ends_with('%');
-    if (coordinate.percent) text.remove_suffix(1);
-    return parseNumber(text, coordinate.value) && std::abs(coordinate.value) <= kFarthest;
+std::optional<TouchCoordinate> parseCoordinate(std::string_view text) {
+    const bool percent = text.ends_with('%');
+    if (percent) text.remove_suffix(1);
+    const std::optional<double> value = parseNumber<double>(text);
+    if (!value || !(std::abs(*value) <= kFarthest)) return std::nullopt;
+    return TouchCoordinate{*value, percent};
 }
 
-// An empty text when the line is a good one.
-std::string parseLine(std::istringstream& words, std::int64_t earliestMs, TouchEvent& event) {
+std::optional<TouchEvent> parseLine(std::istringstream& words, std::int64_t earliestMs, std::string& error) {
+    const auto fail = [&](const std::string& reason) {
+        error = reason;
+        return std::nullopt;
+    };
     std::string time, action, x, y, pressure, rest;
     if (!(words >> time >> action >> x >> y >> pressure) || words >> rest) {
-        return "expected \"time_ms action x y pressure\"";
+        return fail("expected \"time_ms action x y pressure\"");
     }
-    if (!parseNumber(time, event.timeMs) || event.timeMs < 0 || event.timeMs > kLongestTimeMs) {
-        return "the time \"" + time + "\" is not a number of milliseconds within an hour";
+    const auto timeMs = parseNumber<std::int64_t>(time);
+    if (!timeMs || *timeMs < 0 || *timeMs > kLongestTimeMs) {
+        return fail("the time \"" + time + "\" is not a number of milliseconds within an hour");
     }
-    if (event.timeMs < earliestMs) {
-        return "the time " + time + " is before that of the event above, " + std::to_string(earliestMs);
+    if (*timeMs < earliestMs) {
+        return fail("the time " + time + " is before that of the event above, " + std::to_string(earliestMs));
     }
-    if (!parseAction(action, event.action)) {
-        return "the action \"" + action + "\" is none of down, move, up and cancel";
+    const auto parsedAction = parseAction(action);
+    if (!parsedAction) return fail("the action \"" + action + "\" is none of down, move, up and cancel");
+    const auto parsedX = parseCoordinate(x);
+    const auto parsedY = parseCoordinate(y);
+    if (!parsedX || !parsedY) {
+        return fail("the position \"" + (parsedX ? y : x) + "\" is neither pixels nor a percentage");
     }
-    for (const auto& [word, coordinate] : {std::pair{&x, &event.x}, std::pair{&y, &event.y}}) {
-        if (!parseCoordinate(*word, *coordinate)) {
-            return "the position \"" + *word + "\" is neither pixels nor a percentage";
-        }
+    const auto parsedPressure = parseNumber<float>(pressure);
+    if (!parsedPressure || !(*parsedPressure >= 0.0f && *parsedPressure <= 10.0f)) {
+        return fail("the pressure \"" + pressure + "\" is not between 0 and 10");
     }
-    if (!parseNumber(pressure, event.pressure) || !(event.pressure >= 0.0f && event.pressure <= 10.0f)) {
-        return "the pressure \"" + pressure + "\" is not between 0 and 10";
-    }
-    return "";
+    return TouchEvent{*timeMs, *parsedAction, *parsedX, *parsedY, *parsedPressure};
 }
 
 }  // namespace
@@ -80,13 +82,12 @@ std::optional<std::vector<TouchEvent>> parseTouchScript(
     for (int number = 1; std::getline(text, line); ++number) {
         std::istringstream words(line.substr(0, line.find('#')));
         if ((words >> std::ws).eof()) continue;
-        TouchEvent event{};
-        const std::string problem = parseLine(words, events.empty() ? 0 : events.back().timeMs, event);
-        if (!problem.empty()) {
-            error = name + ":" + std::to_string(number) + ": " + problem;
+        const std::optional<TouchEvent> event = parseLine(words, events.empty() ? 0 : events.back().timeMs, error);
+        if (!event) {
+            error = name + ":" + std::to_string(number) + ": " + error;
             return std::nullopt;
         }
-        events.push_back(event);
+        events.push_back(*event);
     }
     if (text.bad()) {
         error = "cannot read the touch script " + name;

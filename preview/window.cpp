@@ -101,8 +101,8 @@ bool fail(const std::string& what, std::string& error) {
 }  // namespace
 
 bool runWindow(const PreviewOptions& options, std::string& error) {
-    Pictures pictures;
-    if (!choosePictures(options, pictures, error)) return false;
+    std::optional<Pictures> pictures = choosePictures(options, error);
+    if (!pictures) return false;
     if (!glfwInit()) return fail("no screen for a window", error);
     struct Ended {
         ~Ended() { glfwTerminate(); }
@@ -121,12 +121,12 @@ bool runWindow(const PreviewOptions& options, std::string& error) {
     glfwMakeContextCurrent(window);
     glfwSwapInterval(1);
     keepDriverLoaded();
-    fitToDriver(options, pictures);
+    fitToDriver(options, *pictures);
 
     // The ink draws from this generator as well.
     srand48(static_cast<long>(options.seed));
     Stage stage{LiveWater(lookFor(options), options.seed), options.withInk, options.rain};
-    stage.water.setPictures(std::move(pictures));
+    stage.water.setPictures(std::move(*pictures));
     stage.water.setInk(stage.withInk);
     stage.water.setRain(stage.raining);
     run(window, stage);

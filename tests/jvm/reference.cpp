@@ -12,8 +12,8 @@
 #include <vector>
 
 #include "host/water_host.h"
+#include "pictures/procedural_pictures.h"
 #include "platform/headless_context.h"
-#include "preview/procedural_pictures.h"
 
 namespace {
 

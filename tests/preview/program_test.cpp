@@ -13,7 +13,7 @@
 #include <fstream>
 #include <sstream>
 
-#include "preview/picture_file.h"
+#include "pictures/picture_file.h"
 
 namespace fs = std::filesystem;
 
@@ -189,6 +189,23 @@ TEST_F(PreviewProgram, MakesVideosOfEachKind) {
                     "-of csv=p=0 new/water.mp4 > probe"),
         0);
     EXPECT_EQ(readFile("probe"), "50,82,15\n");
+}
+
+TEST_F(PreviewProgram, ShowsTheInsideOfAStroke) {
+    const std::string scene = TIDEMARK_SCENES_PATH "/curl.touch";
+    expectSuccess(run({"--size", "300x290", "--seconds", "0.5", "--script", scene, "--inside", "i"}));
+    for (const std::string name : {"height", "velocity", "density", "result"}) {
+        std::string error;
+        const std::optional<Picture> picture = loadPicture("i/" + name + ".png", error);
+        ASSERT_TRUE(picture) << error;
+        EXPECT_EQ(std::pair(picture->width, picture->height), std::pair(300, 290));
+        std::uint8_t darkest = 255, brightest = 0;
+        for (std::size_t i = 1; i < picture->rgba.size(); i += 4) {
+            darkest = std::min(darkest, picture->rgba[i]);
+            brightest = std::max(brightest, picture->rgba[i]);
+        }
+        EXPECT_GT(brightest - darkest, 100) << name;  // the dimmed frame below the arrows has less
+    }
 }
 
 TEST_F(PreviewProgram, RefusesBadInputInOneLineAndLeavesNothing) {

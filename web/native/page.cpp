@@ -8,7 +8,7 @@
 #include <utility>
 
 #include "host/live_water.h"
-#include "preview/log_filter.h"
+#include "platform/log_filter.h"
 
 // The page fills the look as an array of numbers in the order of look.properties.
 static_assert(sizeof(int) == 4 && sizeof(float) == 4 && alignof(Look) == 4);

@@ -1,7 +1,7 @@
 // What the page's worker calls: the built-in pictures. web/src/painter.ts gives them names.
 #include <emscripten.h>
 
-#include "preview/procedural_pictures.h"
+#include "pictures/procedural_pictures.h"
 
 static Picture painted;
 

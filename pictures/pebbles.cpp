@@ -1,4 +1,4 @@
-#include "preview/pebbles.h"
+#include "pictures/pebbles.h"
 
 #include <algorithm>
 #include <array>

@@ -1,4 +1,4 @@
-#include "preview/jpeg_tables.h"
+#include "pictures/jpeg_tables.h"
 
 #include <cstddef>
 #include <numeric>

@@ -1,4 +1,4 @@
-#include "preview/procedural_pictures.h"
+#include "pictures/procedural_pictures.h"
 
 #include <algorithm>
 #include <cmath>
@@ -6,11 +6,11 @@
 #include <future>
 #include <vector>
 
-#include "preview/caustics.h"
-#include "preview/noise.h"
-#include "preview/pebbles.h"
-#include "preview/pool_tiles.h"
-#include "preview/sea_sand.h"
+#include "pictures/caustics.h"
+#include "pictures/noise.h"
+#include "pictures/pebbles.h"
+#include "pictures/pool_tiles.h"
+#include "pictures/sea_sand.h"
 
 // The net of light is cast while the ground is painted; a browser gives its programs one thread.
 #ifdef __EMSCRIPTEN__
@@ -19,27 +19,9 @@ static constexpr auto kBeside = std::launch::deferred;
 static constexpr auto kBeside = std::launch::async;
 #endif
 
-static std::uint8_t toByte(float linear) {
-    return static_cast<std::uint8_t>(std::sqrt(std::clamp(linear, 0.0f, 1.0f)) * 255.0f + 0.5f);
-}
-
 // Rolls bright values off towards white instead of cutting them.
 static float expose(float light) {
     return light * (1.0f + light * 0.25f) / (1.0f + light * 0.60f);
-}
-
-static void put(Picture& picture, std::size_t pixel, Rgb light) {
-    std::uint8_t* bytes = &picture.rgba[pixel * 4];
-    bytes[0] = toByte(light.r);
-    bytes[1] = toByte(light.g);
-    bytes[2] = toByte(light.b);
-    bytes[3] = 255;
-}
-
-static Picture blank(int width, int height) {
-    return {
-        width, height,
-        std::vector<std::uint8_t>(4 * static_cast<std::size_t>(width) * static_cast<std::size_t>(height))};
 }
 
 // The net at half the resolution, read between its four nearest values.
@@ -75,18 +57,13 @@ static Picture flood(int width, int height, float netCell, PaintGround paintGrou
     paintGround(bed, unit);
 
     const std::vector<float> net = futureNet.get();
-    Picture picture = blank(width, height);
-    std::size_t pixel = 0;
-    for (int row = 0; row < height; ++row) {
-        for (int column = 0; column < width; ++column, ++pixel) {
-            const float x = static_cast<float>(column) / static_cast<float>(width);
-            const float y = static_cast<float>(row) / static_cast<float>(height);
-            const float depth = std::clamp(depthAt(x, y), 0.0f, 1.0f);
-            const float caustic = sampleHalf(net, netWidth, netHeight, column, row);
-            put(picture, pixel, underWater(bed.pixels[pixel], depth, caustic));
-        }
-    }
-    return picture;
+    forAllPixels(bed, [&](Rgb& pixel, int column, int row) {
+        const float x = static_cast<float>(column) / static_cast<float>(width);
+        const float y = static_cast<float>(row) / static_cast<float>(height);
+        const float depth = std::clamp(depthAt(x, y), 0.0f, 1.0f);
+        pixel = underWater(pixel, depth, sampleHalf(net, netWidth, netHeight, column, row));
+    });
+    return toPicture(bed);
 }
 
 Picture riverBed(int width, int height) {
@@ -114,16 +91,11 @@ Picture sandyShore(int width, int height) {
 Picture waterLight(int side) {
     const CloudTile clouds(23);
     const std::vector<float> glitter = causticNet(side, side, static_cast<float>(side) / 12.0f, 9);
-    Picture picture = blank(side, side);
-    std::size_t pixel = 0;
-    for (int row = 0; row < side; ++row) {
-        for (int column = 0; column < side; ++column, ++pixel) {
-            const float cloud = std::clamp(clouds.at(column, row) * 1.6f - 0.3f, 0.0f, 1.0f);
-            const float sun = 0.16f * std::min(glitter[pixel], 5.0f);
-            put(picture, pixel,
-                {0.14f + 0.40f * cloud + sun, 0.30f + 0.35f * cloud + sun * 0.97f,
-                 0.52f + 0.26f * cloud + sun * 0.90f});
-        }
-    }
-    return picture;
+    Canvas sky(side, side);
+    forAllPixels(sky, [&](Rgb& pixel, int column, int row) {
+        const float cloud = std::clamp(clouds.at(column, row) * 1.6f - 0.3f, 0.0f, 1.0f);
+        const float sun = 0.16f * std::min(glitter[static_cast<std::size_t>(row * side + column)], 5.0f);
+        pixel = {0.14f + 0.40f * cloud + sun, 0.30f + 0.35f * cloud + sun * 0.97f, 0.52f + 0.26f * cloud + sun * 0.90f};
+    });
+    return toPicture(sky);
 }

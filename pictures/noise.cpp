@@ -1,4 +1,4 @@
-#include "preview/noise.h"
+#include "pictures/noise.h"
 
 #include <cstdint>
 

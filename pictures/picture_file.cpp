@@ -1,4 +1,4 @@
-#include "preview/picture_file.h"
+#include "pictures/picture_file.h"
 
 #include <stb/stb_image.h>
 #include <stb/stb_image_resize.h>
@@ -13,7 +13,7 @@
 #include <sstream>
 #include <utility>
 
-#include "preview/jpeg_tables.h"
+#include "pictures/jpeg_tables.h"
 
 static std::size_t byteCount(int width, int height) {
     return 4 * static_cast<std::size_t>(width) * static_cast<std::size_t>(height);

@@ -1,4 +1,4 @@
-#include "preview/picture_file.h"
+#include "pictures/picture_file.h"
 
 #include <gtest/gtest.h>
 #include <stb/stb_image_write.h>

@@ -1,9 +1,11 @@
-// What the pictures of the ground below the water are painted on.
+// What pictures are painted on.
 #pragma once
 
 #include <algorithm>
 #include <cstddef>
 #include <vector>
+
+#include "host/picture.h"
 
 struct Rgb {
     float r, g, b;  // linear light, 1 is white
@@ -24,6 +26,10 @@ struct Canvas {
     int width, height;
     std::vector<Rgb> pixels;
 };
+
+// A pixel of a picture holds the square roots of its light.
+Picture toPicture(const Canvas& canvas);
+Canvas toCanvas(const Picture& picture);
 
 // Calls paint(pixel, column, row) for the pixels of the canvas within `reach` of (x, y).
 template <class Paint>

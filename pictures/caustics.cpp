@@ -1,11 +1,11 @@
-#include "preview/caustics.h"
+#include "pictures/caustics.h"
 
 #include <array>
 #include <cmath>
 #include <complex>
 #include <numbers>
 
-#include "preview/noise.h"
+#include "pictures/noise.h"
 
 namespace {
 

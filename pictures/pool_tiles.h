@@ -1,8 +1,8 @@
 // Glazed tiles in the shape of fish scales, as they line a pool.
 #pragma once
 
-#include "preview/canvas.h"
-#include "preview/noise.h"
+#include "pictures/canvas.h"
+#include "pictures/noise.h"
 
 // Covers the canvas; `unit` is the radius of a tile in pixels.
 void layTiles(Canvas& canvas, float unit, const CloudTile& clouds);

@@ -1,4 +1,4 @@
-#include "preview/sea_sand.h"
+#include "pictures/sea_sand.h"
 
 #include <algorithm>
 #include <cmath>

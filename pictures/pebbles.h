@@ -1,8 +1,8 @@
 // Pebbles painted one over the other, as they lie on the bed of a river.
 #pragma once
 
-#include "preview/canvas.h"
-#include "preview/noise.h"
+#include "pictures/canvas.h"
+#include "pictures/noise.h"
 
 // Covers the canvas with pebbles; `unit` is the radius of a middling one in pixels.
 void scatterPebbles(Canvas& canvas, float unit, Random& random, const CloudTile& clouds);

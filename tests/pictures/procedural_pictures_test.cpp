@@ -1,4 +1,4 @@
-#include "preview/procedural_pictures.h"
+#include "pictures/procedural_pictures.h"
 
 #include <gtest/gtest.h>
 

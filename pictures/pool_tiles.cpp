@@ -1,4 +1,4 @@
-#include "preview/pool_tiles.h"
+#include "pictures/pool_tiles.h"
 
 #include <algorithm>
 #include <cmath>

@@ -1,4 +1,4 @@
-#include "preview/log_filter.h"
+#include "platform/log_filter.h"
 
 #include <android/log.h>
 

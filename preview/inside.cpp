@@ -1,0 +1,167 @@
+#include "preview/inside.h"
+
+#include <GLES2/gl2.h>
+
+#include <cmath>
+#include <cstdint>
+#include <vector>
+
+#include "jni/globals.h"
+#include "pictures/canvas.h"
+
+namespace {
+
+constexpr Rgb kPaper = {0.91f, 0.89f, 0.84f};
+
+// Of a row of equally spaced colours the one at `t`, 0 to 1.
+template <std::size_t N>
+Rgb colourAt(const Rgb (&colours)[N], float t) {
+    const float place = std::clamp(t, 0.0f, 1.0f) * static_cast<float>(N - 1);
+    const auto below = std::min(static_cast<std::size_t>(place), N - 2);
+    return mix(colours[below], colours[below + 1], place - static_cast<float>(below));
+}
+
+// The value t of the way from b to c, which lie between a and d (Catmull and Rom, 1974).
+float cubic(float a, float b, float c, float d, float t) {
+    return b + 0.5f * t * (c - a + t * (2.0f * a - 5.0f * b + 4.0f * c - d + t * (3.0f * (b - c) + d - a)));
+}
+
+// The height of each pixel's middle; the view shows the middle of the square mesh.
+std::vector<float> heightsInView(const WaterHost& host, const Look& look, int width, int height, float cellsPerPixel) {
+    const int n = look.meshVertices;
+    const Texture<const float> mesh = {host.heights().data(), n, n};  // a row of it is a column of the mesh
+    const auto place = [=](int pixel, int pixels) {
+        return 0.5f * static_cast<float>(n - 1) + 0.5f * static_cast<float>(2 * pixel + 1 - pixels) * cellsPerPixel;
+    };
+    std::vector<float> heights;
+    heights.reserve(static_cast<std::size_t>(width) * static_cast<std::size_t>(height));
+    for (int y = 0; y < height; ++y) {
+        const float down = place(y, height);
+        const int top = static_cast<int>(down);
+        for (int x = 0; x < width; ++x) {
+            const float across = place(x, width);
+            const int left = static_cast<int>(across);
+            float h[4];
+            for (int i = 0; i < 4; ++i) {
+                const auto at = [&](int j) { return mesh.clamped(top + j, left - 1 + i); };
+                h[i] = cubic(at(-1), at(0), at(1), at(2), down - static_cast<float>(top));
+            }
+            heights.push_back(cubic(h[0], h[1], h[2], h[3], across - static_cast<float>(left)));
+        }
+    }
+    return heights;
+}
+
+Picture drawHeight(const WaterHost& host, const Look& look, int width, int height) {
+    constexpr Rgb kColours[] = {{0.010f, 0.030f, 0.160f}, {0.040f, 0.220f, 0.520f}, {0.380f, 0.640f, 0.800f}, kPaper,
+                                {0.900f, 0.480f, 0.260f}, {0.600f, 0.080f, 0.040f}, {0.180f, 0.005f, 0.020f}};
+    const float cellsPerPixel =
+        static_cast<float>(look.meshVertices - 1) / look.pictureZoom / static_cast<float>(std::max(width, height));
+    std::vector<float> heights = heightsInView(host, look, width, height, cellsPerPixel);
+    const Texture<float> view = {heights.data(), width, height};
+    Canvas canvas(width, height);
+    forAllPixels(canvas, [&](Rgb& pixel, int x, int y) {
+        // Heights of 1.13 and more show the water texture fully. The light comes from the upper left.
+        const float h = view.clamped(x, y);
+        const float t = 0.5f + 0.5f * std::copysign(std::pow(std::abs(h) / 1.13f, 0.8f), h);
+        const float rise =
+            view.clamped(x + 1, y) - view.clamped(x - 1, y) + view.clamped(x, y + 1) - view.clamped(x, y - 1);
+        pixel = colourAt(kColours, t) * std::clamp(1.0f + 0.35f * rise / cellsPerPixel, 0.5f, 1.6f);
+    });
+    return toPicture(canvas);
+}
+
+// An arrow with its middle at (x, y), along a unit direction, all in pixels; its shaft grows from the tail.
+void drawArrow(Canvas& canvas, float x, float y, float directionX, float directionY, float length, Rgb colour) {
+    const float head = std::min(0.6f * length, 7.0f);
+    forPixelsAround(canvas, x, y, 0.5f * length + 4.0f, [&](Rgb& pixel, int column, int row) {
+        const float dx = static_cast<float>(column) + 0.5f - x;
+        const float dy = static_cast<float>(row) + 0.5f - y;
+        const float fromTail = 0.5f * length + dx * directionX + dy * directionY;
+        const float toTip = length - fromTail;
+        const float aside = std::abs(dy * directionX - dx * directionY);
+        // How far inside each part the pixel lies.
+        const float inHead = std::min(0.45f * toTip - aside, head - toTip);
+        const float inShaft = std::min({0.35f + 0.65f * fromTail / length - aside, fromTail, toTip - 0.7f * head});
+        pixel = mix(pixel, colour, std::clamp(std::max(inHead, inShaft) + 0.5f, 0.0f, 1.0f));
+    });
+}
+
+Picture drawVelocity(const Picture& result) {
+    constexpr Rgb kColours[] = {
+        {0.080f, 0.450f, 0.600f}, {0.200f, 0.850f, 0.700f}, {0.900f, 0.850f, 0.220f}, {1.000f, 0.400f, 0.100f}};
+    constexpr float kFastest = 60.0f;
+    constexpr int kCells = 2;  // from one arrow to the next
+    Canvas canvas = toCanvas(result);
+    forAllPixels(canvas, [](Rgb& pixel, int, int) {
+        const float grey = 0.3f * pixel.r + 0.6f * pixel.g + 0.1f * pixel.b;
+        pixel = mix(pixel, {grey, grey, grey}, 0.6f) * 0.15f;
+    });
+    const Texture<vec2>& field = fluid.VelocityTex;
+    const float cellWidth = static_cast<float>(result.width) / static_cast<float>(field.width);
+    const float cellHeight = static_cast<float>(result.height) / static_cast<float>(field.height);
+    for (int j = kCells / 2; j < field.height; j += kCells) {
+        for (int i = kCells / 2; i < field.width; i += kCells) {
+            const vec2 u = field.row(j)[i];
+            const float speed = std::hypot(u.x, u.y);
+            const float t = std::sqrt(std::min(speed / kFastest, 1.0f));
+            if (!(t > 0.04f)) continue;
+            const float x = (static_cast<float>(i) + 0.5f) * cellWidth;
+            const float y = static_cast<float>(result.height) - (static_cast<float>(j) + 0.5f) * cellHeight;
+            drawArrow(canvas, x, y, u.x / speed, -u.y / speed, 6.0f + 28.0f * t, colourAt(kColours, t));
+        }
+    }
+    return toPicture(canvas);
+}
+
+// The engine's ink, rows from the bottom.
+std::vector<float> readDensity() {
+    const auto texels = static_cast<std::size_t>(fluid.InkWidth) * static_cast<std::size_t>(fluid.InkHeight);
+    std::vector<std::uint8_t> rgba(4 * texels);
+    glBindFramebuffer(GL_FRAMEBUFFER, fluid.Density.Ping.FboHandle);
+    glReadPixels(0, 0, fluid.InkWidth, fluid.InkHeight, GL_RGBA, GL_UNSIGNED_BYTE, rgba.data());
+    glBindFramebuffer(GL_FRAMEBUFFER, 0);
+    std::vector<float> density(texels);
+    for (std::size_t i = 0; i < texels; ++i) {
+        density[i] = static_cast<float>(rgba[4 * i]) + static_cast<float>(rgba[4 * i + 1]) / 255.0f;
+    }
+    return density;
+}
+
+// Darkens paper by the formula by which the water's shader darkens the picture.
+Picture drawDensity(int width, int height) {
+    std::vector<float> density = readDensity();
+    const Texture<float> ink = {density.data(), fluid.InkWidth, fluid.InkHeight};
+    const float columnsPerPixel = static_cast<float>(ink.width) / static_cast<float>(width);
+    const float rowsPerPixel = static_cast<float>(ink.height) / static_cast<float>(height);
+    Canvas canvas(width, height);
+    forAllPixels(canvas, [&](Rgb& pixel, int x, int y) {
+        const float column = (static_cast<float>(x) + 0.5f) * columnsPerPixel - 0.5f;
+        const float row = (static_cast<float>(height - y) - 0.5f) * rowsPerPixel - 0.5f;
+        const int i = static_cast<int>(std::floor(column));
+        const int j = static_cast<int>(std::floor(row));
+        const float value = bilinear(
+            ink.clamped(i, j), ink.clamped(i + 1, j), ink.clamped(i, j + 1), ink.clamped(i + 1, j + 1),
+            column - static_cast<float>(i), row - static_cast<float>(j));
+        const auto through = [&](float paper, float channel) {
+            const float divisor = 1.0f + fluid.InkIntensity * value * ((1.5f - fluid.InkColorOffset) / channel - 1.0f);
+            return paper / (divisor * divisor);  // of light; the shader divides its square root
+        };
+        const Color_ colour = fluid.InkColor;
+        pixel = {through(kPaper.r, colour.r), through(kPaper.g, colour.g), through(kPaper.b, colour.b)};
+    });
+    return toPicture(canvas);
+}
+
+}  // namespace
+
+std::string insideName(int picture) {
+    constexpr const char* kNames[] = {"height.png", "velocity.png", "density.png", "result.png"};
+    return kNames[picture];
+}
+
+std::array<Picture, 4> drawInside(const WaterHost& host, const Look& look, const Picture& result) {
+    return {
+        drawHeight(host, look, result.width, result.height), drawVelocity(result),
+        drawDensity(result.width, result.height), result};
+}

@@ -14,7 +14,7 @@ bool shareNames(GlKind a, GlKind b) {
 }
 
 bool isHeldOnce(std::span<const GlObject> all, const GlObject& object) {
-    return std::ranges::count_if(all, [&object](const GlObject& other) {
+    return std::count_if(all.begin(), all.end(), [&object](const GlObject& other) {
                return shareNames(other.kind, object.kind) && *other.name == *object.name;
            }) == 1;
 }
@@ -38,8 +38,9 @@ void deleteObject(GlKind kind, GLuint name) {
 
 void deleteGroup(std::span<const GlObject> all, const char* group) {
     const auto isInGroup = [group](const GlObject& object) { return std::string_view(object.group) == group; };
-    const auto first = std::ranges::find_if(
-        all, [&](const GlObject& object) { return isInGroup(object) && object.kind != GlKind::shader; });
+    const auto first = std::find_if(all.begin(), all.end(), [&](const GlObject& object) {
+        return isInGroup(object) && object.kind != GlKind::shader;
+    });
     if (first == all.end() || !*first->name) return;
     LOG_INFO("glDelete %s = %u", group, *first->name);
     for (const GlObject& object : all) {

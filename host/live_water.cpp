@@ -5,8 +5,8 @@
 LiveWater::LiveWater(const Look& look, std::uint32_t seed) : look_(look), seed_(seed), host_(look, 1, 1, seed) {}
 
 void LiveWater::setPictures(Pictures pictures) {
+    handOverDue_ |= pictures.newSince(pictures_);
     pictures_ = std::move(pictures);
-    picturesDue_ = true;
 }
 
 void LiveWater::resize(int width, int height) {
@@ -42,25 +42,39 @@ void LiveWater::setRain(bool falling) {
     host_.rain(falling);
 }
 
+void LiveWater::renewContext() {
+    setUpDue_ = true;
+    texturesDue_ = Pictures::kAll;
+}
+
 void LiveWater::prepare() {
-    if (setUpDue_ || picturesDue_) host_.handOver(pictures_.portrait, pictures_.landscape, pictures_.water);
+    if (host_.proportions() != proportions_) handOverDue_ |= Pictures::kBackgrounds;
+    proportions_ = host_.proportions();
+    host_.handOver(pictures_, handOverDue_);
+    const unsigned textures = handOverDue_ | texturesDue_;
     if (setUpDue_) {
-        host_.setUp(withInk_);
-    } else if (picturesDue_) {
-        host_.showPictures();
+        host_.setUp(withInk_, textures);
+    } else {
+        host_.loadTextures(textures);
     }
-    setUpDue_ = picturesDue_ = false;
+    setUpDue_ = false;
+    handOverDue_ = texturesDue_ = 0;
+}
+
+bool LiveWater::isResting() const {
+    if (pictures_.water.rgba.empty()) return true;
+    return !setUpDue_ && !handOverDue_ && host_.isResting();
 }
 
 LiveWater::Frame LiveWater::frame(double now) {
-    if (pictures_.water.rgba.empty()) return Frame::resting;
-    prepare();
-    if (host_.isResting()) {
+    if (isResting()) {
         clock_.rest();
         return Frame::resting;
     }
+    prepare();
     if (clock_.isEarly(now, look_.stepsPerSecond)) return Frame::waiting;
     if (!host_.advance(clock_.secondsUntil(now, look_.stepsPerSecond))) return Frame::waiting;
     host_.draw();
+    if (isResting()) clock_.rest();
     return Frame::drawn;
 }

@@ -22,21 +22,30 @@ public:
     // `seed` fixes where the rain falls.
     LiveWater(const Look& look, std::uint32_t seed);
 
-    // Nothing is drawn before the first pictures. Sizes are in pixels, each at least 1.
+    // Nothing is drawn before the first pictures. Hands over only those that differ from the last ones.
     void setPictures(Pictures pictures);
+
+    // In pixels, each at least 1. The ink is lost, the water stays.
     void resize(int width, int height);
 
+    // Another mesh begins with flat water.
     void setLook(const Look& look);
+
+    // Whether touches drop ink; they do not at first. A switch ends the stroke that is being drawn.
     void setInk(bool withInk);
+
     void setRain(bool falling);
     void clearInk() { host_.clearInk(); }
     void touch(TouchAction action, int x, int y, float pressure) { host_.touch(action, x, y, pressure); }
 
     // Where the framebuffer has lost the last frame.
-    void redraw() { host_.setLook(look_); }
+    void redraw() { host_.redraw(); }
 
     // After a lost context.
-    void renewContext() { setUpDue_ = true; }
+    void renewContext();
+
+    // Whether there is nothing to draw until the next call that changes something.
+    bool isResting() const;
 
     // Brings the water to the time `now`, in seconds, and draws it where it has changed: without ink into the current
     // framebuffer, with ink into framebuffer 0.
@@ -54,6 +63,10 @@ private:
     int height_ = 1;
     bool withInk_ = false;
     bool raining_ = false;
-    bool setUpDue_ = true;  // at the next frame, where the context is current
-    bool picturesDue_ = false;
+
+    // What the library has not been told yet; the next frame does, where the context is current.
+    bool setUpDue_ = true;
+    unsigned handOverDue_ = 0;
+    unsigned texturesDue_ = 0;  // besides those handed over
+    double proportions_ = 0.0;  // to which the backgrounds were last cropped
 };

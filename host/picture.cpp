@@ -4,6 +4,11 @@
 #include <cmath>
 #include <cstddef>
 
+unsigned Pictures::newSince(const Pictures& before) const {
+    return (portrait == before.portrait ? 0u : kPortrait) | (landscape == before.landscape ? 0u : kLandscape) |
+           (water == before.water ? 0u : kWater);
+}
+
 Picture cropToAspect(const Picture& picture, double aspectWidth, double aspectHeight) {
     const double aspect = aspectWidth / aspectHeight;
     Picture crop;

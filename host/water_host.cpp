@@ -57,35 +57,46 @@ void WaterHost::resize(int width, int height) {
     changed_ = true;
 }
 
-void WaterHost::handOver(const Picture& portrait, const Picture& landscape, const Picture& water) {
-    const int longer = std::max(pictureWidth_, pictureHeight_);
-    const int shorter = std::min(pictureWidth_, pictureHeight_);
-    handOverOne(NATIVE(transferPortraitBGBitmap), cropToAspect(portrait, shorter, longer));
-    handOverOne(NATIVE(transferLandscapeBGBitmap), cropToAspect(landscape, longer, shorter));
-    handOverOne(NATIVE(transferWaterBitmap), water);
+double WaterHost::proportions() const {
+    const auto [shorter, longer] = std::minmax(pictureWidth_, pictureHeight_);
+    return static_cast<double>(shorter) / longer;
 }
 
-void WaterHost::setUp(bool withInk) {
-    // The library would keep a stroke that the switch interrupts and go on with it at the next touch.
-    if (withInk != withInk_) clearInk();
-    withInk_ = withInk;
-    inkFrames_ = 0;
+void WaterHost::handOver(const Pictures& pictures, unsigned which) {
+    const auto [shorter, longer] = std::minmax(pictureWidth_, pictureHeight_);
+    if (which & Pictures::kPortrait) {
+        handOverOne(NATIVE(transferPortraitBGBitmap), cropToAspect(pictures.portrait, shorter, longer));
+    }
+    if (which & Pictures::kLandscape) {
+        handOverOne(NATIVE(transferLandscapeBGBitmap), cropToAspect(pictures.landscape, longer, shorter));
+    }
+    if (which & Pictures::kWater) handOverOne(NATIVE(transferWaterBitmap), pictures.water);
+}
+
+void WaterHost::setUp(bool withInk, unsigned textures) {
     JNIEnv* const env = hostEnvironment();
     NATIVE(onInitSetting)(env, nullptr, width_, height_, withInk);
     NATIVE(onInitGPU)(env, nullptr);
-    showPictures();
-    NATIVE(initWaters)
-    (env, nullptr, &positions_, &indices_, look_.meshVertices * look_.meshVertices, look_.meshExtent, look_.meshExtent,
-     look_.meshVertices, look_.meshVertices);
+    // The library would keep a stroke that the switch interrupts and go on with it at the next touch.
+    if (withInk != withInk_) NATIVE(clearInkValue)(env, nullptr);
+    withInk_ = withInk;
+    inkFrames_ = 0;
+    loadTextures(textures);
+    if (!isSetUp_) {
+        NATIVE(initWaters)
+        (env, nullptr, &positions_, &indices_, look_.meshVertices * look_.meshVertices, look_.meshExtent,
+         look_.meshExtent, look_.meshVertices, look_.meshVertices);
+    }
+    isSetUp_ = true;
     changed_ = true;
 }
 
-void WaterHost::showPictures() {
+void WaterHost::loadTextures(unsigned which) {
     JNIEnv* const env = hostEnvironment();
-    NATIVE(onLoadPortraitBGTextures)(env, nullptr);
-    NATIVE(onLoadLandscapeBGTextures)(env, nullptr);
-    NATIVE(onLoadWaterTextures)(env, nullptr);
-    changed_ = true;
+    if (which & Pictures::kPortrait) NATIVE(onLoadPortraitBGTextures)(env, nullptr);
+    if (which & Pictures::kLandscape) NATIVE(onLoadLandscapeBGTextures)(env, nullptr);
+    if (which & Pictures::kWater) NATIVE(onLoadWaterTextures)(env, nullptr);
+    changed_ |= which != 0;
 }
 
 void WaterHost::setLook(const Look& look) {
@@ -94,8 +105,9 @@ void WaterHost::setLook(const Look& look) {
 }
 
 void WaterHost::touch(TouchAction action, int x, int y, float pressure) {
+    if (!isSetUp_) return;
     raiseTouchRipples(action, x, y, look_.touchAmplitude * pressure);
-    fingerDown_ = action == TouchAction::down || action == TouchAction::move;
+    fingerDown_ = action == TouchAction::down || (action == TouchAction::move && fingerDown_);
     if (!withInk_) return;
     NATIVE(onTouch)(hostEnvironment(), nullptr, x, y, static_cast<jint>(action), pressure);
     inkFrames_ = look_.framesToFade;
@@ -106,7 +118,7 @@ void WaterHost::raiseTouchRipples(TouchAction action, int x, int y, float amplit
     const float modelY = (0.5f - static_cast<float>(y) / static_cast<float>(height_)) * visibleHeight_;
     if (action == TouchAction::down) {
         raiseRipple(modelX, modelY, amplitude);
-    } else if (action == TouchAction::move) {
+    } else if (action == TouchAction::move && fingerDown_) {
         const float spacing =
             look_.trailCells * static_cast<float>(look_.meshExtent) / static_cast<float>(look_.meshVertices - 1);
         const float dx = modelX - touchX_;
@@ -123,11 +135,13 @@ void WaterHost::raiseTouchRipples(TouchAction action, int x, int y, float amplit
 }
 
 void WaterHost::clearInk() {
+    if (!isSetUp_) return;
     NATIVE(clearInkValue)(hostEnvironment(), nullptr);
     changed_ = true;
 }
 
 bool WaterHost::advance(double seconds) {
+    if (!isSetUp_) return false;
     dueSteps_ += std::min(seconds, double{look_.longestFrame}) * look_.stepsPerSecond;
     // The small extra lets a frame of exactly one step's length bring its step in spite of rounding.
     for (; dueSteps_ > 1.0 - 1.0e-6; dueSteps_ -= 1.0) {

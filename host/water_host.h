@@ -21,21 +21,32 @@ public:
     // `seed` fixes where the rain falls. The view is width x height pixels, each at least 1.
     WaterHost(const Look& look, int width, int height, std::uint32_t seed);
 
-    // Hands the three pictures over; before setUp. The backgrounds are cropped to the proportions that the view has in
-    // portrait and in landscape.
-    void handOver(const Picture& portrait, const Picture& landscape, const Picture& water);
-
-    // Sets the library up in the current context, with or without the ink. Again after a lost context or a resize.
-    void setUp(bool withInk);
+    // setUp must follow, and before it another hand-over of the backgrounds where the proportions have changed.
     void resize(int width, int height);
 
-    // Shows the pictures handed over since setUp; the water and the ink stay as they are.
-    void showPictures();
+    // Shorter by longer side of what the backgrounds are cropped to in portrait and in landscape.
+    double proportions() const;
+
+    // Hands pictures over, of which the library keeps copies; before setUp or loadTextures.
+    void handOver(const Pictures& pictures, unsigned which = Pictures::kAll);
+
+    // Sets the library up in the current context, with or without ink. A new context needs all textures; one that goes
+    // on, with another size or mode, keeps those that it has.
+    void setUp(bool withInk, unsigned textures = Pictures::kAll);
+
+    // Shows pictures handed over since setUp; the water and the ink stay as they are.
+    void loadTextures(unsigned which = Pictures::kAll);
 
     // Takes over all values but those of the mesh, which must be the same.
     void setLook(const Look& look);
 
-    // One touch event; x and y in pixels from the top left corner of the view, pressure around 1.
+    // Where the framebuffer has lost the last frame.
+    void redraw() { changed_ = true; }
+
+    // Before the first setUp what follows does nothing.
+
+    // One touch event; x and y in pixels from the top left corner of the view, pressure around 1. A stroke begins with
+    // the finger's coming down.
     void touch(TouchAction action, int x, int y, float pressure);
 
     // Lets rain fall, `look.rainDropsPerSecond` drops a second, until it is switched off.
@@ -71,8 +82,9 @@ private:
     std::minstd_rand random_;
     bool raining_ = false;
     bool withInk_ = false;
+    bool isSetUp_ = false;
     bool fingerDown_ = false;
-    int inkFrames_ = 0;      // frames until the ink has faded
+    int inkFrames_ = 0;      // until the ink has faded: the library does not tell whether any is left
     bool changed_ = true;    // since the last draw
     int calmSteps_;          // calm steps in a row
     double dueSteps_ = 0.0;  // steps that the time passed so far still asks for

@@ -105,7 +105,7 @@ bool runPreview(const PreviewOptions& options, std::string& error) {
     // The ink draws from this generator as well.
     srand48(static_cast<long>(options.seed));
     WaterHost host(lookFor(options), width, height, options.seed);
-    host.handOver(pictures->portrait, pictures->landscape, pictures->water);
+    host.handOver(*pictures);
     host.setUp(options.withInk);
     host.rain(options.rain);
     const int frames = countFrames(options, events);

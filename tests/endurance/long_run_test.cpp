@@ -78,7 +78,7 @@ protected:
     void SetUp() override {
         resetGestures();
         srand48(11);
-        host.handOver(smoothPicture(8, 8, 1), smoothPicture(8, 8, 2), smoothPicture(8, 8, 3));
+        host.handOver({smoothPicture(8, 8, 1), smoothPicture(8, 8, 2), smoothPicture(8, 8, 3)});
     }
 
     int pick(int from, int to) { return from + static_cast<int>(random() % static_cast<unsigned>(to - from + 1)); }

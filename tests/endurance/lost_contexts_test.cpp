@@ -130,7 +130,7 @@ protected:
         Look look;
         look.meshVertices = 32;
         WaterHost host(look, kUpright.width, kUpright.height, 1);
-        host.handOver(smoothPicture(24, 32, 1), smoothPicture(32, 24, 2), smoothPicture(8, 8, 3));
+        host.handOver({smoothPicture(24, 32, 1), smoothPicture(32, 24, 2), smoothPicture(8, 8, 3)});
         return host;
     }
 

@@ -15,7 +15,7 @@ protected:
         renewContext(width, height);
         resetGestures();
         WaterHost host(Look{}, width, height, seed);
-        host.handOver(portrait, landscape, smoothPicture(16, 16, 3));
+        host.handOver({portrait, landscape, smoothPicture(16, 16, 3)});
         host.setUp(withInk);
         return host;
     }

@@ -72,7 +72,7 @@ protected:
 
     void start(bool withInk) {
         resetGestures();
-        host.handOver(smoothPicture(8, 8, 1), smoothPicture(8, 8, 2), smoothPicture(8, 8, 3));
+        host.handOver({smoothPicture(8, 8, 1), smoothPicture(8, 8, 2), smoothPicture(8, 8, 3)});
         host.setUp(withInk);
         host.draw();
         takeGlUse();

@@ -65,7 +65,7 @@ TEST_F(Misuse, nothingHappensBeforeSetUp) {
 TEST_F(Misuse, aNullArrayMakesTheCallDoNothing) {
     JNIEnv* const env = hostEnvironment();
     WaterHost host(Look(), 120, 120, 1);
-    host.handOver(smoothPicture(8, 8, 1), smoothPicture(8, 8, 2), smoothPicture(8, 8, 3));
+    host.handOver({smoothPicture(8, 8, 1), smoothPicture(8, 8, 2), smoothPicture(8, 8, 3)});
     host.setUp(true);
     log.take();
     Arrays a;
@@ -169,7 +169,7 @@ TEST_F(Misuse, anyViewAndAnyOrderOfSetUpIsSurvived) {
 
 TEST_F(Misuse, waterShowsWhenTheInkGoesBeforeItsFirstFrame) {
     WaterHost host(Look(), kSide, kSide, 1);
-    host.handOver(smoothPicture(8, 8, 1), smoothPicture(8, 8, 2), smoothPicture(8, 8, 3));
+    host.handOver({smoothPicture(8, 8, 1), smoothPicture(8, 8, 2), smoothPicture(8, 8, 3)});
     host.setUp(false);
     host.draw();
     const auto water = readPixels();

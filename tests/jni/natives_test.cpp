@@ -121,7 +121,7 @@ using Natives = GlTest;
 TEST_F(Natives, aWholeRunOfTheWaterLogsTheStatedLinesAndDraws) {
     resetGestures();
     WaterHost host(Look{}, kSide, kSide, 1);
-    host.handOver(smoothPicture(30, 30, 1), smoothPicture(30, 30, 2), smoothPicture(8, 8, 3));
+    host.handOver({smoothPicture(30, 30, 1), smoothPicture(30, 30, 2), smoothPicture(8, 8, 3)});
     host.setUp(false);
     auto lines = log.take();
     const std::vector<std::string> wanted = {"I onInitSetting",          "I InitializeSetting",

@@ -29,6 +29,7 @@ int main(int argc, char** argv) {
     file("--portrait", options.portrait, "Picture under the water in portrait (PNG or JPEG)");
     file("--landscape", options.landscape, "Picture under the water in landscape (PNG or JPEG)");
     file("--water", options.water, "Picture of the light on the waves (PNG or JPEG)");
+    file("--look", options.look, "Values of the look: lines of \"key = number\", as in host/look.properties");
     file("--script", options.script, "Touches to play: lines of \"time_ms action x y pressure\"");
     app.add_flag("--rain", options.rain, "Let it rain; without --script it always does");
     app.add_option("--size", size, "Size of the view in pixels")->type_name("WxH")->capture_default_str();

@@ -62,8 +62,8 @@ int countFrames(const PreviewOptions& options, const std::vector<TouchEvent>& ev
 }
 
 bool drawFrames(
-    const PreviewOptions& options, int frames, WaterHost& host, TouchPlayer& touches, Outputs& outputs,
-    std::string& error) {
+    const PreviewOptions& options, const Look& look, int frames, WaterHost& host, TouchPlayer& touches,
+    Outputs& outputs, std::string& error) {
     const auto [width, height] = options.size;
     Picture frame{width, height, std::vector<std::uint8_t>(4 * static_cast<std::size_t>(width * height))};
     Progress progress(frames);
@@ -77,7 +77,7 @@ bool drawFrames(
         progress.show(i + 1);
     }
     if (outputs.inside) {
-        for (const Picture& picture : drawInside(host, lookFor(options), frame)) {
+        for (const Picture& picture : drawInside(host, look, frame)) {
             if (!outputs.inside->write(picture, error)) return false;
         }
     }
@@ -94,6 +94,8 @@ bool runPreview(const PreviewOptions& options, std::string& error) {
         if (!loaded) return false;
         events = std::move(*loaded);
     }
+    const std::optional<Look> look = chooseLook(options, error);
+    if (!look) return false;
     std::optional<Pictures> pictures = choosePictures(options, error);
     if (!pictures) return false;
     const std::unique_ptr<HeadlessContext> context = HeadlessContext::create(width, height, error);
@@ -104,11 +106,11 @@ bool runPreview(const PreviewOptions& options, std::string& error) {
 
     // The ink draws from this generator as well.
     srand48(static_cast<long>(options.seed));
-    WaterHost host(lookFor(options), width, height, options.seed);
+    WaterHost host(*look, width, height, options.seed);
     host.handOver(*pictures);
     host.setUp(options.withInk);
     host.rain(options.rain);
     const int frames = countFrames(options, events);
     TouchPlayer touches(std::move(events), width, height);
-    return drawFrames(options, frames, host, touches, outputs, error);
+    return drawFrames(options, *look, frames, host, touches, outputs, error);
 }

@@ -7,9 +7,10 @@
 
 #include "preview/arguments.h"
 
-// What is left empty is the built-in picture, no script, or no such output.
+// What is left empty is the built-in picture or look, no script, or no such output.
 struct PreviewOptions {
     std::string portrait, landscape, water;  // files
+    std::string look;                        // file
     std::string script;                      // file
     bool rain = false;
     Size size = {540, 960};

@@ -6,6 +6,7 @@
 #include <cstdio>
 #include <functional>
 
+#include "host/look_file.h"
 #include "pictures/picture_file.h"
 #include "pictures/procedural_pictures.h"
 
@@ -51,12 +52,12 @@ void fitToDriver(const PreviewOptions& options, Pictures& pictures) {
     fitToDriver(options.water, pictures.water);
 }
 
-Look lookFor(const PreviewOptions& options) {
-    Look look;
-    if (options.inkColor) {
-        look.inkRed = options.inkColor->red;
-        look.inkGreen = options.inkColor->green;
-        look.inkBlue = options.inkColor->blue;
+std::optional<Look> chooseLook(const PreviewOptions& options, std::string& error) {
+    std::optional<Look> look = options.look.empty() ? Look{} : loadLook(options.look, error);
+    if (look && options.inkColor) {
+        look->inkRed = options.inkColor->red;
+        look->inkGreen = options.inkColor->green;
+        look->inkBlue = options.inkColor->blue;
     }
     return look;
 }

@@ -14,4 +14,5 @@ std::optional<Pictures> choosePictures(const PreviewOptions& options, std::strin
 // Makes what is larger than the current context's driver takes smaller, and says so on standard error.
 void fitToDriver(const PreviewOptions& options, Pictures& pictures);
 
-Look lookFor(const PreviewOptions& options);
+// On failure says why in `error`.
+std::optional<Look> chooseLook(const PreviewOptions& options, std::string& error);

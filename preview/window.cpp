@@ -101,6 +101,8 @@ bool fail(const std::string& what, std::string& error) {
 }  // namespace
 
 bool runWindow(const PreviewOptions& options, std::string& error) {
+    const std::optional<Look> look = chooseLook(options, error);
+    if (!look) return false;
     std::optional<Pictures> pictures = choosePictures(options, error);
     if (!pictures) return false;
     if (!glfwInit()) return fail("no screen for a window", error);
@@ -125,7 +127,7 @@ bool runWindow(const PreviewOptions& options, std::string& error) {
 
     // The ink draws from this generator as well.
     srand48(static_cast<long>(options.seed));
-    Stage stage{LiveWater(lookFor(options), options.seed), options.withInk, options.rain};
+    Stage stage{LiveWater(*look, options.seed), options.withInk, options.rain};
     stage.water.setPictures(std::move(*pictures));
     stage.water.setInk(stage.withInk);
     stage.water.setRain(stage.raining);

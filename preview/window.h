@@ -5,6 +5,6 @@
 
 #include "preview/preview.h"
 
-// Returns when the window is closed. Takes the pictures, the size, the seed, the ink and the rain of the options. On
-// failure says why in `error`.
+// Returns when the window is closed. Takes the pictures, the look, the size, the seed, the ink and the rain of the
+// options. On failure says why in `error`.
 bool runWindow(const PreviewOptions& options, std::string& error);

@@ -9,10 +9,10 @@ static int integer(JNIEnv* env, jobject bitmap, const char* getter) {
     return value;
 }
 
-static void countLock(JNIEnv* env, jobject bitmap, int change) {
+static void count(JNIEnv* env, jobject bitmap, const char* counter, int change) {
     const jclass type = env->GetObjectClass(bitmap);
-    const jfieldID locks = env->GetStaticFieldID(type, "locks", "I");
-    env->SetStaticIntField(type, locks, env->GetStaticIntField(type, locks) + change);
+    const jfieldID field = env->GetStaticFieldID(type, counter, "I");
+    env->SetStaticIntField(type, field, env->GetStaticIntField(type, field) + change);
     env->DeleteLocalRef(type);
 }
 
@@ -34,12 +34,13 @@ int AndroidBitmap_lockPixels(JNIEnv* env, jobject bitmap, void** address) {
     if (!buffer) return ANDROID_BITMAP_RESULT_ALLOCATION_FAILED;
     *address = env->GetDirectBufferAddress(buffer);
     env->DeleteLocalRef(buffer);
-    countLock(env, bitmap, 1);
+    count(env, bitmap, "locks", 1);
+    count(env, bitmap, "locksMade", 1);
     return ANDROID_BITMAP_RESULT_SUCCESS;
 }
 
 int AndroidBitmap_unlockPixels(JNIEnv* env, jobject bitmap) {
     if (!bitmap) return ANDROID_BITMAP_RESULT_BAD_PARAMETER;
-    countLock(env, bitmap, -1);
+    count(env, bitmap, "locks", -1);
     return ANDROID_BITMAP_RESULT_SUCCESS;
 }

@@ -11,8 +11,9 @@ public final class Bitmap {
 
     /** R, G, B, A, rows from the top; null where a pixel has not four bytes. */
     public final ByteBuffer pixels;
-    /** Locks of all bitmaps that are not yet undone. */
+    /** Locks of all bitmaps that are not yet undone, and those that ever were made. */
     public static int locks;
+    public static int locksMade;
 
     private final int[] colors;
     private final int width;

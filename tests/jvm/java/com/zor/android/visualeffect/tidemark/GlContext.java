@@ -24,6 +24,9 @@ final class GlContext {
         return pixels;
     }
 
+    /** What the library has logged since the last call, a line each. */
+    static native String takeLog();
+
     static native void release();
 
     private static native String renew(int width, int height);

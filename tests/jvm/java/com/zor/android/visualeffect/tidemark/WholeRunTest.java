@@ -2,7 +2,7 @@ package com.zor.android.visualeffect.tidemark;
 
 import android.graphics.Bitmap;
 
-import java.awt.image.BufferedImage;
+import java.io.ByteArrayInputStream;
 import java.io.IOException;
 import java.lang.reflect.Method;
 import java.lang.reflect.Modifier;
@@ -10,80 +10,98 @@ import java.nio.file.Files;
 import java.nio.file.Path;
 import java.util.ArrayList;
 import java.util.Arrays;
+import java.util.HashMap;
 import java.util.List;
+import java.util.Map;
 
-import javax.imageio.ImageIO;
-
-/** Plays a scene to the host in Java: its pictures are those of the host in C++, byte for byte. */
+/** Plays a scene to the host in Java: frames, log and pictures are those of the host in C++, byte for byte. */
 public final class WholeRunTest {
+    private static final int SIDE = 160;  // of the framebuffer
+
     private final Path reference;
-    private final Pictures pictures;
     private final JniTidemarkRender library = new JniTidemarkRender();
+    private final LiveWater water = new LiveWater(library, new Look(), 1);
+    private final Map<String, Bitmap> pictures = new HashMap<>();
+    private final StringBuilder journal = new StringBuilder();
     private final List<byte[]> seen = new ArrayList<>();
-    private WaterHost host;
     private int width;
     private int height;
-    private boolean withInk;
+    private double now;
     private int drawn;
+    private int waited;
+    private int drawnInAll;
 
     public static void main(String[] arguments) throws IOException {
         WholeRunTest test = new WholeRunTest(Path.of(arguments[1]));
         for (String line : Files.readAllLines(Path.of(arguments[0]))) {
-            String[] words = line.trim().split("\\s+");
-            if (!words[0].isEmpty() && !words[0].startsWith("#")) test.play(words);
+            if (!line.isEmpty() && !line.startsWith("#")) test.playLine(line);
         }
         test.checkEnd(Files.readString(Path.of(arguments[2])));
         GlContext.release();
     }
 
-    private WholeRunTest(Path reference) throws IOException {
+    private WholeRunTest(Path reference) {
         this.reference = reference;
-        pictures = new Pictures(read("portrait.png"), read("landscape.png"), read("water.png"));
     }
 
-    private Bitmap read(String name) throws IOException {
-        BufferedImage image = ImageIO.read(reference.resolve(name).toFile());
-        int[] colors = image.getRGB(0, 0, image.getWidth(), image.getHeight(), null, 0, image.getWidth());
-        return Bitmap.createBitmap(colors, image.getWidth(), image.getHeight(), Bitmap.Config.ARGB_8888);
+    private void playLine(String line) throws IOException {
+        drawn = waited = 0;
+        play(line.split(" "));
+        journal.append(line + ": " + drawn + " drawn, " + waited + " waited\n" + GlContext.takeLog());
+        drawnInAll += drawn;
     }
 
     private void play(String[] words) throws IOException {
         switch (words[0]) {
-            case "view":
+            case "picture":
+                pictures.put(words[1], read(words[1], Integer.parseInt(words[2]), Integer.parseInt(words[3])));
+                break;
+            case "pictures":
+                water.setPictures(
+                        new Pictures(pictures.get(words[1]), pictures.get(words[2]), pictures.get(words[3])));
+                break;
+            case "context":
+                GlContext.open(SIDE, SIDE);
+                water.renewContext();
+                break;
+            case "resize":
                 width = Integer.parseInt(words[1]);
                 height = Integer.parseInt(words[2]);
-                GlContext.open(width, height);
-                if (host == null) host = new WaterHost(library, new Look(), width, height, 1);
-                host.resize(width, height);
-                host.handOver(pictures);
-                host.setUp(withInk);
-                break;
-            case "lose":
-                GlContext.open(width, height);
-                host.setUp(withInk);
+                water.resize(width, height);
                 break;
             case "ink":
-                withInk = words[1].equals("on");
-                host.setUp(withInk);
+                water.setInk(words[1].equals("on"));
                 break;
             case "rain":
-                host.rain(words[1].equals("on"));
+                water.setRain(words[1].equals("on"));
+                break;
+            case "look":
+                water.setLook(look(words));
+                break;
+            case "clear":
+                water.clearInk();
+                library.getClearInkValue();
+                break;
+            case "redraw":
+                water.redraw();
                 break;
             case "touch":
-                touch(Integer.parseInt(words[1]), Integer.parseInt(words[2]), Integer.parseInt(words[3]),
+                water.touch(Integer.parseInt(words[1]), Integer.parseInt(words[2]), Integer.parseInt(words[3]),
                         Float.parseFloat(words[4]));
                 break;
             case "stroke":
                 stroke(Arrays.stream(words, 1, 6).mapToInt(Integer::parseInt).toArray(), Float.parseFloat(words[6]));
                 break;
-            case "clear":
-                host.clearInk();
-                Check.equal(0, library.getClearInkValue(), "ink value of cleared water");
-                break;
             case "frames":
-                drawFrames(Integer.parseInt(words[1]));
+                for (int i = Integer.parseInt(words[1]); i > 0; --i) frame(Double.parseDouble(words[2]));
                 break;
-            case "picture":
+            case "rest":
+                while (frame(60) != LiveWater.Frame.RESTING && drawn < 2000) continue;
+                break;
+            case "wait":
+                now += Double.parseDouble(words[1]);
+                break;
+            case "keep":
                 comparePicture(words[1]);
                 break;
             default:
@@ -91,55 +109,59 @@ public final class WholeRunTest {
         }
     }
 
-    private void touch(int action, int x, int y, float pressure) {
-        host.touch(action, x, y, pressure);
-        int value = action == WaterHost.CANCEL ? 0 : 1;
-        if (withInk) Check.equal(value, library.getClearInkValue(), "ink value of a touch");
+    private Bitmap read(String name, int columns, int rows) throws IOException {
+        byte[] rgba = Files.readAllBytes(reference.resolve(name + ".rgba"));
+        int[] colors = new int[columns * rows];
+        for (int i = 0; i < colors.length; ++i) {
+            colors[i] = 0xff000000 | (rgba[4 * i] & 255) << 16 | (rgba[4 * i + 1] & 255) << 8 | rgba[4 * i + 2] & 255;
+        }
+        return Bitmap.createBitmap(colors, columns, rows, Bitmap.Config.ARGB_8888);
+    }
+
+    private static Look look(String[] words) throws IOException {
+        StringBuilder lines = new StringBuilder();
+        for (int i = 1; i < words.length; i += 2) lines.append(words[i] + " = " + words[i + 1] + "\n");
+        return Look.load(new ByteArrayInputStream(lines.toString().getBytes()));
     }
 
     private void stroke(int[] path, float pressure) {
-        int frames = path[4];
-        touch(WaterHost.DOWN, path[0], path[1], pressure);
-        for (int i = 1; i <= frames; ++i) {
-            int x = path[0] + (path[2] - path[0]) * i / frames;
-            int y = path[1] + (path[3] - path[1]) * i / frames;
-            touch(WaterHost.MOVE, x, y, pressure);
-            drawFrames(1);
+        water.touch(WaterHost.DOWN, path[0], path[1], pressure);
+        for (int i = 1; i <= path[4]; ++i) {
+            int x = path[0] + (path[2] - path[0]) * i / path[4];
+            int y = path[1] + (path[3] - path[1]) * i / path[4];
+            water.touch(WaterHost.MOVE, x, y, pressure);
+            frame(60);
         }
-        touch(WaterHost.UP, path[2], path[3], pressure);
     }
 
     // The collector moves every array between the frames.
-    private void drawFrames(int count) {
-        for (int i = 0; i < count; ++i) {
-            if (!host.advance(1.0 / 60)) continue;
-            host.draw();
-            ++drawn;
-            System.gc();
-        }
+    private LiveWater.Frame frame(double rate) {
+        LiveWater.Frame frame = water.frame(now += 1 / rate);
+        if (frame == LiveWater.Frame.DRAWN) ++drawn;
+        if (frame == LiveWater.Frame.WAITING) ++waited;
+        System.gc();
+        return frame;
     }
 
     private void comparePicture(String name) throws IOException {
         byte[] expected = Files.readAllBytes(reference.resolve(name + ".rgba"));
         byte[] actual = GlContext.pixels(width, height);
-        Check.equal(expected.length, actual.length, "bytes of " + name);
-        int differing = 0;
-        for (int i = 0; i < actual.length; ++i) {
-            if (actual[i] != expected[i]) ++differing;
-        }
-        Check.equal(0, differing, "differing bytes of " + name);
+        Check.that(Arrays.equals(expected, actual), name + " differs");
         for (byte[] other : seen) Check.that(!Arrays.equals(other, actual), name + " shows nothing new");
         seen.add(actual);
     }
 
     private void checkEnd(String linkLog) throws IOException {
-        Check.equal(Files.readString(reference.resolve("drawn")).trim(), Integer.toString(drawn), "frames drawn");
-        Check.that(drawn >= 2000, "only " + drawn + " frames");
+        String[] actual = journal.toString().split("\n");
+        List<String> expected = Files.readAllLines(reference.resolve("journal"));
+        for (int i = 0; i < actual.length; ++i) Check.equal(expected.get(i), actual[i], "line " + i);
+        Check.equal(expected.size(), actual.length, "lines of the journal");
+        Check.that(drawnInAll >= 2000, "only " + drawnInAll + " frames");
         Check.equal(0, Bitmap.locks, "bitmaps left locked");
         for (Method method : JniTidemarkRender.class.getDeclaredMethods()) {
             String name = JniTidemarkRender.class.getName() + "." + method.getName() + " ";
             if (Modifier.isNative(method.getModifiers())) Check.that(linkLog.contains(name), name + "was never called");
         }
-        System.out.println(drawn + " frames, " + seen.size() + " pictures as in C++");
+        System.out.println(drawnInAll + " frames, " + seen.size() + " pictures as in C++");
     }
 }

@@ -4,6 +4,13 @@ import android.graphics.Bitmap;
 
 /** The three pictures of the effect. The backgrounds may be larger or of other proportions than the view. */
 public final class Pictures {
+    /** Some of the three, as a sum. */
+    public static final int PORTRAIT = 1;
+    public static final int LANDSCAPE = 2;
+    public static final int BACKGROUNDS = 3;
+    public static final int WATER = 4;
+    public static final int ALL = 7;
+
     private final Bitmap portrait;
     private final Bitmap landscape;
     private final Bitmap water;
@@ -15,10 +22,21 @@ public final class Pictures {
         this.water = water;
     }
 
-    void handOver(JniTidemarkRender library, int shorter, int longer) {
-        library.transferPortraitBGBitmap(asRgba(cropToAspect(portrait, shorter, longer)));
-        library.transferLandscapeBGBitmap(asRgba(cropToAspect(landscape, longer, shorter)));
-        library.transferWaterBitmap(asRgba(water));
+    /** Those that are other bitmaps than in {@code before}, which may be null. */
+    int newSince(Pictures before) {
+        if (before == null) return ALL;
+        return (portrait == before.portrait ? 0 : PORTRAIT) | (landscape == before.landscape ? 0 : LANDSCAPE)
+                | (water == before.water ? 0 : WATER);
+    }
+
+    void handOver(JniTidemarkRender library, int which, int shorter, int longer) {
+        if ((which & PORTRAIT) != 0) {
+            library.transferPortraitBGBitmap(asRgba(cropToAspect(portrait, shorter, longer)));
+        }
+        if ((which & LANDSCAPE) != 0) {
+            library.transferLandscapeBGBitmap(asRgba(cropToAspect(landscape, longer, shorter)));
+        }
+        if ((which & WATER) != 0) library.transferWaterBitmap(asRgba(water));
     }
 
     /** The largest middle part of {@code picture} that has the proportions aspectWidth : aspectHeight. */

@@ -12,7 +12,8 @@ import android.view.MotionEvent;
  * library serves a single effect.
  */
 public class TidemarkView extends GLSurfaceView {
-    final TidemarkRenderer renderer = new TidemarkRenderer(new Look(), this::requestRender);
+    private final LiveWater water = new LiveWater(new JniTidemarkRender(), new Look(), (int) System.nanoTime());
+    final TidemarkRenderer renderer = new TidemarkRenderer(water, this::requestRender);
     private final FirstFinger finger = new FirstFinger(this::forwardTouch);
 
     public TidemarkView(Context context) {
@@ -32,23 +33,23 @@ public class TidemarkView extends GLSurfaceView {
      * backgrounds are cropped to the view; no side may be longer than the device's largest texture, 2048 pixels being
      * safe everywhere. Keep the bitmaps unchanged while the view uses them.
      */
-    public void setPictures(Bitmap portrait, Bitmap landscape, Bitmap water) {
-        Pictures pictures = new Pictures(portrait, landscape, water);
-        queueEvent(() -> renderer.setPictures(pictures));
+    public void setPictures(Bitmap portrait, Bitmap landscape, Bitmap light) {
+        Pictures pictures = new Pictures(portrait, landscape, light);
+        change(() -> water.setPictures(pictures));
     }
 
     /** Whether touches drop ink; they do not at first. */
     public void setInk(boolean withInk) {
-        queueEvent(() -> renderer.setInk(withInk));
+        change(() -> water.setInk(withInk));
     }
 
     public void clearInk() {
-        queueEvent(renderer::clearInk);
+        change(water::clearInk);
     }
 
     /** Whether it rains; it does not at first. */
     public void setRain(boolean falling) {
-        queueEvent(() -> renderer.setRain(falling));
+        change(() -> water.setRain(falling));
     }
 
     @Override
@@ -65,6 +66,13 @@ public class TidemarkView extends GLSurfaceView {
 
     // The event itself is recycled before the GL thread could read it.
     private void forwardTouch(int action, int x, int y, float pressure) {
-        queueEvent(() -> renderer.touch(action, x, y, pressure));
+        change(() -> water.touch(action, x, y, pressure));
+    }
+
+    private void change(Runnable call) {
+        queueEvent(() -> {
+            call.run();
+            requestRender();
+        });
     }
 }

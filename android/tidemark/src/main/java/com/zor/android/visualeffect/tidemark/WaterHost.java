@@ -17,15 +17,16 @@ public final class WaterHost {
     public static final int CANCEL = 3;
 
     private final JniTidemarkRender library;
-    private final Look look;
+    private Look look;
     private final RainChance chance;
 
     private int width;
     private int height;
     private boolean raining;
     private boolean withInk;
+    private boolean isSetUp;
     private boolean fingerDown;
-    private int inkFrames;  // until the ink has faded
+    private int inkFrames;  // until the ink has faded: the library does not tell whether any is left
     private boolean changed = true;  // since the last draw
     private int calmSteps;  // in a row
     private double dueSteps;  // that the time passed so far still asks for
@@ -49,7 +50,7 @@ public final class WaterHost {
     /** {@code seed} fixes where the rain falls. The view is width x height pixels, each at least 1. */
     public WaterHost(JniTidemarkRender library, Look look, int width, int height, int seed) {
         this.library = library;
-        this.look = look;
+        this.look = look.clone();
         chance = new RainChance(seed);
         calmSteps = look.stepsToRest;
         int vertices = look.meshVertices * look.meshVertices;
@@ -62,7 +63,9 @@ public final class WaterHost {
         resize(width, height);
     }
 
-    /** {@link #setUp} must follow, and before it another hand-over when the proportions have changed. */
+    /**
+     * {@link #setUp} must follow, and before it another hand-over of the backgrounds where the proportions have changed.
+     */
     public void resize(int width, int height) {
         this.width = width;
         this.height = height;
@@ -81,29 +84,68 @@ public final class WaterHost {
         changed = true;
     }
 
-    /** Hands the pictures over, each background cropped to the view that it is for; before {@link #setUp}. */
-    public void handOver(Pictures pictures) {
-        pictures.handOver(library, Math.min(pictureWidth, pictureHeight), Math.max(pictureWidth, pictureHeight));
+    /** Shorter by longer side of the views that the backgrounds are cropped to, upright and across. */
+    public double proportions() {
+        return (double) Math.min(pictureWidth, pictureHeight) / Math.max(pictureWidth, pictureHeight);
     }
 
-    /** Sets the library up in the current context, with or without ink; again after a lost context or a resize. */
-    public void setUp(boolean withInk) {
-        this.withInk = withInk;
-        inkFrames = 0;
+    /**
+     * Hands pictures over, of which the library keeps copies; before {@link #setUp} or {@link #loadTextures}.
+     *
+     * @param which a sum of {@link Pictures}' numbers
+     */
+    public void handOver(Pictures pictures, int which) {
+        pictures.handOver(library, which, Math.min(pictureWidth, pictureHeight), Math.max(pictureWidth, pictureHeight));
+    }
+
+    /**
+     * Sets the library up in the current context, with or without ink. A new context needs all textures; one that goes
+     * on, with another size or mode, keeps those that it has.
+     */
+    public void setUp(boolean withInk, int textures) {
         library.onInitSetting(width, height, withInk);
         library.onInitGPU();
-        library.onLoadPortraitBGTextures();
-        library.onLoadLandscapeBGTextures();
-        library.onLoadWaterTextures();
-        library.initWaters(positions, indices, look.meshVertices * look.meshVertices, look.meshExtent, look.meshExtent,
-                look.meshVertices, look.meshVertices);
+        // The library would keep a stroke that the switch interrupts and go on with it at the next touch.
+        if (withInk != this.withInk) library.clearInkValue();
+        this.withInk = withInk;
+        inkFrames = 0;
+        loadTextures(textures);
+        if (!isSetUp) {
+            library.initWaters(positions, indices, look.meshVertices * look.meshVertices, look.meshExtent,
+                    look.meshExtent, look.meshVertices, look.meshVertices);
+        }
+        isSetUp = true;
         changed = true;
     }
 
-    /** One touch event: pixels from the top left corner of the view, one of the actions above, pressure around 1. */
+    /** Shows pictures handed over since {@link #setUp}; the water and the ink stay as they are. */
+    public void loadTextures(int which) {
+        if ((which & Pictures.PORTRAIT) != 0) library.onLoadPortraitBGTextures();
+        if ((which & Pictures.LANDSCAPE) != 0) library.onLoadLandscapeBGTextures();
+        if ((which & Pictures.WATER) != 0) library.onLoadWaterTextures();
+        changed |= which != 0;
+    }
+
+    /** Takes over all values but those of the mesh, which must be the same. */
+    public void setLook(Look look) {
+        this.look = look.clone();
+        changed = true;
+    }
+
+    /** Where the framebuffer has lost the last frame. */
+    public void redraw() {
+        changed = true;
+    }
+
+    /**
+     * One touch event: pixels from the top left corner of the view, one of the actions above, pressure around 1. A
+     * stroke begins with the finger's coming down. Like the other calls below it does nothing before the first
+     * {@link #setUp}.
+     */
     public void touch(int action, int x, int y, float pressure) {
+        if (!isSetUp) return;
         raiseTouchRipples(action, x, y, look.touchAmplitude * pressure);
-        fingerDown = action == DOWN || action == MOVE;
+        fingerDown = action == DOWN || action == MOVE && fingerDown;
         if (!withInk) return;
         library.onTouch(x, y, action, pressure);
         inkFrames = look.framesToFade;
@@ -116,12 +158,14 @@ public final class WaterHost {
 
     /** Lets all ink vanish with the next frame. */
     public void clearInk() {
+        if (!isSetUp) return;
         library.clearInkValue();
         changed = true;
     }
 
     /** Advances the water by {@code seconds} and says whether the picture has changed since the last draw. */
     public boolean advance(double seconds) {
+        if (!isSetUp) return false;
         dueSteps += Math.min(seconds, look.longestFrame) * look.stepsPerSecond;
         // The small extra lets a frame of exactly one step's length bring its step in spite of rounding.
         for (; dueSteps > 1 - 1.0e-6; dueSteps -= 1) {
@@ -156,7 +200,7 @@ public final class WaterHost {
         float modelY = (0.5f - (float) y / height) * visibleHeight;
         if (action == DOWN) {
             raiseRipple(modelX, modelY, amplitude);
-        } else if (action == MOVE) {
+        } else if (action == MOVE && fingerDown) {
             float spacing = look.trailCells * look.meshExtent / (look.meshVertices - 1);
             float dx = modelX - touchX;
             float dy = modelY - touchY;

@@ -1,0 +1,70 @@
+#include "host/look_file.h"
+
+#include <algorithm>
+#include <cerrno>
+#include <cstring>
+#include <fstream>
+#include <sstream>
+#include <type_traits>
+
+#include "host/look_fields.h"
+
+namespace {
+
+std::string trimmed(const std::string& text) {
+    constexpr char kBlanks[] = " \t\r";
+    const std::size_t first = text.find_first_not_of(kBlanks);
+    return first == text.npos ? "" : text.substr(first, text.find_last_not_of(kBlanks) + 1 - first);
+}
+
+// An empty text when the line is a good one.
+std::string readLine(const std::string& line, Look& look) {
+    const std::size_t sign = line.find('=');
+    if (sign == line.npos) return "expected \"key = number\"";
+    const std::string key = trimmed(line.substr(0, sign));
+    const std::string value = trimmed(line.substr(sign + 1));
+    const auto* const field = std::ranges::find(kLookFields, key, &LookField::name);
+    if (field == std::end(kLookFields)) return "there is no value \"" + key + "\"";
+    const auto read = [&](auto member) {
+        std::istringstream words(value);
+        if (!(words >> look.*member) || !words.eof()) return key + " takes no \"" + value + "\"";
+        using Number = std::remove_reference_t<decltype(look.*member)>;
+        const auto least = static_cast<Number>(field->least);
+        const auto most = static_cast<Number>(field->most);
+        if (look.*member >= least && look.*member <= most) return std::string();
+        std::ostringstream limits;
+        limits << key << " must be " << least << " to " << most << ", not " << value;
+        return limits.str();
+    };
+    return std::visit(read, field->member);
+}
+
+}  // namespace
+
+std::optional<Look> readLook(std::istream& text, const std::string& name, std::string& error) {
+    Look look;
+    std::string line;
+    for (int number = 1; std::getline(text, line); ++number) {
+        line = trimmed(line);
+        if (line.empty() || line[0] == '#') continue;
+        const std::string problem = readLine(line, look);
+        if (!problem.empty()) {
+            error = name + ":" + std::to_string(number) + ": " + problem;
+            return std::nullopt;
+        }
+    }
+    if (text.bad()) {
+        error = "cannot read the look " + name;
+        return std::nullopt;
+    }
+    return look;
+}
+
+std::optional<Look> loadLook(const std::string& path, std::string& error) {
+    std::ifstream file(path);
+    if (!file) {
+        error = "cannot read the look " + path + ": " + std::strerror(errno);
+        return std::nullopt;
+    }
+    return readLook(file, path, error);
+}

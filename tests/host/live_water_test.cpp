@@ -1,5 +1,6 @@
 #include "host/live_water.h"
 
+#include "jni/bitmaps.h"
 #include "tests/support/gesture_state.h"
 #include "tests/support/gl_test.h"
 #include "tests/support/test_pictures.h"
@@ -36,6 +37,26 @@ protected:
 
     std::vector<Rgba> seen() const { return readPixels(kWidth, kHeight); }
 
+    // What the next frame tells the library: P, L and W for hand-overs, | for a set-up, p, l and w for texture loads.
+    std::string told() {
+        constexpr std::uint32_t kMark = 4711;
+        AndroidBitmapInfo* const slots[] = {&bmp_portrait_bg_info, &bmp_landscape_bg_info, &bmp_water_Info};
+        for (AndroidBitmapInfo* slot : slots) slot->flags = kMark;
+        log.take();
+        next();
+        std::string calls;
+        for (std::size_t i = 0; i < 3; ++i) {
+            if (slots[i]->flags != kMark) calls += "PLW"[i];
+        }
+        for (const std::string& line : log.take()) {
+            if (line == "I onInitSetting") calls += '|';
+            if (line == "I onLoadPortraitBGTextures") calls += 'p';
+            if (line == "I onLoadLandscapeBGTextures") calls += 'l';
+            if (line.starts_with("I glDelete environment")) calls += 'w';
+        }
+        return calls;
+    }
+
     LiveWater water{Look{}, 1};
     double now = 100.0;
 };
@@ -46,8 +67,10 @@ TEST_F(Live, drawsWhatHasChangedAndRestsOtherwise) {
     LiveWater without(Look{}, 1);
     EXPECT_EQ(without.frame(0.0), Frame::resting) << "there is no picture yet";
 
+    water.touch(TouchAction::down, 20, 30, 1.0f);
+    water.clearInk();
     EXPECT_EQ(next(), Frame::drawn);
-    EXPECT_EQ(next(), Frame::resting);
+    EXPECT_EQ(next(), Frame::resting) << "a touch before there is water";
     water.touch(TouchAction::down, 20, 30, 1.0f);
     EXPECT_EQ(next(), Frame::drawn);
     EXPECT_EQ(water.frame(now + 0.004), Frame::waiting) << "one step a frame is enough";
@@ -64,22 +87,63 @@ TEST_F(Live, drawsWhatHasChangedAndRestsOtherwise) {
     EXPECT_LT(framesToRest(), 600);
 }
 
+TEST_F(Live, tellsTheLibraryOnlyWhatHasChanged) {
+    next();
+    water.setInk(true);
+    EXPECT_EQ(told(), "|");
+    water.resize(kHeight, kWidth);
+    EXPECT_EQ(told(), "|") << "the backgrounds fit the view that was turned";
+    water.resize(kHeight, kHeight);
+    EXPECT_EQ(told(), "PL|pl");
+    water.setPictures(pictures(1));
+    EXPECT_EQ(told(), "");
+    Pictures others = pictures(1);
+    others.landscape = pictures(2).landscape;
+    water.setPictures(others);
+    EXPECT_EQ(told(), "Ll");
+    renewContext(kWidth, kHeight);
+    water.renewContext();
+    EXPECT_EQ(told(), "|plw") << "the library has copies";
+    Look look;
+    look.meshVertices = 64;
+    water.setLook(look);
+    EXPECT_EQ(told(), "|");
+    look.meshExtent = 20;
+    water.setLook(look);
+    water.resize(kWidth, kHeight);
+    water.setPictures(pictures(3));
+    EXPECT_EQ(told(), "PLW|plw");
+}
+
 TEST_F(Live, aPauseIsNotMadeUpFor) {
-    const auto ringAfter = [this](double pause) {
-        water.setLook([] {
-            Look other;
-            other.meshVertices = 32;
-            return other;
-        }());
-        water.setLook(Look{});
+    enum Pause { kAfterTheLastFrame, kAfterRainWithoutADrop, kInTheWaves };
+    const auto ringAfter = [this](Pause pause, double seconds) {
+        Look look;
+        look.rainDropsPerSecond = 0.0f;
+        for (const int vertices : {32, 128}) {
+            look.meshVertices = vertices;
+            water.setLook(look);
+        }
         next();
-        next();
-        now += pause;
+        if (pause == kAfterRainWithoutADrop) {
+            water.setRain(true);
+            EXPECT_EQ(next(), Frame::waiting);
+            water.setRain(false);
+            EXPECT_EQ(next(), Frame::resting);
+        }
+        if (pause != kInTheWaves) now += seconds;
         water.touch(TouchAction::down, 20, 30, 1.0f);
-        for (int i = 0; i < 6; ++i) next();
+        for (int i = 0; i < 3; ++i) next();
+        if (pause == kInTheWaves) {
+            water.resize(kWidth, kHeight);
+            now += seconds;
+        }
+        for (int i = 0; i < 3; ++i) next();
         return seen();
     };
-    EXPECT_EQ(ringAfter(0.0), ringAfter(60.0));
+    for (const Pause pause : {kAfterTheLastFrame, kAfterRainWithoutADrop, kInTheWaves}) {
+        EXPECT_TRUE(ringAfter(pause, 60.0) == ringAfter(pause, 0.0)) << pause;
+    }
 }
 
 TEST_F(Live, aLookChangesOnWavingWaterAndOnAnotherMeshStartsFlat) {

@@ -145,6 +145,11 @@ TEST_F(PreviewProgram, TouchesMoveTheWaterInTheFrameThatTheyFallInto) {
     EXPECT_EQ(readFile("o/frame-0000.png"), readFile("o/frame-0001.png"));
     EXPECT_NE(readFile("o/frame-0001.png"), readFile("o/frame-0002.png"));
     EXPECT_NE(readFile("o/frame-0002.png"), readFile("o/frame-0003.png"));
+    const std::string numb = beside("numb.look", "touchAmplitude = 0\n");
+    expectSuccess(run(
+        {"--size", "48x80", "--fps", "20", "--seconds", "0.25", "--script", script, "--no-ink", "--look", numb, "--out",
+         "numb"}));
+    EXPECT_EQ(readFile("numb/frame-0001.png"), readFile("numb/frame-0003.png"));
     // Left to itself a scene outlasts its script.
     expectSuccess(run({"--size", "48x80", "--fps", "10", "--script", script, "--out", "whole"}));
     EXPECT_TRUE(fs::exists("whole/frame-0015.png"));
@@ -211,6 +216,7 @@ TEST_F(PreviewProgram, ShowsTheInsideOfAStroke) {
 TEST_F(PreviewProgram, RefusesBadInputInOneLineAndLeavesNothing) {
     const std::string junk = beside("junk.png", "not a picture");
     const std::string badLine = beside("bad.touch", "0 down 1 1 1\n\n5 tap 1 1 1\n");
+    const std::string badLook = beside("bad.look", "damping = 0.9\ndamping = 2\n");
     const struct {
         std::vector<std::string> arguments;
         std::string reason;
@@ -219,6 +225,7 @@ TEST_F(PreviewProgram, RefusesBadInputInOneLineAndLeavesNothing) {
         {{"--landscape", junk}, "junk.png is not a PNG or JPEG"},
         {{"--water", "/"}, "/ is not a PNG or JPEG"},
         {{"--script", badLine}, "bad.touch:3: "},
+        {{"--look", badLook}, "bad.look:2: "},
         {{"--script", "none.touch"}, "none.touch: No such file"},
         {{"--script", "/"}, "cannot read the touch script /"},
         {{"--out", junk}, "junk.png"},

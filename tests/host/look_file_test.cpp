@@ -1,0 +1,45 @@
+#include "host/look_file.h"
+
+#include <gtest/gtest.h>
+
+#include <sstream>
+
+static std::optional<Look> read(const std::string& text, std::string& error) {
+    std::istringstream stream(text);
+    return readLook(stream, "a.look", error);
+}
+
+TEST(LookFile, ChangesWhatItNamesAndNothingElse) {
+    std::string error;
+    const std::optional<Look> look = read("# calm\r\n\n  damping=0.9\r\nmeshVertices = 64\ndamping = 0.95", error);
+    ASSERT_TRUE(look) << error;
+    EXPECT_EQ(look->damping, 0.95f);
+    EXPECT_EQ(look->meshVertices, 64);
+    EXPECT_EQ(look->waveSpeed, Look{}.waveSpeed);
+
+    const std::optional<Look> shipped = loadLook(TIDEMARK_LOOK_PATH, error);
+    ASSERT_TRUE(shipped) << error;
+    EXPECT_EQ(shipped->framesToFade, Look{}.framesToFade);
+    EXPECT_FALSE(loadLook("no.look", error));
+    EXPECT_NE(error.find("no.look"), std::string::npos) << error;
+}
+
+TEST(LookFile, NamesTheLineThatIsWrong) {
+    for (const auto& [line, reason] :
+         {std::pair{"damping 0.9", "key = number"},
+          {"dampening = 0.9", "dampening"},
+          {"damping =", "damping"},
+          {"damping = 0.9f", "0.9f"},
+          {"damping = nan", "nan"},
+          {"damping = 0.9 0.9", "damping"},
+          {"damping = 1.001", "0 to 1"},
+          {"damping = -0.001", "0 to 1"},
+          {"meshVertices = 64.5", "64.5"},
+          {"meshVertices = 257", "2 to 256"},
+          {"meshVertices = 99999999999", "meshVertices"}}) {
+        std::string error;
+        EXPECT_FALSE(read("waveSpeed = 0.5\npictureZoom = 0.1\n" + std::string(line) + "\n", error)) << line;
+        EXPECT_EQ(error.rfind("a.look:3: ", 0), 0U) << error;
+        EXPECT_NE(error.find(reason), std::string::npos) << error;
+    }
+}

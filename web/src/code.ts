@@ -2,7 +2,7 @@
 import { chosenKeys, lookKeys } from './look';
 import type { Settings } from './settings';
 
-const chosen = new Set(chosenKeys.map(({ key }) => key));
+const chosen = new Set(chosenKeys.map(({ name }) => name));
 
 function assignments({ look }: Settings): string {
     return lookKeys

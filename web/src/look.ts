@@ -1,4 +1,4 @@
-// The numbers of host/look.properties, which the hosts in C++ and Java read as well.
+// The numbers of host/look.properties, which the hosts in C++ and Java keep to as well.
 import properties from '../../host/look.properties?raw';
 
 export type Look = Record<string, number>;
@@ -8,57 +8,40 @@ export interface LookKey {
     value: number;
     whole: boolean;
     help: string;
+    min: number;  // of the range that looks well
+    max: number;
 }
 
 // In the file's order, which is that of the fields in C++.
 export const lookKeys: LookKey[] = [];
 
-let help = '';
-for (const line of properties.split('\n')) {
-    const [name, value] = line.split('=').map((part) => part.trim());
-    if (line.startsWith('#')) {
-        help = `${help} ${line.slice(1).trim()}`.trim();
-    } else if (name && value) {
-        lookKeys.push({ name, value: Number(value), whole: !value.includes('.'), help });
-        help = '';
-    }
+for (const entry of properties.matchAll(/((?:# .*\n)+)# range (\S+) to (\S+), limits .*\n(\w+) = (\S+)/g)) {
+    const [help, min, max, name, value] = entry.slice(1) as [string, string, string, string, string];
+    lookKeys.push({
+        name,
+        value: Number(value),
+        whole: !value.includes('.'),
+        help: help.replace(/^# /gm, '').replace(/\n/g, ' ').trim(),
+        min: Number(min),
+        max: Number(max),
+    });
 }
 
 export const defaultLook = (): Look => Object.fromEntries(lookKeys.map(({ name, value }) => [name, value]));
 
-export interface Slider {
-    key: string;
-    min: number;
-    max: number;
-    step: number;
-}
-
-const slider = (key: string, min: number, max: number, step: number): Slider => ({ key, min, max, step });
+const keys = (...names: string[]) => names.map((name) => lookKeys.find((key) => key.name === name)!);
 
 // The values that change the look, by what they change; the others tune how a host works.
-export const sliders: Record<string, Slider[]> = {
-    Waves: [
-        slider('damping', 0.9, 0.998, 0.001),
-        slider('waveSpeed', 0.05, 0.48, 0.01),
-        slider('stepsPerSecond', 30, 120, 1),
-        slider('touchAmplitude', 0.2, 4, 0.1),
-        slider('trailShare', 0, 1, 0.01),
-        slider('trailCells', 0.5, 5, 0.1),
-    ],
-    Light: [
-        slider('refractiveIndex', 1, 2.5, 0.01),
-        slider('alphaMix', 0, 1, 0.01),
-        slider('alphaScale1', 0, 1, 0.01),
-        slider('alphaScale2', 0, 1, 0.01),
-        slider('fresnelRatio', 0, 2, 0.01),
-        slider('specularRatio', 1, 10, 0.1),
-        slider('exponent', 1, 200, 1),
-    ],
-    Rain: [slider('rainDropsPerSecond', 0, 60, 0.5), slider('rainAmplitude', 0.2, 2, 0.1)],
-    Mesh: [slider('meshVertices', 16, 256, 1), slider('meshExtent', 16, 64, 1)],
+export const sliders: Record<string, LookKey[]> = {
+    Waves: keys('damping', 'waveSpeed', 'stepsPerSecond', 'touchAmplitude', 'trailShare', 'trailCells'),
+    Light: keys('refractiveIndex', 'alphaMix', 'alphaScale1', 'alphaScale2', 'fresnelRatio', 'specularRatio', 'exponent'),
+    Rain: keys('rainDropsPerSecond', 'rainAmplitude'),
+    Mesh: keys('meshVertices', 'meshExtent'),
 };
 
-// Brighter ink would light the picture up.
-export const inkKeys = ['inkRed', 'inkGreen', 'inkBlue'].map((key) => slider(key, 0, 0.75, 0.001));
+export const inkKeys = keys('inkRed', 'inkGreen', 'inkBlue');
 
-export const chosenKeys: Slider[] = [...Object.values(sliders).flat(), ...inkKeys];
+export const chosenKeys: LookKey[] = [...Object.values(sliders).flat(), ...inkKeys];
+
+// Between a slider's positions: a power of ten, for thirty of them at least.
+export const stepOf = ({ whole, min, max }: LookKey) => (whole ? 1 : 10 ** Math.floor(Math.log10((max - min) / 30)));

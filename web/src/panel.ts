@@ -1,12 +1,10 @@
 // The panel: every value of the look, presets, and what the water is doing.
 import GUI, { type Controller } from 'lil-gui';
 import { toCpp, toJava } from './code';
-import { inkKeys, lookKeys, sliders } from './look';
+import { inkKeys, sliders, stepOf } from './look';
 import type { Status } from './loop';
 import { applyPreset, presetNames, presetOf } from './presets';
 import { pictureNames, type Settings } from './settings';
-
-const helpOf = Object.fromEntries(lookKeys.map(({ name, help }) => [name, help]));
 
 function copyButton(gui: GUI, title: string, text: () => string): void {
     const button = gui.add({ copy: async () => {
@@ -45,20 +43,20 @@ export function makePanel(settings: Settings, changed: () => void) {
     for (const [title, group] of Object.entries(sliders)) {
         const folder = gui.addFolder(title);
         if (title === 'Rain' || title === 'Mesh') folder.close();
-        for (const { key, min, max, step } of group) {
-            const control = folder.add(look, key, min, max, step).onChange(changed);
-            control.domElement.title = helpOf[key]!;
+        for (const key of group) {
+            const control = folder.add(look, key.name, key.min, key.max, stepOf(key)).onChange(changed);
+            control.domElement.title = key.help;
         }
     }
 
     const ink = { colour: { r: 0, g: 0, b: 0 } };
     const readInk = () => {
-        [ink.colour.r, ink.colour.g, ink.colour.b] = inkKeys.map(({ key }) => settings.look[key]!) as [number, number, number];
+        [ink.colour.r, ink.colour.g, ink.colour.b] = inkKeys.map(({ name }) => settings.look[name]!) as [number, number, number];
     };
     readInk();
     gui.addColor(ink, 'colour').name('Ink colour').onChange(({ r, g, b }: { r: number; g: number; b: number }) => {
         [r, g, b].forEach((value, i) => {
-            look[inkKeys[i]!.key] = Math.min(value, inkKeys[i]!.max);
+            look[inkKeys[i]!.name] = Math.min(value, inkKeys[i]!.max);
         });
         changed();
     });

@@ -20,8 +20,8 @@ export function toHash(settings: Settings): string {
     if (settings.picture !== usual.picture && settings.picture !== 'photo') words.set('picture', settings.picture);
     if (settings.ink !== usual.ink) words.set('ink', settings.ink ? '1' : '0');
     if (settings.rain !== usual.rain) words.set('rain', settings.rain ? '1' : '0');
-    for (const { key } of chosenKeys) {
-        if (settings.look[key] !== usual.look[key]) words.set(key, String(settings.look[key]));
+    for (const { name } of chosenKeys) {
+        if (settings.look[name] !== usual.look[name]) words.set(name, String(settings.look[name]));
     }
     return words.toString();
 }
@@ -34,11 +34,11 @@ export function fromHash(hash: string): Settings {
     if (Object.hasOwn(pictureNames, picture) && picture !== 'photo') settings.picture = picture as PictureName;
     if (words.has('ink')) settings.ink = words.get('ink') === '1';
     if (words.has('rain')) settings.rain = words.get('rain') === '1';
-    for (const { key, min, max, step } of chosenKeys) {
-        const value = Number(words.get(key) || NaN);
+    for (const { name, whole, min, max } of chosenKeys) {
+        const value = Number(words.get(name) || NaN);
         if (Number.isNaN(value)) continue;
         const near = Math.min(Math.max(value, min), max);
-        settings.look[key] = step === 1 ? Math.round(near) : near;
+        settings.look[name] = whole ? Math.round(near) : near;
     }
     return settings;
 }

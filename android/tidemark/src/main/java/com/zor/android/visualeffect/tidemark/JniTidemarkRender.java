@@ -3,14 +3,12 @@ package com.zor.android.visualeffect.tidemark;
 import android.graphics.Bitmap;
 
 /**
- * The native library's whole interface. Most apps want {@link TidemarkView} or {@link WaterHost}, which make these
- * calls in the right order.
+ * The native library's whole interface, for which {@code jni/natives.h} has the last word. Most apps want
+ * {@link TidemarkView} or {@link LiveWater}, which make these calls in the right order. All objects of this class share
+ * one effect.
  *
  * <p><b>Threads.</b> The library takes no lock: call every method on the one thread that owns the OpenGL ES 2.0
- * context, which is the GL thread of a {@code GLSurfaceView}, and forward touches to it with {@code queueEvent}. The
- * three {@code transfer} methods, {@link #initWaters}, {@link #move}, {@link #ripple}, {@link #onTouch},
- * {@link #getClearInkValue} and {@link #clearInkValue} make no GL call and may run on another thread, but never at the
- * same time as any other method of this class. All objects of this class share one effect.
+ * context, which is the GL thread of a {@code GLSurfaceView}, and forward touches to it with {@code queueEvent}.
  *
  * <p><b>Order.</b>
  * <ol>
@@ -21,12 +19,15 @@ import android.graphics.Bitmap;
  * <li>for every frame {@link #move} and {@link #ripple} as the animation asks, {@link #onTouch} for each touch event,
  * {@link #onDrawFrame} once
  * </ol>
- * After the context was lost, or for another view size or another mode, repeat the second and the third step.
+ * After the context was lost, or for another view size or mode, repeat the second and the third step; the third only
+ * where the context is a new one.
  *
  * <p><b>The mesh.</b> N x N vertices in the plane z = 0, N from 2 to 256, stored column by column from the left, each
- * column from the top: the vertex of column c and row r is number {@code c * N + r}. Model x runs to the right and y
- * upwards, from minus to plus half the mesh's size. The arrays belong to the caller, who hands them in again with every
- * call. Lengths and counts are the caller's word: the library compares none of them, and a short array crashes.
+ * column from the top. Model x runs to the right and y upwards, from minus to plus half the mesh's size; the eye is 30
+ * units away. The arrays belong to the caller. Lengths and counts are the caller's word: a short array crashes.
+ *
+ * <p>{@code docs/look.md} gives the ranges in which the numbers of {@link #move}, {@link #ripple} and
+ * {@link #onDrawFrame} look well.
  */
 public final class JniTidemarkRender {
     static {
@@ -42,22 +43,14 @@ public final class JniTidemarkRender {
      */
     public native void transferPortraitBGBitmap(Bitmap bitmap);
 
-    /**
-     * Takes over the background of a view held across; otherwise like {@link #transferPortraitBGBitmap}.
-     *
-     * @param bitmap as there
-     */
+    /** As {@link #transferPortraitBGBitmap}, for the background of a view held across. */
     public native void transferLandscapeBGBitmap(Bitmap bitmap);
 
-    /**
-     * Takes over the picture of the light on the waves; otherwise like {@link #transferPortraitBGBitmap}.
-     *
-     * @param bitmap as there, of any proportions
-     */
+    /** As {@link #transferPortraitBGBitmap}, for the light on the waves, of any proportions. */
     public native void transferWaterBitmap(Bitmap bitmap);
 
     /**
-     * Fixes the size and the mode; {@link #onInitGPU} must follow. Needs the GL context.
+     * Fixes the size and the mode; {@link #onInitGPU} must follow.
      *
      * @param width of the view in pixels, 1 to the driver's largest viewport; with ink at least 12
      * @param height of the view in pixels, likewise
@@ -65,16 +58,16 @@ public final class JniTidemarkRender {
      */
     public native void onInitSetting(int width, int height, boolean withInk);
 
-    /** Makes programs, render targets and buffers of the size and the mode set last. Needs the GL context. */
+    /** Makes programs, render targets and buffers of the size and the mode set last. */
     public native void onInitGPU();
 
-    /** Uploads the background of an upright view that was taken over last. Needs the GL context. */
+    /** Uploads the background of an upright view that was taken over last. */
     public native void onLoadPortraitBGTextures();
 
-    /** Uploads the background of a view held across that was taken over last. Needs the GL context. */
+    /** Uploads the background of a view held across that was taken over last. */
     public native void onLoadLandscapeBGTextures();
 
-    /** Uploads the picture of the light that was taken over last. Needs the GL context. */
+    /** Uploads the picture of the light that was taken over last. */
     public native void onLoadWaterTextures();
 
     /**
@@ -83,29 +76,26 @@ public final class JniTidemarkRender {
      * @param positions receives x, y, z of every vertex in model units; 3 * vertexCount floats
      * @param indices receives two triangles a cell, as unsigned vertex numbers; 6 * (N - 1) * (N - 1) shorts
      * @param vertexCount vertices to fill, N * N
-     * @param meshSizeWidth extent along x in model units, at least 1; the eye is 30 units away
-     * @param meshSizeHeight extent along y in model units, at least 1
-     * @param numDetailsWidth vertices along x, N
-     * @param numDetailsHeight vertices along y, N too
+     * @param meshSizeWidth extent along x in model units, at least 1; meshSizeHeight likewise
+     * @param numDetailsWidth vertices along x, N; numDetailsHeight too
      */
     public native void initWaters(float[] positions, short[] indices, int vertexCount, int meshSizeWidth,
             int meshSizeHeight, int numDetailsWidth, int numDetailsHeight);
 
     /**
-     * Takes one wave step over a rectangle of the two fields. What lies around it is read and stays: at least one
-     * element on every side. On the mesh x and {@code stride} count down a column, y across the columns.
+     * Takes one wave step over a rectangle of the two fields, N * N floats each with element {@code y * stride + x}.
+     * What lies around it is read and stays: at least one element on every side. On the mesh x and {@code stride} count
+     * down a column, y across the columns.
      *
-     * @param velocity speeds in model units a step, N * N floats, element {@code y * stride + x}
-     * @param height heights in model units, N * N floats likewise; kept within -100 to 100
-     * @param xStart first x, at least 1
-     * @param yStart first y, at least 1
-     * @param xEnd one past the last x, at most N - 1
-     * @param yEnd one past the last y, at most N - 1
+     * @param velocity speeds in model units a step
+     * @param height heights in model units; kept within -100 to 100
+     * @param xStart first x, at least 1; yStart likewise
+     * @param xEnd one past the last x, at most N - 1; yEnd likewise
      * @param stride elements from one y to the next, N
      * @param rowCount ignored; N
      * @param checkCalm whether to look for calm
-     * @param damping factor on every speed, 0 to 1, usefully 0.9 to 0.995; 0.94 exactly also smooths the surface more
-     * @param waveSpeed factor on the curvature, 0 to 0.5, above which waves blow up; usefully 0.05 to 0.45
+     * @param damping factor on every speed, 0 to 1; 0.94 exactly also smooths the surface more
+     * @param waveSpeed factor on the curvature, 0 to 0.5, above which waves blow up
      * @return true when every speed lies within -0.009 to 0.009 after the step, and always without {@code checkCalm}
      */
     public native boolean move(float[] velocity, float[] height, int xStart, int yStart, int xEnd, int yEnd, int stride,
@@ -116,13 +106,11 @@ public final class JniTidemarkRender {
      * on the far sides stay as they are. On the mesh a counts down a column and b across the columns.
      *
      * @param field heights (or speeds) in model units, countA * countB floats, element {@code b * countA + a}
-     * @param extentA range of posA, in any unit, at least 1
-     * @param extentB range of posB, in any unit, at least 1
-     * @param countA elements along a, N
-     * @param countB elements along b, N
-     * @param posA where, -extentA / 2 to extentA / 2; beyond it, the part of the cone inside the field is added
-     * @param posB where, -extentB / 2 to extentB / 2 likewise
-     * @param amplitude a third of the cone's height; negative for a hollow, usefully -4 to 4
+     * @param extentA range of posA, in any unit, at least 1; extentB likewise
+     * @param countA elements along a, N; countB likewise
+     * @param posA where, -extentA / 2 to extentA / 2; beyond it, the part of the cone inside the field is added; posB
+     *     likewise
+     * @param amplitude a third of the cone's height; negative for a hollow
      */
     public native void ripple(float[] field, int extentA, int extentB, int countA, int countB, float posA, float posB,
             float amplitude);
@@ -140,29 +128,24 @@ public final class JniTidemarkRender {
 
     /**
      * Draws one frame into the current framebuffer, over the whole view and without clearing it. In ink mode this is
-     * also one step of the ink: draw at 60 frames a second. Needs the GL context.
+     * also one step of the ink: draw at 60 frames a second.
      *
-     * @param positions from {@link #initWaters}, 3 floats a vertex
+     * @param positions from {@link #initWaters}
      * @param heightAttribs for each vertex its height and those of the vertices to its right and above it, 3 floats
-     * @param indices from {@link #initWaters}, 6 shorts a cell
-     * @param positionFloats floats of {@code positions}, 3 * N * N
-     * @param heightFloats floats of {@code heightAttribs}, 3 * N * N
+     * @param indices from {@link #initWaters}
+     * @param positionFloats floats of {@code positions}, 3 * N * N; heightFloats likewise
      * @param indexCount shorts of {@code indices}, 6 * (N - 1) * (N - 1)
      * @param mvp from model units to clip space, 16 floats, column by column; it must not turn or tilt the mesh
-     * @param meshSizeWidth extent along x in model units that the picture covers, at least 1
-     * @param meshSizeHeight extent along y, at least 1
-     * @param numDetailsWidth vertices along x, N
-     * @param numDetailsHeight vertices along y, N too
-     * @param refractiveIndex of the water, 1 (no bending) to 2.5
+     * @param meshSizeWidth extent along x in model units that the picture covers, at least 1; meshSizeHeight likewise
+     * @param numDetailsWidth vertices along x, N; numDetailsHeight too
+     * @param refractiveIndex of the water, 1 for no bending
      * @param alphaMix share of the light's picture on a wave, 0 to 1
      * @param alphaScale1 factor on that share, 0 to 1
-     * @param alphaScale2 factor on the other share, 0 to 1; not read by the shaders of today
-     * @param inkRed ink colour, red, 0 to 0.75; more brightens instead of darkening
-     * @param inkGreen ink colour, green, likewise
-     * @param inkBlue ink colour, blue, likewise
-     * @param fresnelRatio extra light on slopes that face the light, 0 to 2
-     * @param specularRatio strength of the highlights, 1 to 5.5, with ink to 4.5
-     * @param exponent sharpness of the highlights, 1 (broad) to 200 (pinpoint)
+     * @param alphaScale2 factor on the other share; not read by the shaders of today
+     * @param inkRed ink colour, with inkGreen and inkBlue, 0 to 0.75; more brightens instead of darkening
+     * @param fresnelRatio extra light on slopes that face the light
+     * @param specularRatio strength of the highlights; the picture takes up to 5.5 of it, with ink up to 4.5
+     * @param exponent sharpness of the highlights
      * @param landscape whether to show the background for a view held across
      */
     public native void onDrawFrame(float[] positions, float[] heightAttribs, short[] indices, int positionFloats,
@@ -171,7 +154,11 @@ public final class JniTidemarkRender {
             float inkRed, float inkGreen, float inkBlue, float fresnelRatio, float specularRatio, float exponent,
             boolean landscape);
 
-    /** @return 1 after a touch and, with ink, after the set-up; 0 after a cancelled touch or {@link #clearInkValue} */
+    /**
+     * Whether ink is shown, not whether any is left: count frames since the last touch for that.
+     *
+     * @return 1 after a touch and, with ink, after the set-up; 0 after a cancelled touch or {@link #clearInkValue}
+     */
     public native int getClearInkValue();
 
     /** Lets all ink vanish with the next frame, and ends the gesture. */

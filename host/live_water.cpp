@@ -2,7 +2,7 @@
 
 #include <utility>
 
-LiveWater::LiveWater(const Look& look, std::uint32_t seed) : look_(look), seed_(seed), host_(look, 1, 1, seed) {}
+LiveWater::LiveWater(const Look& look, std::uint32_t seed) : host_(look, 1, 1, seed) {}
 
 void LiveWater::setPictures(Pictures pictures) {
     handOverDue_ |= pictures.newSince(pictures_);
@@ -10,24 +10,8 @@ void LiveWater::setPictures(Pictures pictures) {
 }
 
 void LiveWater::resize(int width, int height) {
-    width_ = width;
-    height_ = height;
     host_.resize(width, height);
     clock_.rest();
-    setUpDue_ = true;
-}
-
-void LiveWater::setLook(const Look& look) {
-    const bool sameMesh = look.meshVertices == look_.meshVertices && look.meshExtent == look_.meshExtent &&
-                          look.pictureZoom == look_.pictureZoom;
-    look_ = look;
-    if (sameMesh) {
-        host_.setLook(look);
-        return;
-    }
-    host_.clearInk();
-    host_ = WaterHost(look, width_, height_, seed_);
-    host_.rain(raining_);
     setUpDue_ = true;
 }
 
@@ -35,11 +19,6 @@ void LiveWater::setInk(bool withInk) {
     if (withInk == withInk_) return;
     withInk_ = withInk;
     setUpDue_ = true;
-}
-
-void LiveWater::setRain(bool falling) {
-    raining_ = falling;
-    host_.rain(falling);
 }
 
 void LiveWater::renewContext() {
@@ -72,8 +51,7 @@ LiveWater::Frame LiveWater::frame(double now) {
         return Frame::resting;
     }
     prepare();
-    if (clock_.isEarly(now, look_.stepsPerSecond)) return Frame::waiting;
-    if (!host_.advance(clock_.secondsUntil(now, look_.stepsPerSecond))) return Frame::waiting;
+    if (!host_.advance(clock_.secondsUntil(now))) return Frame::waiting;
     host_.draw();
     if (isResting()) clock_.rest();
     return Frame::drawn;

@@ -28,13 +28,12 @@ public:
     // In pixels, each at least 1. The ink is lost, the water stays.
     void resize(int width, int height);
 
-    // Another mesh begins with flat water.
-    void setLook(const Look& look);
+    void setLook(const Look& look) { host_.setLook(look); }
 
     // Whether touches drop ink; they do not at first. A switch ends the stroke that is being drawn.
     void setInk(bool withInk);
 
-    void setRain(bool falling);
+    void setRain(bool falling) { host_.rain(falling); }
     void clearInk() { host_.clearInk(); }
     void touch(TouchAction action, int x, int y, float pressure) { host_.touch(action, x, y, pressure); }
 
@@ -47,6 +46,9 @@ public:
     // Whether there is nothing to draw until the next call that changes something.
     bool isResting() const;
 
+    // What the processor spent on the last frame, in seconds; frames that take long make the mesh coarser.
+    void noteWork(double seconds) { host_.noteWork(seconds); }
+
     // Brings the water to the time `now`, in seconds, and draws it where it has changed: without ink into the current
     // framebuffer, with ink into framebuffer 0.
     Frame frame(double now);
@@ -54,15 +56,10 @@ public:
 private:
     void prepare();
 
-    Look look_;
-    std::uint32_t seed_;
     WaterHost host_;
     FrameClock clock_;
     Pictures pictures_;
-    int width_ = 1;
-    int height_ = 1;
     bool withInk_ = false;
-    bool raining_ = false;
 
     // What the library has not been told yet; the next frame does, where the context is current.
     bool setUpDue_ = true;

@@ -18,43 +18,88 @@ void handOverOne(void (*transfer)(JNIEnv*, jobject, jobject), const Picture& pic
     transfer(hostEnvironment(), nullptr, &bitmap);
 }
 
-std::size_t vertexCount(const Look& look) {
-    return static_cast<std::size_t>(look.meshVertices) * static_cast<std::size_t>(look.meshVertices);
+constexpr double kInkStepsPerSecond = 60.0;
+constexpr int kMostInkSteps = 4;
+
+// Nearer to a step than this, in steps, the heights are those of the step.
+constexpr float kAtStep = 0.0625f;
+
+// Steps are taken at the time nearest to theirs, so that neither the jitter of a clock nor rounding brings none to one
+// frame and two to the next.
+int takeSteps(double& due) {
+    const int steps = std::max(static_cast<int>(std::floor(due + 0.5)), 0);
+    due -= steps;
+    return steps;
 }
 
-std::size_t indexCount(const Look& look) {
-    const auto cells = static_cast<std::size_t>(look.meshVertices) - 1;
-    return 6 * cells * cells;
+// A field on a lattice of another size, by its nearest values.
+std::vector<float> resampled(const std::vector<float>& field, int from, int to) {
+    std::vector<float> result(static_cast<std::size_t>(to) * static_cast<std::size_t>(to));
+    const auto nearest = [=](int i) { return (2 * i * (from - 1) + to - 1) / (2 * (to - 1)); };
+    for (int c = 0; c < to && from > 1; ++c) {
+        for (int r = 0; r < to; ++r) {
+            result[static_cast<std::size_t>(c * to + r)] =
+                field[static_cast<std::size_t>(nearest(c) * from + nearest(r))];
+        }
+    }
+    return result;
 }
 
 }  // namespace
 
 WaterHost::WaterHost(const Look& look, int width, int height, std::uint32_t seed)
-    : look_(look),
-      random_(seed),
-      calmSteps_(look.stepsToRest),
-      positions_(3 * vertexCount(look)),
-      indices_(indexCount(look)),
-      velocity_(vertexCount(look)),
-      heights_(vertexCount(look)),
-      heightAttribs_(3 * vertexCount(look)),
-      mvp_(16) {
+    : look_(look), random_(seed), calmSteps_(look.stepsToRest), lattice_{} {
     resize(width, height);
 }
 
 void WaterHost::resize(int width, int height) {
     width_ = width;
     height_ = height;
-    // The mesh is a square around the view, so that its cells are squares on the screen and rings stay round. The
-    // view shows the middle of it.
-    const auto extent = static_cast<float>(look_.meshExtent);
-    const float pixel = extent / look_.pictureZoom / static_cast<float>(std::max(width, height));
-    visibleWidth_ = pixel * static_cast<float>(width);
-    visibleHeight_ = pixel * static_cast<float>(height);
+    quality_.fitTo(width, height, look_.pictureZoom);
+    fit();
+}
+
+void WaterHost::setLook(const Look& look) {
+    look_ = look;
+    fit();
+}
+
+void WaterHost::noteWork(double seconds) {
+    quality_.noteWork(seconds);
+    if (wantedVertices() != vertices_) fit();
+}
+
+// Lays the lattice and the mesh, squares around the view, so that their cells are squares on the screen and rings stay
+// round. The view shows the middle of them.
+void WaterHost::fit() {
+    const WaveLattice old = lattice_;
+    lattice_ = latticeFor(look_, width_, height_);
+    if (lattice_.points != old.points) {
+        velocity_.values = resampled(velocity_.values, old.points, lattice_.points);
+        heights_.values = resampled(heights_.values, old.points, lattice_.points);
+    }
+    const int vertices = wantedVertices();
+    if (lattice_.points != old.points || lattice_.extent != old.extent || vertices != vertices_) makeMesh(vertices);
+
+    const float pixel =
+        static_cast<float>(lattice_.extent) / look_.pictureZoom / static_cast<float>(std::max(width_, height_));
+    visibleWidth_ = pixel * static_cast<float>(width_);
+    visibleHeight_ = pixel * static_cast<float>(height_);
     pictureWidth_ = static_cast<int>(std::ceil(visibleWidth_));
     pictureHeight_ = static_cast<int>(std::ceil(visibleHeight_));
     mvp_.values = {2.0f / visibleWidth_, 0, 0, 0, 0, 2.0f / visibleHeight_, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1};
     changed_ = true;
+}
+
+void WaterHost::makeMesh(int vertices) {
+    const auto side = static_cast<std::size_t>(vertices);
+    vertices_ = vertices;
+    mesh_ = SurfaceMesh(lattice_.points, vertices);
+    positions_ = FloatArray(3 * side * side);
+    indices_ = ShortArray(6 * (side - 1) * (side - 1));
+    heightAttribs_ = FloatArray(3 * side * side);
+    isGathered_ = false;
+    isMeshFilled_ = false;
 }
 
 double WaterHost::proportions() const {
@@ -80,13 +125,8 @@ void WaterHost::setUp(bool withInk, unsigned textures) {
     // The library would keep a stroke that the switch interrupts and go on with it at the next touch.
     if (withInk != withInk_) NATIVE(clearInkValue)(env, nullptr);
     withInk_ = withInk;
-    inkFrames_ = 0;
+    inkSteps_ = 0;
     loadTextures(textures);
-    if (!isSetUp_) {
-        NATIVE(initWaters)
-        (env, nullptr, &positions_, &indices_, look_.meshVertices * look_.meshVertices, look_.meshExtent,
-         look_.meshExtent, look_.meshVertices, look_.meshVertices);
-    }
     isSetUp_ = true;
     changed_ = true;
 }
@@ -99,18 +139,13 @@ void WaterHost::loadTextures(unsigned which) {
     changed_ |= which != 0;
 }
 
-void WaterHost::setLook(const Look& look) {
-    look_ = look;
-    changed_ = true;
-}
-
 void WaterHost::touch(TouchAction action, int x, int y, float pressure) {
     if (!isSetUp_) return;
     raiseTouchRipples(action, x, y, look_.touchAmplitude * pressure);
     fingerDown_ = action == TouchAction::down || (action == TouchAction::move && fingerDown_);
     if (!withInk_) return;
     NATIVE(onTouch)(hostEnvironment(), nullptr, x, y, static_cast<jint>(action), pressure);
-    inkFrames_ = look_.framesToFade;
+    inkSteps_ = look_.framesToFade;
 }
 
 void WaterHost::raiseTouchRipples(TouchAction action, int x, int y, float amplitude) {
@@ -120,7 +155,7 @@ void WaterHost::raiseTouchRipples(TouchAction action, int x, int y, float amplit
         raiseRipple(modelX, modelY, amplitude);
     } else if (action == TouchAction::move && fingerDown_) {
         const float spacing =
-            look_.trailCells * static_cast<float>(look_.meshExtent) / static_cast<float>(look_.meshVertices - 1);
+            look_.trailCells * static_cast<float>(lattice_.extent) / static_cast<float>(lattice_.points - 1);
         const float dx = modelX - touchX_;
         const float dy = modelY - touchY_;
         const int ripples = static_cast<int>(std::min(std::sqrt(dx * dx + dy * dy) / spacing, look_.longestTrail));
@@ -142,13 +177,16 @@ void WaterHost::clearInk() {
 
 bool WaterHost::advance(double seconds) {
     if (!isSetUp_) return false;
-    dueSteps_ += std::min(seconds, double{look_.longestFrame}) * look_.stepsPerSecond;
-    // The small extra lets a frame of exactly one step's length bring its step in spite of rounding.
-    for (; dueSteps_ > 1.0 - 1.0e-6; dueSteps_ -= 1.0) {
+    const double passed = std::min(seconds, double{look_.longestFrame});
+    dueSteps_ += passed * lattice_.stepsPerSecond;
+    for (int steps = takeSteps(dueSteps_); steps > 0; --steps) {
         if (raining_) dropRain();
         if (calmSteps_ < look_.stepsToRest) stepWater();
     }
-    return changed_ || inkMoves();
+    if (calmSteps_ < look_.stepsToRest) changed_ = true;
+    if (!inkMoves()) return changed_;
+    dueInkSteps_ += passed * kInkStepsPerSecond;
+    return dueInkSteps_ >= 0.5;
 }
 
 bool WaterHost::isResting() const {
@@ -156,11 +194,12 @@ bool WaterHost::isResting() const {
 }
 
 void WaterHost::stepWater() {
-    const int n = look_.meshVertices;
+    const int n = lattice_.points;
     const bool calm = NATIVE(move)(
-        hostEnvironment(), nullptr, &velocity_, &heights_, 1, 1, n - 1, n - 1, n, n, JNI_TRUE, look_.damping,
-        look_.waveSpeed);
+        hostEnvironment(), nullptr, &velocity_, &heights_, 1, 1, n - 1, n - 1, n, n, JNI_TRUE, lattice_.damping,
+        lattice_.waveSpeed);
     calmSteps_ = calm ? calmSteps_ + 1 : 0;
+    isGathered_ = false;
     changed_ = true;
 }
 
@@ -168,48 +207,65 @@ void WaterHost::dropRain() {
     const auto draw = [this] {
         return static_cast<float>(static_cast<double>(random_() - random_.min()) / (random_.max() - random_.min()));
     };
-    if (draw() * static_cast<float>(look_.stepsPerSecond) >= look_.rainDropsPerSecond) return;
+    if (draw() * static_cast<float>(lattice_.stepsPerSecond) >= look_.rainDropsPerSecond) return;
     const float x = (draw() - 0.5f) * visibleWidth_;
     const float y = (draw() - 0.5f) * visibleHeight_;
     raiseRipple(x, y, look_.rainAmplitude * (0.5f + 0.5f * draw()));
 }
 
 void WaterHost::raiseRipple(float x, float y, float amplitude) {
-    // The library counts countA cells across the extent, the mesh has one interval less; these positions hit the
-    // very vertex. The fast axis runs down a column of the mesh.
-    const auto extent = static_cast<float>(look_.meshExtent);
-    const auto n = static_cast<float>(look_.meshVertices);
+    // The library counts countA cells across the extent, the lattice has one interval less; these positions hit the
+    // very point. The fast axis runs down a column of the lattice.
+    const auto extent = static_cast<float>(lattice_.extent);
+    const auto n = static_cast<float>(lattice_.points);
     const float row = (0.5f - y / extent) * (n - 1.0f);
     const float column = (0.5f + x / extent) * (n - 1.0f);
     NATIVE(ripple)
-    (hostEnvironment(), nullptr, &heights_, look_.meshExtent, look_.meshExtent, look_.meshVertices, look_.meshVertices,
+    (hostEnvironment(), nullptr, &heights_, lattice_.extent, lattice_.extent, lattice_.points, lattice_.points,
      (row / n - 0.5f) * extent, (column / n - 0.5f) * extent, amplitude);
     calmSteps_ = 0;
+    isGathered_ = false;
 }
 
-// Each vertex gets its own height and those of its right-hand and upper neighbours; vertices are stored column by
-// column from the left, each column from the top. The last ones of their kind repeat their own height.
+// The heights at the time of the frame, which on a display faster than the water lies between two steps.
 void WaterHost::gatherHeights() {
-    const int n = look_.meshVertices;
-    const float* const h = heights_.values.data();
-    float* attribs = heightAttribs_.values.data();
-    for (int column = 0, i = 0; column < n; ++column) {
-        for (int row = 0; row < n; ++row, ++i) {
-            *attribs++ = h[i];
-            *attribs++ = column < n - 1 ? h[i + n] : h[i];
-            *attribs++ = row > 0 ? h[i - 1] : h[i];
-        }
+    const bool moves = calmSteps_ < look_.stepsToRest;
+    const auto since = static_cast<float>(dueSteps_);
+    if (!moves || std::abs(since) < kAtStep) {
+        if (!isGathered_) mesh_.gather(heights_.values.data(), heightAttribs_.values.data());
+        isGathered_ = true;
+        return;
     }
+    between_.resize(heights_.values.size());
+    for (std::size_t i = 0; i < between_.size(); ++i) {
+        between_[i] = heights_.values[i] + since * velocity_.values[i];
+    }
+    mesh_.gather(between_.data(), heightAttribs_.values.data());
+    isGathered_ = false;
 }
 
 void WaterHost::draw() {
+    JNIEnv* const env = hostEnvironment();
+    if (!isMeshFilled_) {
+        NATIVE(initWaters)
+        (env, nullptr, &positions_, &indices_, vertices_ * vertices_, lattice_.extent, lattice_.extent, vertices_,
+         vertices_);
+        isMeshFilled_ = true;
+    }
     gatherHeights();
-    NATIVE(onDrawFrame)
-    (hostEnvironment(), nullptr, &positions_, &heightAttribs_, &indices_, static_cast<jint>(positions_.values.size()),
-     static_cast<jint>(heightAttribs_.values.size()), static_cast<jint>(indices_.values.size()), &mvp_, pictureWidth_,
-     pictureHeight_, look_.meshVertices, look_.meshVertices, look_.refractiveIndex, look_.alphaMix, look_.alphaScale1,
-     look_.alphaScale2, look_.inkRed, look_.inkGreen, look_.inkBlue, look_.fresnelRatio, look_.specularRatio,
-     look_.exponent, width_ > height_);
+    int frames = 1;
+    if (inkMoves()) {
+        frames = std::clamp(takeSteps(dueInkSteps_), 1, kMostInkSteps);
+        dueInkSteps_ = std::clamp(dueInkSteps_, -0.5, 0.5);
+    }
+    for (int i = 0; i < frames; ++i) {
+        NATIVE(onDrawFrame)
+        (env, nullptr, &positions_, &heightAttribs_, &indices_, static_cast<jint>(positions_.values.size()),
+         static_cast<jint>(heightAttribs_.values.size()), static_cast<jint>(indices_.values.size()), &mvp_,
+         pictureWidth_, pictureHeight_, vertices_, vertices_, look_.refractiveIndex, look_.alphaMix, look_.alphaScale1,
+         look_.alphaScale2, look_.inkRed, look_.inkGreen, look_.inkBlue, look_.fresnelRatio, look_.specularRatio,
+         look_.exponent, width_ > height_);
+        if (inkSteps_ > 0) --inkSteps_;
+    }
     changed_ = false;
-    if (inkFrames_ > 0) --inkFrames_;
 }

@@ -26,9 +26,9 @@ float cubic(float a, float b, float c, float d, float t) {
     return b + 0.5f * t * (c - a + t * (2.0f * a - 5.0f * b + 4.0f * c - d + t * (3.0f * (b - c) + d - a)));
 }
 
-// The height of each pixel's middle; the view shows the middle of the square mesh.
-std::vector<float> heightsInView(const WaterHost& host, const Look& look, int width, int height, float cellsPerPixel) {
-    const int n = look.meshVertices;
+// The height of each pixel's middle; the view shows the middle of the square lattice.
+std::vector<float> heightsInView(const WaterHost& host, int width, int height, float cellsPerPixel) {
+    const int n = host.lattice().points;
     const Texture<const float> mesh = {host.heights().data(), n, n};  // a row of it is a column of the mesh
     const auto place = [=](int pixel, int pixels) {
         return 0.5f * static_cast<float>(n - 1) + 0.5f * static_cast<float>(2 * pixel + 1 - pixels) * cellsPerPixel;
@@ -56,8 +56,8 @@ Picture drawHeight(const WaterHost& host, const Look& look, int width, int heigh
     constexpr Rgb kColours[] = {{0.010f, 0.030f, 0.160f}, {0.040f, 0.220f, 0.520f}, {0.380f, 0.640f, 0.800f}, kPaper,
                                 {0.900f, 0.480f, 0.260f}, {0.600f, 0.080f, 0.040f}, {0.180f, 0.005f, 0.020f}};
     const float cellsPerPixel =
-        static_cast<float>(look.meshVertices - 1) / look.pictureZoom / static_cast<float>(std::max(width, height));
-    std::vector<float> heights = heightsInView(host, look, width, height, cellsPerPixel);
+        static_cast<float>(host.lattice().points - 1) / look.pictureZoom / static_cast<float>(std::max(width, height));
+    std::vector<float> heights = heightsInView(host, width, height, cellsPerPixel);
     const Texture<float> view = {heights.data(), width, height};
     Canvas canvas(width, height);
     forAllPixels(canvas, [&](Rgb& pixel, int x, int y) {

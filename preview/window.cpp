@@ -76,8 +76,10 @@ void run(GLFWwindow* window, Stage& stage) {
     glfwGetFramebufferSize(window, &width, &height);
     onResize(window, width, height);
     while (!glfwWindowShouldClose(window)) {
-        switch (stage.water.frame(glfwGetTime())) {
+        const double start = glfwGetTime();
+        switch (stage.water.frame(start)) {
             case LiveWater::Frame::drawn:
+                stage.water.noteWork(glfwGetTime() - start);
                 glfwSwapBuffers(window);
                 glfwPollEvents();
                 break;

@@ -17,16 +17,10 @@ public final class LiveWater {
         DRAWN
     }
 
-    private final JniTidemarkRender library;
-    private final int seed;
     private final FrameClock clock = new FrameClock();
-    private Look look;
-    private WaterHost host;
+    private final WaterHost host;
     private Pictures pictures;
-    private int width = 1;
-    private int height = 1;
     private boolean withInk;
-    private boolean raining;
 
     // What the library has not been told yet; the next frame does, where the context is current.
     private boolean setUpDue = true;
@@ -36,10 +30,7 @@ public final class LiveWater {
 
     /** {@code seed} fixes where the rain falls. */
     public LiveWater(JniTidemarkRender library, Look look, int seed) {
-        this.library = library;
-        this.look = look.clone();
-        this.seed = seed;
-        host = new WaterHost(library, look, width, height, seed);
+        host = new WaterHost(library, look, 1, 1, seed);
     }
 
     /**
@@ -53,26 +44,13 @@ public final class LiveWater {
 
     /** In pixels, each at least 1. The ink is lost, the water stays. */
     public void resize(int width, int height) {
-        this.width = width;
-        this.height = height;
         host.resize(width, height);
         clock.rest();
         setUpDue = true;
     }
 
-    /** Another mesh begins with flat water. */
     public void setLook(Look look) {
-        boolean sameMesh = look.meshVertices == this.look.meshVertices && look.meshExtent == this.look.meshExtent
-                && look.pictureZoom == this.look.pictureZoom;
-        this.look = look.clone();
-        if (sameMesh) {
-            host.setLook(look);
-            return;
-        }
-        host.clearInk();
-        host = new WaterHost(library, look, width, height, seed);
-        host.rain(raining);
-        setUpDue = true;
+        host.setLook(look);
     }
 
     /** Whether touches drop ink; they do not at first. A switch ends the stroke that is being drawn. */
@@ -83,7 +61,6 @@ public final class LiveWater {
     }
 
     public void setRain(boolean falling) {
-        raining = falling;
         host.rain(falling);
     }
 
@@ -107,6 +84,11 @@ public final class LiveWater {
         texturesDue = Pictures.ALL;
     }
 
+    /** What the processor spent on the last frame, in seconds; frames that take long make the mesh coarser. */
+    public void noteWork(double seconds) {
+        host.noteWork(seconds);
+    }
+
     /** Whether there is nothing to draw until the next call that changes something. */
     public boolean isResting() {
         if (pictures == null) return true;
@@ -123,8 +105,7 @@ public final class LiveWater {
             return Frame.RESTING;
         }
         prepare();
-        if (clock.isEarly(now, look.stepsPerSecond)) return Frame.WAITING;
-        if (!host.advance(clock.secondsUntil(now, look.stepsPerSecond))) return Frame.WAITING;
+        if (!host.advance(clock.secondsUntil(now))) return Frame.WAITING;
         host.draw();
         if (isResting()) clock.rest();
         return Frame.DRAWN;

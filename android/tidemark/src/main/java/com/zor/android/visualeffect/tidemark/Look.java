@@ -8,14 +8,17 @@ import java.io.InputStream;
  * Change the fields before you hand them on, or load them from a file that your app ships.
  */
 public final class Look implements Cloneable {
-    public int meshVertices = 128;
+    public int meshVertices = 0;
     public int meshExtent = 32;
     public float pictureZoom = 1.015f;
+    public float ringSpeed = 0.2713f;
+    public float dropRadius = 0.024f;
+    public float calmingTime = 6.6f;
     public int stepsPerSecond = 60;
     public float longestFrame = 0.25f;
     public int stepsToRest = 30;
-    public float damping = 0.985f;
-    public float waveSpeed = 0.32f;
+    public float damping = 0.0f;
+    public float waveSpeed = 0.0f;
     public float refractiveIndex = 1.75f;
     public float alphaMix = 0.5f;
     public float alphaScale1 = 0.7f;
@@ -44,9 +47,12 @@ public final class Look implements Cloneable {
     public static Look load(InputStream text) throws IOException {
         LookFile values = new LookFile(text);
         Look look = new Look();
-        look.meshVertices = values.whole("meshVertices", look.meshVertices, 2, 256);
+        look.meshVertices = values.whole("meshVertices", look.meshVertices, 0, 256);
         look.meshExtent = values.whole("meshExtent", look.meshExtent, 1, 1000);
         look.pictureZoom = values.real("pictureZoom", look.pictureZoom, 0.1f, 10);
+        look.ringSpeed = values.real("ringSpeed", look.ringSpeed, 0.01f, 3);
+        look.dropRadius = values.real("dropRadius", look.dropRadius, 0.01f, 0.3f);
+        look.calmingTime = values.real("calmingTime", look.calmingTime, 0.1f, 1000);
         look.stepsPerSecond = values.whole("stepsPerSecond", look.stepsPerSecond, 1, 1000);
         look.longestFrame = values.real("longestFrame", look.longestFrame, 0, 10);
         look.stepsToRest = values.whole("stepsToRest", look.stepsToRest, 1, 10000);

@@ -37,8 +37,13 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
     public void onDrawFrame(GL10 gl) {
         // The surface shows its buffer after every call, so every call has to fill it.
         water.redraw();
+        double start = seconds();
         LiveWater.Frame frame;
-        while ((frame = water.frame(seconds())) == LiveWater.Frame.WAITING) SystemClock.sleep(1);
+        while ((frame = water.frame(start)) == LiveWater.Frame.WAITING) {
+            SystemClock.sleep(1);
+            start = seconds();
+        }
+        if (frame == LiveWater.Frame.DRAWN) water.noteWork(seconds() - start);
         if (frame == LiveWater.Frame.RESTING) GLES20.glClear(GLES20.GL_COLOR_BUFFER_BIT);  // no pictures yet
         if (!water.isResting()) requestRender.run();
     }

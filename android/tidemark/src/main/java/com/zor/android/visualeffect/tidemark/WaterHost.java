@@ -1,10 +1,8 @@
 package com.zor.android.visualeffect.tidemark;
 
-import java.util.Arrays;
-
 /**
  * What an app does around the library: owns the mesh arrays, the view, the transform and the lighting values, turns
- * touches and rain into ripples, steps the water at a fixed rate and tells when there is nothing new to draw.
+ * touches and rain into ripples, steps water and ink in time and tells when there is nothing new to draw.
  *
  * <p>Call everything on the one thread that owns the OpenGL ES 2.0 context. It needs nothing of Android, and draws the
  * same pictures as the host in C++ with the same calls: keep every sum in its order and in its precision.
@@ -16,6 +14,12 @@ public final class WaterHost {
     public static final int MOVE = 2;
     public static final int CANCEL = 3;
 
+    private static final double INK_STEPS_PER_SECOND = 60;
+    private static final int MOST_INK_STEPS = 4;
+
+    // Nearer to a step than this, in steps, the heights are those of the step.
+    private static final float AT_STEP = 0.0625f;
+
     private final JniTidemarkRender library;
     private Look look;
     private final RainChance chance;
@@ -26,10 +30,13 @@ public final class WaterHost {
     private boolean withInk;
     private boolean isSetUp;
     private boolean fingerDown;
-    private int inkFrames;  // until the ink has faded: the library does not tell whether any is left
+    private int inkSteps;  // until the ink has faded: the library does not tell whether any is left
     private boolean changed = true;  // since the last draw
     private int calmSteps;  // in a row
-    private double dueSteps;  // that the time passed so far still asks for
+    private double dueSteps;  // of the water that the time passed so far still asks for; below 0 when it is ahead
+    private double dueInkSteps;
+    private boolean isGathered;  // the mesh has the heights of the lattice
+    private boolean isMeshFilled;  // by the library
     private float touchX;  // where the finger raised its last ripple, model units
     private float touchY;
 
@@ -40,11 +47,17 @@ public final class WaterHost {
     private int pictureWidth;
     private int pictureHeight;
 
-    private final float[] positions;
-    private final short[] indices;
-    private final float[] velocity;
-    private final float[] heights;
-    private final float[] heightAttribs;
+    private WaveLattice lattice;
+    private float[] velocity = {};
+    private float[] heights = {};
+    private float[] between = {};  // heights at a time between two steps
+
+    private final MeshQuality quality = new MeshQuality();
+    private SurfaceMesh mesh;
+    private int vertices;  // of the mesh, along each side
+    private float[] positions;
+    private short[] indices;
+    private float[] heightAttribs;
     private final float[] mvp = new float[16];
 
     /** {@code seed} fixes where the rain falls. The view is width x height pixels, each at least 1. */
@@ -53,35 +66,85 @@ public final class WaterHost {
         this.look = look.clone();
         chance = new RainChance(seed);
         calmSteps = look.stepsToRest;
-        int vertices = look.meshVertices * look.meshVertices;
-        int cells = (look.meshVertices - 1) * (look.meshVertices - 1);
-        positions = new float[3 * vertices];
-        indices = new short[6 * cells];
-        velocity = new float[vertices];
-        heights = new float[vertices];
-        heightAttribs = new float[3 * vertices];
         resize(width, height);
     }
 
     /**
      * {@link #setUp} must follow, and before it another hand-over of the backgrounds where the proportions have changed.
+     * The water stays.
      */
     public void resize(int width, int height) {
         this.width = width;
         this.height = height;
-        // The mesh is a square around the view, so that its cells are squares on the screen and rings stay round. The
-        // view shows the middle of it.
-        float pixel = look.meshExtent / look.pictureZoom / Math.max(width, height);
+        quality.fitTo(width, height, look.pictureZoom);
+        fit();
+    }
+
+    /** Takes over all values; the water and the ink stay. */
+    public void setLook(Look look) {
+        this.look = look.clone();
+        fit();
+    }
+
+    /**
+     * What the processor spent on a frame, in seconds: where the look leaves the mesh to the host, it gets coarser when
+     * frames take long.
+     */
+    public void noteWork(double seconds) {
+        quality.noteWork(seconds);
+        if (wantedVertices() != vertices) fit();
+    }
+
+    private int wantedVertices() {
+        return look.meshVertices > 1 ? look.meshVertices : quality.vertices();
+    }
+
+    // Lays the lattice and the mesh, squares around the view, so that their cells are squares on the screen and rings stay
+    // round. The view shows the middle of them.
+    private void fit() {
+        int oldPoints = lattice == null ? 0 : lattice.points;
+        int oldExtent = lattice == null ? 0 : lattice.extent;
+        lattice = new WaveLattice(look, width, height);
+        if (lattice.points != oldPoints) {
+            velocity = resampled(velocity, oldPoints, lattice.points);
+            heights = resampled(heights, oldPoints, lattice.points);
+        }
+        int wanted = wantedVertices();
+        if (lattice.points != oldPoints || lattice.extent != oldExtent || wanted != vertices) makeMesh(wanted);
+
+        float pixel = lattice.extent / look.pictureZoom / Math.max(width, height);
         visibleWidth = pixel * width;
         visibleHeight = pixel * height;
         pictureWidth = (int) Math.ceil(visibleWidth);
         pictureHeight = (int) Math.ceil(visibleHeight);
-        Arrays.fill(mvp, 0);
         mvp[0] = 2 / visibleWidth;
         mvp[5] = 2 / visibleHeight;
         mvp[10] = 1;
         mvp[15] = 1;
         changed = true;
+    }
+
+    private void makeMesh(int side) {
+        vertices = side;
+        mesh = new SurfaceMesh(lattice.points, side);
+        positions = new float[3 * side * side];
+        indices = new short[6 * (side - 1) * (side - 1)];
+        heightAttribs = new float[3 * side * side];
+        isGathered = false;
+        isMeshFilled = false;
+    }
+
+    // A field on a lattice of another size, by its nearest values.
+    private static float[] resampled(float[] field, int from, int to) {
+        float[] result = new float[to * to];
+        for (int c = 0; c < to && from > 1; ++c) {
+            int column = (2 * c * (from - 1) + to - 1) / (2 * (to - 1));
+            for (int r = 0; r < to; ++r) {
+                int row = (2 * r * (from - 1) + to - 1) / (2 * (to - 1));
+                result[c * to + r] = field[column * from + row];
+            }
+        }
+        return result;
     }
 
     /** Shorter by longer side of the views that the backgrounds are cropped to, upright and across. */
@@ -108,12 +171,8 @@ public final class WaterHost {
         // The library would keep a stroke that the switch interrupts and go on with it at the next touch.
         if (withInk != this.withInk) library.clearInkValue();
         this.withInk = withInk;
-        inkFrames = 0;
+        inkSteps = 0;
         loadTextures(textures);
-        if (!isSetUp) {
-            library.initWaters(positions, indices, look.meshVertices * look.meshVertices, look.meshExtent,
-                    look.meshExtent, look.meshVertices, look.meshVertices);
-        }
         isSetUp = true;
         changed = true;
     }
@@ -124,12 +183,6 @@ public final class WaterHost {
         if ((which & Pictures.LANDSCAPE) != 0) library.onLoadLandscapeBGTextures();
         if ((which & Pictures.WATER) != 0) library.onLoadWaterTextures();
         changed |= which != 0;
-    }
-
-    /** Takes over all values but those of the mesh, which must be the same. */
-    public void setLook(Look look) {
-        this.look = look.clone();
-        changed = true;
     }
 
     /** Where the framebuffer has lost the last frame. */
@@ -148,7 +201,7 @@ public final class WaterHost {
         fingerDown = action == DOWN || action == MOVE && fingerDown;
         if (!withInk) return;
         library.onTouch(x, y, action, pressure);
-        inkFrames = look.framesToFade;
+        inkSteps = look.framesToFade;
     }
 
     /** Lets rain fall, {@code look.rainDropsPerSecond} drops a second, until it is switched off. */
@@ -163,16 +216,30 @@ public final class WaterHost {
         changed = true;
     }
 
-    /** Advances the water by {@code seconds} and says whether the picture has changed since the last draw. */
+    /**
+     * Advances the water by {@code seconds} and says whether there is something to draw: while ink lives, when a step of
+     * it is due, as each frame moves it; otherwise when the picture has changed since the last draw.
+     */
     public boolean advance(double seconds) {
         if (!isSetUp) return false;
-        dueSteps += Math.min(seconds, look.longestFrame) * look.stepsPerSecond;
-        // The small extra lets a frame of exactly one step's length bring its step in spite of rounding.
-        for (; dueSteps > 1 - 1.0e-6; dueSteps -= 1) {
+        double passed = Math.min(seconds, look.longestFrame);
+        dueSteps += passed * lattice.stepsPerSecond;
+        int steps = stepsIn(dueSteps);
+        dueSteps -= steps;
+        for (; steps > 0; --steps) {
             if (raining) dropRain();
             if (calmSteps < look.stepsToRest) stepWater();
         }
-        return changed || inkMoves();
+        if (calmSteps < look.stepsToRest) changed = true;
+        if (!inkMoves()) return changed;
+        dueInkSteps += passed * INK_STEPS_PER_SECOND;
+        return dueInkSteps >= 0.5;
+    }
+
+    // Steps are taken at the time nearest to theirs, so that neither the jitter of a clock nor rounding brings none to one
+    // frame and two to the next.
+    private static int stepsIn(double due) {
+        return Math.max((int) Math.floor(due + 0.5), 0);
     }
 
     /** Whether the picture stays as it is, however much time passes, until the next call that changes something. */
@@ -180,19 +247,36 @@ public final class WaterHost {
         return !changed && !raining && calmSteps >= look.stepsToRest && !inkMoves();
     }
 
-    /** Draws one frame into the current framebuffer. With ink, this is also one step of the ink. */
+    /**
+     * Draws a frame: without ink into the current framebuffer, with ink into framebuffer 0. With ink, moves it by the
+     * steps that are due, at least by one; steps beyond the fourth are left out, so that a late frame does not make the
+     * next one late.
+     */
     public void draw() {
+        if (!isMeshFilled) {
+            library.initWaters(positions, indices, vertices * vertices, lattice.extent, lattice.extent, vertices,
+                    vertices);
+            isMeshFilled = true;
+        }
         gatherHeights();
-        library.onDrawFrame(positions, heightAttribs, indices, positions.length, heightAttribs.length, indices.length,
-                mvp, pictureWidth, pictureHeight, look.meshVertices, look.meshVertices, look.refractiveIndex,
-                look.alphaMix, look.alphaScale1, look.alphaScale2, look.inkRed, look.inkGreen, look.inkBlue,
-                look.fresnelRatio, look.specularRatio, look.exponent, width > height);
+        int frames = 1;
+        if (inkMoves()) {
+            int steps = stepsIn(dueInkSteps);
+            frames = Math.max(1, Math.min(steps, MOST_INK_STEPS));
+            dueInkSteps = Math.max(-0.5, Math.min(dueInkSteps - steps, 0.5));
+        }
+        for (int i = 0; i < frames; ++i) {
+            library.onDrawFrame(positions, heightAttribs, indices, positions.length, heightAttribs.length,
+                    indices.length, mvp, pictureWidth, pictureHeight, vertices, vertices, look.refractiveIndex,
+                    look.alphaMix, look.alphaScale1, look.alphaScale2, look.inkRed, look.inkGreen, look.inkBlue,
+                    look.fresnelRatio, look.specularRatio, look.exponent, width > height);
+            if (inkSteps > 0) --inkSteps;
+        }
         changed = false;
-        if (inkFrames > 0) --inkFrames;
     }
 
     private boolean inkMoves() {
-        return withInk && fingerDown || inkFrames > 0;
+        return withInk && fingerDown || inkSteps > 0;
     }
 
     private void raiseTouchRipples(int action, int x, int y, float amplitude) {
@@ -201,7 +285,7 @@ public final class WaterHost {
         if (action == DOWN) {
             raiseRipple(modelX, modelY, amplitude);
         } else if (action == MOVE && fingerDown) {
-            float spacing = look.trailCells * look.meshExtent / (look.meshVertices - 1);
+            float spacing = look.trailCells * lattice.extent / (lattice.points - 1);
             float dx = modelX - touchX;
             float dy = modelY - touchY;
             int ripples = (int) Math.min((float) Math.sqrt(dx * dx + dy * dy) / spacing, look.longestTrail);
@@ -216,14 +300,16 @@ public final class WaterHost {
     }
 
     private void stepWater() {
-        int n = look.meshVertices;
-        boolean calm = library.move(velocity, heights, 1, 1, n - 1, n - 1, n, n, true, look.damping, look.waveSpeed);
+        int n = lattice.points;
+        boolean calm = library.move(velocity, heights, 1, 1, n - 1, n - 1, n, n, true, lattice.damping,
+                lattice.waveSpeed);
         calmSteps = calm ? calmSteps + 1 : 0;
+        isGathered = false;
         changed = true;
     }
 
     private void dropRain() {
-        if (chance.draw() * look.stepsPerSecond >= look.rainDropsPerSecond) return;
+        if (chance.draw() * lattice.stepsPerSecond >= look.rainDropsPerSecond) return;
         float x = (chance.draw() - 0.5f) * visibleWidth;
         float y = (chance.draw() - 0.5f) * visibleHeight;
         raiseRipple(x, y, look.rainAmplitude * (0.5f + 0.5f * chance.draw()));
@@ -231,28 +317,30 @@ public final class WaterHost {
 
     /** Position in model units. */
     private void raiseRipple(float x, float y, float amplitude) {
-        // The library counts countA cells across the extent, the mesh has one interval less; these positions hit the
-        // very vertex. The fast axis runs down a column of the mesh.
-        float extent = look.meshExtent;
-        float n = look.meshVertices;
+        // The library counts countA cells across the extent, the lattice has one interval less; these positions hit the
+        // very point. The fast axis runs down a column of the lattice.
+        float extent = lattice.extent;
+        float n = lattice.points;
         float row = (0.5f - y / extent) * (n - 1);
         float column = (0.5f + x / extent) * (n - 1);
-        library.ripple(heights, look.meshExtent, look.meshExtent, look.meshVertices, look.meshVertices,
+        library.ripple(heights, lattice.extent, lattice.extent, lattice.points, lattice.points,
                 (row / n - 0.5f) * extent, (column / n - 0.5f) * extent, amplitude);
         calmSteps = 0;
+        isGathered = false;
     }
 
-    // Each vertex gets its own height and those of its right-hand and upper neighbours; vertices are stored column by
-    // column from the left, each column from the top. The last ones of their kind repeat their own height.
+    // The heights at the time of the frame, which on a display faster than the water lies between two steps.
     private void gatherHeights() {
-        int n = look.meshVertices;
-        float[] h = heights;
-        for (int column = 0, i = 0, out = 0; column < n; ++column) {
-            for (int row = 0; row < n; ++row, ++i) {
-                heightAttribs[out++] = h[i];
-                heightAttribs[out++] = column < n - 1 ? h[i + n] : h[i];
-                heightAttribs[out++] = row > 0 ? h[i - 1] : h[i];
-            }
+        boolean moves = calmSteps < look.stepsToRest;
+        float since = (float) dueSteps;
+        if (!moves || Math.abs(since) < AT_STEP) {
+            if (!isGathered) mesh.gather(heights, heightAttribs);
+            isGathered = true;
+            return;
         }
+        if (between.length != heights.length) between = new float[heights.length];
+        for (int i = 0; i < between.length; ++i) between[i] = heights[i] + since * velocity[i];
+        mesh.gather(between, heightAttribs);
+        isGathered = false;
     }
 }

@@ -1,0 +1,38 @@
+#include "host/wave_lattice.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace {
+
+// Beyond this factor on the curvature a wave of the shortest length grows from rounding errors.
+constexpr double kMostWaveSpeed = 0.45;
+
+// The library's ripples are three cells in radius.
+constexpr double kRippleCells = 3.0;
+
+}  // namespace
+
+WaveLattice latticeFor(const Look& look, int width, int height) {
+    const double longer = std::max(width, height);
+    const double sides = longer / std::sqrt(static_cast<double>(width) * height * 16.0 / 9.0);  // in view heights
+    const double spanned = look.pictureZoom * sides;
+    WaveLattice lattice;
+    lattice.points =
+        static_cast<int>(std::clamp(std::floor(spanned * kRippleCells / look.dropRadius + 1.5), 16.0, 256.0));
+    lattice.extent = std::max(static_cast<int>(std::floor(look.meshExtent * sides + 0.5)), 1);
+
+    // Shorter steps where the waves would outrun the lattice.
+    const double cell = spanned / (lattice.points - 1);
+    const double cellsPerStep = look.ringSpeed / (cell * look.stepsPerSecond);
+    const double steps = std::clamp(std::ceil(cellsPerStep / std::sqrt(kMostWaveSpeed)), 1.0, 8.0);
+    lattice.stepsPerSecond = look.stepsPerSecond * static_cast<int>(steps);
+    const double waveSpeed = std::min(cellsPerStep / steps * (cellsPerStep / steps), kMostWaveSpeed);
+
+    // A wave sinks half as fast as speeds are damped, and exp(-3) is 5 %. The fraction is exp(-x) but for x^3 / 12.
+    const double x = 6.0 / (double{look.calmingTime} * lattice.stepsPerSecond);
+    const double damping = std::max((2.0 - x) / (2.0 + x), 0.0);
+    lattice.waveSpeed = look.waveSpeed > 0.0f ? look.waveSpeed : static_cast<float>(waveSpeed);
+    lattice.damping = look.damping > 0.0f ? look.damping : static_cast<float>(damping);
+    return lattice;
+}

@@ -6,13 +6,13 @@
 #include <cstdint>
 #include <iterator>
 
-#include "fluid/fluid.h"
 #include "fuzz/checked_bitmap.h"
 #include "fuzz/checked_jni.h"
 #include "fuzz/library_state.h"
 #include "fuzz/require.h"
 #include "fuzz/values.h"
 #include "host/native_names.h"
+#include "jni/globals.h"
 
 namespace {
 

@@ -3,7 +3,7 @@
 #include <random>
 #include <string_view>
 
-#include "shaders.h"
+#include "shaders/shaders.h"
 #include "tests/support/gesture_state.h"
 #include "tests/support/gl_test.h"
 #include "tshader/velocity_packing.h"

@@ -1,6 +1,6 @@
 #include "fluid/fluid.h"
 #include "gl/shader_program.h"
-#include "shaders.h"
+#include "shaders/shaders.h"
 #include "tests/support/gl_test.h"
 
 namespace {

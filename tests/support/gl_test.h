@@ -46,6 +46,12 @@ protected:
         return value;
     }
 
+    static std::array<int, 4> viewport() {
+        std::array<int, 4> box = {};
+        glGetIntegerv(GL_VIEWPORT, box.data());
+        return box;
+    }
+
     LogRecorder log;
 
 private:

@@ -68,12 +68,3 @@ TEST_F(FrameCalls, areThoseOfTheTable) {
     }
     EXPECT_EQ(fluid.DragMode, kFastDrag);
 }
-
-TEST_F(FrameCalls, touchesRipplesAndStepsMakeNone) {
-    start(true);
-    touch(100, 100, kActionDown, 1.0f);
-    FloatArray velocity(81), height(81);
-    NATIVE(ripple)(hostEnvironment(), nullptr, &velocity, 8, 8, 9, 9, 0.0f, 0.0f, 1.0f);
-    NATIVE(move)(hostEnvironment(), nullptr, &velocity, &height, 1, 1, 8, 8, 9, 9, true, 0.9f, 0.3f);
-    EXPECT_TRUE(takeGlUse().calls.empty());
-}

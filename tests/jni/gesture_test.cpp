@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <array>
 #include <cmath>
 #include <limits>
 #include <vector>
@@ -90,31 +91,27 @@ TEST(Gesture, theReleaseOfADragLeavesTheInkToFade) {
     drag_step = 10;
     fluid.SourceStrength = 45.0f;
     touch(59, 50, kActionUp, 1.0f);
-    EXPECT_EQ(fluid.SourceStrength, 0.0f);
-    EXPECT_EQ(fluid.VelocityDissipation, 0.9f);
-    EXPECT_EQ(fluid.DensityDissipation, 0.9f);
+    EXPECT_EQ(
+        (std::array{fluid.SourceStrength, fluid.VelocityDissipation, fluid.DensityDissipation}),
+        (std::array{0.0f, 0.9f, 0.9f}));
 }
 
 TEST(Gesture, measuresMovementsAndStartsSegmentsOnlyInsideAGesture) {
+    using Values = std::array<int, 7>;
+    const auto after = [](int x, int y, int action) {
+        touch(x, y, action, 1.0f);
+        return Values{DX, DY, DRAG_START_X, DRAG_START_Y, DRAG_END_X, DRAG_END_Y, count};
+    };
     resetGestures();
-    touch(50, 60, kActionDown, 1.0f);
-    EXPECT_EQ(DX, 0) << "the way to a touch-down is no movement";
-    EXPECT_EQ(std::pair(DRAG_START_X, DRAG_START_Y), std::pair(50, 60));
-    EXPECT_EQ(std::pair(DRAG_END_X, DRAG_END_Y), std::pair(50, 60));
     count = 7;
-    touch(57, 40, kActionMove, 1.0f);
-    EXPECT_EQ(std::pair(DX, DY), std::pair(7, -20));
-    EXPECT_EQ(DRAG_START_X, 50) << "the frame moves the segment, not the touch";
-    EXPECT_EQ(count, 7);
-    touch(57, 40, kActionCancel, 1.0f);
-    DX = 7;
-    touch(9, 9, kActionMove, 1.0f);
-    touch(20, 30, kActionDown, 1.0f);
-    EXPECT_EQ(count, 0);
-    touch(25, 35, kActionDown, 1.0f);
-    EXPECT_EQ(std::pair(DRAG_START_X, DRAG_END_Y), std::pair(25, 35)) << "a second touch-down starts anew";
-    touch(60, 9, kActionCancel, 1.0f);
-    EXPECT_EQ(DX, 7) << "neither a cancelled tap is measured, nor a movement without a gesture";
+    EXPECT_EQ(after(50, 60, kActionDown), (Values{0, 0, 50, 60, 50, 60, 0})) << "the way to a touch-down is none";
+    count = 7;
+    EXPECT_EQ(after(57, 40, kActionMove), (Values{7, -20, 50, 60, 50, 60, 7})) << "the frame moves the segment";
+    EXPECT_EQ(after(58, 42, kActionCancel), (Values{1, 2, 50, 60, 50, 60, 7}));
+    EXPECT_EQ(after(9, 9, kActionMove), (Values{1, 2, 50, 60, 50, 60, 7})) << "without a gesture";
+    EXPECT_EQ(after(20, 30, kActionDown), (Values{1, 2, 20, 30, 20, 30, 0}));
+    EXPECT_EQ(after(25, 35, kActionDown), (Values{1, 2, 25, 35, 25, 35, 0})) << "starts anew";
+    EXPECT_EQ(after(60, 9, kActionCancel), (Values{1, 2, 25, 35, 25, 35, 0})) << "a cancelled tap";
 }
 
 TEST(Gesture, weighsThePressureAndTakesAnyValue) {

@@ -1,7 +1,6 @@
 // What a host gets wrong must not take its app down. Any call with any value is tried by the fuzz target; here stands
 // what it cannot see.
 #include <algorithm>
-#include <limits>
 
 #include "jni/gesture.h"
 #include "tests/support/frame.h"
@@ -9,9 +8,6 @@
 #include "tests/support/gl_test.h"
 
 namespace {
-
-constexpr int kMin = std::numeric_limits<int>::min();
-constexpr int kMax = std::numeric_limits<int>::max();
 
 class Misuse : public GlTest {
 protected:
@@ -33,12 +29,8 @@ protected:
         while (glGetError() != GL_NO_ERROR) continue;
     }
 
-    jint move(JNIEnv* from, FloatArray* v, FloatArray* h, int xStart = 0, int yStart = 0, int xEnd = 2, int yEnd = 2) {
-        return NATIVE(move)(from, nullptr, v, h, xStart, yStart, xEnd, yEnd, 2, 2, true, 0.9f, 0.3f);
-    }
-
-    void initWaters(FloatArray* p, ShortArray* i, int columns = 2, int rows = 2) {
-        NATIVE(initWaters)(env, nullptr, p, i, 4, 1, 1, columns, rows);
+    static jint move(JNIEnv* from, FloatArray* v, FloatArray* h) {
+        return NATIVE(move)(from, nullptr, v, h, 0, 0, 2, 2, 2, 2, true, 0.9f, 0.3f);
     }
 
     JNIEnv* const env = hostEnvironment();
@@ -68,8 +60,8 @@ TEST_F(Misuse, aMissingArrayMakesItsCallDoNothing) {
     frame.height.values = frame.velocity.values = {1, 2, 3, 4};
     log.take();
     for (int i = 0; i < 2; ++i) {
-        initWaters(nullptr, &frame.indices);
-        initWaters(&frame.positions, nullptr);
+        NATIVE(initWaters)(env, nullptr, nullptr, &frame.indices, 4, 1, 1, 2, 2);
+        NATIVE(initWaters)(env, nullptr, &frame.positions, nullptr, 4, 1, 1, 2, 2);
         EXPECT_TRUE(move(env, nullptr, &frame.height));
         EXPECT_TRUE(move(env, &frame.velocity, nullptr));
         NATIVE(ripple)(env, nullptr, nullptr, 1, 1, 9, 9, 0.0f, 0.0f, 1.0f);
@@ -99,20 +91,6 @@ TEST_F(Misuse, aMissingArrayMakesItsCallDoNothing) {
     EXPECT_EQ(lines, expected) << "each once in the life of the process";
 }
 
-TEST_F(Misuse, absurdCountsWriteNothing) {
-    for (const int n : {kMin, -1, 0}) {
-        initWaters(&frame.positions, &frame.indices, n, 2);
-        initWaters(&frame.positions, &frame.indices, 2, n);
-        NATIVE(ripple)(env, nullptr, &frame.height, 1, 1, n, 9, 0.0f, 0.0f, 1.0f);
-        NATIVE(ripple)(env, nullptr, &frame.height, 1, 1, 9, n, 0.0f, 0.0f, 1.0f);
-    }
-    EXPECT_TRUE(move(env, &frame.velocity, &frame.height, kMax, 0, kMin, 2));
-    EXPECT_TRUE(move(env, &frame.velocity, &frame.height, 0, kMax, 2, kMin));
-    EXPECT_EQ(frame.positions.values, std::vector<float>(12));
-    EXPECT_EQ(frame.height.values, std::vector<float>(4));
-    EXPECT_EQ(frame.indices.values, std::vector<short>(6));
-}
-
 // On the real driver, which crashes where it trusts its caller. A good set-up recovers from all of it.
 TEST_F(Misuse, anyViewAndAnyOrderOfSetUpIsSurvived) {
     for (const auto& [width, height] :
@@ -122,7 +100,7 @@ TEST_F(Misuse, anyViewAndAnyOrderOfSetUpIsSurvived) {
     }
     // More texels than any machine has memory for; and a grid longer than floats can count.
     for (const auto& [width, height, grid] :
-         {std::tuple(2000000000, 2000000000, "166666666 x 166666666"), {kMax, 12, "178956970 x 1"}}) {
+         {std::tuple(2000000000, 2000000000, "166666666 x 166666666"), {2147483647, 12, "178956970 x 1"}}) {
         log.take();
         Frame::setUp(width, height, true);
         EXPECT_EQ(logged(std::string("E no memory for an ink grid of ") + grid), 1);

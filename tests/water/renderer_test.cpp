@@ -1,6 +1,7 @@
 #include "water/renderer.h"
 
 #include <cmath>
+#include <functional>
 #include <random>
 
 #include "fluid/fluid.h"
@@ -132,8 +133,9 @@ protected:
     }
 
     // `divisor` is what the ink of a row of pixels divides a channel by.
-    template <class Divisor>
-    void expectFormulas(bool landscape, Divisor divisor) {
+    using Divisor = std::function<double(std::size_t row, std::size_t channel)>;
+    void expectFormulas(
+        bool landscape, const Divisor& divisor = [](auto...) { return 1.0; }) {
         draw(landscape);
         const std::vector<Rgba> pixels = readPixels(kView, kView);
         // The driver filters pictures with weights of 8 bits, and computes mediump in half precision where it can. It
@@ -150,10 +152,6 @@ protected:
                 }
             }
         }
-    }
-
-    void expectFormulas(bool landscape) {
-        expectFormulas(landscape, [](std::size_t, std::size_t) { return 1.0; });
     }
 
     Fluid engine;

@@ -2,7 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <cmath>
 #include <limits>
 #include <vector>
 
@@ -21,19 +20,6 @@ struct Field {
 };
 
 }  // namespace
-
-TEST(Ripples, aConeOfThreeCellsRisesAroundTheCentre) {
-    std::vector<float> field(64 * 64, 0.25f);
-    addRipple({field.data(), 100, 100, 64, 64}, 0.0f, 0.0f, 2.0f);
-    const auto at = [&field](int a, int b) { return field[static_cast<std::size_t>(b * 64 + a)] - 0.25f; };
-    EXPECT_FLOAT_EQ(at(32, 32), 6.0f);
-    for (const int side : {-1, 1}) {
-        EXPECT_FLOAT_EQ(at(32 + side, 32), 4.0f);
-        EXPECT_FLOAT_EQ(at(32 + side, 32 - side), (3.0f - std::sqrt(2.0f)) * 2.0f);
-        EXPECT_FLOAT_EQ(at(32, 32 + 2 * side), 2.0f);
-        EXPECT_EQ(at(32 + 3 * side, 32), 0.0f);
-    }
-}
 
 // For centres everywhere on fields of odd sizes: the cells 0, 1 and count - 1 of either axis and all that lies outside
 // stay as they are.

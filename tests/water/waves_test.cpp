@@ -85,21 +85,6 @@ TEST(Waves, calmMeansEverySpeedWithinTheBandBothEndsIncluded) {
     EXPECT_EQ(moving.v, before.v) << "an empty region changes nothing";
 }
 
-TEST(Waves, oneRaisedVertexIsLimitedAndSmoothedIntoItsFourNeighbours) {
-    for (const auto& [damping, share] : {std::pair(1.0f, 0.018f), {0.94f, 0.068f}}) {
-        Surface s;
-        constexpr std::size_t middle = 4 * kStride + 7;
-        s.h[middle] = 150.0f;
-        s.step(kLibrary, {1, 1, 15, 8, kStride}, false, damping, 0.0f);
-        EXPECT_FLOAT_EQ(s.h[middle], 100.0f * (1.0f - 4.0f * share));
-        for (const auto k : {middle - 1, middle + 1, middle - kStride, middle + kStride}) {
-            EXPECT_FLOAT_EQ(s.h[k], 100.0f * share);
-        }
-        EXPECT_EQ(s.h[middle - kStride - 1], 0.0f);
-        EXPECT_EQ(s.v, std::vector<float>(s.v.size()));
-    }
-}
-
 // The lowest standing wave of a fixed square turns at the speed that the wave equation gives it.
 TEST(Waves, aStandingWaveSwingsAtItsOwnFrequency) {
     constexpr int n = 33;

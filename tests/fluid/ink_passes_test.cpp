@@ -21,9 +21,8 @@ double largestDifference(const Density& a, const Density& b) {
     return largest;
 }
 
-// What the texture holds.
-float rounded(float value) {
-    return std::floor(value) + static_cast<float>(std::lround((value - std::floor(value)) * 255)) / 255.0f;
+float decoded(const Rgba& texel) {
+    return static_cast<float>(texel[0]) + static_cast<float>(texel[1]) / 255.0f;
 }
 
 // `centre` is where the kernel looks for the first texel.
@@ -50,11 +49,15 @@ protected:
         engine.InitializeGPU(true);
         glBindFramebuffer(GL_FRAMEBUFFER, 0);
         // Smooth, so that the filter's weights matter little, with all fractions in it.
+        std::vector<Rgba> texels;
         for (std::size_t i = 0; i < kTexels; ++i) {
             const double along = 0.21 * static_cast<double>(i % kWidth), up = 0.13 * static_cast<double>(i / kWidth);
-            before.push_back(rounded(static_cast<float>(60 + 60 * std::sin(along) * std::cos(up))));
+            const double value = 60 + 60 * std::sin(along) * std::cos(up);
+            const auto byte = [](double x) { return static_cast<std::uint8_t>(x); };
+            texels.push_back({byte(value), byte((value - std::floor(value)) * 255), 0, 0});
+            before.push_back(decoded(texels.back()));
         }
-        setDensity(before);
+        fill(engine.Density.Ping, texels.data());
     }
 
     // Mesa's software rasteriser of last resort is exact; the other one filters in 8 bits.
@@ -68,21 +71,10 @@ protected:
         glTexImage2D(GL_TEXTURE_2D, 0, GL_RGBA, kWidth, kHeight, 0, GL_RGBA, GL_UNSIGNED_BYTE, texels);
     }
 
-    void setDensity(const Density& density) {
-        std::vector<Rgba> texels;
-        for (const float value : density) {
-            const auto whole = static_cast<std::uint8_t>(value);
-            texels.push_back({whole, static_cast<std::uint8_t>(std::lround((value - whole) * 255)), 0, 0});
-        }
-        fill(engine.Density.Ping, texels.data());
-    }
-
     static Density densityOf(const Surface_& surface) {
         glBindFramebuffer(GL_FRAMEBUFFER, surface.FboHandle);
         Density values;
-        for (const Rgba& texel : readPixels(kWidth, kHeight)) {
-            values.push_back(static_cast<float>(texel[0]) + static_cast<float>(texel[1]) / 255.0f);
-        }
+        for (const Rgba& texel : readPixels(kWidth, kHeight)) values.push_back(decoded(texel));
         glBindFramebuffer(GL_FRAMEBUFFER, 0);
         return values;
     }

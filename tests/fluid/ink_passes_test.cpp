@@ -92,16 +92,17 @@ TEST_F(InkPasses, injectionAddsWhatTheKernelAdds) {
     kernel.InverseSize = Vec2(1.0f / kWidth, 1.0f / kHeight);
     engine.Radius = kernel.Radius = 300;
     kernel.ImpulseDensity = 30;
+    kernel.current = {903.3f, 1503.3f};
     for (const int mode : {-1, 0, 1, 2}) {
-        for (vec2 previous : {vec2{320, 500}, {900, 500}, {900, 1500}}) {
+        for (vec2 previous : {vec2{320.3f, 500.4f}, {903.3f, 500.4f}, kernel.current}) {
             SCOPED_TRACE(testing::Message() << "mode " << mode << " from " << previous.x << ", " << previous.y);
             kernel.mode = mode;
             kernel.previous = previous;
-            kernel.current = {900, 1500};
             kernel.len = distance(kernel.previous, kernel.current);
             const bool hasLength = kernel.len > 0;
             kernel.normal = hasLength ? (kernel.current - kernel.previous) / kernel.len : Vec2(0);
-            engine.AddInk(engine.Density.Ping, engine.Density.Pong, mode, {previous.x, previous.y}, {900, 1500}, 30);
+            engine.AddInk(
+                engine.Density.Ping, engine.Density.Pong, mode, {previous.x, previous.y}, {903.3f, 1503.3f}, 30);
             const Density expected = everyTexel(kernel, 0.5f);
             EXPECT_EQ(largestDifference(expected, before) > 0.2, mode != 2 || hasLength) << "adds something";
             EXPECT_LE(

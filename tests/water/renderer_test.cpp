@@ -109,7 +109,7 @@ protected:
         for (std::size_t i = 0; i < kPixels; ++i) {
             const float steepness = static_cast<float>(i) / kPixels;
             heights[3 * i] = height(random);
-            for (const std::size_t k : {1, 2}) heights[3 * i + k] = heights[3 * i] + steepness * height(random);
+            for (const std::size_t k : {1u, 2u}) heights[3 * i + k] = heights[3 * i] + steepness * height(random);
         }
         setUp(false);
         kPortrait.load(engine.portraitBG);

@@ -4,6 +4,7 @@
 
 #include "bench/forms.h"
 #include "fluid/fluid.h"
+#include "fluid/touch.h"
 #include "jni/globals.h"
 #include "tests/support/gl_test.h"
 
@@ -109,6 +110,8 @@ TEST_F(InkPasses, injectionAddsWhatTheKernelAdds) {
                 largestDifference(densityOf(engine.Density.Pong), expected), 0.5 / 255 + (isExact() ? 1e-3 : 2e-3));
         }
     }
+    const Segment none = segmentBetween({5, 7}, {5, 7});
+    EXPECT_EQ((std::array{none.normal.x, none.normal.y, none.length}), (std::array{0.0f, 0.0f, 1.0f}));
 }
 
 // With a velocity grid of the density's own size both samplers address the same texels: the kernel's runs from 0 at the

@@ -8,6 +8,7 @@ using Toolkit = GlTest;
 TEST_F(Toolkit, whatDoesNotCompileOrLinkIsLoggedAndGivesNone) {
     EXPECT_EQ(zorloadShaderScript(GL_FRAGMENT_SHADER, "void main() { nonsense }"), 0u);
     EXPECT_EQ(log.take().at(1).find("E Could not compile shader 35632:\n"), 0u);
+    for (GLuint name = 1; name < 9; ++name) EXPECT_FALSE(glIsShader(name)) << "nothing is left of it";
     EXPECT_EQ(zorloadShaderScript(GL_TEXTURE_2D, kQuadVert), 0u) << "no such kind of shader";
     EXPECT_EQ(glGetError(), static_cast<GLenum>(GL_INVALID_ENUM));
 
@@ -18,6 +19,7 @@ TEST_F(Toolkit, whatDoesNotCompileOrLinkIsLoggedAndGivesNone) {
     log.take();
     EXPECT_EQ(zorCreateShaderProgram(vertex, fragment), 0u);
     EXPECT_EQ(log.take().at(1).find("E Could not link program:\n"), 0u);
+    for (GLuint name = 1; name < 9; ++name) EXPECT_FALSE(glIsProgram(name)) << "nothing is left of it";
     EXPECT_TRUE(glIsShader(vertex) && glIsShader(fragment)) << "the shaders stay the caller's";
     EXPECT_EQ(zorCreateShaderProgram(vertex, 0), 0u);
     EXPECT_EQ(zorCreateShaderProgram(0, fragment), 0u);

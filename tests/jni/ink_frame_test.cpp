@@ -109,19 +109,20 @@ TEST_F(InkFrame, dragsWriteThePresetOfTheirSpeed) {
     frames(1);
     EXPECT_EQ(written(), before) << "until the first measured movement";
     const float weight = 0.45f;
-    int x = 103;
+    int x = 103, y = 400;
     for (const auto& [way, preset] :
          {std::pair(20, Preset{2, 30, 40, 20, 4, 0.96f, 0.92f}),
           {9, Preset{1, 25, 150, 10, 20, 0.94f, 0.92f}},
-          {2, Preset{0, 40 * weight, 100, 45 * weight, 20, 0.8f, 0.94f}},
+          {1, Preset{0, 40 * weight, 100, 45 * weight, 20, 0.8f, 0.94f}},
           {11, Preset{2, 30, 40, 20, 4, 0.96f, 0.92f}}}) {
         SCOPED_TRACE(way);
-        const std::pair segment(static_cast<float>(x), static_cast<float>(x + way));
-        touch(x += way, 400, kActionMove, 0.5f);
+        const std::array segment = {x, 800 - y, x + way, 800 - y - 1};
+        touch(x += way, ++y, kActionMove, 0.5f);
         const vec2* const velocity = fluid.VelocityTex.data;
         frames(1);
         EXPECT_EQ(written(), preset);
-        EXPECT_EQ(std::pair(fluid.Previous.x, fluid.Current.x), segment) << "segments join";
+        const auto [from, to] = std::pair(fluid.Previous, fluid.Current);
+        EXPECT_TRUE(std::ranges::equal(std::array{from.x, from.y, to.x, to.y}, segment)) << "segments join";
         // Two swaps of the pair in Update; a push adds a third.
         EXPECT_EQ(fluid.VelocityTex.data != velocity, preset[0] == 2);
     }
@@ -151,7 +152,8 @@ TEST_F(InkFrame, clearedInkAndInkThatWasSwitchedOffComeBackWithTheNextTouch) {
     Frame::setUp(480, 800, true);
     EXPECT_EQ(densest(), 0);
     touch(180, 400, kActionMove, 1.0f);
-    frames(1);
+    Frame().draw();
+    EXPECT_NEAR(fluid.InkColor.r, 0.15f, 1e-6f);
     EXPECT_GT(densest(), 0) << "the stroke goes on";
     EXPECT_EQ(std::pair(fluid.Previous.x, fluid.Current.x), std::pair(140.0f, 180.0f));
 }

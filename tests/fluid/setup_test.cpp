@@ -1,5 +1,3 @@
-#include <regex>
-
 #include "fluid/fluid.h"
 #include "tests/support/gl_test.h"
 
@@ -29,7 +27,7 @@ TEST_F(Setup, logsEveryStepAndEveryObjectThatItReplaces) {
     }
     engine.InitializeGPU(true);
     std::string lines;
-    for (const std::string& line : log.take()) lines += std::regex_replace(line, std::regex("[0-9]+"), "#") + '\n';
+    for (const std::string& line : log.take()) lines += line.substr(0, line.find_last_not_of("0123456789") + 1) + '\n';
     const std::string build = "E zorloadShaderScript\nE zorloadShaderScript\nI zorCreateShaderProgram\n";
     const std::string ripple = "I ripple_vertextShader zorCreateShaderProgram()\n" + build;
     const std::string advect = "I advect_density_program zorCreateShaderProgram()\n" + build;
@@ -37,16 +35,16 @@ TEST_F(Setup, logsEveryStepAndEveryObjectThatItReplaces) {
     EXPECT_EQ(
         lines, "I InitializeSetting\nI InitializeGPU\n" + ripple +
                    "I LoadPortraitBGTextures\nI LoadLandscapeBGTextures\n" +
-                   "I InitializeSetting\nI glDelete v_buf = #\nI glDelete h_buf = #\nI glDelete i_buf = #\n" +
-                   "I InitializeGPU\nI bInk is true\nI glDelete ripple_program = #\n" + ripple + advect + addInk +
+                   "I InitializeSetting\nI glDelete v_buf = \nI glDelete h_buf = \nI glDelete i_buf = \n" +
+                   "I InitializeGPU\nI bInk is true\nI glDelete ripple_program = \n" + ripple + advect + addInk +
                    "E CreateSurface\nE CreateSurface\nE CreateSurface\nI CreateQuad\n" +
-                   "I LoadPortraitBGTextures\nI glDelete portraitBG = #\n" +
-                   "I LoadLandscapeBGTextures\nI glDelete landscapeBG = #\nI glDelete environment = #\n" +
-                   "I InitializeGPU\nI bInk is true\nI glDelete ripple_program = #\n" + ripple +
-                   "I glDelete advect_density_program = #\n" + advect + "I glDelete addInk_program = #\n" + addInk +
-                   "I glDelete Velocity.Ping.FboHandle = #\nE CreateSurface\n" +
-                   "I glDelete Density.Ping.FboHandle = #\nE CreateSurface\nE CreateSurface\n" +
-                   "I CreateQuad\nI glDelete quadvbo = #\n");
+                   "I LoadPortraitBGTextures\nI glDelete portraitBG = \n" +
+                   "I LoadLandscapeBGTextures\nI glDelete landscapeBG = \nI glDelete environment = \n" +
+                   "I InitializeGPU\nI bInk is true\nI glDelete ripple_program = \n" + ripple +
+                   "I glDelete advect_density_program = \n" + advect + "I glDelete addInk_program = \n" + addInk +
+                   "I glDelete Velocity.Ping.FboHandle = \nE CreateSurface\n" +
+                   "I glDelete Density.Ping.FboHandle = \nE CreateSurface\nE CreateSurface\n" +
+                   "I CreateQuad\nI glDelete quadvbo = \n");
 }
 
 TEST_F(Setup, sizesFollowTheViewAndParametersHaveTheirValues) {

@@ -27,6 +27,7 @@ TEST_F(Toolkit, whatDoesNotCompileOrLinkIsLoggedAndGivesNone) {
 
 TEST_F(Toolkit, anIncompleteTargetIsLoggedAndReturnedAllTheSame) {
     EXPECT_NE(createSurface(0, 4).FboHandle, 0u);
+    EXPECT_EQ(binding(GL_FRAMEBUFFER_BINDING), 0);
     EXPECT_EQ(log.take().at(1).find("I FRAMEBUFFER_ERROR - "), 0u);
     glGetError();
 }

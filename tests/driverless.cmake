@@ -1,8 +1,8 @@
 # The tests that need no OpenGL driver; they also run on another processor in an emulator.
 set(TIDEMARK_DRIVERLESS_TESTS
-    fluid/touch_test.cpp
+    ../bench/ink_grid.cpp
+    ../bench/library_forms.cpp
     jni/gesture_test.cpp
-    tshader/density_kernels_test.cpp
     tshader/flush_denormals_test.cpp
     tshader/kernels_test.cpp
     tshader/samplers_test.cpp

@@ -84,7 +84,7 @@ public final class WaterHost {
         changed = true;
     }
 
-    /** Shorter by longer side of the views that the backgrounds are cropped to, upright and across. */
+    /** Shorter by longer side of what the backgrounds are cropped to in portrait and in landscape. */
     public double proportions() {
         return (double) Math.min(pictureWidth, pictureHeight) / Math.max(pictureWidth, pictureHeight);
     }

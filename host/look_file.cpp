@@ -41,7 +41,7 @@ std::string readLine(const std::string& line, Look& look) {
 
 }  // namespace
 
-std::optional<Look> readLook(std::istream& text, const std::string& name, std::string& error) {
+std::optional<Look> parseLook(std::istream& text, const std::string& name, std::string& error) {
     Look look;
     std::string line;
     for (int number = 1; std::getline(text, line); ++number) {
@@ -66,5 +66,5 @@ std::optional<Look> loadLook(const std::string& path, std::string& error) {
         error = "cannot read the look " + path + ": " + std::strerror(errno);
         return std::nullopt;
     }
-    return readLook(file, path, error);
+    return parseLook(file, path, error);
 }

@@ -1,8 +1,10 @@
-// The files that the preview reads: a picture after a 'p', after any other first byte a touch script.
+// The files that the preview reads: a picture after a 'p', a look after an 'l', after any other first byte a touch
+// script.
 #include <sys/mman.h>
 #include <unistd.h>
 
 #include <algorithm>
+#include <cmath>
 #include <cstddef>
 #include <cstdint>
 #include <sstream>
@@ -12,6 +14,7 @@
 
 #include "fuzz/library_state.h"
 #include "fuzz/require.h"
+#include "host/look_file.h"
 #include "pictures/picture_file.h"
 #include "preview/touch_script.h"
 
@@ -37,10 +40,8 @@ void requireSoundEvents(const std::vector<TouchEvent>& events) {
 }
 
 // Through the host into the library, which must stay sound whatever the finger does.
-void play(const std::vector<TouchEvent>& events) {
+void play(const std::vector<TouchEvent>& events, const Look& look) {
     resetLibrary();
-    Look look;
-    look.meshVertices = 16;
     WaterHost host(look, kViewWidth, kViewHeight, 1);
     host.setUp(true);
     TouchPlayer player(events, kViewWidth, kViewHeight);
@@ -49,6 +50,16 @@ void play(const std::vector<TouchEvent>& events) {
         if (host.advance(1.0 / 60)) host.draw();
         requireSoundLibrary();
     }
+    for (const float height : host.heights()) require(std::isfinite(height), "a height is not a number");
+}
+
+void readLook(std::string_view text) {
+    std::istringstream stream{std::string(text)};
+    std::string error;
+    const std::optional<Look> look = parseLook(stream, "a.look", error);
+    if (!look) return requireReason(error, "a.look:");
+    const TouchCoordinate start = {20, true}, end = {80, true};
+    play({{0, TouchAction::down, start, start, 1.0f}, {16, TouchAction::move, end, end, 1.0f}}, *look);
 }
 
 void readScript(std::string_view text) {
@@ -57,7 +68,9 @@ void readScript(std::string_view text) {
     const auto events = parseTouchScript(stream, "a.touch", error);
     if (!events) return requireReason(error, "a.touch:");
     requireSoundEvents(*events);
-    play(*events);
+    Look look;
+    look.meshVertices = 16;
+    play(*events, look);
 }
 
 // A file without a directory entry.
@@ -110,6 +123,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     if (bytes.empty()) return 0;
     if (bytes.front() == 'p') {
         readPicture(bytes.substr(1));
+    } else if (bytes.front() == 'l') {
+        readLook(bytes.substr(1));
     } else {
         readScript(bytes.substr(1));
     }

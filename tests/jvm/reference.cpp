@@ -66,7 +66,7 @@ private:
         } else if (command == "look") {
             std::stringstream lines;
             while (words >> a >> b) lines << a << " = " << b << '\n';
-            const std::optional<Look> look = readLook(lines, command, a);
+            const std::optional<Look> look = parseLook(lines, command, a);
             if (!look) fail(a);
             water_.setLook(*look);
         } else if (command == "clear") {

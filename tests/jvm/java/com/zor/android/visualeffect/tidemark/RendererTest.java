@@ -1,6 +1,7 @@
 package com.zor.android.visualeffect.tidemark;
 
 import android.graphics.Bitmap;
+import android.opengl.GLES20;
 import android.os.SystemClock;
 import android.view.MotionEvent;
 
@@ -46,6 +47,8 @@ public final class RendererTest {
         int frames = drawUntilRest();
         Check.that(frames > 60 && frames < 480, frames + " frames of waves");
         Check.that(difference(still, GlContext.pixels(width, height)) <= 8, "water at rest looks as before");
+        drawFrame();
+        Check.equal(1, GLES20.clears, "frames without water");
     }
 
     private void aRotationShowsTheOtherPicture() {

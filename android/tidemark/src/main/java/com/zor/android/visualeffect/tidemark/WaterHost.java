@@ -84,7 +84,7 @@ public final class WaterHost {
         changed = true;
     }
 
-    /** Shorter by longer side of the views that the backgrounds are cropped to, upright and across. */
+    /** Shorter by longer side of what the backgrounds are cropped to in portrait and in landscape. */
     public double proportions() {
         return (double) Math.min(pictureWidth, pictureHeight) / Math.max(pictureWidth, pictureHeight);
     }
@@ -139,8 +139,8 @@ public final class WaterHost {
 
     /**
      * One touch event: pixels from the top left corner of the view, one of the actions above, pressure around 1. A
-     * stroke begins with the finger's coming down. Like the other calls below it does nothing before the first
-     * {@link #setUp}.
+     * stroke begins with the finger's coming down. This, {@link #advance} and {@link #clearInk} do nothing before the
+     * first {@link #setUp}.
      */
     public void touch(int action, int x, int y, float pressure) {
         if (!isSetUp) return;
@@ -180,7 +180,10 @@ public final class WaterHost {
         return !changed && !raining && calmSteps >= look.stepsToRest && !inkMoves();
     }
 
-    /** Draws one frame into the current framebuffer. With ink, this is also one step of the ink. */
+    /**
+     * Draws one frame: without ink into the current framebuffer, with ink into framebuffer 0. With ink, this is also one
+     * step of the ink.
+     */
     public void draw() {
         gatherHeights();
         library.onDrawFrame(positions, heightAttribs, indices, positions.length, heightAttribs.length, indices.length,

@@ -4,7 +4,7 @@ build_packages=(cmake g++ ninja-build openjdk-17-jdk-headless libgles-dev libegl
     libstb-dev libcli11-dev libglfw3-dev ffmpeg)
 test_packages=(clang clang-format clang-tidy libgtest-dev glslang-tools binutils git valgrind xvfb xauth xdotool)
 fuzz_packages=(clang libclang-rt-dev llvm)
-arm64_packages=(g++-aarch64-linux-gnu qemu-user googletest)
+arm64_packages=(g++-aarch64-linux-gnu qemu-user)
 web_packages=(cmake ninja-build openjdk-17-jdk-headless emscripten)
 web_test_packages=(chromium)
 bench_packages=(clang libbenchmark-dev libeigen3-dev python3)

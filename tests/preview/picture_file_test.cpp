@@ -67,6 +67,15 @@ TEST(PictureFile, RefusesWhatWouldHarmTheProcess) {
     EXPECT_EQ(reasonAgainst("\xff\xd8\xff\xfe\1\x20"s + table + "........"s).find("Huffman"), std::string::npos);
 }
 
+TEST(PictureFile, SaysInOneLineWhatIsWrongWithAFileThatOnceDidHarm) {
+    for (const auto& file : std::filesystem::directory_iterator(TIDEMARK_REGRESSIONS_PATH)) {
+        std::string error;
+        EXPECT_FALSE(loadPicture(file.path(), error));
+        EXPECT_NE(error.find(file.path()), std::string::npos) << error;
+        EXPECT_EQ(error.find('\n'), std::string::npos) << error;
+    }
+}
+
 TEST(PictureFile, FitsLargePicturesInTheirOwnProportions) {
     Picture wide{400, 100, {}};
     for (int i = 0; i < 400 * 100; ++i) {

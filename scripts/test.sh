@@ -41,5 +41,5 @@ ctest --preset release -j "$(nproc)"
 ctest --preset asan -j "$(nproc)"
 ctest --preset fuzz -j "$(nproc)"
 # Java, the screen and long sessions are about contracts which no compiler changes.
-ctest --preset clang -j "$(nproc)" --exclude-regex "^(jvm|window|LostContexts|FailingAllocations|LongRun)"
+ctest --preset clang -j "$(nproc)" --exclude-regex "^(jvm|window|endurance)"
 scripts/lint.sh

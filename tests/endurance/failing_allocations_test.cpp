@@ -22,8 +22,7 @@ protected:
 
     // A blot grows for some frames, and is cleared.
     Shown play() const {
-        Look look;
-        look.meshVertices = vertices_;
+        const Look look = {.meshVertices = vertices_};
         // The pictures are cropped alike for each view, so that one that stays in place is the same.
         WaterHost square(look, 1, 1, 1);
         handOverPictures(square);

@@ -12,13 +12,16 @@ namespace {
 
 class FailingAllocations : public GlTest {
 protected:
-    static constexpr int kLargestView = 384;
+    static constexpr int kLargestView = 468;
 
     struct Shown {
         std::vector<Rgba> inked, water;
     };
 
-    void SetUp() override { renewContext(kLargestView, kHeight); }
+    void SetUp() override {
+        renewContext(kLargestView, kHeight);
+        resetGestures();
+    }
 
     // A blot grows for some frames, and is cleared.
     Shown play() const {
@@ -32,7 +35,7 @@ protected:
         // A driver that refuses a shader explains it in a text of its own length.
         zorloadShaderScript(GL_VERTEX_SHADER, "void main( {");
         host.touch(TouchAction::down, width_ / 2, kHeight / 2, 1.0f);
-        for (int i = 0; i < 4; ++i) {
+        for (int i = 0; i < 3; ++i) {
             host.advance(1.0 / 60);
             host.draw();
         }
@@ -78,8 +81,8 @@ protected:
     }
 
 private:
-    static constexpr int kHeight = 132;
-    int width_ = 144;
+    static constexpr int kHeight = 144;
+    int width_ = 300;
     int vertices_ = 40;
 };
 

@@ -1,7 +1,6 @@
 // A context that is lost in the middle of a gesture, over and over.
 #include <algorithm>
 #include <functional>
-#include <iostream>
 #include <random>
 #include <string_view>
 
@@ -149,6 +148,4 @@ TEST_F(LostContexts, costOneSetUpEvenInTheMiddleOfAStroke) {
         }
     }
     EXPECT_GT(strokesGoneOn, losses / 8);
-    std::cout << losses << " contexts lost, with ink: " << testing::PrintToString(first_[true])
-              << ", strokes gone on after " << strokesGoneOn << '\n';
 }

@@ -95,7 +95,10 @@ void transfer(Values& values) {
     const bool fits = bitmap.info.height == 0 || rowBytes <= kLargestBitmap / Wide{bitmap.info.height};
     std::vector<std::uint8_t> pixels(fits ? static_cast<std::size_t>(rowBytes * bitmap.info.height) : 0);
     pixels.reserve(1);
-    if (fits && !fails) bitmap.pixels = pixels.data();
+    // One beyond max_allocation_size_mb is locked and never read.
+    const std::uint64_t texels = std::uint64_t{bitmap.info.width} * bitmap.info.height;
+    const bool refused = texels > 1 << 24 && texels < std::uint64_t{1} << 60;
+    if ((fits || refused) && !fails) bitmap.pixels = pixels.data();
     native(env, nullptr, &bitmap);
     require(bitmap.locks == 0, "a bitmap is still locked, or was unlocked twice");
 }

@@ -54,6 +54,15 @@ TEST(PictureFile, RefusesWhatWouldHarmTheProcess) {
     EXPECT_EQ(reasonAgainst("\xff\xd8\xff\xfe\1\x20"s + table + "........").find("Huffman"), std::string::npos);
 }
 
+TEST(PictureFile, NamesInOneLineEachFileThatOnceDidHarm) {
+    for (const auto& file : std::filesystem::directory_iterator(TIDEMARK_REGRESSIONS_PATH)) {
+        std::string error;
+        EXPECT_FALSE(loadPicture(file.path(), error));
+        EXPECT_NE(error.find(file.path()), std::string::npos) << error;
+        EXPECT_EQ(error.find('\n'), std::string::npos) << error;
+    }
+}
+
 TEST(PictureFile, FitsLargePicturesInTheirOwnProportions) {
     Picture wide{40, 10, std::vector<std::uint8_t>(40 * 10 * 4, 7)};
     for (int row = 0; row < 10; ++row) std::fill_n(wide.rgba.begin() + 160 * row, 80, std::uint8_t{200});

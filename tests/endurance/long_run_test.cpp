@@ -34,6 +34,7 @@ protected:
 
     void SetUp() override {
         resetGestures();
+        finite = true;
         hostEnvironment()->functions = &watching;
         watching.ReleaseFloatArrayElements = [](JNIEnv* env, jfloatArray reference, jfloat* elements, jint mode) {
             if (looking) lookAt(elements, static_cast<FloatArray*>(reference)->values.size());

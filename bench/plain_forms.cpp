@@ -1,5 +1,6 @@
 // The formulas as plain loops over one value at a time. Compiled twice, with the optimizations that CMakeLists.txt
-// gives to each PLAIN_FORMS.
+// gives to each PLAIN_FORMS. The order of arguments of min and max says what becomes of a value that is not a number:
+// a height stays none, a coordinate is 0, a speed counts as calm and is packed as 127.
 #include <algorithm>
 #include <cmath>
 #include <vector>
@@ -26,7 +27,7 @@ bool wave(float* v, float* h, const WaveRegion& region, bool checkCalm, float da
     }
     for (int y = yStart; y < yEnd; ++y) {
         for (int i = y * stride + xStart; i < y * stride + xEnd; ++i) {
-            h[i] = std::max(-100.0f, std::min(100.0f, h[i] + v[i]));
+            h[i] = std::max(std::min(h[i] + v[i], 100.0f), -100.0f);
         }
     }
     std::copy(h + (yStart - 1) * stride, h + (yEnd + 1) * stride, s + (yStart - 1) * stride);
@@ -59,8 +60,8 @@ void ripple(const RippleField& field, float posA, float posB, float amplitude) {
 }
 
 vec2 sample(const vec2* texels, int width, int height, float u, float v) {
-    const float x = static_cast<float>(width - 1) * std::clamp(u, 0.0f, 1.0f);
-    const float y = static_cast<float>(height - 1) * std::clamp(v, 0.0f, 1.0f);
+    const float x = static_cast<float>(width - 1) * std::min(std::max(0.0f, u), 1.0f);
+    const float y = static_cast<float>(height - 1) * std::min(std::max(0.0f, v), 1.0f);
     const int x0 = static_cast<int>(x);
     const int y0 = static_cast<int>(y);
     const int x1 = std::min(x0 + 1, width - 1);

@@ -6,7 +6,6 @@
 
 #include <cstdint>
 #include <cstdlib>
-#include <initializer_list>
 #include <utility>
 
 #include "fuzz/require.h"
@@ -19,20 +18,20 @@ constexpr unsigned kModes = ~0x3fU;  // all but the flags of past operations
 
 unsigned hostModes = 0;
 
-bool owns(const void* block, std::uint64_t bytes) {
-    return __sanitizer_get_ownership(block) && __sanitizer_get_allocated_size(block) >= bytes;
-}
+struct HandedOver {
+    AndroidBitmapInfo& info;
+    std::uint8_t*& pixels;
+};
+const HandedOver pictures[] = {
+    {bmp_portrait_bg_info, bmp_portrait_bg_Pixels},
+    {bmp_landscape_bg_info, bmp_landscapebg_Pixels},
+    {bmp_water_Info, bmp_water_Pixels}};
 
-void dropPicture(AndroidBitmapInfo& info, std::uint8_t*& pixels) {
-    std::free(std::exchange(pixels, nullptr));
-    info = {};
-}
-
-void requireSoundPicture(const AndroidBitmapInfo& info, const std::uint8_t* pixels) {
-    if (!pixels) return;
-    // Divided instead of multiplied: the product of two sides may be beyond 64 bits once it is counted in bytes.
-    const std::uint64_t texels = std::uint64_t{info.width} * info.height;
-    require(texels <= SIZE_MAX / 4 && owns(pixels, 4 * texels), "a picture is smaller than its size says");
+// Divided instead of multiplied: once counted in bytes, the product of two sides may be beyond 64 bits.
+void requireRoom(const void* block, std::uint64_t bytesOfOne, std::uint64_t width, std::uint64_t height) {
+    require(
+        __sanitizer_get_ownership(block) && __sanitizer_get_allocated_size(block) / bytesOfOne >= width * height,
+        "a block is smaller than its size says");
 }
 
 template <class T>
@@ -41,9 +40,7 @@ void requireSoundGrid(const Texture<T>& grid) {
     require(!grid.data == !velocity.data, "some of the ink's grids are missing");
     if (!grid.data) return;
     require(grid.width == velocity.width && grid.height == velocity.height, "the ink's grids differ in size");
-    require(grid.width >= 0 && grid.height >= 0, "a grid has a negative size");
-    const auto texels = static_cast<std::uint64_t>(grid.width) * static_cast<std::uint64_t>(grid.height);
-    require(owns(grid.data, sizeof(T) * texels), "a grid is smaller than its size says");
+    requireRoom(grid.data, sizeof(T), static_cast<std::uint64_t>(grid.width), static_cast<std::uint64_t>(grid.height));
 }
 
 }  // namespace
@@ -51,17 +48,18 @@ void requireSoundGrid(const Texture<T>& grid) {
 void resetLibrary() {
     __android_log_set_logger([](const __android_log_message*) {});
     resetGestures();
-    dropPicture(bmp_portrait_bg_info, bmp_portrait_bg_Pixels);
-    dropPicture(bmp_landscape_bg_info, bmp_landscapebg_Pixels);
-    dropPicture(bmp_water_Info, bmp_water_Pixels);
+    for (const auto& [info, pixels] : pictures) {
+        std::free(std::exchange(pixels, nullptr));
+        info = {};
+    }
     srand48(1);
     hostModes = _mm_getcsr() & kModes;
 }
 
 void requireSoundLibrary() {
-    requireSoundPicture(bmp_portrait_bg_info, bmp_portrait_bg_Pixels);
-    requireSoundPicture(bmp_landscape_bg_info, bmp_landscapebg_Pixels);
-    requireSoundPicture(bmp_water_Info, bmp_water_Pixels);
+    for (const auto& [info, pixels] : pictures) {
+        if (pixels) requireRoom(pixels, 4, info.width, info.height);
+    }
     requireSoundGrid(fluid.VelocityTex);
     requireSoundGrid(fluid.VelocityTexTemp);
     requireSoundGrid(fluid.PressureTex);

@@ -1,18 +1,19 @@
 // Sessions of native calls in any order, with any arguments that a host can pass. Arrays have the length that the
-// counts ask for, which is the host's duty; where that is more than any host has, the call is left out.
+// counts ask for, which is the host's duty; where that is more than any host has, the call is left out. What the
+// library gets of an array is a block of its very length, beyond which the sanitizer looks.
 #include <algorithm>
 #include <concepts>
 #include <cstddef>
 #include <cstdint>
-#include <iterator>
+#include <vector>
 
-#include "fluid/fluid.h"
-#include "fuzz/checked_bitmap.h"
-#include "fuzz/checked_jni.h"
 #include "fuzz/library_state.h"
 #include "fuzz/require.h"
 #include "fuzz/values.h"
+#include "host/host_jni.h"
 #include "host/native_names.h"
+#include "jni/globals.h"
+#include "platform/desktop_bitmap.h"
 
 namespace {
 
@@ -27,7 +28,41 @@ Wide product(Wide a, Wide b) {
     return std::max<Wide>(a, 0) * std::max<Wide>(b, 0);
 }
 
-JNIEnv* const env = checkedEnvironment();
+// Usually there, now and then null or without memory for its copy.
+template <class Array>
+struct Argument : Array {
+    Argument(Values& drawn, Wide length) : Array(static_cast<std::size_t>(std::max<Wide>(length, 0))) {
+        const int kind = drawn.below(256);
+        pinnable = kind < 240;
+        reference = kind < 248 ? this : nullptr;
+        if constexpr (std::same_as<Array, FloatArray>) {
+            if (kind >= 200) std::ranges::fill(this->values, drawn.real());
+        }
+    }
+    ~Argument() { require(this->pins == 0, "an array is still pinned, or was released twice"); }
+    Argument(const Argument&) = delete;
+    Argument& operator=(const Argument&) = delete;
+
+    bool pinnable;
+    Array* reference;
+};
+
+using Floats = Argument<FloatArray>;
+using Shorts = Argument<ShortArray>;
+
+JNIEnv* const env = [] {
+    static const JNINativeInterface_& host = *hostEnvironment()->functions;
+    static JNINativeInterface_ table = host;
+    table.GetFloatArrayElements = [](JNIEnv* self, jfloatArray array, jboolean* isCopy) {
+        return static_cast<Floats*>(array)->pinnable ? host.GetFloatArrayElements(self, array, isCopy) : nullptr;
+    };
+    table.GetShortArrayElements = [](JNIEnv* self, jshortArray array, jboolean* isCopy) {
+        return static_cast<Shorts*>(array)->pinnable ? host.GetShortArrayElements(self, array, isCopy) : nullptr;
+    };
+    static JNIEnv environment = {&table};
+    return &environment;
+}();
+
 Wide workLeft = 0;
 
 // Whether a session has room for one more frame on the grids; with a view of 16384 x 16384 it has it once.
@@ -36,67 +71,36 @@ bool mayCompute(Wide share = 1) {
     return workLeft > 0;
 }
 
-// Usually there, now and then null or without memory for its pin.
-template <class Array>
-struct Argument {
-    Argument(Values& values, Wide length) {
-        const int kind = values.below(256);
-        array.length = static_cast<std::size_t>(std::max<Wide>(length, 0));
-        array.pinnable = kind < 240;
-        reference = kind < 248 ? &array : nullptr;
-        if constexpr (std::same_as<Array, CheckedFloats>) array.content = kind >= 200 ? values.real() : 0.0f;
-    }
-    Argument(const Argument&) = delete;
-    Argument& operator=(const Argument&) = delete;
-
-    Array array;
-    Array* reference;
-};
-
-using Floats = Argument<CheckedFloats>;
-using Shorts = Argument<CheckedShorts>;
-
 std::uint32_t strideOf(Values& values, std::uint32_t width) {
-    switch (values.below(6)) {
-        case 0:
-            return width * 4;
-        case 1:
-            return 0;
-        case 2:
-            return width * 2;
-        case 3:
-            return width * 4 + static_cast<std::uint32_t>(values.below(64));
-        case 4:
-            return static_cast<std::uint32_t>(values.below(64));
-        default:
-            return width * 8;
-    }
+    const int kind = values.below(6);
+    const std::uint32_t extra = kind == 3 || kind == 4 ? static_cast<std::uint32_t>(values.below(64)) : 0;
+    const std::uint32_t strides[] = {width * 4, 0, width * 2, width * 4 + extra, extra, width * 8};
+    return strides[kind];
 }
 
 void transfer(Values& values) {
-    using Transfer = void (*)(JNIEnv*, jobject, jobject);
-    const Transfer transfers[] = {
+    constexpr void (*kTransfers[])(JNIEnv*, jobject, jobject) = {
         NATIVE(transferPortraitBGBitmap), NATIVE(transferLandscapeBGBitmap), NATIVE(transferWaterBitmap)};
-    const Transfer native = values.PickValueInArray(transfers);
+    const auto native = values.PickValueInArray(kTransfers);
     if (values.below(16) == 15) return native(env, nullptr, nullptr);
 
-    CheckedBitmap bitmap;
+    DesktopBitmap bitmap;
     bitmap.info.width = static_cast<std::uint32_t>(values.number(0, 16));
     bitmap.info.height = static_cast<std::uint32_t>(values.number(0, 16));
     bitmap.info.stride = strideOf(values, bitmap.info.width);
     bitmap.info.format = values.number(1, 8);
-    const int failure = values.below(16);
-    if (failure == 13) bitmap.infoResult = ANDROID_BITMAP_RESULT_JNI_EXCEPTION;
-    if (failure == 14) bitmap.lockResult = ANDROID_BITMAP_RESULT_JNI_EXCEPTION;
+    const bool fails = values.below(16) >= 13;
     // A stride of 0 says that the rows are packed.
     const Wide rowBytes = bitmap.info.stride ? Wide{bitmap.info.stride} : Wide{bitmap.info.width} * 4;
     const bool fits = bitmap.info.height == 0 || rowBytes <= kLargestBitmap / Wide{bitmap.info.height};
-    if (!fits) bitmap.lockResult = ANDROID_BITMAP_RESULT_ALLOCATION_FAILED;
-    if (fits && failure != 15) {
-        bitmap.pixels.reset(new std::uint8_t[static_cast<std::size_t>(rowBytes * bitmap.info.height)]());
-    }
+    std::vector<std::uint8_t> pixels(fits ? static_cast<std::size_t>(rowBytes * bitmap.info.height) : 0);
+    pixels.reserve(1);
+    // One beyond max_allocation_size_mb is locked and never read.
+    const std::uint64_t texels = std::uint64_t{bitmap.info.width} * bitmap.info.height;
+    const bool refused = texels > 1 << 24 && texels < std::uint64_t{1} << 60;
+    if ((fits || refused) && !fails) bitmap.pixels = pixels.data();
     native(env, nullptr, &bitmap);
-    require(bitmap.locks == 0, "a bitmap is still locked");
+    require(bitmap.locks == 0, "a bitmap is still locked, or was unlocked twice");
 }
 
 void setUp(Values& values) {
@@ -106,15 +110,13 @@ void setUp(Values& values) {
 }
 
 void setUpGpu(Values&) {
-    if (!mayCompute(8)) return;
-    NATIVE(onInitGPU)(env, nullptr);
+    if (mayCompute(8)) NATIVE(onInitGPU)(env, nullptr);
 }
 
 void loadTextures(Values& values) {
-    const int which = values.below(3);
-    if (which == 0) NATIVE(onLoadPortraitBGTextures)(env, nullptr);
-    if (which == 1) NATIVE(onLoadLandscapeBGTextures)(env, nullptr);
-    if (which == 2) NATIVE(onLoadWaterTextures)(env, nullptr);
+    constexpr void (*kLoads[])(JNIEnv*, jobject) = {
+        NATIVE(onLoadPortraitBGTextures), NATIVE(onLoadLandscapeBGTextures), NATIVE(onLoadWaterTextures)};
+    values.PickValueInArray(kLoads)(env, nullptr);
 }
 
 void makeMesh(Values& values) {
@@ -133,20 +135,6 @@ void makeMesh(Values& values) {
     (env, nullptr, positions.reference, indices.reference, vertices, width, height, columns, rows);
 }
 
-// The elements of a field that a wave step may touch: its region and the next vertex on each side of it.
-struct Reach {
-    Wide first, last;
-};
-
-Reach reachOf(Wide xStart, Wide yStart, Wide xEnd, Wide yEnd, Wide stride) {
-    const Wide corners[] = {(yStart - 1) * stride + xStart,   (yStart - 1) * stride + xEnd - 1, yEnd * stride + xStart,
-                            yEnd * stride + xEnd - 1,         yStart * stride + xStart - 1,     yStart * stride + xEnd,
-                            (yEnd - 1) * stride + xStart - 1, (yEnd - 1) * stride + xEnd};
-    return {
-        *std::min_element(std::begin(corners), std::end(corners)),
-        *std::max_element(std::begin(corners), std::end(corners))};
-}
-
 void moveWater(Values& values) {
     const int xStart = values.number(0, 4);
     const int yStart = values.number(0, 4);
@@ -159,11 +147,14 @@ void moveWater(Values& values) {
     const float waveSpeed = values.real();
     Wide length = 0;
     if (xStart < xEnd && yStart < yEnd) {
-        const Reach reach = reachOf(xStart, yStart, xEnd, yEnd, stride);
-        const Wide columns = Wide{xEnd} - xStart;
-        const Wide rows = Wide{yEnd} - yStart;
-        if (reach.first < 0 || reach.last >= kLongestArray || rows > kLongestArray / columns) return;
-        length = reach.last + 1;
+        // The region and the next vertex on each side of it.
+        const Wide top = Wide{yStart} * stride;
+        const Wide bottom = (Wide{yEnd} - 1) * stride;
+        const auto [first, last] = std::minmax(
+            {top - stride + xStart, top - stride + xEnd - 1, top + xStart - 1, top + xEnd, bottom + xStart - 1,
+             bottom + xEnd, bottom + stride + xStart, bottom + stride + xEnd - 1});
+        if (first < 0 || last >= kLongestArray || Wide{yEnd} - yStart > kLongestArray / (Wide{xEnd} - xStart)) return;
+        length = last + 1;
     }
     Floats velocity(values, length);
     Floats height(values, length);
@@ -180,7 +171,7 @@ void ripple(Values& values) {
     const float posA = values.real();
     const float posB = values.real();
     const float amplitude = values.real();
-    if (countA > 0 && countB > 0 && countA > kLongestArray / countB) return;
+    if (product(countA, countB) > kLongestArray) return;
     Floats field(values, product(countA, countB));
     NATIVE(ripple)(env, nullptr, field.reference, extentA, extentB, countA, countB, posA, posB, amplitude);
 }
@@ -213,7 +204,6 @@ void draw(Values& values) {
         (env, nullptr, positions.reference, heights.reference, indices.reference, positionFloats, heightFloats,
          indexCount, mvp.reference, sizes[0], sizes[1], sizes[2], sizes[3], look[0], look[1], look[2], look[3], look[4],
          look[5], look[6], look[7], look[8], look[9], landscape);
-        requireNothingPinned();
         requireSoundLibrary();
     }
 }
@@ -227,9 +217,8 @@ void askForInk(Values&) {
     require(shown == 0 || shown == 1, "the ink is neither shown nor hidden");
 }
 
-using Call = void (*)(Values&);
-constexpr Call kCalls[] = {transfer, setUp, setUpGpu, loadTextures, makeMesh, moveWater,
-                           ripple,   touch, draw,     clearInk,     askForInk};
+constexpr void (*kCalls[])(Values&) = {transfer, setUp, setUpGpu, loadTextures, makeMesh, moveWater,
+                                       ripple,   touch, draw,     clearInk,     askForInk};
 
 }  // namespace
 
@@ -246,7 +235,6 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     Values values(data, size);
     for (int calls = 0; calls < kMostCalls && values.remaining_bytes() > 0; ++calls) {
         values.PickValueInArray(kCalls)(values);
-        requireNothingPinned();
         requireSoundLibrary();
     }
     return 0;

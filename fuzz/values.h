@@ -1,5 +1,5 @@
 // Arguments drawn from the fuzzer's bytes: mostly of a usual size, so that sessions get deep and stay fast, now and
-// then from the edges of their type. natives_seeds.py writes what these functions read.
+// then from the edges of their type.
 #pragma once
 
 #include <fuzzer/FuzzedDataProvider.h>

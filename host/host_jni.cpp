@@ -1,11 +1,13 @@
 #include "host/host_jni.h"
 
+#include <algorithm>
+
 template <class Array, class Element, class Reference>
 static Element* JNICALL getElements(JNIEnv*, Reference reference, jboolean* isCopy) {
     if (isCopy) *isCopy = JNI_TRUE;
     auto* const array = static_cast<Array*>(reference);
     // An array without elements has an address as well, as in a virtual machine.
-    array->pinned.reserve(array->values.size() + 1);
+    array->pinned.reserve(std::max<std::size_t>(array->values.size(), 1));
     array->pinned = array->values;
     ++array->pins;
     return array->pinned.data();

@@ -23,7 +23,8 @@ std::string readLine(const std::string& line, Look& look) {
     if (sign == line.npos) return "expected \"key = number\"";
     const std::string key = trimmed(line.substr(0, sign));
     const std::string value = trimmed(line.substr(sign + 1));
-    const auto* const field = std::ranges::find(kLookFields, key, &LookField::name);
+    const auto* const field = std::find_if(
+        std::begin(kLookFields), std::end(kLookFields), [&key](const LookField& f) { return f.name == key; });
     if (field == std::end(kLookFields)) return "there is no value \"" + key + "\"";
     const auto read = [&](auto member) {
         std::istringstream words(value);
@@ -41,7 +42,7 @@ std::string readLine(const std::string& line, Look& look) {
 
 }  // namespace
 
-std::optional<Look> readLook(std::istream& text, const std::string& name, std::string& error) {
+std::optional<Look> parseLook(std::istream& text, const std::string& name, std::string& error) {
     Look look;
     std::string line;
     for (int number = 1; std::getline(text, line); ++number) {
@@ -66,5 +67,5 @@ std::optional<Look> loadLook(const std::string& path, std::string& error) {
         error = "cannot read the look " + path + ": " + std::strerror(errno);
         return std::nullopt;
     }
-    return readLook(file, path, error);
+    return parseLook(file, path, error);
 }

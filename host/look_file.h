@@ -9,5 +9,5 @@
 #include "host/look.h"
 
 // On failure says why in `error`, in one line that starts with "name:line: ".
-std::optional<Look> readLook(std::istream& text, const std::string& name, std::string& error);
+std::optional<Look> parseLook(std::istream& text, const std::string& name, std::string& error);
 std::optional<Look> loadLook(const std::string& path, std::string& error);

@@ -51,7 +51,7 @@ public:
     // Where the framebuffer has lost the last frame.
     void redraw() { changed_ = true; }
 
-    // Before the first setUp what follows does nothing.
+    // Before the first setUp touch, advance and clearInk do nothing.
 
     // One touch event; x and y in pixels from the top left corner of the view, pressure around 1. A stroke begins with
     // the finger's coming down.

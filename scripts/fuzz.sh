@@ -1,7 +1,9 @@
 #!/usr/bin/env bash
-# Fuzzes the native methods and the preview's files for the given minutes, both at once, each on one core. Inputs that
-# reach new code are kept in build/fuzz/corpus for the next run. An input that fails is left in build/fuzz/failures: copy
-# it to fuzz/regressions, under a name that tells what is wrong.
+# Fuzzes the native methods for the given minutes, on one core. What is found to be interesting is kept in
+# build/fuzz/corpus for the next run; what of it reaches new code is added to the shipped corpus by
+#   build/fuzz/fuzz/fuzz_natives -merge=1 -use_counters=0 fuzz/corpus build/fuzz/corpus
+# An input that fails is left in build/fuzz/failures; it belongs into fuzz/regressions under a name that tells what is
+# wrong.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/common.sh
@@ -16,26 +18,6 @@ no_more_arguments "$usage" "$@"
 install_missing "${build_packages[@]}" "${fuzz_packages[@]}"
 cmake --preset fuzz >/dev/null
 cmake --build --preset fuzz
-
-failures=build/fuzz/failures
-mkdir -p "$failures"
-declare -A runs
-for target in natives files; do
-    corpus=build/fuzz/corpus/$target
-    mkdir -p "$corpus"
-    options=(-max_total_time=$((minutes * 60)) -timeout=20 -artifact_prefix="$failures/$target-")
-    [ ! -f fuzz/$target.dict ] || options+=("-dict=fuzz/$target.dict")
-    build/fuzz/fuzz/fuzz_$target "${options[@]}" \
-        "$corpus" fuzz/seeds/$target fuzz/regressions/$target >"build/fuzz/$target.log" 2>&1 &
-    runs[$target]=$!
-done
-failed=0
-for target in natives files; do
-    if wait "${runs[$target]}"; then
-        echo "$target: nothing found. $(grep DONE "build/fuzz/$target.log")"
-    else
-        echo "$target: a failure, in $failures; its report ends build/fuzz/$target.log"
-        failed=1
-    fi
-done
-exit "$failed"
+mkdir -p build/fuzz/corpus build/fuzz/failures
+build/fuzz/fuzz/fuzz_natives -max_total_time=$((minutes * 60)) -timeout=20 -artifact_prefix=build/fuzz/failures/ \
+    build/fuzz/corpus fuzz/corpus fuzz/regressions

@@ -6,7 +6,7 @@
 
 static std::optional<Look> read(const std::string& text, std::string& error) {
     std::istringstream stream(text);
-    return readLook(stream, "a.look", error);
+    return parseLook(stream, "a.look", error);
 }
 
 TEST(LookFile, ChangesWhatItNamesAndNothingElse) {

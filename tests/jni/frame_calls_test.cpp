@@ -1,146 +1,70 @@
 // Every GL call of a frame, counted by name: a call too many is paid in every frame on a phone.
 #include <gtest/gtest.h>
 
-#include "fluid/fluid.h"
-#include "host/water_host.h"
+#include "fluid/ink_presets.h"
+#include "jni/gesture.h"
 #include "jni/globals.h"
 #include "tests/support/counting_gl.h"
+#include "tests/support/frame.h"
 #include "tests/support/gesture_state.h"
 #include "tests/support/library_blocks.h"
 #include "tests/support/log_recorder.h"
-#include "tests/support/test_pictures.h"
 
 namespace {
 
-using Calls = std::map<std::string, int>;
+constexpr int kMeshBytes = 2 * 12 * sizeof(float) + 6 * sizeof(short);
+constexpr int kQuadBytes = 4 * 4 * sizeof(short);
+constexpr int kGridBytes = (480 / 12) * (800 / 12) * 4;
 
-Calls operator+(Calls a, const Calls& b) {
-    for (const auto& [name, count] : b) a[name] += count;
-    return a;
-}
-
-// The water: its uniforms by name, three arrays anew, two attributes, two textures.
-const Calls kWater = {
-    {"glViewport", 2},
-    {"glUseProgram", 1},
-    {"glGetUniformLocation", 14},
-    {"glUniform1f", 11},
-    {"glUniform1i", 2},
-    {"glUniformMatrix4fv", 1},
-    {"glGetAttribLocation", 2},
-    {"glBindBuffer", 10},
-    {"glBufferData", 3},
-    {"glVertexAttribPointer", 2},
-    {"glEnableVertexAttribArray", 2},
-    {"glDisableVertexAttribArray", 2},
-    {"glActiveTexture", 2 + 4},
-    {"glBindTexture", 2 + 4},
-    {"glDrawElements", 1}};
-
-// Its ink: scale, colour, intensity and the density texture.
-const Calls kShownInk = {{"glGetUniformLocation", 4}, {"glUniform1f", 1},     {"glUniform1i", 1},  {"glUniform2f", 1},
-                         {"glUniform3f", 1},          {"glActiveTexture", 1}, {"glBindTexture", 1}};
-
-// A pass over the ink draws the quad and puts everything back.
-const Calls kPass = {
-    {"glUseProgram", 1},
-    {"glBindFramebuffer", 2},
-    {"glBindBuffer", 1},
-    {"glBufferData", 1},
-    {"glEnableVertexAttribArray", 2},
-    {"glVertexAttribPointer", 2},
-    {"glDrawArrays", 1},
-    {"glDisableVertexAttribArray", 1},
-    {"glActiveTexture", 4},
-    {"glBindTexture", 4},
-    {"glDisable", 1}};
-
-const Calls kMovedInk =
-    kPass + Calls{{"glBindTexture", 1 + 2}, {"glTexImage2D", 1}, {"glViewport", 1},  {"glGetUniformLocation", 7},
-                  {"glUniform1f", 2},       {"glUniform1i", 2},  {"glUniform2f", 3}, {"glActiveTexture", 2}};
-
-const Calls kAddedInk =
-    kPass + Calls{{"glViewport", 1},  {"glGetUniformLocation", 9}, {"glUniform1f", 3},  {"glUniform1i", 2},
-                  {"glUniform2f", 4}, {"glActiveTexture", 1},      {"glBindTexture", 1}};
-
-const Calls kInkFrame = kWater + kShownInk + kMovedInk;
+// What a frame calls and hands over: the water alone, with ink that is carried, and with ink that is added as well.
+struct Use {
+    int calls, bytes;
+};
+constexpr Use kWater = {65, kMeshBytes};
+constexpr Use kCarried = {116, kMeshBytes + kQuadBytes + kGridBytes};
+constexpr Use kAdded = {157, kMeshBytes + 2 * kQuadBytes + kGridBytes};
 
 class FrameCalls : public testing::Test {
 protected:
-    static constexpr int kWidth = 480;
-    static constexpr int kHeight = 800;
-
     void start(bool withInk) {
         resetGestures();
-        host.handOver({smoothPicture(8, 8, 1), smoothPicture(8, 8, 2), smoothPicture(8, 8, 3)});
-        host.setUp(withInk);
-        host.draw();
+        Frame::setUp(480, 800, withInk);
+        frame.draw();
         takeGlUse();
     }
 
-    GlUse frame() {
-        host.draw();
-        return takeGlUse();
+    void expectFrame(const Use& expected) {
+        const int before = LibraryBlocks::requested;
+        frame.draw();
+        EXPECT_EQ(LibraryBlocks::requested, before) << "a warm frame allocates nothing";
+        const GlUse use = takeGlUse();
+        int calls = 0;
+        for (const auto& [name, times] : use.calls) calls += times;
+        EXPECT_EQ(calls, expected.calls) << testing::PrintToString(use.calls);
+        EXPECT_EQ(use.bytes, static_cast<std::size_t>(expected.bytes));
     }
 
     LogRecorder log;
-    const Look look = {};
-    WaterHost host = WaterHost(look, kWidth, kHeight, 1);
+    Frame frame;
 };
 
 }  // namespace
 
-TEST_F(FrameCalls, waterAlone) {
+TEST_F(FrameCalls, areThoseOfTheTable) {
     start(false);
-    const GlUse use = frame();
-    EXPECT_EQ(use.calls, kWater);
-    const auto vertices = static_cast<std::size_t>(look.meshVertices * look.meshVertices);
-    const auto indices = static_cast<std::size_t>(6 * (look.meshVertices - 1) * (look.meshVertices - 1));
-    EXPECT_EQ(use.bytes, 2 * vertices * 3 * sizeof(float) + indices * sizeof(short));
-}
-
-TEST_F(FrameCalls, ripplesAndStepsCallNothing) {
+    expectFrame(kWater);
     start(true);
-    host.touch(TouchAction::down, 100, 100, 1.0f);
-    host.rain(true);
-    host.advance(0.1);
-    EXPECT_EQ(takeGlUse().calls, Calls());
-}
-
-TEST_F(FrameCalls, idleInkIsMovedAndShown) {
-    start(false);
-    const std::size_t water = frame().bytes;
-    start(true);
-    const GlUse use = frame();
-    EXPECT_EQ(use.calls, kInkFrame);
-    const std::size_t grid = (kWidth / 12) * (kHeight / 12) * 4;
-    const std::size_t quad = 4 * 4 * sizeof(short);
-    EXPECT_EQ(use.bytes, water + grid + quad);
-}
-
-TEST_F(FrameCalls, aTapAddsOneInjectionInItsFirstTenFrames) {
-    start(true);
-    host.touch(TouchAction::down, kWidth / 2, kHeight / 2, 1.0f);
-    for (int i = 0; i < 15; ++i) EXPECT_EQ(frame().calls, i < 10 ? kInkFrame + kAddedInk : kInkFrame) << i;
-}
-
-TEST_F(FrameCalls, aTapAtTheEdgeAddsNothing) {
-    start(true);
-    host.touch(TouchAction::down, 3, kHeight / 2, 1.0f);
-    for (int i = 0; i < 15; ++i) EXPECT_EQ(frame().calls, kInkFrame) << i;
-}
-
-TEST_F(FrameCalls, aFastDragPushesTheFlowWithoutTheGpuAndAllocatesNothing) {
-    start(true);
-    host.touch(TouchAction::down, 100, 400, 1.0f);
-    host.touch(TouchAction::move, 130, 400, 1.0f);
+    expectFrame(kCarried);
+    touch(3, 400, kActionDown, 1.0f);
+    for (int i = 0; i < 13; ++i) expectFrame(kCarried);
+    // A tap inside the margin adds ink in its first ten frames.
+    touch(240, 400, kActionDown, 1.0f);
+    for (int i = 0; i < 13; ++i) expectFrame(i < sim_step ? kAdded : kCarried);
+    // A fast drag pushes the flow without the GPU.
+    touch(100, 400, kActionDown, 1.0f);
     for (int i = 1; i <= 6; ++i) {
-        host.touch(TouchAction::move, 130 + 30 * i, 400, 1.0f);
-        host.advance(1.0 / 60);
-        const int before = LibraryBlocks::requested;
-        host.draw();
-        EXPECT_EQ(LibraryBlocks::requested, before);
-        EXPECT_EQ(takeGlUse().calls, kInkFrame + kAddedInk) << i;
-        ASSERT_EQ(fluid.DragMode, 2);
+        touch(100 + 30 * i, 400, kActionMove, 1.0f);
+        expectFrame(kAdded);
     }
+    EXPECT_EQ(fluid.DragMode, kFastDrag);
 }

@@ -1,9 +1,9 @@
 // Plays a scene to the host in C++ and keeps its pictures and its journal, for the host in Java to be held against.
 #include <GLES2/gl2.h>
 
-#include <cstdio>
 #include <cstdlib>
 #include <fstream>
+#include <functional>
 #include <map>
 #include <memory>
 #include <sstream>
@@ -16,118 +16,97 @@
 #include "tests/support/log_recorder.h"
 #include "tests/support/test_pictures.h"
 
-namespace {
-
-constexpr int kSide = 160;  // of framebuffer 0
-
-[[noreturn]] void fail(const std::string& reason) {
-    std::fprintf(stderr, "%s\n", reason.c_str());
-    std::exit(1);
-}
-
-class Player {
-public:
-    explicit Player(std::string directory) : directory_(std::move(directory)), journal_(directory_ + "/journal") {}
-
-    // Notes what became of the frames, and what the library said.
-    void playLine(const std::string& line) {
-        drawn_ = waited_ = 0;
-        std::istringstream words(line);
-        std::string command;
-        words >> command;
-        play(command, words);
-        journal_ << line << ": " << drawn_ << " drawn, " << waited_ << " waited\n";
-        for (const std::string& said : log_.take()) journal_ << said << '\n';
-    }
-
-private:
-    void play(const std::string& command, std::istringstream& words) {
-        std::string a, b, c;
-        int x, y, endX, endY, count;
-        float pressure;
-        double number;
-        if (command == "picture" && words >> a >> x >> y >> count) {
-            pictures_[a] = smoothPicture(x, y, count);
-            write(a, pictures_[a].rgba);
-        } else if (command == "pictures" && words >> a >> b >> c) {
-            water_.setPictures({pictures_.at(a), pictures_.at(b), pictures_.at(c)});
-        } else if (command == "context") {
-            std::string error;
-            context_.reset();
-            context_ = HeadlessContext::create(kSide, kSide, error);
-            if (!context_) fail(error);
-            water_.renewContext();
-        } else if (command == "resize" && words >> width_ >> height_) {
-            water_.resize(width_, height_);
-        } else if (command == "ink" && words >> a) {
-            water_.setInk(a == "on");
-        } else if (command == "rain" && words >> a) {
-            water_.setRain(a == "on");
-        } else if (command == "look") {
-            std::stringstream lines;
-            while (words >> a >> b) lines << a << " = " << b << '\n';
-            const std::optional<Look> look = readLook(lines, command, a);
-            if (!look) fail(a);
-            water_.setLook(*look);
-        } else if (command == "clear") {
-            water_.clearInk();
-        } else if (command == "redraw") {
-            water_.redraw();
-        } else if (command == "touch" && words >> count >> x >> y >> pressure) {
-            water_.touch(static_cast<TouchAction>(count), x, y, pressure);
-        } else if (command == "stroke" && words >> x >> y >> endX >> endY >> count >> pressure) {
-            water_.touch(TouchAction::down, x, y, pressure);
-            for (int i = 1; i <= count; ++i) {
-                water_.touch(TouchAction::move, x + (endX - x) * i / count, y + (endY - y) * i / count, pressure);
-                frame(60);
-            }
-        } else if (command == "frames" && words >> count >> number) {
-            for (int i = 0; i < count; ++i) frame(number);
-        } else if (command == "rest") {
-            while (frame(60) != LiveWater::Frame::resting && drawn_ < 2000) continue;
-        } else if (command == "wait" && words >> number) {
-            now_ += number;
-        } else if (command == "keep" && words >> a) {
-            std::vector<std::uint8_t> pixels(4 * static_cast<std::size_t>(width_ * height_));
-            glReadPixels(0, 0, width_, height_, GL_RGBA, GL_UNSIGNED_BYTE, pixels.data());
-            write(a, pixels);
-        } else {
-            fail("cannot play " + command);
-        }
-    }
-
-    LiveWater::Frame frame(double rate) {
-        const LiveWater::Frame frame = water_.frame(now_ += 1.0 / rate);
-        drawn_ += frame == LiveWater::Frame::drawn;
-        waited_ += frame == LiveWater::Frame::waiting;
-        return frame;
-    }
-
-    void write(const std::string& name, const std::vector<std::uint8_t>& rgba) const {
-        std::ofstream(directory_ + "/" + name + ".rgba", std::ios::binary)
-            .write(reinterpret_cast<const char*>(rgba.data()), static_cast<std::streamsize>(rgba.size()));
-    }
-
-    LogRecorder log_;
-    std::string directory_;
-    std::ofstream journal_;
-    std::map<std::string, Picture> pictures_;
-    std::unique_ptr<HeadlessContext> context_;
-    LiveWater water_{Look{}, 1};
-    int width_ = 0;
-    int height_ = 0;
-    double now_ = 0.0;
-    int drawn_ = 0;
-    int waited_ = 0;
-};
-
-}  // namespace
-
 int main(int, char** argv) {
+    const std::string directory = std::string(argv[2]) + '/';
+    std::ofstream journal(directory + "journal");
+    LogRecorder log;
+    std::string error;
+    std::unique_ptr<HeadlessContext> context;
+    std::map<std::string, Picture> pictures;
+    LiveWater water(Look{}, 1);
+    int width = 0, height = 0, drawn = 0, waited = 0;
+    double now = 0.0;
+    std::vector<std::string> words;
+    std::vector<double> n;  // the words' values, from the first on
+
+    const auto write = [&](const std::string& name, const std::vector<std::uint8_t>& rgba) {
+        std::ofstream file(directory + name + ".rgba", std::ios::binary);
+        file.write(reinterpret_cast<const char*>(rgba.data()), static_cast<std::streamsize>(rgba.size()));
+    };
+    const auto frame = [&](double rate) {
+        const LiveWater::Frame result = water.frame(now += 1.0 / rate);
+        drawn += result == LiveWater::Frame::drawn;
+        waited += result == LiveWater::Frame::waiting;
+        return result;
+    };
+    const auto whole = [&](std::size_t i) { return static_cast<int>(n[i]); };
+    const auto touch = [&](TouchAction action, int x, int y, double pressure) {
+        water.touch(action, x, y, static_cast<float>(pressure));
+    };
+
+    const std::map<std::string, std::function<void()>> commands = {
+        {"picture", [&] { write(words[1], (pictures[words[1]] = smoothPicture(whole(2), whole(3), whole(4))).rgba); }},
+        {"pictures",
+         [&] {
+             water.setPictures({pictures.at(words[1]), pictures.at(words[2]), pictures.at(words[3])});
+         }},
+        {"context",
+         [&] {
+             context.reset();
+             context = HeadlessContext::create(160, 160, error);
+             water.renewContext();
+         }},
+        {"resize", [&] { water.resize(width = whole(1), height = whole(2)); }},
+        {"ink", [&] { water.setInk(words[1] == "on"); }},
+        {"rain", [&] { water.setRain(words[1] == "on"); }},
+        {"look",
+         [&] {
+             std::stringstream lines;
+             for (std::size_t i = 1; i < words.size(); i += 2) lines << words[i] << " = " << words[i + 1] << '\n';
+             water.setLook(parseLook(lines, "look", error).value());
+         }},
+        {"clear", [&] { water.clearInk(); }},
+        {"redraw", [&] { water.redraw(); }},
+        {"touch", [&] { touch(static_cast<TouchAction>(whole(1)), whole(2), whole(3), n[4]); }},
+        {"stroke",
+         [&] {
+             touch(TouchAction::down, whole(1), whole(2), n[6]);
+             for (int i = 1; i <= whole(5); ++i, frame(60)) {
+                 touch(
+                     TouchAction::move, whole(1) + (whole(3) - whole(1)) * i / whole(5),
+                     whole(2) + (whole(4) - whole(2)) * i / whole(5), n[6]);
+             }
+         }},
+        {"frames",
+         [&] {
+             for (int i = 0; i < whole(1); ++i) frame(n[2]);
+         }},
+        {"rest",
+         [&] {
+             while (frame(60) != LiveWater::Frame::resting && drawn < 2000) continue;
+         }},
+        {"wait", [&] { now += n[1]; }},
+        {"keep",
+         [&] {
+             std::vector<std::uint8_t> pixels(4 * static_cast<std::size_t>(width * height));
+             glReadPixels(0, 0, width, height, GL_RGBA, GL_UNSIGNED_BYTE, pixels.data());
+             write(words[1], pixels);
+         }},
+    };
+
     std::ifstream scene(argv[1]);
-    if (!scene) fail("cannot read the scene");
-    Player player(argv[2]);
     for (std::string line; std::getline(scene, line);) {
-        if (!line.empty() && line[0] != '#') player.playLine(line);
+        if (line.empty() || line[0] == '#') continue;
+        std::istringstream in(line);
+        words.clear();
+        n.clear();
+        for (std::string word; in >> word;) {
+            words.push_back(word);
+            n.push_back(std::strtod(word.c_str(), nullptr));
+        }
+        drawn = waited = 0;
+        commands.at(words[0])();
+        journal << line << ": " << drawn << " drawn, " << waited << " waited\n";
+        for (const std::string& said : log.take()) journal << said << '\n';
     }
 }

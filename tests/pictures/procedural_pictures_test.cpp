@@ -4,45 +4,37 @@
 
 #include <algorithm>
 
-// The difference between the brightest and the darkest green value in a part of the picture.
-static int contrast(const Picture& picture, int left, int top, int width, int height) {
-    int darkest = 255, brightest = 0;
-    for (int row = top; row < top + height; ++row) {
-        for (int column = left; column < left + width; ++column) {
-            const int green = picture.rgba[static_cast<std::size_t>(row * picture.width + column) * 4 + 1];
-            darkest = std::min(darkest, green);
-            brightest = std::max(brightest, green);
+// Of all whole squares of the picture the least difference between their brightest and darkest green.
+static int leastContrast(const Picture& picture, int side) {
+    int least = 255;
+    for (int square = 0; square < picture.width / side * (picture.height / side); ++square) {
+        const int left = square % (picture.width / side) * side, top = square / (picture.width / side) * side;
+        int darkest = 255, brightest = 0;
+        for (int i = 0; i < side * side; ++i) {
+            const int pixel = (top + i / side) * picture.width + left + i % side;
+            darkest = std::min<int>(darkest, picture.rgba[static_cast<std::size_t>(4 * pixel + 1)]);
+            brightest = std::max<int>(brightest, picture.rgba[static_cast<std::size_t>(4 * pixel + 1)]);
         }
+        least = std::min(least, brightest - darkest);
     }
-    return brightest - darkest;
+    return least;
 }
 
-TEST(ProceduralPictures, GroundsAreRepeatableAndShowDetailEverywhere) {
+TEST(ProceduralPictures, GroundsOfAnySizeShowDetailEverywhere) {
     for (Picture (*const ground)(int, int) : {riverBed, tiledPool, sandyShore}) {
-        for (const auto& [width, height] : {std::pair{216, 384}, std::pair{384, 216}}) {
+        for (const auto& [width, height] : {std::pair{216, 384}, {384, 216}, {1, 1}, {3, 200}, {200, 1}}) {
             const Picture picture = ground(width, height);
             ASSERT_EQ(picture.rgba.size(), static_cast<std::size_t>(width * height) * 4);
-            EXPECT_EQ(picture.rgba, ground(width, height).rgba);
-            const int side = 54;
-            for (int top = 0; top + side <= height; top += side) {
-                for (int left = 0; left + side <= width; left += side) {
-                    EXPECT_GT(contrast(picture, left, top, side, side), 40) << left << ", " << top;
-                }
-            }
             for (std::size_t alpha = 3; alpha < picture.rgba.size(); alpha += 4) ASSERT_EQ(picture.rgba[alpha], 255);
-        }
-        for (const auto& [width, height] : {std::pair{1, 1}, std::pair{3, 200}, std::pair{200, 1}}) {
-            EXPECT_EQ(ground(width, height).rgba.size(), static_cast<std::size_t>(width * height) * 4);
+            EXPECT_GT(leastContrast(picture, 54), 40) << width << "x" << height;
         }
     }
 }
 
 TEST(ProceduralPictures, WaterLightIsBluishAndNeverDark) {
     const Picture light = waterLight(128);
-    EXPECT_EQ(light.rgba, waterLight(128).rgba);
-    EXPECT_GT(contrast(light, 32, 32, 64, 64), 60);
+    EXPECT_GT(leastContrast(light, 64), 60);
     for (std::size_t pixel = 0; pixel < light.rgba.size(); pixel += 4) {
-        ASSERT_GE(light.rgba[pixel + 2], light.rgba[pixel]);
-        ASSERT_GT(light.rgba[pixel + 2], 120);
+        ASSERT_GE(light.rgba[pixel + 2], std::max<int>(light.rgba[pixel], 121));
     }
 }

@@ -21,22 +21,16 @@ protected:
     static constexpr int kSide = 64;  // of framebuffer 0
 
     void SetUp() override { renewContext(); }
-    void TearDown() override {
-        if (!context_) return;
-        const GLenum error = glGetError();
-        // A set-up in a new context deletes names of the lost one, which the new one does not know.
-        EXPECT_TRUE(error == GL_NO_ERROR || (renewals_ > 1 && error == GL_INVALID_VALUE)) << "GL error " << error;
-    }
+    void TearDown() override { loseContext(); }
 
     // Loses everything that the last context held.
     void renewContext(int width = kSide, int height = kSide) {
+        loseContext();
         // An OpenGL ES 2.0 driver, so that the use of anything newer shows.
         setenv("MESA_GLES_VERSION_OVERRIDE", "2.0", 1);
         std::string error;
-        context_.reset();
         context_ = HeadlessContext::create(width, height, error);
         ASSERT_TRUE(context_) << error;
-        ++renewals_;
     }
 
     // Rows from the bottom.
@@ -52,9 +46,24 @@ protected:
         return value;
     }
 
+    static std::array<int, 4> viewport() {
+        std::array<int, 4> box = {};
+        glGetIntegerv(GL_VIEWPORT, box.data());
+        return box;
+    }
+
     LogRecorder log;
 
 private:
+    void loseContext() {
+        if (!context_) return;
+        const GLenum error = glGetError();
+        EXPECT_TRUE(error == GL_NO_ERROR || (staleNames_ && error == GL_INVALID_VALUE)) << "GL error " << error;
+        for (GLuint name = 1; name < 100; ++name) staleNames_ = staleNames_ || glIsProgram(name);
+        context_.reset();
+    }
+
     std::unique_ptr<HeadlessContext> context_;
-    int renewals_ = 0;
+    // A context with programs was lost: the next set-up deletes names that the new one does not know.
+    bool staleNames_ = false;
 };

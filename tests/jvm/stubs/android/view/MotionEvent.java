@@ -6,7 +6,9 @@ public final class MotionEvent {
     public static final int ACTION_UP = 1;
     public static final int ACTION_MOVE = 2;
     public static final int ACTION_CANCEL = 3;
+    public static final int ACTION_POINTER_DOWN = 5;
     public static final int ACTION_POINTER_UP = 6;
+    public static final int ACTION_HOVER_MOVE = 7;
 
     private final int action;
     private final int actionIndex;

@@ -1,8 +1,14 @@
 package com.zor.android.visualeffect.tidemark;
 
+import static org.junit.Assert.assertEquals;
+import static org.junit.Assert.assertTrue;
+
 import android.graphics.Bitmap;
 import android.os.SystemClock;
 import android.view.MotionEvent;
+
+import org.junit.After;
+import org.junit.Test;
 
 import java.util.Arrays;
 
@@ -20,39 +26,37 @@ public final class RendererTest {
     private int width;
     private int height;
 
-    public static void main(String[] arguments) {
-        new RendererTest().drawsWhileSomethingMoves();
-        new RendererTest().aRotationShowsTheOtherPicture();
-        new RendererTest().inkShowsAndFadesAndSurvivesAPause();
-        new RendererTest().onlyWhatIsNewIsHandedOver();
-        new RendererTest().aPictureOfTwoBytesAPixelIsConverted();
+    @After
+    public void release() {
         GlContext.release();
     }
 
-    private void drawsWhileSomethingMoves() {
+    @Test
+    public void drawsWhileSomethingMoves() {
         view.renderer.onDrawFrame(null);  // before there is anything to show
         start();
-        Check.equal(1, drawUntilRest(), "frames of still water");
-        Check.equal(0, drawUntilRest(), "frames of drawn water");
+        assertEquals("frames of still water", 1, drawUntilRest());
+        assertEquals("frames of drawn water", 0, drawUntilRest());
         expectColor(RED);
         byte[] still = GlContext.pixels(width, height);
         touch(MotionEvent.ACTION_DOWN, 20, 40);
         touch(MotionEvent.ACTION_UP, 20, 40);
         drawFrame();
-        Check.that(difference(still, GlContext.pixels(width, height)) > 30, "a touch raises a wave");
+        assertTrue("a touch raises a wave", difference(still, GlContext.pixels(width, height)) > 30);
         long before = SystemClock.nanos;
         view.renderer.onDrawFrame(null);
-        Check.that(SystemClock.nanos - before >= 10000000, "a frame that comes too early waits");
+        assertTrue("a frame that comes too early waits", SystemClock.nanos - before >= 10000000);
         int frames = drawUntilRest();
-        Check.that(frames > 60 && frames < 480, frames + " frames of waves");
-        Check.that(difference(still, GlContext.pixels(width, height)) <= 8, "water at rest looks as before");
+        assertTrue(frames + " frames of waves", frames > 60 && frames < 480);
+        assertTrue("water at rest looks as before", difference(still, GlContext.pixels(width, height)) <= 8);
     }
 
-    private void aRotationShowsTheOtherPicture() {
+    @Test
+    public void aRotationShowsTheOtherPicture() {
         start();
         drawUntilRest();
         surface(LONG, SHORT);
-        Check.equal(1, drawUntilRest(), "frames after a rotation");
+        assertEquals("frames after a rotation", 1, drawUntilRest());
         expectColor(GREEN);
 
         // A window that changes its size keeps its context.
@@ -67,33 +71,35 @@ public final class RendererTest {
         expectColor(RED);
     }
 
-    private void inkShowsAndFadesAndSurvivesAPause() {
+    @Test
+    public void inkShowsAndFadesAndSurvivesAPause() {
         start();
         view.setInk(true);
         drawUntilRest();
         drawStroke();
-        Check.that(inked() > 100, "ink along a stroke");
+        assertTrue("ink along a stroke", inked() > 100);
 
         view.onPause();
         runQueue();
-        Check.equal(0, new JniTidemarkRender().getClearInkValue(), "a pause ends the touch");
+        assertEquals("a pause ends the touch", 0, new JniTidemarkRender().getClearInkValue());
         surface(SHORT, LONG);
         view.onResume();
         touch(MotionEvent.ACTION_MOVE, 60, 100);
-        Check.that(drawUntilRest() < 600, "ink that never rests");
+        assertTrue("ink that never rests", drawUntilRest() < 600);
         expectColor(RED);
 
         drawStroke();
-        Check.that(inked() > 100, "ink after a pause");
+        assertTrue("ink after a pause", inked() > 100);
         view.clearInk();
         drawFrame();
-        Check.equal(0, inked(), "ink after it was cleared");
+        assertEquals("ink after it was cleared", 0, inked());
         view.setInk(false);
         drawStroke();
-        Check.equal(0, inked(), "ink when it is off");
+        assertEquals("ink when it is off", 0, inked());
     }
 
-    private void onlyWhatIsNewIsHandedOver() {
+    @Test
+    public void onlyWhatIsNewIsHandedOver() {
         surface(LONG, LONG);
         resize(SHORT, LONG);
         expectHandOvers(0, "before there are pictures");
@@ -115,10 +121,11 @@ public final class RendererTest {
     private void expectHandOvers(int expected, String after) {
         int before = Bitmap.locksMade;
         drawUntilRest();
-        Check.equal(expected, Bitmap.locksMade - before, "hand-overs after " + after);
+        assertEquals("hand-overs after " + after, expected, Bitmap.locksMade - before);
     }
 
-    private void aPictureOfTwoBytesAPixelIsConverted() {
+    @Test
+    public void aPictureOfTwoBytesAPixelIsConverted() {
         start();
         Bitmap narrow = plain(Bitmap.Config.RGB_565, 0xff102030);
         view.setPictures(narrow, narrow, narrow);
@@ -190,7 +197,7 @@ public final class RendererTest {
         byte[] pixels = GlContext.pixels(width, height);
         for (int i = 0; i < pixels.length; ++i) {
             if (i % 4 == 3) continue;
-            Check.that(Math.abs((pixels[i] & 255) - expected[i % 4]) <= 8, (pixels[i] & 255) + " at byte " + i);
+            assertTrue((pixels[i] & 255) + " at byte " + i, Math.abs((pixels[i] & 255) - expected[i % 4]) <= 8);
         }
     }
 

@@ -35,7 +35,7 @@ public final class JniTidemarkRender {
     }
 
     /**
-     * Takes over the background of an upright view. The pixels are copied: the bitmap may be recycled afterwards.
+     * Takes over the background for portrait. The pixels are copied: the bitmap may be recycled afterwards.
      * A failure is logged and leaves the earlier picture in place.
      *
      * @param bitmap of the configuration ARGB_8888, without padding between its rows, 1 pixel to the driver's largest
@@ -43,7 +43,7 @@ public final class JniTidemarkRender {
      */
     public native void transferPortraitBGBitmap(Bitmap bitmap);
 
-    /** As {@link #transferPortraitBGBitmap}, for the background of a view held across. */
+    /** As {@link #transferPortraitBGBitmap}, for landscape. */
     public native void transferLandscapeBGBitmap(Bitmap bitmap);
 
     /** As {@link #transferPortraitBGBitmap}, for the light on the waves, of any proportions. */
@@ -61,10 +61,10 @@ public final class JniTidemarkRender {
     /** Makes programs, render targets and buffers of the size and the mode set last. */
     public native void onInitGPU();
 
-    /** Uploads the background of an upright view that was taken over last. */
+    /** Uploads the background for portrait that was taken over last. */
     public native void onLoadPortraitBGTextures();
 
-    /** Uploads the background of a view held across that was taken over last. */
+    /** Uploads the background for landscape that was taken over last. */
     public native void onLoadLandscapeBGTextures();
 
     /** Uploads the picture of the light that was taken over last. */
@@ -127,8 +127,8 @@ public final class JniTidemarkRender {
     public native void onTouch(int x, int y, int action, float pressure);
 
     /**
-     * Draws one frame into the current framebuffer, over the whole view and without clearing it. In ink mode this is
-     * also one step of the ink: draw at 60 frames a second.
+     * Draws one frame over the whole view, without clearing it: without ink into the current framebuffer, with ink into
+     * framebuffer 0. With ink this is also one step of the ink: draw at 60 frames a second.
      *
      * @param positions from {@link #initWaters}
      * @param heightAttribs for each vertex its height and those of the vertices to its right and above it, 3 floats
@@ -146,7 +146,7 @@ public final class JniTidemarkRender {
      * @param fresnelRatio extra light on slopes that face the light
      * @param specularRatio strength of the highlights; the picture takes up to 5.5 of it, with ink up to 4.5
      * @param exponent sharpness of the highlights
-     * @param landscape whether to show the background for a view held across
+     * @param landscape whether to show the background for landscape
      */
     public native void onDrawFrame(float[] positions, float[] heightAttribs, short[] indices, int positionFloats,
             int heightFloats, int indexCount, float[] mvp, int meshSizeWidth, int meshSizeHeight, int numDetailsWidth,

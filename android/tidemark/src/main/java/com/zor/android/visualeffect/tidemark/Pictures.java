@@ -15,7 +15,7 @@ public final class Pictures {
     private final Bitmap landscape;
     private final Bitmap water;
 
-    /** Background of an upright view, background of a view held across, and the light on the waves. */
+    /** What the water lies over in portrait and in landscape, and the light on the waves. */
     public Pictures(Bitmap portrait, Bitmap landscape, Bitmap water) {
         this.portrait = portrait;
         this.landscape = landscape;

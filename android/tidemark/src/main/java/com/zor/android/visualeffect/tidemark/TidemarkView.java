@@ -29,9 +29,9 @@ public class TidemarkView extends GLSurfaceView {
     }
 
     /**
-     * The background of the upright view, the background of the view held across, and the light on the waves. The
-     * backgrounds are cropped to the view; no side may be longer than the device's largest texture, 2048 pixels being
-     * safe everywhere. Keep the bitmaps unchanged while the view uses them.
+     * What the water lies over in portrait and in landscape, and the light on the waves. The backgrounds are cropped to
+     * the view; no side may be longer than the device's largest texture, 2048 pixels being safe everywhere. Keep the
+     * bitmaps unchanged while the view uses them.
      */
     public void setPictures(Bitmap portrait, Bitmap landscape, Bitmap light) {
         Pictures pictures = new Pictures(portrait, landscape, light);

@@ -147,7 +147,7 @@ public final class WaterHost {
         return result;
     }
 
-    /** Shorter by longer side of the views that the backgrounds are cropped to, upright and across. */
+    /** Shorter by longer side of what the backgrounds are cropped to in portrait and in landscape. */
     public double proportions() {
         return (double) Math.min(pictureWidth, pictureHeight) / Math.max(pictureWidth, pictureHeight);
     }
@@ -192,8 +192,8 @@ public final class WaterHost {
 
     /**
      * One touch event: pixels from the top left corner of the view, one of the actions above, pressure around 1. A
-     * stroke begins with the finger's coming down. Like the other calls below it does nothing before the first
-     * {@link #setUp}.
+     * stroke begins with the finger's coming down. This, {@link #advance} and {@link #clearInk} do nothing before the
+     * first {@link #setUp}.
      */
     public void touch(int action, int x, int y, float pressure) {
         if (!isSetUp) return;

@@ -1,0 +1,36 @@
+// Tests that run programs in a directory of their own.
+#pragma once
+
+#include <gtest/gtest.h>
+#include <unistd.h>
+
+#include <cstdio>
+#include <filesystem>
+#include <string>
+
+class Program : public testing::Test {
+protected:
+    void SetUp() override {
+        std::filesystem::create_directories(directory_ / "work");
+        std::filesystem::current_path(directory_ / "work");
+    }
+    void TearDown() override {
+        std::filesystem::current_path("/");
+        std::filesystem::remove_all(directory_);
+    }
+
+    // What a command line of the shell writes to its outputs, and its exit code, as a line, behind that.
+    static std::string run(const std::string& command) {
+        std::FILE* const shell = popen(("exec 2>&1; timeout 60 " + command + "; echo $?").c_str(), "r");
+        std::string output;
+        for (int c; (c = std::fgetc(shell)) != EOF;) output += static_cast<char>(c);
+        pclose(shell);
+        return output;
+    }
+    static std::string preview(const std::string& arguments, const std::string& environment = "") {
+        return run("env " + environment + " '" TIDEMARK_PREVIEW_PATH "' " + arguments);
+    }
+
+private:
+    const std::filesystem::path directory_ = testing::TempDir() + "preview-" + std::to_string(getpid());
+};

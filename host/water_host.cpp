@@ -141,6 +141,7 @@ void WaterHost::loadTextures(unsigned which) {
 
 void WaterHost::touch(TouchAction action, int x, int y, float pressure) {
     if (!isSetUp_) return;
+    if (!inkMoves()) dueInkSteps_ = 0.0;
     raiseTouchRipples(action, x, y, look_.touchAmplitude * pressure);
     fingerDown_ = action == TouchAction::down || (action == TouchAction::move && fingerDown_);
     if (!withInk_) return;

@@ -87,7 +87,10 @@ protected:
         const unsigned event = below(15);
         if (event < 4) water.rain(event < 2);
         if (event == 5) water.clearInk();
-        if (event == 6) water.advance(3600.0);  // nobody looked for a while
+        if (event == 6) {  // nobody looked for a while, and the frame after it makes up for some of the ink
+            water.advance(3600.0);
+            water.draw();
+        }
         if (event == 7 || event == 8) withInk = !withInk;
         if (event == 9 || event == 10) width = 456 - width;
         if (event >= 7 && event < 12) setUp();

@@ -73,7 +73,7 @@ TEST_F(Live, drawsWhatHasChangedAndRestsOtherwise) {
     EXPECT_EQ(next(), Frame::resting) << "a touch before there is water";
     water.touch(TouchAction::down, 20, 30, 1.0f);
     EXPECT_EQ(next(), Frame::drawn);
-    EXPECT_EQ(water.frame(now + 0.004), Frame::waiting) << "one step a frame is enough";
+    EXPECT_EQ(water.frame(now + 0.004), Frame::drawn) << "between two steps of the water";
     EXPECT_EQ(next(), Frame::drawn);
     const int frames = framesToRest();
     EXPECT_GT(frames, 60);
@@ -107,7 +107,7 @@ TEST_F(Live, tellsTheLibraryOnlyWhatHasChanged) {
     Look look;
     look.meshVertices = 64;
     water.setLook(look);
-    EXPECT_EQ(told(), "|");
+    EXPECT_EQ(told(), "");
     look.meshExtent = 20;
     water.setLook(look);
     water.resize(kWidth, kHeight);
@@ -120,10 +120,9 @@ TEST_F(Live, aPauseIsNotMadeUpFor) {
     const auto ringAfter = [this](Pause pause, double seconds) {
         Look look;
         look.rainDropsPerSecond = 0.0f;
-        for (const int vertices : {32, 128}) {
-            look.meshVertices = vertices;
-            water.setLook(look);
-        }
+        water = LiveWater(look, 1);
+        water.resize(kWidth, kHeight);
+        water.setPictures(pictures(1));
         next();
         if (pause == kAfterRainWithoutADrop) {
             water.setRain(true);
@@ -146,7 +145,7 @@ TEST_F(Live, aPauseIsNotMadeUpFor) {
     }
 }
 
-TEST_F(Live, aLookChangesOnWavingWaterAndOnAnotherMeshStartsFlat) {
+TEST_F(Live, aLookChangesOnWavingWater) {
     next();
     const auto flat = seen();
     water.touch(TouchAction::down, 20, 30, 1.0f);
@@ -160,12 +159,49 @@ TEST_F(Live, aLookChangesOnWavingWaterAndOnAnotherMeshStartsFlat) {
     EXPECT_NE(lessBent, ring);
     EXPECT_NE(lessBent, flat) << "the waves live on";
     look.meshVertices = 64;
+    look.dropRadius = 0.05f;
     water.setLook(look);
     EXPECT_EQ(next(), Frame::drawn);
-    EXPECT_EQ(next(), Frame::resting);
-    water.setLook(Look{});
+    EXPECT_NE(seen(), flat) << "on a coarser lattice too";
+}
+
+// `count` counts the ink's steps since the finger came down.
+TEST_F(Live, inkMovesByTheClockOnAnyDisplay) {
+    for (const double rate : {30.0, 60.0, 75.0, 90.0, 120.0, 144.0}) {
+        SCOPED_TRACE(rate);
+        water.setInk(false);
+        next();
+        water.setInk(true);
+        next();
+        water.touch(TouchAction::down, 20, 30, 1.0f);
+        const double start = now;
+        while (count < 72) water.frame(now += 1.0 / rate);
+        EXPECT_NEAR(now - start, 1.2, std::max(1.0 / rate, 1.0 / 60)) << "within a frame of the display or the ink";
+
+        const int before = count;
+        water.frame(now += 0.2);
+        EXPECT_LE(count - before, 4) << "a late frame is not made up for without end";
+        water.frame(now += 1.0 / 60);
+        EXPECT_LE(count - before, 6) << "nor later";
+        water.touch(TouchAction::up, 20, 30, 1.0f);
+        framesToRest();
+        now = 100.0 + rate;
+    }
+}
+
+TEST_F(Live, longFramesMakeTheMeshCoarser) {
+    water.resize(960, 540);
     next();
-    EXPECT_EQ(seen(), flat);
+    GLint bytes[2];
+    for (GLint& size : bytes) {
+        water.redraw();
+        next();
+        glBindBuffer(GL_ARRAY_BUFFER, fluid.v_buf);
+        glGetBufferParameteriv(GL_ARRAY_BUFFER, GL_BUFFER_SIZE, &size);
+        for (int i = 0; i < 20; ++i) water.noteWork(0.02);
+    }
+    EXPECT_EQ(bytes[0], 164 * 164 * 12) << "cells of 6 pixels";
+    EXPECT_EQ(bytes[1], 123 * 123 * 12);
 }
 
 TEST_F(Live, picturesAreExchangedUnderTheInk) {

@@ -35,7 +35,7 @@ TEST(LookFile, NamesTheLineThatIsWrong) {
           {"damping = 1.001", "0 to 1"},
           {"damping = -0.001", "0 to 1"},
           {"meshVertices = 64.5", "64.5"},
-          {"meshVertices = 257", "2 to 256"},
+          {"meshVertices = 257", "0 to 256"},
           {"meshVertices = 99999999999", "meshVertices"}}) {
         std::string error;
         EXPECT_FALSE(read("waveSpeed = 0.5\npictureZoom = 0.1\n" + std::string(line) + "\n", error)) << line;

@@ -64,7 +64,7 @@ TEST_F(Program, SameInputsGiveTheSameBytesInVideosOfEachKind) {
 }
 
 TEST_F(Program, ShowsTheInsideOfAStroke) {
-    const std::string scene = "--size 100x96 --fps 30 --seconds 0.5 --script '" TIDEMARK_SCENES_PATH "/curl.touch' ";
+    const std::string scene = "--size 100x96 --fps 60 --seconds 0.5 --script '" TIDEMARK_SCENES_PATH "/curl.touch' ";
     EXPECT_EQ(preview(scene + "--inside i"), "0\n");
     for (const std::string name : {"height", "velocity", "density", "result"}) {
         const Picture picture = load("i/" + name + ".png");

@@ -197,6 +197,7 @@ public final class WaterHost {
      */
     public void touch(int action, int x, int y, float pressure) {
         if (!isSetUp) return;
+        if (!inkMoves()) dueInkSteps = 0;
         raiseTouchRipples(action, x, y, look.touchAmplitude * pressure);
         fingerDown = action == DOWN || action == MOVE && fingerDown;
         if (!withInk) return;

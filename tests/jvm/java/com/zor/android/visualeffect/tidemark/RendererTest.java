@@ -57,7 +57,8 @@ public final class RendererTest {
 
     @Test
     public void drawsWhileSomethingMoves() {
-        view.renderer.onDrawFrame(null);  // before there is anything to show
+        int cleared = GLES20.clears;
+        view.renderer.onDrawFrame(null);
         start();
         assertEquals("frames of still water", 1, drawUntilRest());
         assertEquals("frames of drawn water", 0, drawUntilRest());
@@ -73,6 +74,8 @@ public final class RendererTest {
         int frames = drawUntilRest();
         assertTrue(frames + " frames of waves", frames > 60 && frames < 480);
         assertTrue("water at rest looks as before", difference(still, GlContext.pixels(width, height)) <= 8);
+        drawFrame();
+        assertEquals("frames without water", cleared + 1, GLES20.clears);
     }
 
     @Test

@@ -37,6 +37,8 @@ public:
     void clearInk() { host_.clearInk(); }
     void touch(TouchAction action, int x, int y, float pressure) { host_.touch(action, x, y, pressure); }
 
+    void splash(int x, int y, float pressure) { host_.splash(x, y, pressure); }
+
     // Where the framebuffer has lost the last frame.
     void redraw() { host_.redraw(); }
 

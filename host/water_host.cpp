@@ -170,6 +170,13 @@ void WaterHost::raiseTouchRipples(TouchAction action, int x, int y, float amplit
     touchY_ = modelY;
 }
 
+void WaterHost::splash(int x, int y, float pressure) {
+    if (!isSetUp_) return;
+    const float modelX = (static_cast<float>(x) / static_cast<float>(width_) - 0.5f) * visibleWidth_;
+    const float modelY = (0.5f - static_cast<float>(y) / static_cast<float>(height_)) * visibleHeight_;
+    raiseRipple(modelX, modelY, look_.touchAmplitude * pressure);
+}
+
 void WaterHost::clearInk() {
     if (!isSetUp_) return;
     NATIVE(clearInkValue)(hostEnvironment(), nullptr);

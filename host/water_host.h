@@ -57,6 +57,9 @@ public:
     // the finger's coming down.
     void touch(TouchAction action, int x, int y, float pressure);
 
+    // Raises the ripple of a finger of this pressure that comes down, without a finger and without ink.
+    void splash(int x, int y, float pressure);
+
     // Lets rain fall, `look.rainDropsPerSecond` drops a second, until it is switched off.
     void rain(bool falling) { raining_ = falling; }
 

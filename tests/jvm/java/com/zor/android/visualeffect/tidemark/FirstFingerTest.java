@@ -40,13 +40,16 @@ public final class FirstFingerTest {
     }
 
     @Test
-    public void cancelComesOnceAndOnlyInATouch() {
-        finger.cancel();
+    public void anEndComesOnceAndOnlyInATouch() {
+        finger.lift();
         follow(MotionEvent.ACTION_DOWN, 0, new int[] {0}, at(1, 2));
-        finger.cancel();
+        finger.lift();
         follow(MotionEvent.ACTION_CANCEL, 0, new int[] {0}, at(3, 4));
         follow(MotionEvent.ACTION_MOVE, 0, new int[] {0}, at(5, 6));
-        assertEquals(List.of("0 1 2 1.0", "3 1 2 0.0"), heard);
+        follow(MotionEvent.ACTION_DOWN, 0, new int[] {0}, at(1, 2));
+        follow(MotionEvent.ACTION_CANCEL, 0, new int[] {0}, at(3, 4));
+        finger.lift();
+        assertEquals(List.of("0 1 2 1.0", "1 1 2 0.0", "0 1 2 1.0", "3 1 2 0.0"), heard);
     }
 
     private void follow(int action, int actionIndex, int[] ids, float[][]... positions) {

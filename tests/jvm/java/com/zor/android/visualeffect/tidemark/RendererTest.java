@@ -1,16 +1,22 @@
 package com.zor.android.visualeffect.tidemark;
 
 import static org.junit.Assert.assertEquals;
+import static org.junit.Assert.assertThrows;
 import static org.junit.Assert.assertTrue;
 
+import android.app.Activity;
 import android.graphics.Bitmap;
+import android.opengl.GLES20;
 import android.os.SystemClock;
 import android.view.MotionEvent;
 
 import org.junit.After;
+import org.junit.Before;
 import org.junit.Test;
 
+import java.util.ArrayList;
 import java.util.Arrays;
+import java.util.List;
 
 /** The view and its renderer, from the touch to the screen: when they draw, when they rest, and what they show. */
 public final class RendererTest {
@@ -19,21 +25,40 @@ public final class RendererTest {
     private static final int RED = 0xffc04030;
     private static final int GREEN = 0xff40a050;
 
-    private final TidemarkView view = new TidemarkView(null);
+    private final TidemarkView view = new TidemarkView(new Activity());
     private final Bitmap red = plain(Bitmap.Config.ARGB_8888, RED);
     private final Bitmap green = plain(Bitmap.Config.ARGB_8888, GREEN);
     private final Bitmap white = plain(Bitmap.Config.ARGB_8888, 0xffffffff);
+    private final List<String> heard = new ArrayList<>();
     private int width;
     private int height;
 
+    @Before
+    public void attach() {
+        view.onAttachedToWindow();
+        view.setListener(new TidemarkListener() {
+            @Override
+            public void onCalm() {
+                heard.add("calm");
+            }
+
+            @Override
+            public void onFailure(Failure failure, String message) {
+                heard.add(failure.name());
+            }
+        });
+    }
+
     @After
     public void release() {
+        view.onDetachedFromWindow();
         GlContext.release();
     }
 
     @Test
     public void drawsWhileSomethingMoves() {
-        view.renderer.onDrawFrame(null);  // before there is anything to show
+        int cleared = GLES20.clears;
+        view.renderer.onDrawFrame(null);
         start();
         assertEquals("frames of still water", 1, drawUntilRest());
         assertEquals("frames of drawn water", 0, drawUntilRest());
@@ -49,6 +74,8 @@ public final class RendererTest {
         int frames = drawUntilRest();
         assertTrue(frames + " frames of waves", frames > 60 && frames < 480);
         assertTrue("water at rest looks as before", difference(still, GlContext.pixels(width, height)) <= 8);
+        drawFrame();
+        assertEquals("frames without water", cleared + 1, GLES20.clears);
     }
 
     @Test
@@ -72,18 +99,17 @@ public final class RendererTest {
     }
 
     @Test
-    public void inkShowsAndFadesAndSurvivesAPause() {
+    public void inkShowsAndFadesAndComesBackAfterALostContext() {
         start();
         view.setInk(true);
         drawUntilRest();
         drawStroke();
         assertTrue("ink along a stroke", inked() > 100);
 
-        view.onPause();
-        runQueue();
-        assertEquals("a pause ends the touch", 0, new JniTidemarkRender().getClearInkValue());
+        view.onStop();
+        drawFrame();
         surface(SHORT, LONG);
-        view.onResume();
+        view.onStart();
         touch(MotionEvent.ACTION_MOVE, 60, 100);
         assertTrue("ink that never rests", drawUntilRest() < 600);
         expectColor(RED);
@@ -96,6 +122,23 @@ public final class RendererTest {
         view.setInk(false);
         drawStroke();
         assertEquals("ink when it is off", 0, inked());
+    }
+
+    @Test
+    public void inkSurvivesAPauseThatKeepsTheContext() {
+        start();
+        view.setInk(true);
+        drawUntilRest();
+        drawStroke();
+        view.onStop();
+        view.onStart();
+        resize(SHORT, LONG);
+        drawFrame();
+        assertTrue("ink goes on after a pause that kept the context", inked() > 100);
+        view.setInk(false);
+        view.setInk(true);
+        drawFrame();
+        assertEquals("a switch clears the ink", 0, inked());
     }
 
     @Test
@@ -131,6 +174,70 @@ public final class RendererTest {
         view.setPictures(narrow, narrow, narrow);
         drawUntilRest();
         expectColor(0xff102030);
+    }
+
+    @Test
+    public void whatIsSetWhileTheViewIsAwayIsKept() {
+        start();
+        drawUntilRest();
+        view.onDetachedFromWindow();
+        view.setPictures(green, green, white);
+        view.queue.clear();
+        view.onAttachedToWindow();
+        surface(SHORT, LONG);
+        drawUntilRest();
+        expectColor(GREEN);
+    }
+
+    @Test
+    public void theNewestViewDraws() {
+        start();
+        drawUntilRest();
+        TidemarkView newer = new TidemarkView(new Activity());
+        newer.onAttachedToWindow();
+        newer.setPictures(green, green, white);
+        GlContext.open(SHORT, LONG);
+        newer.renderer.onSurfaceCreated(null, null);
+        newer.renderer.onSurfaceChanged(null, SHORT, LONG);
+        newer.renderer.onDrawFrame(null);
+        expectColor(GREEN);
+        touch(MotionEvent.ACTION_DOWN, 20, 40);
+        int handedOver = Bitmap.locksMade;
+        drawFrame();
+        assertEquals("hand-overs of an older view", handedOver, Bitmap.locksMade);
+        expectColor(GREEN);
+        newer.onDetachedFromWindow();
+        touch(MotionEvent.ACTION_UP, 20, 40);
+        drawUntilRest();
+        expectColor(RED);
+    }
+
+    @Test
+    public void aListenerHearsOfCalmAndFailures() {
+        start();
+        drawUntilRest();
+        view.ripple(40, 40, 1);
+        assertTrue("a splash moves", drawUntilRest() > 60);
+        GLES20.largestTexture = 39;
+        view.setPictures(green, green, white);
+        drawUntilRest();
+        GLES20.largestTexture = 2048;
+        expectColor(RED);
+        assertEquals(List.of("calm", "calm", "PICTURE_TOO_LARGE", "calm"), heard);
+        assertThrows(IllegalArgumentException.class, () -> view.setPictures(red, null, white));
+    }
+
+    @Test
+    public void aLookIsTakenAtAnyTime() {
+        start();
+        drawUntilRest();
+        Look look = new Look();
+        look.meshVertices = 64;
+        look.stepsToRest = 5;
+        view.setLook(look);
+        look.meshVertices = 1;  // the view has its own copy
+        assertEquals("frames of another mesh", 1, drawUntilRest());
+        expectColor(RED);
     }
 
     private void start() {
@@ -174,19 +281,13 @@ public final class RendererTest {
         return dark;
     }
 
-    private void runQueue() {
-        while (!view.queue.isEmpty()) view.queue.remove().run();
-    }
-
     private void drawFrame() {
-        runQueue();
         view.renderRequested = false;
         SystemClock.nanos += 1000000000 / 60;
         view.renderer.onDrawFrame(null);
     }
 
     private int drawUntilRest() {
-        runQueue();
         int frames = 0;
         for (; view.renderRequested && frames < 3000; ++frames) drawFrame();
         return frames;

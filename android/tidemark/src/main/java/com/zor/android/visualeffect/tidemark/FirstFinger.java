@@ -36,16 +36,20 @@ final class FirstFinger {
                 }
                 break;
             case MotionEvent.ACTION_CANCEL:
-                cancel();
+                end(WaterHost.CANCEL);
                 break;
             default:  // further fingers, and what is no touch
         }
     }
 
-    /** Ends a touch whose end will not be seen. */
-    void cancel() {
+    /** Ends a touch whose end will not be seen; the ink stays. */
+    void lift() {
+        end(WaterHost.UP);
+    }
+
+    private void end(int action) {
         if (finger == NONE) return;
-        listener.touch(WaterHost.CANCEL, lastX, lastY, 0);
+        listener.touch(action, lastX, lastY, 0);
         finger = NONE;
     }
 

@@ -73,6 +73,11 @@ public final class LiveWater {
         host.touch(action, x, y, pressure);
     }
 
+    /** A ripple without a finger, as {@link WaterHost#splash} takes it. */
+    public void splash(int x, int y, float pressure) {
+        host.splash(x, y, pressure);
+    }
+
     /** Where the framebuffer has lost the last frame. */
     public void redraw() {
         host.redraw();

@@ -14,17 +14,36 @@ public final class Pictures {
     private final Bitmap portrait;
     private final Bitmap landscape;
     private final Bitmap water;
+    private final Object library;  // another one when the library has lost the pictures
 
     /** What the water lies over in portrait and in landscape, and the light on the waves. */
     public Pictures(Bitmap portrait, Bitmap landscape, Bitmap water) {
-        this.portrait = portrait;
-        this.landscape = landscape;
-        this.water = water;
+        this.portrait = usable(portrait, "portrait");
+        this.landscape = usable(landscape, "landscape");
+        this.water = usable(water, "light");
+        library = null;
+    }
+
+    private Pictures(Pictures other) {
+        portrait = other.portrait;
+        landscape = other.landscape;
+        water = other.water;
+        library = new Object();
+    }
+
+    /** The same bitmaps, all to be handed over again. */
+    Pictures asNew() {
+        return new Pictures(this);
+    }
+
+    /** In pixels. */
+    int longestSide() {
+        return Math.max(longestSide(portrait), Math.max(longestSide(landscape), longestSide(water)));
     }
 
     /** Those that are other bitmaps than in {@code before}, which may be null. */
     int newSince(Pictures before) {
-        if (before == null) return ALL;
+        if (before == null || library != null && library != before.library) return ALL;
         return (portrait == before.portrait ? 0 : PORTRAIT) | (landscape == before.landscape ? 0 : LANDSCAPE)
                 | (water == before.water ? 0 : WATER);
     }
@@ -47,6 +66,17 @@ public final class Pictures {
         int left = (picture.getWidth() - width) / 2;
         int top = (picture.getHeight() - height) / 2;
         return Bitmap.createBitmap(picture, left, top, width, height);
+    }
+
+    private static Bitmap usable(Bitmap bitmap, String name) {
+        if (bitmap == null || bitmap.isRecycled()) {
+            throw new IllegalArgumentException("the picture for " + name + (bitmap == null ? " is null" : " is recycled"));
+        }
+        return bitmap;
+    }
+
+    private static int longestSide(Bitmap bitmap) {
+        return Math.max(bitmap.getWidth(), bitmap.getHeight());
     }
 
     private static int within(int side, int most) {

@@ -2,53 +2,225 @@ package com.zor.android.visualeffect.tidemark;
 
 import android.opengl.GLES20;
 import android.opengl.GLSurfaceView;
+import android.os.Handler;
+import android.os.Looper;
 import android.os.SystemClock;
+import android.util.Log;
+
+import java.util.ArrayList;
+import java.util.List;
+import java.util.Queue;
+import java.util.concurrent.ConcurrentLinkedQueue;
+import java.util.concurrent.atomic.AtomicReference;
 
 import javax.microedition.khronos.egl.EGLConfig;
 import javax.microedition.khronos.opengles.GL10;
 
 /**
- * Draws a {@link LiveWater} into a {@code GLSurfaceView} of {@code RENDERMODE_WHEN_DIRTY}, and asks for frames only
- * while something moves. Whoever changes the water does so on the GL thread, through {@code queueEvent}, and asks for a
- * frame; {@link TidemarkView} does.
+ * Draws water into a {@code GLSurfaceView} of {@code RENDERMODE_WHEN_DIRTY}, and asks for frames only while something
+ * moves. {@link TidemarkView} is built on it; a surface view of your own calls {@link #show} and {@link #hide} too.
+ *
+ * <p>All methods but those of {@code GLSurfaceView.Renderer} may be called on any thread, whether there is a surface or
+ * not: the next frame takes over what has changed.
  */
 public final class TidemarkRenderer implements GLSurfaceView.Renderer {
-    private final LiveWater water;
+    private interface Change {
+        void apply(LiveWater water);
+    }
+
+    private static final String TAG = "Tidemark";
+
+    // The library serves one effect. The lock is held for every call of it, since each view has its own GL thread.
+    private static final List<TidemarkRenderer> SHOWN = new ArrayList<>();  // the newest last
+    private static TidemarkRenderer owner;  // whose pictures and objects the library has
+
     private final Runnable requestRender;
+    private final Queue<Change> changes = new ConcurrentLinkedQueue<>();
+    private final AtomicReference<Pictures> newPictures = new AtomicReference<>();
+    private volatile TidemarkListener listener;
+
+    // Of the GL thread.
+    private LiveWater water;  // null where the library does not load
+    private boolean isBroken;
+    private Pictures pictures;
+    private int width;
+    private int height;
 
     /** {@code requestRender} asks for one frame, as the method of that name of {@code GLSurfaceView} does. */
-    public TidemarkRenderer(LiveWater water, Runnable requestRender) {
-        this.water = water;
+    public TidemarkRenderer(Runnable requestRender) {
         this.requestRender = requestRender;
     }
 
-    /** Also after the context was lost, in a pause for example. */
-    @Override
-    public void onSurfaceCreated(GL10 gl, EGLConfig config) {
-        water.renewContext();
+    /** Null for nobody. */
+    public void setListener(TidemarkListener listener) {
+        this.listener = listener;
     }
 
+    /** The bitmaps must stay unchanged while they are shown. */
+    public void setPictures(Pictures pictures) {
+        newPictures.set(pictures);
+        requestRender.run();
+    }
+
+    /** Another mesh begins with flat water. */
+    public void setLook(Look look) {
+        Look copy = look.clone();
+        change(water -> water.setLook(copy));
+    }
+
+    /** Whether touches drop ink; they do not at first. */
+    public void setInk(boolean withInk) {
+        change(water -> water.setInk(withInk));
+    }
+
+    /** Lets all ink vanish. */
+    public void clearInk() {
+        change(LiveWater::clearInk);
+    }
+
+    /** Whether it rains; it does not at first. */
+    public void setRain(boolean falling) {
+        change(water -> water.setRain(falling));
+    }
+
+    /** One touch event, as {@link WaterHost#touch} takes it. */
+    public void touch(int action, int x, int y, float pressure) {
+        change(water -> water.touch(action, x, y, pressure));
+    }
+
+    /** A splash without a finger, as {@link WaterHost#splash} takes it. */
+    public void ripple(int x, int y, float strength) {
+        change(water -> water.splash(x, y, strength));
+    }
+
+    /** From now on this renderer draws, and others rest until it hides. */
+    public void show() {
+        synchronized (SHOWN) {
+            SHOWN.remove(this);
+            if (!SHOWN.isEmpty()) Log.w(TAG, "one view at a time: the older one rests while a newer one is shown");
+            SHOWN.add(this);
+        }
+        requestRender.run();
+    }
+
+    /** Draws no longer, and lets the one that was shown before go on. */
+    public void hide() {
+        synchronized (SHOWN) {
+            boolean wasNewest = isNewest();
+            SHOWN.remove(this);
+            if (wasNewest && !SHOWN.isEmpty()) SHOWN.get(SHOWN.size() - 1).requestRender.run();
+        }
+    }
+
+    /** Also after the context was lost. */
+    @Override
+    public void onSurfaceCreated(GL10 gl, EGLConfig config) {
+        if (isReady()) water.renewContext();
+    }
+
+    /** A surface of the same size in the same context keeps water and ink, as after a pause. */
     @Override
     public void onSurfaceChanged(GL10 gl, int width, int height) {
+        if (!isReady() || width == this.width && height == this.height) return;
+        this.width = width;
+        this.height = height;
         water.resize(width, height);
     }
 
     @Override
     public void onDrawFrame(GL10 gl) {
-        // The surface shows its buffer after every call, so every call has to fill it.
-        water.redraw();
-        double start = seconds();
         LiveWater.Frame frame;
-        while ((frame = water.frame(start)) == LiveWater.Frame.WAITING) {
-            SystemClock.sleep(1);
-            start = seconds();
+        while ((frame = tryFrame()) == LiveWater.Frame.WAITING) SystemClock.sleep(1);
+        if (frame == LiveWater.Frame.RESTING) GLES20.glClear(GLES20.GL_COLOR_BUFFER_BIT);  // nothing to show
+    }
+
+    void report(TidemarkListener.Failure failure, String message) {
+        Log.e(TAG, message);
+        TidemarkListener heard = listener;
+        if (heard != null) onMainThread(() -> heard.onFailure(failure, message));
+    }
+
+    private void change(Change change) {
+        changes.add(change);
+        requestRender.run();
+    }
+
+    private LiveWater.Frame tryFrame() {
+        synchronized (SHOWN) {
+            if (!isNewest() || !isReady()) return LiveWater.Frame.RESTING;
+            if (owner != this) takeOver();
+            takeChanges();
+            // The surface shows its buffer after every call, so every call has to fill it.
+            water.redraw();
+            double start = seconds();
+            LiveWater.Frame frame = water.frame(start);
+            if (frame == LiveWater.Frame.DRAWN) {
+                water.noteWork(seconds() - start);
+                askForNextFrame();
+            }
+            return frame;
         }
-        if (frame == LiveWater.Frame.DRAWN) water.noteWork(seconds() - start);
-        if (frame == LiveWater.Frame.RESTING) GLES20.glClear(GLES20.GL_COLOR_BUFFER_BIT);  // no pictures yet
-        if (!water.isResting()) requestRender.run();
     }
 
     private static double seconds() {
         return SystemClock.elapsedRealtimeNanos() * 1.0e-9;
+    }
+
+    private boolean isNewest() {
+        return !SHOWN.isEmpty() && SHOWN.get(SHOWN.size() - 1) == this;
+    }
+
+    // Loads the library, which the layout editor and an app's tests on a desktop do not have.
+    private boolean isReady() {
+        if (water != null || isBroken) return water != null;
+        try {
+            water = new LiveWater(new JniTidemarkRender(), new Look(), (int) System.nanoTime());
+        } catch (LinkageError e) {
+            isBroken = true;
+            report(TidemarkListener.Failure.NO_LIBRARY, e.toString());
+        }
+        return water != null;
+    }
+
+    // The library may have another renderer's pictures, a stroke of its finger, and objects of its context.
+    private void takeOver() {
+        if (owner != null) {
+            new JniTidemarkRender().clearInkValue();
+            water.renewContext();
+            if (pictures != null) water.setPictures(pictures = pictures.asNew());
+        }
+        owner = this;
+    }
+
+    private void takeChanges() {
+        Pictures handedIn = newPictures.getAndSet(null);
+        if (handedIn != null) takePictures(handedIn);
+        for (Change change; (change = changes.poll()) != null;) change.apply(water);
+    }
+
+    private void takePictures(Pictures handedIn) {
+        int[] most = new int[1];
+        GLES20.glGetIntegerv(GLES20.GL_MAX_TEXTURE_SIZE, most, 0);
+        if (handedIn.longestSide() > most[0]) {
+            report(TidemarkListener.Failure.PICTURE_TOO_LARGE, "a picture has a side of " + handedIn.longestSide()
+                    + " pixels, and the largest texture of the device one of " + most[0]);
+            return;
+        }
+        pictures = handedIn;
+        water.setPictures(handedIn);
+    }
+
+    private void askForNextFrame() {
+        boolean isResting = water.isResting();
+        TidemarkListener heard = listener;
+        if (!isResting) {
+            requestRender.run();
+        } else if (heard != null) {
+            onMainThread(heard::onCalm);
+        }
+    }
+
+    private static void onMainThread(Runnable call) {
+        new Handler(Looper.getMainLooper()).post(call);
     }
 }

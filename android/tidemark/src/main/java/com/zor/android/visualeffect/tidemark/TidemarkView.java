@@ -1,20 +1,31 @@
 package com.zor.android.visualeffect.tidemark;
 
+import android.app.ActivityManager;
 import android.content.Context;
 import android.graphics.Bitmap;
 import android.opengl.GLSurfaceView;
 import android.util.AttributeSet;
 import android.view.MotionEvent;
+import android.view.ViewConfiguration;
 
 /**
  * Rippling water over a picture, which answers to touches. Put it into a layout, give it pictures, and call
- * {@link #onPause} and {@link #onResume} with the activity's own. Use it on the main thread, and one at a time: the
- * library serves a single effect.
+ * {@link #onStart} and {@link #onStop} with the activity's own. Use it on the main thread. What is set while the view is not shown takes effect when it is.
+ *
+ * <p>Of several views the newest one draws, since the library serves a single effect. An older one rests, and goes on
+ * when the newer one is stopped or taken out of its window.
  */
 public class TidemarkView extends GLSurfaceView {
-    private final LiveWater water = new LiveWater(new JniTidemarkRender(), new Look(), (int) System.nanoTime());
-    final TidemarkRenderer renderer = new TidemarkRenderer(water, this::requestRender);
-    private final FirstFinger finger = new FirstFinger(this::forwardTouch);
+    private static final int OPENGL_ES_2 = 0x20000;
+
+    final TidemarkRenderer renderer = new TidemarkRenderer(this::requestFrame);
+    private final FirstFinger finger = new FirstFinger(renderer::touch);
+    private boolean canDraw;  // not in a layout editor
+    private boolean isStopped;
+    private boolean isDetached;
+    private boolean mayBeClick;
+    private float downX;
+    private float downY;
 
     public TidemarkView(Context context) {
         this(context, null);
@@ -22,57 +33,146 @@ public class TidemarkView extends GLSurfaceView {
 
     public TidemarkView(Context context, AttributeSet attributes) {
         super(context, attributes);
+        canDraw = !isInEditMode() && hasOpenGl(context);
+        if (!canDraw) return;
         setEGLContextClientVersion(2);
         setEGLConfigChooser(8, 8, 8, 0, 0, 0);
+        setPreserveEGLContextOnPause(true);
         setRenderer(renderer);
         setRenderMode(RENDERMODE_WHEN_DIRTY);
+    }
+
+    /** Hears on the main thread when the water is calm and what fails; null for nobody. */
+    public void setListener(TidemarkListener listener) {
+        renderer.setListener(listener);
+        if (canDraw || isInEditMode()) return;
+        renderer.report(TidemarkListener.Failure.NO_OPENGL, "this device has no OpenGL ES 2.0");
     }
 
     /**
      * What the water lies over in portrait and in landscape, and the light on the waves. The backgrounds are cropped to
      * the view; no side may be longer than the device's largest texture, 2048 pixels being safe everywhere. Keep the
      * bitmaps unchanged while the view uses them.
+     *
+     * @throws IllegalArgumentException for a bitmap that is null or recycled
      */
     public void setPictures(Bitmap portrait, Bitmap landscape, Bitmap light) {
-        Pictures pictures = new Pictures(portrait, landscape, light);
-        change(() -> water.setPictures(pictures));
+        renderer.setPictures(new Pictures(portrait, landscape, light));
+    }
+
+    /** How the water looks and moves from now on. Another mesh begins with flat water. */
+    public void setLook(Look look) {
+        renderer.setLook(look);
     }
 
     /** Whether touches drop ink; they do not at first. */
     public void setInk(boolean withInk) {
-        change(() -> water.setInk(withInk));
+        renderer.setInk(withInk);
     }
 
+    /** Lets all ink vanish. */
     public void clearInk() {
-        change(water::clearInk);
+        renderer.clearInk();
     }
 
     /** Whether it rains; it does not at first. */
     public void setRain(boolean falling) {
-        change(() -> water.setRain(falling));
+        renderer.setRain(falling);
     }
+
+    /**
+     * A splash without a finger; it drops no ink.
+     *
+     * @param x pixels from the left edge of the view
+     * @param y pixels from its top edge
+     * @param strength 1 for that of a finger that comes down
+     */
+    public void ripple(float x, float y, float strength) {
+        renderer.ripple(Math.round(x), Math.round(y), strength);
+    }
+
+    /** With the activity's own {@code onStart}, or the fragment's. */
+    public void onStart() {
+        isStopped = false;
+        if (canDraw) super.onResume();
+        if (!isDetached) renderer.show();
+    }
+
+    /**
+     * With the activity's own {@code onStop}. Between the two the view draws nothing; its water and its ink go on where
+     * they were, unless the device takes the context away.
+     */
+    public void onStop() {
+        finger.lift();
+        isStopped = true;
+        renderer.hide();
+        if (canDraw) super.onPause();
+    }
+
+    /**
+     * Does nothing. An activity is paused while it is still seen, below a dialog or beside another app: use
+     * {@link #onStop}.
+     */
+    @Override
+    public final void onPause() {}
+
+    /** Does nothing: use {@link #onStart}. */
+    @Override
+    public final void onResume() {}
 
     @Override
     public boolean onTouchEvent(MotionEvent event) {
         finger.follow(event);
+        switch (event.getActionMasked()) {
+            case MotionEvent.ACTION_DOWN:
+                // A list around the view would take the finger's way for scrolling.
+                if (getParent() != null) getParent().requestDisallowInterceptTouchEvent(true);
+                mayBeClick = true;
+                downX = event.getX(0);
+                downY = event.getY(0);
+                break;
+            case MotionEvent.ACTION_UP:
+                if (mayBeClick && isNearDown(event)) performClick();
+                break;
+            default:
+                mayBeClick &= event.getActionMasked() == MotionEvent.ACTION_MOVE && isNearDown(event);
+        }
         return true;
     }
 
+    /** For a tap, and for services that tap without a finger. */
     @Override
-    public void onPause() {
-        finger.cancel();
-        super.onPause();
+    public boolean performClick() {
+        return super.performClick();
     }
 
-    // The event itself is recycled before the GL thread could read it.
-    private void forwardTouch(int action, int x, int y, float pressure) {
-        change(() -> water.touch(action, x, y, pressure));
+    @Override
+    protected void onAttachedToWindow() {
+        super.onAttachedToWindow();
+        isDetached = false;
+        if (!isStopped) renderer.show();
     }
 
-    private void change(Runnable call) {
-        queueEvent(() -> {
-            call.run();
-            requestRender();
-        });
+    @Override
+    protected void onDetachedFromWindow() {
+        finger.lift();
+        isDetached = true;
+        renderer.hide();
+        super.onDetachedFromWindow();
+    }
+
+    private boolean isNearDown(MotionEvent event) {
+        int slop = ViewConfiguration.get(getContext()).getScaledTouchSlop();
+        return Math.abs(event.getX(0) - downX) <= slop && Math.abs(event.getY(0) - downY) <= slop;
+    }
+
+    // Without it the GL thread would throw.
+    private static boolean hasOpenGl(Context context) {
+        ActivityManager device = (ActivityManager) context.getSystemService(Context.ACTIVITY_SERVICE);
+        return device == null || device.getDeviceConfigurationInfo().reqGlEsVersion >= OPENGL_ES_2;
+    }
+
+    private void requestFrame() {
+        if (canDraw) requestRender();
     }
 }

@@ -205,6 +205,14 @@ public final class WaterHost {
         inkSteps = look.framesToFade;
     }
 
+    /** Raises the ripple of a finger of this pressure that comes down, without a finger and without ink. */
+    public void splash(int x, int y, float pressure) {
+        if (!isSetUp) return;
+        float modelX = ((float) x / width - 0.5f) * visibleWidth;
+        float modelY = (0.5f - (float) y / height) * visibleHeight;
+        raiseRipple(modelX, modelY, look.touchAmplitude * pressure);
+    }
+
     /** Lets rain fall, {@code look.rainDropsPerSecond} drops a second, until it is switched off. */
     public void rain(boolean falling) {
         raining = falling;

@@ -1,6 +1,7 @@
 package com.zor.android.visualeffect.tidemark.sample;
 
 import android.app.Activity;
+import android.content.ActivityNotFoundException;
 import android.content.Intent;
 import android.graphics.Bitmap;
 import android.net.Uri;
@@ -17,7 +18,7 @@ import java.io.IOException;
 public final class MainActivity extends Activity {
     private static final int PICK_PICTURE = 1;
 
-    private final Bitmap light = SamplePictures.light(256);
+    private Bitmap light;  // once the sand is shown
     private TidemarkView water;
 
     @Override
@@ -25,7 +26,7 @@ public final class MainActivity extends Activity {
         super.onCreate(savedState);
         setContentView(R.layout.main);
         water = findViewById(R.id.water);
-        water.setPictures(SamplePictures.sand(480, 854), SamplePictures.sand(854, 480), light);
+        new Thread(this::showSand).start();
 
         CompoundButton ink = findViewById(R.id.ink);
         ink.setOnCheckedChangeListener((button, checked) -> water.setInk(checked));
@@ -38,22 +39,38 @@ public final class MainActivity extends Activity {
     }
 
     @Override
-    protected void onResume() {
-        super.onResume();
-        water.onResume();
+    protected void onStart() {
+        super.onStart();
+        water.onStart();
     }
 
     @Override
-    protected void onPause() {
-        water.onPause();
-        super.onPause();
+    protected void onStop() {
+        water.onStop();
+        super.onStop();
+    }
+
+    // Takes up to a second.
+    private void showSand() {
+        Bitmap portrait = SamplePictures.sand(480, 854);
+        Bitmap landscape = SamplePictures.sand(854, 480);
+        Bitmap net = SamplePictures.light(256);
+        runOnUiThread(() -> {
+            light = net;
+            water.setPictures(portrait, landscape, light);
+        });
     }
 
     private void pickPicture() {
+        if (light == null) return;
         Intent pick = new Intent(Intent.ACTION_OPEN_DOCUMENT);
         pick.addCategory(Intent.CATEGORY_OPENABLE);
         pick.setType("image/*");
-        startActivityForResult(pick, PICK_PICTURE);
+        try {
+            startActivityForResult(pick, PICK_PICTURE);
+        } catch (ActivityNotFoundException e) {
+            complain(R.string.no_picker);
+        }
     }
 
     @Override
@@ -67,9 +84,15 @@ public final class MainActivity extends Activity {
     private void showPicture(Uri uri) {
         try {
             Bitmap picture = PictureLoader.load(getContentResolver(), uri);
-            runOnUiThread(() -> water.setPictures(picture, picture, light));
+            runOnUiThread(() -> {
+                if (light != null) water.setPictures(picture, picture, light);
+            });
         } catch (IOException | SecurityException e) {
-            runOnUiThread(() -> Toast.makeText(this, R.string.unreadable, Toast.LENGTH_LONG).show());
+            runOnUiThread(() -> complain(R.string.unreadable));
         }
+    }
+
+    private void complain(int text) {
+        Toast.makeText(this, text, Toast.LENGTH_LONG).show();
     }
 }

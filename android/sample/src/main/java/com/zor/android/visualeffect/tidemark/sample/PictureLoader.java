@@ -24,14 +24,15 @@ final class PictureLoader {
         decode(resolver, uri, options);
         options.inJustDecodeBounds = false;
         options.inPreferredConfig = Bitmap.Config.ARGB_8888;
-        // The decoder rounds the divisor down to a power of two.
+        // The decoder takes powers of two, and may round a side up.
+        int longest = Math.max(options.outWidth, options.outHeight);
         options.inSampleSize = 1;
-        while (Math.max(options.outWidth, options.outHeight) / options.inSampleSize > LONGEST_SIDE) {
+        while ((longest + options.inSampleSize - 1) / options.inSampleSize > LONGEST_SIDE) {
             options.inSampleSize *= 2;
         }
         Bitmap picture = decode(resolver, uri, options);
         if (picture == null) throw new IOException("not a picture: " + uri);
-        return turn(picture, degrees(resolver, uri));
+        return upright(picture, orientation(resolver, uri));
     }
 
     private static Bitmap decode(ContentResolver resolver, Uri uri, BitmapFactory.Options options) throws IOException {
@@ -41,27 +42,43 @@ final class PictureLoader {
     }
 
     // Cameras store a picture as the sensor saw it and note how it was held.
-    private static int degrees(ContentResolver resolver, Uri uri) throws IOException {
-        if (Build.VERSION.SDK_INT < Build.VERSION_CODES.N) return 0;
+    private static int orientation(ContentResolver resolver, Uri uri) throws IOException {
+        if (Build.VERSION.SDK_INT < Build.VERSION_CODES.N) return ExifInterface.ORIENTATION_NORMAL;
         try (InputStream stream = open(resolver, uri)) {
-            ExifInterface exif = new ExifInterface(stream);
-            switch (exif.getAttributeInt(ExifInterface.TAG_ORIENTATION, ExifInterface.ORIENTATION_NORMAL)) {
-                case ExifInterface.ORIENTATION_ROTATE_90:
-                    return 90;
-                case ExifInterface.ORIENTATION_ROTATE_180:
-                    return 180;
-                case ExifInterface.ORIENTATION_ROTATE_270:
-                    return 270;
-                default:
-                    return 0;
-            }
+            return new ExifInterface(stream)
+                    .getAttributeInt(ExifInterface.TAG_ORIENTATION, ExifInterface.ORIENTATION_NORMAL);
         }
     }
 
-    private static Bitmap turn(Bitmap picture, int degrees) {
-        if (degrees == 0) return picture;
+    private static Bitmap upright(Bitmap picture, int orientation) {
         Matrix matrix = new Matrix();
-        matrix.postRotate(degrees);
+        switch (orientation) {
+            case ExifInterface.ORIENTATION_FLIP_HORIZONTAL:
+                matrix.postScale(-1, 1);
+                break;
+            case ExifInterface.ORIENTATION_ROTATE_180:
+                matrix.postRotate(180);
+                break;
+            case ExifInterface.ORIENTATION_FLIP_VERTICAL:
+                matrix.postScale(1, -1);
+                break;
+            case ExifInterface.ORIENTATION_TRANSPOSE:
+                matrix.postRotate(90);
+                matrix.postScale(-1, 1);
+                break;
+            case ExifInterface.ORIENTATION_ROTATE_90:
+                matrix.postRotate(90);
+                break;
+            case ExifInterface.ORIENTATION_TRANSVERSE:
+                matrix.postRotate(270);
+                matrix.postScale(-1, 1);
+                break;
+            case ExifInterface.ORIENTATION_ROTATE_270:
+                matrix.postRotate(270);
+                break;
+            default:
+                return picture;
+        }
         return Bitmap.createBitmap(picture, 0, 0, picture.getWidth(), picture.getHeight(), matrix, true);
     }
 

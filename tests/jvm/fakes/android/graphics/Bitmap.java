@@ -46,13 +46,12 @@ public final class Bitmap {
         return new Bitmap(colors, width, height, source.config);
     }
 
-    public static Bitmap createBitmap(
-            Bitmap source, int x, int y, int width, int height, Matrix matrix, boolean filter) {
-        return source;
-    }
-
     public Bitmap copy(Config config, boolean mutable) {
         return new Bitmap(colors, width, height, config);
+    }
+
+    public boolean isRecycled() {
+        return false;
     }
 
     public int getWidth() {

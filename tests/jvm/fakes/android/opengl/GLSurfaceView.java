@@ -25,7 +25,9 @@ public class GLSurfaceView extends SurfaceView {
     public final Queue<Runnable> queue = new ArrayDeque<>();
     public boolean renderRequested;
 
-    public GLSurfaceView(Context context, AttributeSet attributes) {}
+    public GLSurfaceView(Context context, AttributeSet attributes) {
+        super(context, attributes);
+    }
 
     public void setEGLContextClientVersion(int version) {}
 
@@ -34,6 +36,8 @@ public class GLSurfaceView extends SurfaceView {
     public void setRenderer(Renderer renderer) {}
 
     public void setRenderMode(int mode) {}
+
+    public void setPreserveEGLContextOnPause(boolean preserve) {}
 
     public void requestRender() {
         renderRequested = true;

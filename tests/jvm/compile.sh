@@ -1,0 +1,34 @@
+#!/usr/bin/env bash
+# compile.sh SOURCE BINARY: the classes that ship, against the platform's API and resources, and the tests
+set -euo pipefail
+source=$1
+cd "$2"
+"$source/scripts/android_platform.sh"
+platform=$source/build/android-platform
+rm -rf classes generated resources && mkdir -p classes generated resources
+java() {
+    find "$@" -name '*.java'
+}
+compile() {
+    "$JAVAC" -Xlint:all,-options -Werror "$@"
+}
+mapfile -t shipped < <(java "$source/android")
+mapfile -t tests < <(java "$source/tests/jvm/java")
+mapfile -t fakes < <(java "$source/tests/jvm/fakes")
+
+"$PYTHON" "$source/tests/jvm/platform/classes_of_api.py" "$platform/api/current.txt" generated "${shipped[@]}" "${fakes[@]}"
+mapfile -t generated < <(java generated)
+"$JAVAC" -nowarn -Xlint:none --release 8 -d classes/platform "${generated[@]}"
+
+# Gradle writes the package and the versions into the manifest.
+sed 's/<manifest /&package="com.zor.android.visualeffect.tidemark.sample" /
+    s/<application/<uses-sdk android:minSdkVersion="21" android:targetSdkVersion="29" \/>&/' \
+    "$source/android/sample/src/main/AndroidManifest.xml" >resources/manifest.xml
+"$AAPT2" compile --dir "$source/android/sample/src/main/res" -o resources/compiled.zip
+"$AAPT2" link -I /usr/share/android-framework-res/framework-res.apk --manifest resources/manifest.xml \
+    -o resources/linked.apk --java resources resources/compiled.zip
+
+mapfile -t shipped < <(java "$source/android" resources)
+compile --release 8 -parameters -h headers -cp classes/platform -d classes/shipped "${shipped[@]}"
+compile --release 8 -cp classes/platform -d classes/fakes "${fakes[@]}"
+compile --release 17 -h headers -cp "classes/fakes:classes/platform:classes/shipped:$JUNIT" -d classes/tests "${tests[@]}"

@@ -1,7 +1,0 @@
-package android.graphics;
-
-public class Matrix {
-    public boolean postRotate(float degrees) {
-        return true;
-    }
-}

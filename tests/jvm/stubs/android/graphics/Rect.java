@@ -1,3 +1,0 @@
-package android.graphics;
-
-public final class Rect {}

@@ -1,3 +1,0 @@
-package android.util;
-
-public interface AttributeSet {}

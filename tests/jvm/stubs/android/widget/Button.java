@@ -1,5 +1,0 @@
-package android.widget;
-
-import android.view.View;
-
-public class Button extends View {}

@@ -1,3 +1,0 @@
-package javax.microedition.khronos.egl;
-
-public abstract class EGLConfig {}

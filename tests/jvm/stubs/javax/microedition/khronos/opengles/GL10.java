@@ -1,3 +1,0 @@
-package javax.microedition.khronos.opengles;
-
-public interface GL10 {}

@@ -23,7 +23,8 @@ std::string readLine(const std::string& line, Look& look) {
     if (sign == line.npos) return "expected \"key = number\"";
     const std::string key = trimmed(line.substr(0, sign));
     const std::string value = trimmed(line.substr(sign + 1));
-    const auto* const field = std::ranges::find(kLookFields, key, &LookField::name);
+    const auto* const field = std::find_if(
+        std::begin(kLookFields), std::end(kLookFields), [&](const LookField& known) { return known.name == key; });
     if (field == std::end(kLookFields)) return "there is no value \"" + key + "\"";
     const auto read = [&](auto member) {
         std::istringstream words(value);

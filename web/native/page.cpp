@@ -88,7 +88,10 @@ EMSCRIPTEN_KEEPALIVE void renewContext() {
 }
 
 EMSCRIPTEN_KEEPALIVE int frame(double seconds) {
-    return static_cast<int>(water->frame(seconds));
+    const double start = emscripten_get_now();
+    const LiveWater::Frame done = water->frame(seconds);
+    if (done == LiveWater::Frame::drawn) water->noteWork((emscripten_get_now() - start) / 1000.0);
+    return static_cast<int>(done);
 }
 
 }  // extern "C"

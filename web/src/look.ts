@@ -33,10 +33,10 @@ const keys = (...names: string[]) => names.map((name) => lookKeys.find((key) => 
 
 // The values that change the look, by what they change; the others tune how a host works.
 export const sliders: Record<string, LookKey[]> = {
-    Waves: keys('damping', 'waveSpeed', 'stepsPerSecond', 'touchAmplitude', 'trailShare', 'trailCells'),
+    Waves: keys('ringSpeed', 'dropRadius', 'calmingTime', 'touchAmplitude', 'trailShare', 'trailCells'),
     Light: keys('refractiveIndex', 'alphaMix', 'alphaScale1', 'alphaScale2', 'fresnelRatio', 'specularRatio', 'exponent'),
     Rain: keys('rainDropsPerSecond', 'rainAmplitude'),
-    Mesh: keys('meshVertices', 'meshExtent'),
+    Mesh: keys('meshExtent'),
 };
 
 export const inkKeys = keys('inkRed', 'inkGreen', 'inkBlue');

@@ -9,15 +9,15 @@ interface Preset {
 
 const presets: Record<string, Preset> = {
     'As shipped': { look: {} },
-    'Summer rain': { look: { rainDropsPerSecond: 14, rainAmplitude: 0.7, damping: 0.975 }, ink: false, rain: true },
-    'Heavy glass': { look: { refractiveIndex: 2.4, damping: 0.96, waveSpeed: 0.18, exponent: 120, specularRatio: 8 }, ink: false },
+    'Summer rain': { look: { rainDropsPerSecond: 14, rainAmplitude: 0.7, calmingTime: 4 }, ink: false, rain: true },
+    'Heavy glass': { look: { refractiveIndex: 2.4, calmingTime: 2.5, ringSpeed: 0.2, exponent: 120, specularRatio: 8 }, ink: false },
     'Quick silver': {
-        look: { alphaMix: 0.8, alphaScale1: 0.8, fresnelRatio: 1.2, specularRatio: 6, exponent: 60, touchAmplitude: 3, damping: 0.99 },
+        look: { alphaMix: 0.8, alphaScale1: 0.8, fresnelRatio: 1.2, specularRatio: 6, exponent: 60, touchAmplitude: 3, calmingTime: 10 },
         ink: false,
     },
-    Honey: { look: { damping: 0.94, waveSpeed: 0.12, touchAmplitude: 3.4, alphaMix: 0.8, inkRed: 0.6, inkGreen: 0.3, inkBlue: 0.02 } },
+    Honey: { look: { calmingTime: 1.6, ringSpeed: 0.17, touchAmplitude: 3.4, alphaMix: 0.8, inkRed: 0.6, inkGreen: 0.3, inkBlue: 0.02 } },
     'Red ink': { look: { inkRed: 0.6, inkGreen: 0.03, inkBlue: 0.05, touchAmplitude: 1.2, trailShare: 0.06 } },
-    'Deep swell': { look: { meshVertices: 96, meshExtent: 20, damping: 0.992, waveSpeed: 0.45, touchAmplitude: 3 } },
+    'Deep swell': { look: { dropRadius: 0.032, meshExtent: 20, calmingTime: 12.5, ringSpeed: 0.43, touchAmplitude: 3 } },
 };
 
 export const presetNames = Object.keys(presets);

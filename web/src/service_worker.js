@@ -16,7 +16,7 @@ async function dropOlder() {
 
 async function answer(request) {
     const cache = await caches.open(cacheName);
-    return (await cache.match(request, { ignoreSearch: true })) ?? fetch(request);
+    return (await cache.match(request, { ignoreSearch: true, ignoreVary: true })) ?? fetch(request);
 }
 
 self.addEventListener('install', (event) => event.waitUntil(keepAll()));

@@ -1,0 +1,79 @@
+// A page with water, and its water frame by frame: without the page's loop and its clock.
+import { test as plain, expect } from '@playwright/test';
+import { PNG } from 'pngjs';
+
+export { expect };
+
+// Fails where the page complains.
+export const test = plain.extend({
+    page: async ({ page }, use) => {
+        const problems = [];
+        page.on('console', (message) => {
+            if (['error', 'warning'].includes(message.type())) problems.push(`${message.text()} ${message.location().url}`);
+        });
+        page.on('pageerror', (error) => problems.push(String(error)));
+        await use(page);
+        expect(problems).toEqual([]);
+    },
+});
+
+// Opens the page and waits until it shows water.
+export async function open(page, hash = '') {
+    await page.goto(`./${hash}`);
+    await page.waitForSelector('#water.shown');
+}
+
+export const calm = (page) => page.waitForSelector('.status.calm', { state: 'attached' });
+
+// The page's loop stands still from here on; what `play` of the next function does is all that happens.
+export const takeOver = (page) =>
+    page.evaluate(() => {
+        const { loop, water, settings } = window.tidemark;
+        const canvas = document.querySelector('canvas');
+        const gl = canvas.getContext('webgl');
+        loop.pause();
+        let seconds = performance.now() / 1000;
+        window.frames = (count) => {
+            for (let i = 0; i < count; ++i) water.frame((seconds += 1 / 60));
+        };
+        window.settle = () => {
+            for (let i = 0; water.frame((seconds += 1 / 60)) !== 0; ++i) if (i > 2000) throw new Error('no rest');
+        };
+        // Only in the task that has drawn: afterwards the browser takes the canvas away. Rows from the top.
+        window.read = () => {
+            water.setLook(settings.look);
+            window.frames(1);
+            const { width, height } = canvas;
+            const pixels = new Uint8Array(4 * width * height);
+            gl.readPixels(0, 0, width, height, gl.RGBA, gl.UNSIGNED_BYTE, pixels);
+            let text = '';
+            for (let row = height - 1; row >= 0; --row) {
+                text += String.fromCharCode(...pixels.subarray(4 * width * row, 4 * width * (row + 1)));
+            }
+            return btoa(text);
+        };
+    });
+
+// Runs `play` in the page, which returns what read() gives, or several.
+export async function pixelsAfter(page, play, argument) {
+    const result = await page.evaluate(play, argument);
+    return Array.isArray(result) ? result.map((text) => Buffer.from(text, 'base64')) : Buffer.from(result, 'base64');
+}
+
+export const flatPixels = (page) => pixelsAfter(page, () => (window.settle(), window.read()));
+
+// A PNG file whose red grows to the right and whose green grows downwards.
+export function slope(width, height) {
+    const png = new PNG({ width, height });
+    for (let i = 0; i < width * height; ++i) {
+        png.data.set([(255 * (i % width)) / width, (255 * Math.floor(i / width)) / height, 40, 255], 4 * i);
+    }
+    return { name: `${width}x${height}.png`, mimeType: 'image/png', buffer: PNG.sync.write(png) };
+}
+
+// The mean difference of two pictures a channel, 0 to 255.
+export function difference(a, b) {
+    let sum = 0;
+    for (let i = 0; i < a.length; ++i) sum += Math.abs(a[i] - b[i]);
+    return sum / a.length;
+}

@@ -1,0 +1,27 @@
+// The built page in the system's Chromium. It lies in a folder, so that a path that is not relative shows.
+import { defineConfig } from '@playwright/test';
+
+const port = 4811;
+
+export default defineConfig({
+    testDir: '.',
+    outputDir: '../../build/web/test-results',
+    workers: 1,
+    timeout: 90_000,
+    expect: { timeout: 20_000 },
+    use: {
+        baseURL: `http://localhost:${port}/some/where/`,
+        viewport: { width: 200, height: 300 },
+        actionTimeout: 20_000,
+        launchOptions: {
+            executablePath: process.env.CHROMIUM ?? '/usr/bin/chromium',
+            args: ['--headless=new', '--no-sandbox', '--use-angle=swiftshader', '--enable-unsafe-swiftshader', '--disable-quic',
+                '--no-first-run', '--disable-background-networking', '--disable-component-update', '--disable-sync'],
+        },
+    },
+    webServer: {
+        command: `npx vite preview --host localhost --port ${port} --strictPort --base /some/where/`,
+        cwd: new URL('..', import.meta.url).pathname,
+        url: `http://localhost:${port}/some/where/`,
+    },
+});

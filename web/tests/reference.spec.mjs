@@ -1,0 +1,52 @@
+// The page draws what the desktop program draws.
+import { execFile } from 'node:child_process';
+import { mkdirSync, readFileSync } from 'node:fs';
+import { join } from 'node:path';
+import { promisify } from 'node:util';
+import { PNG } from 'pngjs';
+import { expect, open, pixelsAfter, takeOver, test } from './page.mjs';
+
+const root = new URL('../..', import.meta.url).pathname;
+const preview = process.env.TIDEMARK_PREVIEW ?? join(root, 'build/release/preview/tidemark-preview');
+const [width, height] = [270, 480];
+
+test.use({ viewport: { width, height } });
+
+test('frames of a script equal those of tidemark-preview', async ({ page }, { outputDir }) => {
+    const script = join(root, 'scenes/demo.touch');
+    mkdirSync(outputDir, { recursive: true });
+    // The driver that filters textures exactly, as the browser's does; the faster one has weights of 8 bits, which the
+    // two bytes of the ink's texels do not stand.
+    const options = ['--script', script, '--size', `${width}x${height}`, '--seconds', '1.7', '--every', '20', '--out', outputDir];
+    const drawn = promisify(execFile)(preview, options, { env: { ...process.env, GALLIUM_DRIVER: 'softpipe' } });
+
+    const actions = ['down', 'up', 'move', 'cancel'];
+    const pixels = (text, extent) => Math.round((parseFloat(text) * extent) / 100);
+    const touches = readFileSync(script, 'utf8').split('\n').filter((line) => /^\d/.test(line)).map((line) => {
+        const [time, action, x, y, pressure] = line.split(/\s+/);
+        return [Number(time), actions.indexOf(action), pixels(x, width), pixels(y, height), Number(pressure)];
+    });
+    await open(page, '#picture=river');
+    await takeOver(page);
+    const frames = await pixelsAfter(page, (touches) => {
+        window.settle();
+        const taken = [];
+        for (let i = 0, next = 0; i < 102; ++i) {
+            for (; next < touches.length && touches[next][0] < ((i + 1) * 1000) / 60; ++next) {
+                window.tidemark.water.touch(...touches[next].slice(1));
+            }
+            if (i % 20 === 0) taken.push(window.read());
+            else window.frames(1);
+        }
+        return taken;
+    }, touches);
+    await drawn;
+    for (const [i, frame] of frames.entries()) {
+        const reference = PNG.sync.read(readFileSync(join(outputDir, `frame-${String(i).padStart(4, '0')}.png`))).data;
+        let apart = 0;
+        for (let at = 0; at < frame.length; at += 4) {
+            if ([0, 1, 2].some((c) => Math.abs(frame[at + c] - reference[at + c]) > 2)) ++apart;
+        }
+        expect(apart / (width * height), `frame ${20 * i}`).toBeLessThan(0.01);
+    }
+});

@@ -1,0 +1,56 @@
+// The page as a site: screens, a missing network, and browsers that cannot show it.
+import { difference, calm, expect, flatPixels, open, takeOver, test } from './page.mjs';
+
+// To look at, in build/web/screens.
+const screens = {
+    desktop: { viewport: { width: 1440, height: 900 } },
+    phone: { viewport: { width: 390, height: 844 }, deviceScaleFactor: 3, isMobile: true, hasTouch: true },
+    'phone-landscape': { viewport: { width: 844, height: 390 }, deviceScaleFactor: 3, isMobile: true, hasTouch: true },
+};
+for (const [name, screen] of Object.entries(screens)) {
+    test.describe(name, () => {
+        test.use(screen);
+        test('fills the screen, at most twice as dense as the page', async ({ page }) => {
+            await open(page);
+            await calm(page);
+            await expect(page.locator('canvas')).toHaveCSS('opacity', '1');
+            await page.screenshot({ path: `../build/web/screens/${name}.png` });
+            const { width, height } = screen.viewport;
+            const density = Math.min(screen.deviceScaleFactor ?? 1, 2);
+            expect(await page.locator('canvas').evaluate(({ width, height }) => [width, height])).toEqual([width * density, height * density]);
+            expect(await page.evaluate(() => document.documentElement.scrollHeight <= innerHeight)).toBe(true);
+            for (const tool of await page.locator('#tools button').all()) await expect(tool).toBeInViewport({ ratio: 1 });
+            if (screen.hasTouch) await page.touchscreen.tap(width / 2, height / 2);
+            else await page.mouse.click(width / 2, height / 2);
+            await expect(page.locator('#hint')).toHaveClass(/gone/);
+        });
+    });
+}
+
+test('opens without a network once it has been loaded, and no two pictures look alike', async ({ page, context }) => {
+    await open(page);
+    await page.evaluate(async () => {
+        const { serviceWorker } = navigator;
+        await serviceWorker.ready;
+        if (!serviceWorker.controller) await new Promise((resolve) => { serviceWorker.oncontrollerchange = resolve; });
+    });
+    await context.setOffline(true);
+    const seen = [];
+    for (const picture of ['river', 'pool', 'shore']) {
+        await page.goto('about:blank');
+        await open(page, `#picture=${picture}`);
+        await takeOver(page);
+        seen.push(await flatPixels(page));
+    }
+    for (const [a, b] of [[0, 1], [1, 2], [0, 2]]) expect(difference(seen[a], seen[b])).toBeGreaterThan(15);
+});
+
+test('says in one sentence what the browser lacks', async ({ page }) => {
+    const lacks = async (lack, sentence) => {
+        await page.addInitScript(lack);
+        await page.goto('./');
+        await expect(page.getByRole('alert')).toHaveText(sentence);
+    };
+    await lacks(() => { HTMLCanvasElement.prototype.getContext = () => null; }, /needs WebGL/);
+    await lacks(() => { WebAssembly.validate = () => false; }, /needs WebAssembly with SIMD/);
+});

@@ -8,7 +8,9 @@
 #include "bench/frame_scene.h"
 #include "platform/headless_context.h"
 
-static void frames(benchmark::State& run, Scene kind, int width, int height) {
+namespace {
+
+void frames(benchmark::State& run, Scene kind, int width, int height) {
     std::string error;
     const auto context = HeadlessContext::create(width, height, error);
     if (!context) {
@@ -23,6 +25,8 @@ static void frames(benchmark::State& run, Scene kind, int width, int height) {
         glFinish();
     }
 }
+
+}  // namespace
 
 int main(int argc, char** argv) {
     for (const Scene scene : {Scene::water, Scene::idleInk, Scene::drag}) {

@@ -80,7 +80,7 @@ std::uint32_t strideOf(Values& values, std::uint32_t width) {
 
 void transfer(Values& values) {
     constexpr void (*kTransfers[])(JNIEnv*, jobject, jobject) = {
-        NATIVE(transferPortraitBGBitmap), NATIVE(transferLandscapeBGBitmap), NATIVE(transferWaterBitmap)};
+        native::transferPortraitBGBitmap, native::transferLandscapeBGBitmap, native::transferWaterBitmap};
     const auto native = values.PickValueInArray(kTransfers);
     if (values.below(16) == 15) return native(env, nullptr, nullptr);
 
@@ -106,16 +106,16 @@ void transfer(Values& values) {
 void setUp(Values& values) {
     const int width = values.number(-12, 243);
     const int height = values.number(-12, 243);
-    NATIVE(onInitSetting)(env, nullptr, width, height, static_cast<jboolean>(values.below(4) > 0));
+    native::onInitSetting(env, nullptr, width, height, static_cast<jboolean>(values.below(4) > 0));
 }
 
 void setUpGpu(Values&) {
-    if (mayCompute(8)) NATIVE(onInitGPU)(env, nullptr);
+    if (mayCompute(8)) native::onInitGPU(env, nullptr);
 }
 
 void loadTextures(Values& values) {
     constexpr void (*kLoads[])(JNIEnv*, jobject) = {
-        NATIVE(onLoadPortraitBGTextures), NATIVE(onLoadLandscapeBGTextures), NATIVE(onLoadWaterTextures)};
+        native::onLoadPortraitBGTextures, native::onLoadLandscapeBGTextures, native::onLoadWaterTextures};
     values.PickValueInArray(kLoads)(env, nullptr);
 }
 
@@ -131,8 +131,7 @@ void makeMesh(Values& values) {
     if (floats > kLongestArray || cells > kLongestArray / 6) return;
     Floats positions(values, floats);
     Shorts indices(values, 6 * cells);
-    NATIVE(initWaters)
-    (env, nullptr, positions.reference, indices.reference, vertices, width, height, columns, rows);
+    native::initWaters(env, nullptr, positions.reference, indices.reference, vertices, width, height, columns, rows);
 }
 
 void moveWater(Values& values) {
@@ -158,9 +157,9 @@ void moveWater(Values& values) {
     }
     Floats velocity(values, length);
     Floats height(values, length);
-    NATIVE(move)
-    (env, nullptr, velocity.reference, height.reference, xStart, yStart, xEnd, yEnd, stride, rowCount, checkCalm,
-     damping, waveSpeed);
+    native::move(
+        env, nullptr, velocity.reference, height.reference, xStart, yStart, xEnd, yEnd, stride, rowCount, checkCalm,
+        damping, waveSpeed);
 }
 
 void ripple(Values& values) {
@@ -173,14 +172,14 @@ void ripple(Values& values) {
     const float amplitude = values.real();
     if (product(countA, countB) > kLongestArray) return;
     Floats field(values, product(countA, countB));
-    NATIVE(ripple)(env, nullptr, field.reference, extentA, extentB, countA, countB, posA, posB, amplitude);
+    native::ripple(env, nullptr, field.reference, extentA, extentB, countA, countB, posA, posB, amplitude);
 }
 
 void touch(Values& values) {
     const int x = values.number(-10, 245);
     const int y = values.number(-10, 245);
     const int action = values.number(0, 3);
-    NATIVE(onTouch)(env, nullptr, x, y, action, values.real());
+    native::onTouch(env, nullptr, x, y, action, values.real());
 }
 
 // One frame or several, as a tap lasts for a dozen.
@@ -200,20 +199,20 @@ void draw(Values& values) {
     Shorts indices(values, indexCount);
     Floats mvp(values, 16);
     for (int frame = 0; frame < frames && mayCompute(); ++frame) {
-        NATIVE(onDrawFrame)
-        (env, nullptr, positions.reference, heights.reference, indices.reference, positionFloats, heightFloats,
-         indexCount, mvp.reference, sizes[0], sizes[1], sizes[2], sizes[3], look[0], look[1], look[2], look[3], look[4],
-         look[5], look[6], look[7], look[8], look[9], landscape);
+        native::onDrawFrame(
+            env, nullptr, positions.reference, heights.reference, indices.reference, positionFloats, heightFloats,
+            indexCount, mvp.reference, sizes[0], sizes[1], sizes[2], sizes[3], look[0], look[1], look[2], look[3],
+            look[4], look[5], look[6], look[7], look[8], look[9], landscape);
         requireSoundLibrary();
     }
 }
 
 void clearInk(Values&) {
-    NATIVE(clearInkValue)(env, nullptr);
+    native::clearInkValue(env, nullptr);
 }
 
 void askForInk(Values&) {
-    const int shown = NATIVE(getClearInkValue)(env, nullptr);
+    const int shown = native::getClearInkValue(env, nullptr);
     require(shown == 0 || shown == 1, "the ink is neither shown nor hidden");
 }
 

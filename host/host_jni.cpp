@@ -2,8 +2,10 @@
 
 #include <algorithm>
 
+namespace {
+
 template <class Array, class Element, class Reference>
-static Element* JNICALL getElements(JNIEnv*, Reference reference, jboolean* isCopy) {
+Element* JNICALL getElements(JNIEnv*, Reference reference, jboolean* isCopy) {
     if (isCopy) *isCopy = JNI_TRUE;
     auto* const array = static_cast<Array*>(reference);
     // An array without elements has an address as well, as in a virtual machine.
@@ -14,11 +16,13 @@ static Element* JNICALL getElements(JNIEnv*, Reference reference, jboolean* isCo
 }
 
 template <class Array, class Element, class Reference>
-static void JNICALL releaseElements(JNIEnv*, Reference reference, Element*, jint mode) {
+void JNICALL releaseElements(JNIEnv*, Reference reference, Element*, jint mode) {
     auto* const array = static_cast<Array*>(reference);
     if (mode != JNI_ABORT) array->values = array->pinned;
     --array->pins;
 }
+
+}  // namespace
 
 JNIEnv* hostEnvironment() {
     static const JNINativeInterface_ functions = [] {

@@ -41,7 +41,7 @@ void LiveWater::prepare() {
 }
 
 bool LiveWater::isResting() const {
-    if (pictures_.water.rgba.empty()) return true;
+    if (pictures_.light.rgba.empty()) return true;
     return !setUpDue_ && !handOverDue_ && host_.isResting();
 }
 

@@ -6,7 +6,7 @@
 
 unsigned Pictures::newSince(const Pictures& before) const {
     return (portrait == before.portrait ? 0u : kPortrait) | (landscape == before.landscape ? 0u : kLandscape) |
-           (water == before.water ? 0u : kWater);
+           (light == before.light ? 0u : kLight);
 }
 
 Picture cropToAspect(const Picture& picture, double aspectWidth, double aspectHeight) {

@@ -14,10 +14,10 @@ struct Picture {
 
 // What the water lies over in portrait and in landscape, and the light that its waves throw back.
 struct Pictures {
-    Picture portrait, landscape, water;
+    Picture portrait, landscape, light;
 
     // Some of the three, as a sum.
-    enum : unsigned { kPortrait = 1, kLandscape = 2, kBackgrounds = 3, kWater = 4, kAll = 7 };
+    enum : unsigned { kPortrait = 1, kLandscape = 2, kBackgrounds = 3, kLight = 4, kAll = 7 };
 
     // Those that are others than in `before`.
     unsigned newSince(const Pictures& before) const;

@@ -110,20 +110,20 @@ double WaterHost::proportions() const {
 void WaterHost::handOver(const Pictures& pictures, unsigned which) {
     const auto [shorter, longer] = std::minmax(pictureWidth_, pictureHeight_);
     if (which & Pictures::kPortrait) {
-        handOverOne(NATIVE(transferPortraitBGBitmap), cropToAspect(pictures.portrait, shorter, longer));
+        handOverOne(native::transferPortraitBGBitmap, cropToAspect(pictures.portrait, shorter, longer));
     }
     if (which & Pictures::kLandscape) {
-        handOverOne(NATIVE(transferLandscapeBGBitmap), cropToAspect(pictures.landscape, longer, shorter));
+        handOverOne(native::transferLandscapeBGBitmap, cropToAspect(pictures.landscape, longer, shorter));
     }
-    if (which & Pictures::kWater) handOverOne(NATIVE(transferWaterBitmap), pictures.water);
+    if (which & Pictures::kLight) handOverOne(native::transferWaterBitmap, pictures.light);
 }
 
 void WaterHost::setUp(bool withInk, unsigned textures) {
     JNIEnv* const env = hostEnvironment();
-    NATIVE(onInitSetting)(env, nullptr, width_, height_, withInk);
-    NATIVE(onInitGPU)(env, nullptr);
+    native::onInitSetting(env, nullptr, width_, height_, withInk);
+    native::onInitGPU(env, nullptr);
     // The library would keep a stroke that the switch interrupts and go on with it at the next touch.
-    if (withInk != withInk_) NATIVE(clearInkValue)(env, nullptr);
+    if (withInk != withInk_) native::clearInkValue(env, nullptr);
     withInk_ = withInk;
     inkSteps_ = 0;
     loadTextures(textures);
@@ -133,9 +133,9 @@ void WaterHost::setUp(bool withInk, unsigned textures) {
 
 void WaterHost::loadTextures(unsigned which) {
     JNIEnv* const env = hostEnvironment();
-    if (which & Pictures::kPortrait) NATIVE(onLoadPortraitBGTextures)(env, nullptr);
-    if (which & Pictures::kLandscape) NATIVE(onLoadLandscapeBGTextures)(env, nullptr);
-    if (which & Pictures::kWater) NATIVE(onLoadWaterTextures)(env, nullptr);
+    if (which & Pictures::kPortrait) native::onLoadPortraitBGTextures(env, nullptr);
+    if (which & Pictures::kLandscape) native::onLoadLandscapeBGTextures(env, nullptr);
+    if (which & Pictures::kLight) native::onLoadWaterTextures(env, nullptr);
     changed_ |= which != 0;
 }
 
@@ -145,7 +145,7 @@ void WaterHost::touch(TouchAction action, int x, int y, float pressure) {
     raiseTouchRipples(action, x, y, look_.touchAmplitude * pressure);
     fingerDown_ = action == TouchAction::down || (action == TouchAction::move && fingerDown_);
     if (!withInk_) return;
-    NATIVE(onTouch)(hostEnvironment(), nullptr, x, y, static_cast<jint>(action), pressure);
+    native::onTouch(hostEnvironment(), nullptr, x, y, static_cast<jint>(action), pressure);
     inkSteps_ = look_.framesToFade;
 }
 
@@ -179,7 +179,7 @@ void WaterHost::splash(int x, int y, float pressure) {
 
 void WaterHost::clearInk() {
     if (!isSetUp_) return;
-    NATIVE(clearInkValue)(hostEnvironment(), nullptr);
+    native::clearInkValue(hostEnvironment(), nullptr);
     changed_ = true;
 }
 
@@ -203,7 +203,7 @@ bool WaterHost::isResting() const {
 
 void WaterHost::stepWater() {
     const int n = lattice_.points;
-    const bool calm = NATIVE(move)(
+    const bool calm = native::move(
         hostEnvironment(), nullptr, &velocity_, &heights_, 1, 1, n - 1, n - 1, n, n, JNI_TRUE, lattice_.damping,
         lattice_.waveSpeed);
     calmSteps_ = calm ? calmSteps_ + 1 : 0;
@@ -228,9 +228,9 @@ void WaterHost::raiseRipple(float x, float y, float amplitude) {
     const auto n = static_cast<float>(lattice_.points);
     const float row = (0.5f - y / extent) * (n - 1.0f);
     const float column = (0.5f + x / extent) * (n - 1.0f);
-    NATIVE(ripple)
-    (hostEnvironment(), nullptr, &heights_, lattice_.extent, lattice_.extent, lattice_.points, lattice_.points,
-     (row / n - 0.5f) * extent, (column / n - 0.5f) * extent, amplitude);
+    native::ripple(
+        hostEnvironment(), nullptr, &heights_, lattice_.extent, lattice_.extent, lattice_.points, lattice_.points,
+        (row / n - 0.5f) * extent, (column / n - 0.5f) * extent, amplitude);
     calmSteps_ = 0;
     isGathered_ = false;
 }
@@ -255,9 +255,9 @@ void WaterHost::gatherHeights() {
 void WaterHost::draw() {
     JNIEnv* const env = hostEnvironment();
     if (!isMeshFilled_) {
-        NATIVE(initWaters)
-        (env, nullptr, &positions_, &indices_, vertices_ * vertices_, lattice_.extent, lattice_.extent, vertices_,
-         vertices_);
+        native::initWaters(
+            env, nullptr, &positions_, &indices_, vertices_ * vertices_, lattice_.extent, lattice_.extent, vertices_,
+            vertices_);
         isMeshFilled_ = true;
     }
     gatherHeights();
@@ -267,12 +267,12 @@ void WaterHost::draw() {
         dueInkSteps_ = std::clamp(dueInkSteps_, -0.5, 0.5);
     }
     for (int i = 0; i < frames; ++i) {
-        NATIVE(onDrawFrame)
-        (env, nullptr, &positions_, &heightAttribs_, &indices_, static_cast<jint>(positions_.values.size()),
-         static_cast<jint>(heightAttribs_.values.size()), static_cast<jint>(indices_.values.size()), &mvp_,
-         pictureWidth_, pictureHeight_, vertices_, vertices_, look_.refractiveIndex, look_.alphaMix, look_.alphaScale1,
-         look_.alphaScale2, look_.inkRed, look_.inkGreen, look_.inkBlue, look_.fresnelRatio, look_.specularRatio,
-         look_.exponent, width_ > height_);
+        native::onDrawFrame(
+            env, nullptr, &positions_, &heightAttribs_, &indices_, static_cast<jint>(positions_.values.size()),
+            static_cast<jint>(heightAttribs_.values.size()), static_cast<jint>(indices_.values.size()), &mvp_,
+            pictureWidth_, pictureHeight_, vertices_, vertices_, look_.refractiveIndex, look_.alphaMix,
+            look_.alphaScale1, look_.alphaScale2, look_.inkRed, look_.inkGreen, look_.inkBlue, look_.fresnelRatio,
+            look_.specularRatio, look_.exponent, width_ > height_);
         if (inkSteps_ > 0) --inkSteps_;
     }
     changed_ = false;

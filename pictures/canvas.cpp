@@ -2,14 +2,18 @@
 
 #include <cmath>
 
-static std::uint8_t toByte(float linear) {
+namespace {
+
+std::uint8_t toByte(float linear) {
     return static_cast<std::uint8_t>(std::sqrt(std::clamp(linear, 0.0f, 1.0f)) * 255.0f + 0.5f);
 }
 
-static float toLinear(std::uint8_t byte) {
+float toLinear(std::uint8_t byte) {
     const float root = static_cast<float>(byte) / 255.0f;
     return root * root;
 }
+
+}  // namespace
 
 Picture toPicture(const Canvas& canvas) {
     Picture picture{canvas.width, canvas.height, {}};

@@ -2,11 +2,13 @@
 
 #include <cstdint>
 
-static float smooth(float t) {
+namespace {
+
+float smooth(float t) {
     return t * t * (3.0f - 2.0f * t);
 }
 
-static void addOctave(std::vector<float>& values, int cell, float amplitude, Random& random) {
+void addOctave(std::vector<float>& values, int cell, float amplitude, Random& random) {
     const int side = CloudTile::kSide;
     const int knots = side / cell;
     std::vector<float> lattice(static_cast<std::size_t>(knots) * static_cast<std::size_t>(knots));
@@ -26,6 +28,8 @@ static void addOctave(std::vector<float>& values, int cell, float amplitude, Ran
         }
     }
 }
+
+}  // namespace
 
 float grainAt(int column, int row) {
     std::uint32_t bits =

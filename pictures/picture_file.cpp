@@ -15,17 +15,21 @@
 
 #include "pictures/jpeg_tables.h"
 
-static std::size_t byteCount(int width, int height) {
+namespace {
+
+std::size_t byteCount(int width, int height) {
     return 4 * static_cast<std::size_t>(width) * static_cast<std::size_t>(height);
 }
 
 // The reader's reason quotes bytes of the file, which may be anything.
-static std::string failureReason() {
+std::string failureReason() {
     std::string reason = stbi_failure_reason();
     std::replace_if(
         reason.begin(), reason.end(), [](char c) { return c < ' ' || c > '~'; }, '?');
     return reason;
 }
+
+}  // namespace
 
 std::optional<Picture> loadPicture(const std::string& path, std::string& error, int mostPixels) {
     std::ifstream file(path, std::ios::binary);

@@ -14,18 +14,20 @@
 
 // The net of light is cast while the ground is painted; a browser gives its programs one thread.
 #ifdef __EMSCRIPTEN__
-static constexpr auto kBeside = std::launch::deferred;
+constexpr auto kBeside = std::launch::deferred;
 #else
-static constexpr auto kBeside = std::launch::async;
+constexpr auto kBeside = std::launch::async;
 #endif
 
+namespace {
+
 // Rolls bright values off towards white instead of cutting them.
-static float expose(float light) {
+float expose(float light) {
     return light * (1.0f + light * 0.25f) / (1.0f + light * 0.60f);
 }
 
 // The net at half the resolution, read between its four nearest values.
-static float sampleHalf(const std::vector<float>& net, int netWidth, int netHeight, int column, int row) {
+float sampleHalf(const std::vector<float>& net, int netWidth, int netHeight, int column, int row) {
     const auto at = [&](int x, int y) {
         return net[static_cast<std::size_t>(
             std::clamp(y, 0, netHeight - 1) * netWidth + std::clamp(x, 0, netWidth - 1))];
@@ -38,7 +40,7 @@ static float sampleHalf(const std::vector<float>& net, int netWidth, int netHeig
 }
 
 // What the eye sees of a stone under `depth` of water: 0 is shallow and warm, 1 deep and blue-green.
-static Rgb underWater(Rgb stone, float depth, float caustic) {
+Rgb underWater(Rgb stone, float depth, float caustic) {
     const float sun = (0.75f + 0.95f * std::min(caustic, 4.5f)) * (1.30f - 0.50f * depth);
     return {
         expose(stone.r * sun * (1.20f - 0.80f * depth) + 0.002f),
@@ -48,7 +50,7 @@ static Rgb underWater(Rgb stone, float depth, float caustic) {
 
 // The ground that paintGround(canvas, unit) leaves, under water of depthAt(x, y) in the sun; x and y run from 0 to 1.
 template <class PaintGround, class DepthAt>
-static Picture flood(int width, int height, float netCell, PaintGround paintGround, DepthAt depthAt) {
+Picture flood(int width, int height, float netCell, PaintGround paintGround, DepthAt depthAt) {
     const float unit = 0.045f * std::sqrt(static_cast<float>(width) * static_cast<float>(height));
     const int netWidth = (width + 1) / 2;
     const int netHeight = (height + 1) / 2;
@@ -65,6 +67,8 @@ static Picture flood(int width, int height, float netCell, PaintGround paintGrou
     });
     return toPicture(bed);
 }
+
+}  // namespace
 
 Picture riverBed(int width, int height) {
     const auto pebbles = [](Canvas& bed, float unit) {

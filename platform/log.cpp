@@ -3,7 +3,11 @@
 #include <cstdarg>
 #include <cstdio>
 
-static __android_logger_function currentLogger = __android_log_stderr_logger;
+namespace {
+
+__android_logger_function currentLogger = __android_log_stderr_logger;
+
+}  // namespace
 
 void __android_log_set_logger(__android_logger_function logger) {
     currentLogger = logger;

@@ -4,14 +4,18 @@
 
 #include <string_view>
 
+namespace {
+
 // The library notes these two steps of every set-up at error priority, though nothing is wrong.
-static bool marksSetUp(std::string_view message) {
+bool marksSetUp(std::string_view message) {
     return message == "CreateSurface" || message == "zorloadShaderScript";
 }
 
-static void passFailures(const __android_log_message* message) {
+void passFailures(const __android_log_message* message) {
     if (message->priority >= ANDROID_LOG_ERROR && !marksSetUp(message->message)) __android_log_stderr_logger(message);
 }
+
+}  // namespace
 
 void quietenLog() {
     __android_log_set_logger(passFailures);

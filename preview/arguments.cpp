@@ -3,13 +3,15 @@
 #include <algorithm>
 #include <charconv>
 
+namespace {
+
 // More than any screen, and still within what drivers draw.
-static constexpr int kLongestSide = 8192;
+constexpr int kLongestSide = 8192;
 
 // Ink of this brightness leaves a channel as it is; brighter ink would light the picture up.
-static constexpr float kBrightestChannel = 0.75f;
+constexpr float kBrightestChannel = 0.75f;
 
-static std::optional<int> parseWhole(std::string_view text, int base) {
+std::optional<int> parseWhole(std::string_view text, int base) {
     int value = 0;
     const auto [end, problem] = std::from_chars(text.data(), text.data() + text.size(), value, base);
     if (problem != std::errc() || end != text.data() + text.size() || text.front() == '-') return std::nullopt;
@@ -17,10 +19,12 @@ static std::optional<int> parseWhole(std::string_view text, int base) {
 }
 
 // A side of the view in pixels, 0 for what is none.
-static int parseSide(std::string_view text) {
+int parseSide(std::string_view text) {
     const int side = parseWhole(text, 10).value_or(0);
     return side <= kLongestSide ? side : 0;
 }
+
+}  // namespace
 
 std::optional<Size> parseSize(std::string_view text, std::string& error) {
     const std::size_t cross = std::min(text.find('x'), text.size());

@@ -8,10 +8,14 @@
 #include "preview/preview.h"
 #include "preview/window.h"
 
-static int fail(const std::string& reason) {
+namespace {
+
+int fail(const std::string& reason) {
     std::fprintf(stderr, "tidemark-preview: %s\n", reason.c_str());
     return 1;
 }
+
+}  // namespace
 
 int main(int argc, char** argv) {
     PreviewOptions options;
@@ -28,7 +32,7 @@ int main(int argc, char** argv) {
     };
     file("--portrait", options.portrait, "Picture under the water in portrait (PNG or JPEG)");
     file("--landscape", options.landscape, "Picture under the water in landscape (PNG or JPEG)");
-    file("--water", options.water, "Picture of the light on the waves (PNG or JPEG)");
+    file("--light", options.light, "Picture of the light on the waves (PNG or JPEG)");
     file("--look", options.look, "Values of the look: lines of \"key = number\", as in host/look.properties");
     file("--script", options.script, "Touches to play: lines of \"time_ms action x y pressure\"");
     app.add_flag("--rain", options.rain, "Let it rain; without --script it always does");

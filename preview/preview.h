@@ -9,7 +9,7 @@
 
 // What is left empty is the built-in picture or look, no script, or no such output.
 struct PreviewOptions {
-    std::string portrait, landscape, water;  // files
+    std::string portrait, landscape, light;  // files
     std::string look;                        // file
     std::string script;                      // file
     bool rain = false;

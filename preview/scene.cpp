@@ -10,11 +10,15 @@
 #include "pictures/picture_file.h"
 #include "pictures/procedural_pictures.h"
 
+namespace {
+
 // The picture of `file`, or the built-in one where there is no file.
-static std::optional<Picture> choosePicture(
+std::optional<Picture> choosePicture(
     const std::string& file, const std::function<Picture()>& builtIn, std::string& error) {
     return file.empty() ? builtIn() : loadPicture(file, error);
 }
+
+}  // namespace
 
 std::optional<Pictures> choosePictures(const PreviewOptions& options, std::string& error) {
     // The built-in pictures stay as sharp as the view up to a size where they take too long to make.
@@ -29,12 +33,14 @@ std::optional<Pictures> choosePictures(const PreviewOptions& options, std::strin
         options.landscape, [&] { return riverBed(longer, shorter); }, error);
     if (!landscape) return std::nullopt;
     std::optional<Picture> water = choosePicture(
-        options.water, [] { return waterLight(512); }, error);
+        options.light, [] { return waterLight(512); }, error);
     if (!water) return std::nullopt;
     return Pictures{std::move(*portrait), std::move(*landscape), std::move(*water)};
 }
 
-static void fitToDriver(const std::string& file, Picture& picture) {
+namespace {
+
+void fitToDriver(const std::string& file, Picture& picture) {
     GLint limit = 0;
     glGetIntegerv(GL_MAX_TEXTURE_SIZE, &limit);
     const int width = picture.width;
@@ -46,10 +52,12 @@ static void fitToDriver(const std::string& file, Picture& picture) {
         file.c_str(), width, height, picture.width, picture.height);
 }
 
+}  // namespace
+
 void fitToDriver(const PreviewOptions& options, Pictures& pictures) {
     fitToDriver(options.portrait, pictures.portrait);
     fitToDriver(options.landscape, pictures.landscape);
-    fitToDriver(options.water, pictures.water);
+    fitToDriver(options.light, pictures.light);
 }
 
 std::optional<Look> chooseLook(const PreviewOptions& options, std::string& error) {

@@ -19,3 +19,17 @@ mkdir -p docs/inside
 for name in height velocity density result; do
     ffmpeg -v error -y -i "out/inside/$name.png" -c:v libwebp -quality 85 "docs/inside/$name.webp"
 done
+
+for vertices in 96 128 192 256; do
+    echo "meshVertices = $vertices" >"out/$vertices.look"
+    "$preview" --look "out/$vertices.look" --script scenes/quality.touch --size 1440x900 --seconds 0.45 --no-ink \
+        --every 26 --out "out/quality-$vertices"
+done
+parts=()
+for vertices in 96 128 192 256; do
+    parts+=(-i "out/quality-$vertices/frame-0001.png")
+done
+crop=crop=360:360:540:300
+ffmpeg -v error -y "${parts[@]}" \
+    -filter_complex "[0]${crop}[a];[1]${crop}[b];[2]${crop}[c];[3]${crop}[d];[a][b][c][d]hstack=inputs=4" \
+    -frames:v 1 -c:v libwebp -quality 88 docs/quality.webp

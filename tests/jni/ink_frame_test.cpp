@@ -136,14 +136,14 @@ TEST_F(InkFrame, clearedInkAndInkThatWasSwitchedOffComeBackWithTheNextTouch) {
     touch(240, 400, kActionDown, 1.0f);
     frames(6);
     EXPECT_GT(densest(), 0);
-    NATIVE(clearInkValue)(hostEnvironment(), nullptr);
-    EXPECT_EQ(NATIVE(getClearInkValue)(hostEnvironment(), nullptr), 0);
+    native::clearInkValue(hostEnvironment(), nullptr);
+    EXPECT_EQ(native::getClearInkValue(hostEnvironment(), nullptr), 0);
     frames(1);
     EXPECT_EQ(densest(), 0);
     EXPECT_EQ((std::array{state, step, fluid.DragMode}), (std::array{0, 0, 0}));
 
     touch(100, 400, kActionDown, 1.0f);
-    EXPECT_EQ(NATIVE(getClearInkValue)(hostEnvironment(), nullptr), 1);
+    EXPECT_EQ(native::getClearInkValue(hostEnvironment(), nullptr), 1);
     touch(120, 400, kActionMove, 1.0f);
     touch(140, 400, kActionMove, 1.0f);
     frames(1);

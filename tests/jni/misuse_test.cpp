@@ -30,7 +30,7 @@ protected:
     }
 
     static jint move(JNIEnv* from, FloatArray* v, FloatArray* h) {
-        return NATIVE(move)(from, nullptr, v, h, 0, 0, 2, 2, 2, 2, true, 0.9f, 0.3f);
+        return native::move(from, nullptr, v, h, 0, 0, 2, 2, 2, 2, true, 0.9f, 0.3f);
     }
 
     JNIEnv* const env = hostEnvironment();
@@ -42,7 +42,7 @@ protected:
 TEST_F(Misuse, nothingIsDrawnBeforeASetUpAndThatIsLoggedOnce) {
     bWithInk = true;
     drag(100, 100);
-    NATIVE(onInitGPU)(env, nullptr);  // half a set-up, whose ink has no texels
+    native::onInitGPU(env, nullptr);  // half a set-up, whose ink has no texels
     frame.draw();
     static int times = 0;
     EXPECT_EQ(times += logged("E Ripple_Render() without a set-up"), 1) << "in the life of the process";
@@ -60,11 +60,11 @@ TEST_F(Misuse, aMissingArrayMakesItsCallDoNothing) {
     frame.height.values = frame.velocity.values = {1, 2, 3, 4};
     log.take();
     for (int i = 0; i < 2; ++i) {
-        NATIVE(initWaters)(env, nullptr, nullptr, &frame.indices, 4, 1, 1, 2, 2);
-        NATIVE(initWaters)(env, nullptr, &frame.positions, nullptr, 4, 1, 1, 2, 2);
+        native::initWaters(env, nullptr, nullptr, &frame.indices, 4, 1, 1, 2, 2);
+        native::initWaters(env, nullptr, &frame.positions, nullptr, 4, 1, 1, 2, 2);
         EXPECT_TRUE(move(env, nullptr, &frame.height));
         EXPECT_TRUE(move(env, &frame.velocity, nullptr));
-        NATIVE(ripple)(env, nullptr, nullptr, 1, 1, 9, 9, 0.0f, 0.0f, 1.0f);
+        native::ripple(env, nullptr, nullptr, 1, 1, 9, 9, 0.0f, 0.0f, 1.0f);
         Frame::draw(env, nullptr, &frame.heights, &frame.indices, &frame.mvp);
         Frame::draw(env, &frame.positions, nullptr, &frame.indices, &frame.mvp);
         Frame::draw(env, &frame.positions, &frame.heights, nullptr, &frame.mvp);
@@ -108,11 +108,11 @@ TEST_F(Misuse, anyViewAndAnyOrderOfSetUpIsSurvived) {
         EXPECT_TRUE(log.take().empty()) << "the water goes on";
     }
     // The set-up stops half-way, in the other mode, or starts at its end, and no picture was handed over.
-    NATIVE(onLoadWaterTextures)(env, nullptr);
-    NATIVE(onInitSetting)(env, nullptr, 200, 100, true);
+    native::onLoadWaterTextures(env, nullptr);
+    native::onInitSetting(env, nullptr, 200, 100, true);
     drag(200, 100);
     Frame::setUp(100, 200, false);
-    NATIVE(onInitSetting)(env, nullptr, 100, 200, true);
+    native::onInitSetting(env, nullptr, 100, 200, true);
     drag(100, 200);
     ignoreErrors();
     renewContext();

@@ -13,9 +13,9 @@ TEST(Natives, takeOverABitmapAndKeepItWhenTheNextOneFails) {
     using Transfer = void (*)(JNIEnv*, jobject, jobject);
     for (const auto& [transfer, info, kept] :
          {std::tuple<Transfer, AndroidBitmapInfo&, std::uint8_t*&>(
-              NATIVE(transferPortraitBGBitmap), bmp_portrait_bg_info, bmp_portrait_bg_Pixels),
-          {NATIVE(transferLandscapeBGBitmap), bmp_landscape_bg_info, bmp_landscapebg_Pixels},
-          {NATIVE(transferWaterBitmap), bmp_water_Info, bmp_water_Pixels}}) {
+              native::transferPortraitBGBitmap, bmp_portrait_bg_info, bmp_portrait_bg_Pixels),
+          {native::transferLandscapeBGBitmap, bmp_landscape_bg_info, bmp_landscapebg_Pixels},
+          {native::transferWaterBitmap, bmp_water_Info, bmp_water_Pixels}}) {
         std::vector<std::uint8_t> pixels(2 * 3 * 4);
         std::iota(pixels.begin(), pixels.end(), std::uint8_t{100});
         const auto original = pixels;
@@ -46,11 +46,11 @@ TEST(Natives, fillWhatHasElementsBesideWhatHasNone) {
     FloatArray none(0), one(3);
     ShortArray cells(6), noCells(0);
     functions.GetFloatArrayElements = [](JNIEnv*, jfloatArray, jboolean*) -> jfloat* { return nullptr; };
-    NATIVE(initWaters)(&sparing, nullptr, &none, &cells, 0, 2, 2, 2, 2);
+    native::initWaters(&sparing, nullptr, &none, &cells, 0, 2, 2, 2, 2);
     EXPECT_EQ(cells.values, (std::vector<jshort>{0, 1, 3, 0, 3, 2}));
     functions = *hostEnvironment()->functions;
     functions.GetShortArrayElements = [](JNIEnv*, jshortArray, jboolean*) -> jshort* { return nullptr; };
-    NATIVE(initWaters)(&sparing, nullptr, &one, &noCells, 1, 2, 2, 3, 1);
+    native::initWaters(&sparing, nullptr, &one, &noCells, 1, 2, 2, 3, 1);
     EXPECT_EQ(one.values[0], -1.0f);
 }
 
@@ -58,7 +58,7 @@ TEST(Natives, moveAnswersWhetherTheWaterIsCalm) {
     FloatArray velocity(9), height(9);
     velocity.values[4] = 1.0f;
     const auto move = [&](jboolean check) {
-        return NATIVE(move)(hostEnvironment(), nullptr, &velocity, &height, 1, 1, 2, 2, 3, 3, check, 0.5f, 0.0f);
+        return native::move(hostEnvironment(), nullptr, &velocity, &height, 1, 1, 2, 2, 3, 3, check, 0.5f, 0.0f);
     };
     EXPECT_EQ(move(JNI_TRUE), JNI_FALSE);
     EXPECT_EQ(velocity.values[4], 0.5f);

@@ -83,7 +83,7 @@ TEST_F(Program, ShowsTheInsideOfAStroke) {
 TEST_F(Program, SaysWhatItScalesAndTheLogWhenAsked) {
     const std::vector<std::uint8_t> strip(40000 * 3, 90);
     ASSERT_TRUE(stbi_write_png("../strip.png", 40000, 1, 3, strip.data(), 0));
-    const std::string output = preview("--size 48x80 --seconds 0.1 --water ../strip.png --verbose");
+    const std::string output = preview("--size 48x80 --seconds 0.1 --light ../strip.png --verbose");
     EXPECT_NE(output.find("scaled from 40000x1 to "), std::string::npos) << output;
     EXPECT_NE(output.find("I/Tidemark_Native: onInitSetting"), std::string::npos) << output;
     EXPECT_TRUE(fs::exists("out/frame-0005.png"));

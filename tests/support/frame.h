@@ -11,12 +11,12 @@ struct Frame {
     int pins() const { return positions.pins + heights.pins + mvp.pins + velocity.pins + height.pins + indices.pins; }
     void draw(JNIEnv* env = hostEnvironment()) { draw(env, &positions, &heights, &indices, &mvp); }
     static void draw(JNIEnv* env, FloatArray* p, FloatArray* h, ShortArray* i, FloatArray* m) {
-        NATIVE(onDrawFrame)
-        (env, nullptr, p, h, i, 12, 12, 6, m, 1, 1, 2, 2, 1.33f, 0.5f, 0.5f, 1.0f, 0.1f, 0.2f, 0.3f, 1.0f, 1.0f, 40.0f,
-         false);
+        native::onDrawFrame(
+            env, nullptr, p, h, i, 12, 12, 6, m, 1, 1, 2, 2, 1.33f, 0.5f, 0.5f, 1.0f, 0.1f, 0.2f, 0.3f, 1.0f, 1.0f,
+            40.0f, false);
     }
     static void setUp(int width, int height, bool withInk) {
-        NATIVE(onInitSetting)(hostEnvironment(), nullptr, width, height, withInk);
-        NATIVE(onInitGPU)(hostEnvironment(), nullptr);
+        native::onInitSetting(hostEnvironment(), nullptr, width, height, withInk);
+        native::onInitGPU(hostEnvironment(), nullptr);
     }
 };

@@ -13,9 +13,13 @@
 // The page fills the look as an array of numbers in the order of look.properties.
 static_assert(sizeof(int) == 4 && sizeof(float) == 4 && alignof(Look) == 4);
 
-static Look look;
-static std::optional<LiveWater> water;
-static Pictures pictures;  // being filled
+namespace {
+
+Look look;
+std::optional<LiveWater> water;
+Pictures pictures;  // being filled
+
+}  // namespace
 
 // The names of objects that were lost with their context must not reach the new one.
 // clang-format off
@@ -56,7 +60,7 @@ EMSCRIPTEN_KEEPALIVE void applyLook() {
 
 // `which`: 0 for portrait, 1 for landscape, 2 for the light on the waves.
 EMSCRIPTEN_KEEPALIVE std::uint8_t* pictureToFill(int which, int width, int height) {
-    Picture& picture = which == 0 ? pictures.portrait : which == 1 ? pictures.landscape : pictures.water;
+    Picture& picture = which == 0 ? pictures.portrait : which == 1 ? pictures.landscape : pictures.light;
     picture = {width, height, {}};
     picture.rgba.resize(static_cast<std::size_t>(width) * static_cast<std::size_t>(height) * 4);
     return picture.rgba.data();

@@ -3,12 +3,16 @@
 
 #include "pictures/procedural_pictures.h"
 
-static Picture painted;
+namespace {
 
-static const std::uint8_t* keep(Picture picture) {
+Picture painted;
+
+const std::uint8_t* keep(Picture picture) {
     painted = std::move(picture);
     return painted.rgba.data();
 }
+
+}  // namespace
 
 extern "C" {
 

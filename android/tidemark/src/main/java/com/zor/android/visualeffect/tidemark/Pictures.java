@@ -8,26 +8,26 @@ public final class Pictures {
     public static final int PORTRAIT = 1;
     public static final int LANDSCAPE = 2;
     public static final int BACKGROUNDS = 3;
-    public static final int WATER = 4;
+    public static final int LIGHT = 4;
     public static final int ALL = 7;
 
     private final Bitmap portrait;
     private final Bitmap landscape;
-    private final Bitmap water;
+    private final Bitmap light;
     private final Object library;  // another one when the library has lost the pictures
 
     /** What the water lies over in portrait and in landscape, and the light on the waves. */
-    public Pictures(Bitmap portrait, Bitmap landscape, Bitmap water) {
+    public Pictures(Bitmap portrait, Bitmap landscape, Bitmap light) {
         this.portrait = usable(portrait, "portrait");
         this.landscape = usable(landscape, "landscape");
-        this.water = usable(water, "light");
+        this.light = usable(light, "light");
         library = null;
     }
 
     private Pictures(Pictures other) {
         portrait = other.portrait;
         landscape = other.landscape;
-        water = other.water;
+        light = other.light;
         library = new Object();
     }
 
@@ -38,14 +38,14 @@ public final class Pictures {
 
     /** In pixels. */
     int longestSide() {
-        return Math.max(longestSide(portrait), Math.max(longestSide(landscape), longestSide(water)));
+        return Math.max(longestSide(portrait), Math.max(longestSide(landscape), longestSide(light)));
     }
 
     /** Those that are other bitmaps than in {@code before}, which may be null. */
     int newSince(Pictures before) {
         if (before == null || library != null && library != before.library) return ALL;
         return (portrait == before.portrait ? 0 : PORTRAIT) | (landscape == before.landscape ? 0 : LANDSCAPE)
-                | (water == before.water ? 0 : WATER);
+                | (light == before.light ? 0 : LIGHT);
     }
 
     void handOver(JniTidemarkRender library, int which, int shorter, int longer) {
@@ -55,7 +55,7 @@ public final class Pictures {
         if ((which & LANDSCAPE) != 0) {
             library.transferLandscapeBGBitmap(asRgba(cropToAspect(landscape, longer, shorter)));
         }
-        if ((which & WATER) != 0) library.transferWaterBitmap(asRgba(water));
+        if ((which & LIGHT) != 0) library.transferWaterBitmap(asRgba(light));
     }
 
     /** The largest middle part of {@code picture} that has the proportions aspectWidth : aspectHeight. */

@@ -181,7 +181,7 @@ public final class WaterHost {
     public void loadTextures(int which) {
         if ((which & Pictures.PORTRAIT) != 0) library.onLoadPortraitBGTextures();
         if ((which & Pictures.LANDSCAPE) != 0) library.onLoadLandscapeBGTextures();
-        if ((which & Pictures.WATER) != 0) library.onLoadWaterTextures();
+        if ((which & Pictures.LIGHT) != 0) library.onLoadWaterTextures();
         changed |= which != 0;
     }
 

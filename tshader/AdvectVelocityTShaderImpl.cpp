@@ -14,7 +14,7 @@ vec2 dragPush(int drag, const vec2& delta) {
 }
 
 // Texels texels[at] and texels[at + 1] for each lane of `at`.
-void gatherNeighbours(const vec2* texels, int4 at, Pair<float4>& left, Pair<float4>& right) {
+inline void gatherNeighbours(const vec2* texels, int4 at, Pair<float4>& left, Pair<float4>& right) {
     const float4 a = load<float4>(&texels[at[0]].x);
     const float4 b = load<float4>(&texels[at[1]].x);
     const float4 c = load<float4>(&texels[at[2]].x);
@@ -29,7 +29,7 @@ void gatherNeighbours(const vec2* texels, int4 at, Pair<float4>& left, Pair<floa
     right.y = __builtin_shufflevector(rightAB, rightCD, 2, 3, 6, 7);
 }
 
-Pair<float> sample(Texture<vec2> source, Pair<float> c) {
+inline Pair<float> sample(Texture<vec2> source, Pair<float> c) {
     const vec2 s = texture2DLinear(source, Vec2(c.x, c.y));
     return {s.x, s.y};
 }
@@ -37,7 +37,7 @@ Pair<float> sample(Texture<vec2> source, Pair<float> c) {
 // texture2DLinear at four points of a source that is at least two texels wide. One load brings both texels of a row, so
 // the last column is reached from the left with weight 1, and the last row of several from below. The other texel
 // counts 0 times there, and only one that is not finite would still be seen; no valid frame leaves one.
-Pair<float4> sample(Texture<vec2> source, Pair<float4> c) {
+inline Pair<float4> sample(Texture<vec2> source, Pair<float4> c) {
     const float lastX = static_cast<float>(source.width - 1);
     const float lastY = static_cast<float>(source.height - 1);
     const bool oneRow = source.height == 1;

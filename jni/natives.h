@@ -10,8 +10,8 @@
 //   3. onLoadPortraitBGTextures, onLoadLandscapeBGTextures, onLoadWaterTextures
 //   4. initWaters, once for the mesh arrays
 //   5. for every frame: move and ripple as the animation asks, onTouch for each touch event, onDrawFrame once
-// Steps 2 and 3 and onDrawFrame need the context to be current. After the context was lost, or for another view size or
-// another mode, repeat steps 2 and 3.
+// Steps 2 and 3 and onDrawFrame need the context to be current. After the context was lost, repeat steps 2 and 3; for
+// another view size or another mode in the same context, step 2.
 //
 // The caller guarantees: the thread and the context; arrays at least as long as the counts and regions passed with them
 // ask for; indices that name vertices which exist; bitmaps that stay valid during their hand-over. The library cannot

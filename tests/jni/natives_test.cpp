@@ -26,7 +26,7 @@ TEST(Natives, takeOverABitmapAndKeepItWhenTheNextOneFails) {
         narrow.info.stride = 4;
         LogRecorder log;
         for (DesktopBitmap* const bitmap : {&good, &narrow, &locked, static_cast<DesktopBitmap*>(nullptr)}) {
-            transfer(hostEnvironment(), nullptr, bitmap);
+            transfer(copyingEnvironment(), nullptr, bitmap);
             EXPECT_TRUE(!bitmap || bitmap->locks == 0);
             EXPECT_EQ(std::pair(info.width, info.height), std::pair(2u, 3u));
             EXPECT_EQ(std::memcmp(kept, original.data(), original.size()), 0);
@@ -41,14 +41,14 @@ TEST(Natives, takeOverABitmapAndKeepItWhenTheNextOneFails) {
 
 // A virtual machine may have no address for an array without elements.
 TEST(Natives, fillWhatHasElementsBesideWhatHasNone) {
-    JNINativeInterface_ functions = *hostEnvironment()->functions;
+    JNINativeInterface_ functions = *copyingEnvironment()->functions;
     JNIEnv sparing = {&functions};
     FloatArray none(0), one(3);
     ShortArray cells(6), noCells(0);
     functions.GetFloatArrayElements = [](JNIEnv*, jfloatArray, jboolean*) -> jfloat* { return nullptr; };
     native::initWaters(&sparing, nullptr, &none, &cells, 0, 2, 2, 2, 2);
     EXPECT_EQ(cells.values, (std::vector<jshort>{0, 1, 3, 0, 3, 2}));
-    functions = *hostEnvironment()->functions;
+    functions = *copyingEnvironment()->functions;
     functions.GetShortArrayElements = [](JNIEnv*, jshortArray, jboolean*) -> jshort* { return nullptr; };
     native::initWaters(&sparing, nullptr, &one, &noCells, 1, 2, 2, 3, 1);
     EXPECT_EQ(one.values[0], -1.0f);
@@ -58,7 +58,7 @@ TEST(Natives, moveAnswersWhetherTheWaterIsCalm) {
     FloatArray velocity(9), height(9);
     velocity.values[4] = 1.0f;
     const auto move = [&](jboolean check) {
-        return native::move(hostEnvironment(), nullptr, &velocity, &height, 1, 1, 2, 2, 3, 3, check, 0.5f, 0.0f);
+        return native::move(copyingEnvironment(), nullptr, &velocity, &height, 1, 1, 2, 2, 3, 3, check, 0.5f, 0.0f);
     };
     EXPECT_EQ(move(JNI_TRUE), JNI_FALSE);
     EXPECT_EQ(velocity.values[4], 0.5f);

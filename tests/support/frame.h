@@ -1,22 +1,21 @@
 // The native methods of a frame, over the arrays of one square cell.
 #pragma once
 
-#include "host/host_jni.h"
 #include "host/native_names.h"
+#include "tests/support/copying_environment.h"
 
 struct Frame {
     FloatArray positions{12}, heights{12}, mvp{16}, velocity{4}, height{4};
     ShortArray indices{6};
 
-    int pins() const { return positions.pins + heights.pins + mvp.pins + velocity.pins + height.pins + indices.pins; }
-    void draw(JNIEnv* env = hostEnvironment()) { draw(env, &positions, &heights, &indices, &mvp); }
+    void draw(JNIEnv* env = copyingEnvironment()) { draw(env, &positions, &heights, &indices, &mvp); }
     static void draw(JNIEnv* env, FloatArray* p, FloatArray* h, ShortArray* i, FloatArray* m) {
         native::onDrawFrame(
             env, nullptr, p, h, i, 12, 12, 6, m, 1, 1, 2, 2, 1.33f, 0.5f, 0.5f, 1.0f, 0.1f, 0.2f, 0.3f, 1.0f, 1.0f,
             40.0f, false);
     }
     static void setUp(int width, int height, bool withInk) {
-        native::onInitSetting(hostEnvironment(), nullptr, width, height, withInk);
-        native::onInitGPU(hostEnvironment(), nullptr);
+        native::onInitSetting(copyingEnvironment(), nullptr, width, height, withInk);
+        native::onInitGPU(copyingEnvironment(), nullptr);
     }
 };

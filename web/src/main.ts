@@ -35,6 +35,15 @@ function say(text: string, stays = false): void {
     if (!stays) messageDue = window.setTimeout(() => say('', true), 5000);
 }
 
+// Of a file that no image shows, false.
+async function isPortrait(file: File): Promise<boolean> {
+    const image = new Image();
+    image.src = URL.createObjectURL(file);
+    await new Promise((resolve) => (image.onload = image.onerror = resolve));
+    URL.revokeObjectURL(image.src);
+    return image.naturalHeight > image.naturalWidth;
+}
+
 async function showPicture(): Promise<void> {
     const ticket = ++lastTicket;
     const isLast = () => ticket === lastTicket;
@@ -44,14 +53,9 @@ async function showPicture(): Promise<void> {
     try {
         if (shown === 'photo') {
             const [first, second] = photos;
-            const sizes = await Promise.all(photos.slice(0, 2).map((file) => createImageBitmap(file).then((bitmap) => {
-                const portrait = bitmap.height > bitmap.width;
-                bitmap.close();
-                return portrait;
-            }, () => false)));
+            const turned = second && (await isPortrait(first!));
             if (!isLast()) return;
-            const [portrait, landscape] = sizes[0] ? [first, second] : [second, first];
-            await water.setPicture(landscape ?? first!, portrait ?? null);
+            await water.setPicture(turned ? second : first!, (turned ? first : second) ?? null);
         } else {
             const density = Math.min(devicePixelRatio, 2, 2048 / Math.max(water.clientWidth, water.clientHeight));
             const bitmap = await paint(shown, Math.round(water.clientWidth * density), Math.round(water.clientHeight * density));
@@ -145,10 +149,10 @@ addEventListener('hashchange', () => {
     apply();
 });
 // Painted pictures fit one size; until the next is painted the last one serves, cropped.
-new ResizeObserver(() => {
+addEventListener('resize', () => {
     clearTimeout(repaintDue);
     if (shown && shown !== 'photo' && shown !== 'src') repaintDue = window.setTimeout(showPicture, 250);
-}).observe(water);
+});
 
 water.addEventListener('pointerdown', hideHint);
 water.addEventListener('ready', () => setTimeout(hideHint, 9000));

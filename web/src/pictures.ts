@@ -1,27 +1,31 @@
-// The painted pictures, out of a worker.
-import type { Painting } from './painter';
+// The painted pictures, out of a worker, which is started anew where it failed.
+import type { Painted, Painting } from './painter';
 
-interface Waiting {
-    resolve(bitmap: ImageBitmap): void;
-    reject(error: unknown): void;
-}
-
-const worker = new Worker(new URL('./painter.ts', import.meta.url), { type: 'module' });
-const waiting = new Map<number, Waiting>();
+const waiting = new Map<number, { resolve(bitmap: ImageBitmap): void; reject(error: Error): void }>();
 let lastId = 0;
+let worker: Worker | undefined;
 
-worker.onmessage = ({ data }: MessageEvent<{ id: number; bitmap: ImageBitmap }>) => {
-    waiting.get(data.id)?.resolve(data.bitmap);
-    waiting.delete(data.id);
-};
-worker.onerror = () => {
-    for (const { reject } of waiting.values()) reject(new Error('The painted pictures do not load.'));
-    waiting.clear();
-};
+function startWorker(): Worker {
+    const started = new Worker(new URL('./painter.ts', import.meta.url), { type: 'module' });
+    const fail = () => {
+        for (const { reject } of waiting.values()) reject(new Error('The painted pictures do not load. Please try again.'));
+        waiting.clear();
+        started.terminate();
+        worker = undefined;
+    };
+    started.onerror = fail;
+    started.onmessage = ({ data: { id, bitmap } }: MessageEvent<Painted>) => {
+        if (!bitmap) return fail();
+        waiting.get(id)?.resolve(bitmap);
+        waiting.delete(id);
+    };
+    return started;
+}
 
 export function paint(painting: Painting, width: number, height: number): Promise<ImageBitmap> {
     return new Promise((resolve, reject) => {
         waiting.set(++lastId, { resolve, reject });
+        worker ??= startWorker();
         worker.postMessage({ id: lastId, painting, width, height });
     });
 }

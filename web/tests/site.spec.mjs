@@ -54,3 +54,30 @@ test('says in one sentence what the browser lacks', async ({ page }) => {
     await lacks(() => { HTMLCanvasElement.prototype.getContext = () => null; }, /needs WebGL/);
     await lacks(() => { WebAssembly.validate = () => false; }, /needs WebAssembly with SIMD/);
 });
+
+test('a worker that is gone is told and started anew; of two pictures the last chosen stays', async ({ page }) => {
+    await page.addInitScript(() => {
+        window.works = [];
+        window.Worker = class {
+            postMessage = ({ id }) => window.works.push((bitmap) => this.onmessage({ data: { id, bitmap } }));
+            terminate() {}
+        };
+        window.answer = async (i, side) => window.works.at(i)(side && await createImageBitmap(new ImageData(side, side)));
+    });
+    await page.goto('./');
+    const answer = (i, side) => page.evaluate(([i, side]) => window.answer(i, side), [i, side]);
+    await page.waitForFunction(() => window.works.length > 0);
+    await answer(0);
+    await expect(page.locator('#message.shown')).toHaveText(/painted pictures do not load/);
+    await page.setViewportSize({ width: 500, height: 800 });
+    await page.click('#look');
+    await page.getByRole('button', { name: 'River bed' }).click();
+    await expect(page.locator('body')).toHaveClass('busy');
+    await page.getByRole('button', { name: 'Sandy shore' }).click();
+    await page.waitForFunction(() => window.works.length > 2);
+    await answer(-1, 30);
+    await answer(-2, 20);
+    await expect(page.locator('body')).not.toHaveClass('busy');
+    expect(await page.evaluate(() => window.tidemark.water.water.picture.size())).toEqual([30, 30]);
+    await expect(page.locator('#message')).toHaveText('');
+});

@@ -100,6 +100,7 @@ test('keys and buttons switch the ink, and clear it', async ({ page }) => {
 });
 
 test('a lost context is told and survived', async ({ page }) => {
+    await page.emulateMedia({ reducedMotion: 'reduce' });  // no drop falls by itself
     await open(page);
     await takeOver(page);
     const flat = await flatPixels(page);

@@ -8,7 +8,7 @@ const shortestInterval = 1000 / 130;
 
 // Of a pointer that only ripples: pixels from one ripple to the next, and their height as a share of a touch's.
 const spacing = 14;
-const hoverHeight = 0.16;
+const hoverHeight = 0.25;
 const fingerHeight = 0.3;
 
 export interface Touched {

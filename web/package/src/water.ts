@@ -277,9 +277,9 @@ export class Water extends EventTarget implements Borrower, Touched {
     }
 
     private wake(): void {
-        if (!this.running() || !this.picture) return;
+        if (!this.running()) return;
         if (!this.live) void this.open();
-        else this.asked ||= requestAnimationFrame(this.draw);
+        else if (this.picture) this.asked ||= requestAnimationFrame(this.draw);
     }
 
     private async open(): Promise<void> {
@@ -446,7 +446,12 @@ export class Water extends EventTarget implements Borrower, Touched {
         if (!this.live || !native || !picture || !this.running()) return;
         const start = performance.now();
         if (picture.changed()) native._renewPictures();
-        const frame: Frame = native._frame(now / 1000);
+        let frame: Frame;
+        try {
+            frame = native._frame(now / 1000);
+        } catch (error) {
+            return this.fail(error);
+        }
         if (frame === Frame.drawn) {
             this.cost.frame = blend(this.cost.frame, this.calm ? 0 : now - this.lastFrame);
             this.cost.work = blend(this.cost.work, performance.now() - start);

@@ -6,8 +6,8 @@ export { expect };
 
 // Fails where the page complains.
 export const test = plain.extend({
-    page: async ({ page }, use) => {
-        const problems = [];
+    problems: ({}, use) => use([]),
+    page: async ({ page, problems }, use) => {
         page.on('console', (message) => {
             if (['error', 'warning'].includes(message.type())) problems.push(`${message.text()} ${message.location().url}`);
         });

@@ -1,10 +1,10 @@
 // Browsers give a page about sixteen WebGL contexts and then take away the one that was used least. So a few are
-// lent out, and a water that nobody sees or that rests gives its own back when another needs one.
+// lent out, and a water that nobody sees, that rests, or that only rain moves shows a still picture when another needs one.
 const most = 12;
 
 export interface Borrower {
-    /** Higher is easier to spare: 0 moves in view or comes up, 1 rests in view, 2 is out of view. */
-    spare(): number;
+    /** Who needs it more takes it from who needs it less. */
+    urgency(): number;
     park(): void;
     resume(): void;
 }
@@ -12,20 +12,21 @@ export interface Borrower {
 const borrowers = new Set<Borrower>();  // the longest held first
 const waiting = new Set<Borrower>();
 
-/** False where all are in use; then resume() is called when one is free. */
+/** False where all are in use by others as urgent; then resume() is called when that may have changed. */
 export function borrow(borrower: Borrower): boolean {
+    waiting.delete(borrower);
     if (borrowers.delete(borrower) || borrowers.size < most) {
         borrowers.add(borrower);
         return true;
     }
-    const [spared] = [...borrowers].sort((a, b) => b.spare() - a.spare());
-    if (spared!.spare() === 0) {
+    const spared = [...borrowers].reduce((least, other) => (other.urgency() < least.urgency() ? other : least));
+    if (spared.urgency() >= borrower.urgency()) {
         waiting.add(borrower);
         return false;
     }
-    borrowers.delete(spared!);
+    borrowers.delete(spared);
     borrowers.add(borrower);
-    spared!.park();
+    spared.park();
     return true;
 }
 
@@ -34,13 +35,12 @@ export function giveBack(borrower: Borrower): void {
     borrowers.delete(borrower);
 }
 
-/** When a context may have become free. */
+/** When a context may have become free, or less needed. */
 export function offer(): void {
-    for (const borrower of waiting) {
-        waiting.delete(borrower);
-        borrower.resume();
-        return;
-    }
+    if (waiting.size === 0) return;
+    const first = [...waiting].reduce((most, other) => (other.urgency() > most.urgency() ? other : most));
+    waiting.delete(first);
+    first.resume();
 }
 
 interface Held {

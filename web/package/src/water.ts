@@ -39,6 +39,7 @@ const densities = { low: 1, medium: 2, high: 3 };
 const longestSide = 2048;  // as much as a phone draws at full speed
 const shortestSide = 64;
 const parkAfter = 4000;    // milliseconds out of view
+const touchCounts = 3000;  // milliseconds that a touched water is not taken its context
 const lightSide = 512;
 
 // Steady enough to be read.
@@ -70,6 +71,7 @@ export class Water extends EventTarget implements Borrower, Touched {
     private paused = false;
     private asked = 0;
     private lastFrame = 0;
+    private lastTouch = -touchCounts;
     private parkTimer = 0;
     private dropTimer = 0;
     private given = '';       // the look that the library has
@@ -129,9 +131,9 @@ export class Water extends EventTarget implements Borrower, Touched {
                 this.native?._splash(column, row, strength);
             }
         };
-        if (this.live) fall();
-        else void this.open().then(fall);
-        this.wake();
+        if (this.shown) fall();
+        else this.addEventListener('ready', fall, { once: true, signal: this.end.signal });
+        this.touched();
     }
 
     clearInk(): void {
@@ -190,17 +192,21 @@ export class Water extends EventTarget implements Borrower, Touched {
     }
     touch(action: Touch, clientX: number, clientY: number, pressure: number): void {
         this.native?._touch(action, ...this.pixelAt(clientX, clientY), pressure);
-        this.wake();
+        this.touched();
     }
     ripple(clientX: number, clientY: number, pressure: number): void {
         this.native?._splash(...this.pixelAt(clientX, clientY), pressure);
-        this.wake();
+        this.touched();
     }
 
     // What the other waters ask for.
 
-    spare(): number {
-        return this.opening ? 0 : !this.running() ? 2 : this.calm && this.shown ? 1 : 0;
+    urgency(): number {
+        if (this.opening) return 5;
+        if (!this.running()) return 0;
+        if (!this.shown) return this.picture ? 4 : 1;
+        if (!this.still || performance.now() - this.lastTouch < touchCounts) return 3;
+        return this.calm ? 1 : 2;
     }
     park(): void {
         if (!this.live) return giveBack(this);
@@ -250,11 +256,16 @@ export class Water extends EventTarget implements Borrower, Touched {
     }
 
     private fail(error: unknown): void {
-        if (this.end.signal.aborted) return;
+        if (this.end.signal.aborted || this.failed) return;
         const known = error instanceof WaterError ? error : new WaterError('module', String(error));
         if (!this.shown) this.settle.reject(known);
         if (['webgl', 'simd', 'csp', 'module'].includes(known.code)) this.failed = true;
         this.dispatchEvent(new CustomEvent('error', { detail: known }));
+    }
+
+    private touched(): void {
+        this.lastTouch = performance.now();
+        this.wake();
     }
 
     private setInView(inView: boolean): void {
@@ -283,10 +294,9 @@ export class Water extends EventTarget implements Borrower, Touched {
     }
 
     private async open(): Promise<void> {
-        if (this.live || this.opening || this.failed) return;
+        if (this.live || this.opening || this.failed || !borrow(this)) return;
         this.opening = true;
         try {
-            if (!borrow(this)) return;
             const [module, light] = await Promise.all([compile(), this.loadLight()]);
             this.light = light;
             if (this.end.signal.aborted) return;
@@ -479,6 +489,7 @@ export class Water extends EventTarget implements Borrower, Touched {
         this.shown = true;
         this.settle.resolve();
         this.dispatchEvent(new Event('ready'));
+        offer();
         if (!this.options.firstDrop || this.reduced()) return;
         const { clientWidth, clientHeight } = this.canvas;
         this.dropTimer = setTimeout(() => this.drop(0.5 * clientWidth, 0.42 * clientHeight), 700);

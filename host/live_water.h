@@ -48,16 +48,20 @@ public:
     // Whether there is nothing to draw until the next call that changes something.
     bool isResting() const;
 
+    // Shorter by longer side of what the backgrounds are cropped to.
+    double proportions() const { return host_.proportions(); }
+
     // What the processor spent on the last frame, in seconds; frames that take long make the mesh coarser.
     void noteWork(double seconds) { host_.noteWork(seconds); }
+
+    // Does what frame() does before it draws: sets the library up and loads what was handed over, where that is due.
+    void prepare();
 
     // Brings the water to the time `now`, in seconds, and draws it where it has changed: without ink into the current
     // framebuffer, with ink into framebuffer 0.
     Frame frame(double now);
 
 private:
-    void prepare();
-
     WaterHost host_;
     FrameClock clock_;
     Pictures pictures_;

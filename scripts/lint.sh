@@ -19,7 +19,9 @@ fi
 git ls-files '*.cpp' '*.h' | xargs clang-format --dry-run --Werror
 shellcheck -x scripts/*.sh .ci/run tests/arm64/*.sh tests/jvm/*.sh
 git ls-files '*.py' | PYTHONPYCACHEPREFIX=build/pycache xargs python3 -m py_compile
-[ ! -d web/node_modules ] || web/node_modules/.bin/tsc --noEmit -p web
+# The playground has the package's types from its build.
+[ ! -d web/package/dist ] || web/node_modules/.bin/tsc --noEmit -p web
+[ ! -d web/node_modules ] || web/node_modules/.bin/tsc --noEmit -p web/package
 
 # One version, that of CMakeLists.txt.
 version=$(sed -n 's/^project(Tidemark VERSION \([0-9.]*\) .*/\1/p' CMakeLists.txt)
@@ -29,6 +31,7 @@ has_version() {
 has_version android/tidemark/build.gradle "version = '$version'"
 has_version android/sample/build.gradle "versionName '$version'"
 has_version web/package.json "\"version\": \"$version\""
+has_version web/package/package.json "\"version\": \"$version\""
 has_version CHANGELOG.md "## [$version]"
 
 # Every place that stands by contract is listed, and every place that is listed is marked.

@@ -4,7 +4,7 @@
 #             sanitizers, and some seconds of fuzzing
 #   --arm64   64-bit Arm: vector arithmetic in the machine code of the loops over many numbers, and results, computed in
 #             an emulator, that equal this machine's bit for bit
-#   --web     the web page in Chromium
+#   --web     the package for web pages and the playground, in Chromium
 set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/common.sh

@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# Builds the web page into web/dist, one folder that any web server can serve, and serves it at the address that it
-# prints. With --build: only builds.
+# Builds the npm package into web/package/dist and the playground into web/dist, one folder that any web server can
+# serve, and serves it at the address that it prints. With --build: only builds.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/common.sh

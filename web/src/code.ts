@@ -1,25 +1,46 @@
-// The chosen values in the words of the two reference hosts.
-import { chosenKeys, lookKeys } from './look';
-import type { Settings } from './settings';
+// The chosen values for a page of one's own and for the hosts.
+import { defaultLook, lookKeys, lookOf } from 'tidemark-water';
+import { defaultSettings, type Settings } from './settings';
 
-const chosen = new Set(chosenKeys.map(({ name }) => name));
+// What an element or a canvas is told.
+function choices({ preset, ink, inkColor, rain, look }: Settings): Record<string, unknown> {
+    return {
+        ...(preset !== defaultSettings().preset && { preset }),
+        ...(ink && { ink, ...(inkColor !== defaultSettings().inkColor && { inkColor }) }),
+        ...(rain > 0 && { rain }),
+        ...(Object.keys(look).length > 0 && { look }),
+    };
+}
 
-function assignments({ look }: Settings): string {
+export function toHtml(settings: Settings): string {
+    const words = Object.entries(choices(settings)).map(([name, value]) => {
+        const attribute = name.replace('C', '-c');
+        if (value === true) return ` ${attribute}`;
+        return typeof value === 'object' ? ` ${attribute}='${JSON.stringify(value)}'` : ` ${attribute}="${value}"`;
+    });
+    const off = !settings.ink ? ' ink="off"' : '';
+    return `<script type="module" src="tidemark-water.js"></script>\n<tidemark-water src="picture.jpg"${words.join('')}${off}></tidemark-water>\n`;
+}
+
+export function toJavaScript(settings: Settings): string {
+    const options = { src: 'picture.jpg', ...choices(settings), ink: settings.ink };
+    return `import { createWater } from 'tidemark-water';\ncreateWater(document.querySelector('canvas'), ${JSON.stringify(options, null, 4)});\n`;
+}
+
+function assignments(settings: Settings): string {
+    const usual = defaultLook();
+    const look = lookOf(settings);
     return lookKeys
-        .filter(({ name }) => chosen.has(name))
+        .filter(({ name }) => look[name] !== usual[name])
         .map(({ name, whole }) => {
-            const text = String(look[name]);
+            const text = String(Number(look[name]!.toFixed(4)));
             return `look.${name} = ${whole ? text : `${text.includes('.') ? text : `${text}.0`}f`};\n`;
         })
         .join('');
 }
 
-export function toCpp(settings: Settings): string {
-    const { ink, rain } = settings;
-    return `Look look;\n${assignments(settings)}const bool withInk = ${ink};\nconst bool raining = ${rain};\n`;
-}
+export const toCpp = (settings: Settings): string =>
+    `Look look;\n${assignments(settings)}const bool withInk = ${settings.ink};\nconst bool raining = ${settings.rain > 0};\n`;
 
-export function toJava(settings: Settings): string {
-    const { ink, rain } = settings;
-    return `Look look = new Look();\n${assignments(settings)}boolean withInk = ${ink};\nboolean raining = ${rain};\n`;
-}
+export const toJava = (settings: Settings): string =>
+    `Look look = new Look();\n${assignments(settings)}boolean withInk = ${settings.ink};\nboolean raining = ${settings.rain > 0};\n`;

@@ -1,144 +1,179 @@
-// The page: settings flow from the controls into the water, touches from the pointers, frames out of the loop.
+// The page around the element: settings flow from the controls into it and into the address.
 import './style.css';
-import { Loop } from './loop';
+import { WaterError, type ErrorCode, type WaterElement } from 'tidemark-water';
 import { makePanel } from './panel';
-import { paint, readPhotos, type Photos } from './pictures';
-import { followPointers } from './pointers';
+import { paint } from './pictures';
 import { fromHash, toHash, type PictureName, type Settings } from './settings';
-import { fitToScreen } from './stage';
-import { hasVectors, say } from './support';
-import { openWater, type Water } from './water';
 
 const element = <T extends HTMLElement>(id: string) => document.querySelector<T>(`#${id}`)!;
-const canvas = element<HTMLCanvasElement>('water');
+const water = element<WaterElement>('water');
+const asked = new URLSearchParams(location.search);
+const settings: Settings = fromHash(location.hash);
+const usualRain = 14;
 
-function run(water: Water): void {
-    const settings: Settings = fromHash(location.hash);
-    const light = paint('light', 512, 512);
-    let photos: Photos | null = null;
-    let shown: PictureName = settings.picture;
-    let pictureDue = 0;
-    let lastTicket = 0;  // of the picture asked for last
+let photos: File[] = [];
+let shown: PictureName | 'src' | null = null;
+let lastTicket = 0;  // of the picture asked for last
+let repaintDue = 0;
+let addressDue = 0;
+let messageDue = 0;
 
-    const panel = makePanel(settings, () => apply());
-    const loop = new Loop(water, panel.showStatus);
+const sentences: Partial<Record<ErrorCode, string>> = {
+    webgl: 'This page needs WebGL, which this browser does not have or has switched off.',
+    simd: 'This page needs WebAssembly with SIMD, which this browser does not have.',
+    module: 'The water did not load. Please try again.',
+    decode: 'That file is not a picture that this browser can show.',
+    'cross-origin': 'The server of that picture does not allow other pages to use it.',
+    load: 'That picture does not load.',
+};
 
-    const renewPicture = async () => {
-        const ticket = ++lastTicket;
-        const under = shown === 'photo' ? photos! : await paint(shown, canvas.width, canvas.height);
-        const shine = await light;
-        if (ticket !== lastTicket) return;
-        const [portrait, landscape] = 'rgba' in under ? [under, under] : [under.portrait, under.landscape];
-        water.setPictures(portrait, landscape, shine);
-        loop.drawNow();
-        canvas.classList.add('shown');
-    };
-    const apply = () => {
-        if (settings.picture === 'photo' && !photos) {
-            settings.picture = shown;
-            element('files').click();
+// Goes by itself, unless it tells that nothing works.
+function say(text: string, stays = false): void {
+    clearTimeout(messageDue);
+    element('message').textContent = text;
+    element('message').classList.toggle('shown', text !== '');
+    if (!stays) messageDue = window.setTimeout(() => say('', true), 5000);
+}
+
+// Of a file that no image shows, false.
+async function isPortrait(file: File): Promise<boolean> {
+    const image = new Image();
+    image.src = URL.createObjectURL(file);
+    await new Promise((resolve) => (image.onload = image.onerror = resolve));
+    URL.revokeObjectURL(image.src);
+    return image.naturalHeight > image.naturalWidth;
+}
+
+async function showPicture(): Promise<void> {
+    const ticket = ++lastTicket;
+    const isLast = () => ticket === lastTicket;
+    const before = shown;
+    shown = settings.picture;
+    const busy = window.setTimeout(() => document.body.classList.add('busy'), 150);
+    try {
+        if (shown === 'photo') {
+            const [first, second] = photos;
+            const turned = second && (await isPortrait(first!));
+            if (!isLast()) return;
+            await water.setPicture(turned ? second : first!, (turned ? first : second) ?? null);
+        } else {
+            const density = Math.min(devicePixelRatio, 2, 2048 / Math.max(water.clientWidth, water.clientHeight));
+            const bitmap = await paint(shown, Math.round(water.clientWidth * density), Math.round(water.clientHeight * density));
+            if (isLast()) await water.setPicture(bitmap);
         }
-        water.setLook(settings.look);
-        water.setInk(settings.ink);
-        water.setRain(settings.rain);
-        element('ink').ariaPressed = String(settings.ink);
-        element('rain').ariaPressed = String(settings.rain);
-        if (settings.picture !== shown) {
-            shown = settings.picture;
-            void renewPicture();
-        }
-        history.replaceState(null, '', `#${toHash(settings)}`);
+    } catch (error) {
+        if (!isLast()) return;
+        shown = before;
+        if (before && before !== 'src') settings.picture = before;
+        // The element has told its own errors.
+        if (!(error instanceof WaterError)) say(String((error as Error).message));
         panel.refresh();
-        loop.wake();
-    };
-    const takePhotos = async (files: File[]) => {
-        if (files.length === 0) return;
-        const read = await readPhotos(files, water.largestPicture);
-        say(read ? '' : 'That file is not a picture that this browser can read.');
-        if (!read) return;
-        photos = read;
-        settings.picture = shown = 'photo';
-        await renewPicture();
-        apply();
-    };
-    const toggle = (name: 'ink' | 'rain') => {
-        settings[name] = !settings[name];
-        apply();
-    };
-    const clearInk = () => {
-        water.clearInk();
-        loop.wake();
-    };
+    } finally {
+        clearTimeout(busy);
+        if (isLast()) document.body.classList.remove('busy');
+    }
+}
 
-    fitToScreen(canvas);
-    water.resize(canvas.width, canvas.height);
-    new ResizeObserver(() => {
-        if (!fitToScreen(canvas)) return;
-        water.resize(canvas.width, canvas.height);
-        loop.drawNow();
-        // Painted pictures fit one size; until the next is painted the last one serves, cropped.
-        clearTimeout(pictureDue);
-        if (shown !== 'photo') pictureDue = window.setTimeout(renewPicture, 200);
-    }).observe(canvas);
+const apply = () => {
+    if (settings.picture === 'photo' && photos.length === 0) {
+        settings.picture = shown && shown !== 'src' ? shown : 'pool';
+        element('files').click();
+    }
+    const { preset, ink, inkColor, rain, look } = settings;
+    Object.assign(water, { preset, ink, inkColor, rain, look: { ...look } });
+    element('ink').ariaPressed = String(ink);
+    element('rain').ariaPressed = String(rain > 0);
+    if (settings.picture !== shown && !(shown === 'src' && settings.picture === 'pool')) void showPicture();
+    panel.refresh();
+    // Some browsers refuse more than a hundred changes in ten seconds.
+    clearTimeout(addressDue);
+    addressDue = window.setTimeout(() => {
+        try {
+            history.replaceState(null, '', `#${toHash(settings)}`);
+        } catch {
+            // Then the next change brings it.
+        }
+    }, 300);
+};
+const panel = makePanel(element('panel'), settings, apply);
 
-    followPointers(canvas, water, () => {
-        element('hint').classList.add('gone');
-        loop.wake();
-    });
-    element('ink').onclick = () => toggle('ink');
-    element('rain').onclick = () => toggle('rain');
-    element('clear').onclick = clearInk;
-    element('photo').onclick = () => element('files').click();
-    element<HTMLInputElement>('files').onchange = ({ target }) => takePhotos([...(target as HTMLInputElement).files!]);
-    addEventListener('keydown', ({ key, target, ctrlKey, metaKey, altKey }) => {
-        if (target instanceof HTMLInputElement || ctrlKey || metaKey || altKey) return;
-        if (key === 'i') toggle('ink');
-        if (key === 'r') toggle('rain');
-        if (key === 'c') clearInk();
-    });
-    addEventListener('dragover', (event) => {
-        event.preventDefault();
-        document.body.classList.add('dropping');
-    });
-    addEventListener('dragleave', ({ relatedTarget }) => {
-        if (!relatedTarget) document.body.classList.remove('dropping');
-    });
-    addEventListener('drop', (event) => {
-        event.preventDefault();
-        document.body.classList.remove('dropping');
-        void takePhotos([...event.dataTransfer!.files]);
-    });
-    addEventListener('hashchange', () => {
-        Object.assign(settings, fromHash(location.hash), shown === 'photo' ? { picture: 'photo' } : {});
-        apply();
-    });
-    canvas.addEventListener('webglcontextlost', (event) => {
-        event.preventDefault();
-        loop.pause();
-    });
-    canvas.addEventListener('webglcontextrestored', () => {
-        water.renewContext();
-        loop.resume();
-    });
-
+async function takePhotos(files: File[]): Promise<void> {
+    if (files.length === 0) return;
+    photos = files;
+    settings.picture = 'photo';
+    shown = shown === 'photo' ? null : shown;
     apply();
-    void renewPicture();
-    // For the browser's console.
-    Object.assign(window, { tidemark: { settings, apply, water, loop } });
 }
-
-async function start(): Promise<void> {
-    if (!hasVectors()) {
-        say('This page needs WebAssembly with SIMD, which this browser does not have.');
-        return;
-    }
-    const water = await openWater();
-    if (water) {
-        run(water);
-    } else {
-        say('This page needs WebGL, which this browser does not have or has switched off.');
-    }
+function toggle(name: 'ink' | 'rain'): void {
+    if (name === 'ink') settings.ink = !settings.ink;
+    else settings.rain = settings.rain > 0 ? 0 : usualRain;
+    apply();
 }
+function togglePanel(open = element('panel').hidden): void {
+    element('panel').hidden = !open;
+    element('look').ariaPressed = String(open);
+}
+const hideHint = () => element('hint').classList.add('gone');
 
-void start();
+element('ink').onclick = () => toggle('ink');
+element('rain').onclick = () => toggle('rain');
+element('clear').onclick = () => water.clearInk();
+element('photo').onclick = () => element('files').click();
+element('look').onclick = () => togglePanel();
+element<HTMLInputElement>('files').onchange = ({ target }) => {
+    const input = target as HTMLInputElement;
+    void takePhotos([...input.files!]);
+    input.value = '';  // the same file again is a change as well
+};
+addEventListener('keydown', ({ key, target, ctrlKey, metaKey, altKey }) => {
+    if (target instanceof HTMLInputElement || ctrlKey || metaKey || altKey) return;
+    if (key === 'i') toggle('ink');
+    if (key === 'r') toggle('rain');
+    if (key === 'c') water.clearInk();
+    if (key === 'Escape') togglePanel(false);
+});
+addEventListener('dragover', (event) => {
+    event.preventDefault();
+    document.body.classList.add('dropping');
+});
+addEventListener('dragleave', ({ relatedTarget }) => {
+    if (!relatedTarget) document.body.classList.remove('dropping');
+});
+addEventListener('drop', (event) => {
+    event.preventDefault();
+    document.body.classList.remove('dropping');
+    void takePhotos([...event.dataTransfer!.files]);
+});
+addEventListener('hashchange', () => {
+    Object.assign(settings, fromHash(location.hash), shown === 'photo' ? { picture: 'photo' } : {});
+    apply();
+});
+// Painted pictures fit one size; until the next is painted the last one serves, cropped.
+addEventListener('resize', () => {
+    clearTimeout(repaintDue);
+    if (shown && shown !== 'photo' && shown !== 'src') repaintDue = window.setTimeout(showPicture, 250);
+});
+
+water.addEventListener('pointerdown', hideHint);
+water.addEventListener('ready', () => setTimeout(hideHint, 9000));
+water.addEventListener('error', (event) => {
+    const { code, message } = (event as Event as CustomEvent<WaterError>).detail;
+    say(sentences[code] ?? message, ['webgl', 'simd', 'csp', 'module'].includes(code));
+});
+water.addEventListener('contextlost', () => say('The browser took the graphics away. They come back by themselves.', true));
+water.addEventListener('contextrestored', () => say('', true));
+setInterval(() => {
+    if (!element('panel').hidden && water.water) panel.showStatus(water.water);
+}, 500);
+
+if (asked.get('ui') === '0') document.body.classList.add('bare');
+const src = asked.get('src');
+if (src) {
+    shown = 'src';
+    water.src = src;
+}
+togglePanel(!matchMedia('(max-width: 900px), (max-height: 560px)').matches);
+apply();
+// For the browser's console.
+Object.assign(window, { tidemark: { settings, apply, water } });
 if (import.meta.env.PROD) void navigator.serviceWorker?.register('./service_worker.js');

@@ -6,8 +6,8 @@ export { expect };
 
 // Fails where the page complains.
 export const test = plain.extend({
-    page: async ({ page }, use) => {
-        const problems = [];
+    problems: ({}, use) => use([]),
+    page: async ({ page, problems }, use) => {
         page.on('console', (message) => {
             if (['error', 'warning'].includes(message.type())) problems.push(`${message.text()} ${message.location().url}`);
         });
@@ -20,28 +20,26 @@ export const test = plain.extend({
 // Opens the page and waits until it shows water.
 export async function open(page, hash = '') {
     await page.goto(`./${hash}`);
-    await page.waitForSelector('#water.shown');
+    await page.waitForSelector('#water[shown]');
 }
-
-export const calm = (page) => page.waitForSelector('.status.calm', { state: 'attached' });
 
 // The page's loop stands still from here on; what `play` of the next function does is all that happens.
 export const takeOver = (page) =>
     page.evaluate(() => {
-        const { loop, water, settings } = window.tidemark;
-        const canvas = document.querySelector('canvas');
-        const gl = canvas.getContext('webgl');
-        loop.pause();
+        const { water } = document.querySelector('tidemark-water');
+        const { canvas, gl, native } = water;
+        water.pause();
         let seconds = performance.now() / 1000;
+        window.native = native;
         window.frames = (count) => {
-            for (let i = 0; i < count; ++i) water.frame((seconds += 1 / 60));
+            for (let i = 0; i < count; ++i) native._frame((seconds += 1 / 60));
         };
         window.settle = () => {
-            for (let i = 0; water.frame((seconds += 1 / 60)) !== 0; ++i) if (i > 2000) throw new Error('no rest');
+            for (let i = 0; native._frame((seconds += 1 / 60)) !== 0; ++i) if (i > 2000) throw new Error('no rest');
         };
         // Only in the task that has drawn: afterwards the browser takes the canvas away. Rows from the top.
         window.read = () => {
-            water.setLook(settings.look);
+            native._renewPictures();
             window.frames(1);
             const { width, height } = canvas;
             const pixels = new Uint8Array(4 * width * height);

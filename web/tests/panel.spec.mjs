@@ -5,25 +5,31 @@ import { join } from 'node:path';
 import { difference, expect, open, pixelsAfter, takeOver, test } from './page.mjs';
 
 const root = new URL('../..', import.meta.url).pathname;
-const look = (page) => page.evaluate(() => ({ ...window.tidemark.settings, ...window.tidemark.settings.look }));
+const settings = (page) => page.evaluate(() => structuredClone(window.tidemark.settings));
+const openPanel = async (page, hash) => {
+    await page.setViewportSize({ width: 1000, height: 800 });
+    await open(page, hash);
+    await page.getByText('Expert').click();
+};
+const slide = (page, name, value) => page.getByLabel(name, { exact: true }).fill(String(value));
 
 // A tap and a short stroke on water that was never touched, to where their waves are in full view.
 const touchAndRun = () => {
-    const { water } = window.tidemark;
     window.frames(1);  // the time since the last one is over
     for (let x = 60; x <= 140; x += 20) {
-        water.touch(x === 60 ? 0 : 2, x, 200, 1);
+        window.native._touch(x === 60 ? 0 : 2, x, 200, 1);
         window.frames(1);
     }
-    water.touch(1, 140, 200, 1);
+    window.native._touch(1, 140, 200, 1);
     window.frames(20);
     return window.read();
 };
 
 test('every value reaches the water under its own name', async ({ page }) => {
+    await page.emulateMedia({ reducedMotion: 'reduce' });  // no drop falls by itself
     const pixelsWith = async (value) => {
         await page.goto('about:blank');
-        await open(page, `#ink=0&rain=0&${value}`);
+        await open(page, `?src=favicon.svg#ink=0&${value}`);
         await takeOver(page);
         return pixelsAfter(page, touchAndRun);
     };
@@ -39,35 +45,50 @@ test('every value reaches the water under its own name', async ({ page }) => {
 });
 
 test('a link brings the same look, and a bad one the nearest', async ({ page }) => {
-    await page.setViewportSize({ width: 480, height: 640 });
-    await open(page);
-    await page.getByText('The look of the water').click();
-    const field = page.locator('.lil-number', { has: page.getByText('calmingTime', { exact: true }) }).locator('input');
-    await field.fill('9');
-    await field.press('Enter');
+    await openPanel(page);
+    await slide(page, 'calmingTime', 9);
+    await page.getByRole('button', { name: 'Violet' }).click();
     await page.click('#rain');
-    await page.locator('.lil-option select').nth(1).selectOption('Tiled pool');
-    const chosen = await look(page);
-    expect(chosen).toMatchObject({ calmingTime: 9, rain: true, picture: 'pool' });
+    await page.getByRole('button', { name: 'River bed' }).click();
+    const chosen = await settings(page);
+    expect(chosen).toMatchObject({ picture: 'river', inkColor: '#4d1a80', rain: 14, look: { calmingTime: 9 } });
+    await expect.poll(() => page.url()).toContain('river');
     await page.reload();
-    await page.waitForSelector('#water.shown');
-    expect(await look(page)).toEqual(chosen);
+    await page.waitForSelector('#water[shown]');
+    expect(await settings(page)).toEqual(chosen);
 
-    await page.evaluate(() => { location.hash = 'ringSpeed=9&meshExtent=1e9&calmingTime=x&exponent=&picture=toString&inkRed=-1'; });
-    await expect.poll(() => look(page)).toMatchObject(
-        { ringSpeed: 1, meshExtent: 64, calmingTime: 6.6, exponent: 40, inkRed: 0, picture: 'river' });
-    await page.getByText('The look of the water').click();
-    await page.locator('.lil-option select').first().selectOption('Honey');
-    expect(await look(page)).toMatchObject({ calmingTime: 1.6, ringSpeed: 0.17 });
+    await page.evaluate(() => { location.hash = 'ringSpeed=9&meshExtent=1e9&calmingTime=x&exponent=&picture=toString&preset=valueOf&inkColor=red&rain=-1'; });
+    await expect.poll(() => settings(page)).toMatchObject(
+        { picture: 'pool', preset: 'as-shipped', inkColor: '#0d2673', rain: 0, look: { ringSpeed: 1, meshExtent: 64 } });
+    await page.getByRole('button', { name: 'Honey' }).click();
+    expect(await settings(page)).toMatchObject({ preset: 'honey', inkColor: '#994d05', look: {} });
+});
+
+test('a dragged slider changes the address once', async ({ page }) => {
+    await openPanel(page);
+    const changes = await page.evaluate(async () => {
+        let changes = 0;
+        const replace = history.replaceState;
+        history.replaceState = function (...state) {
+            ++changes;
+            return replace.apply(this, state);
+        };
+        const slider = document.querySelector('input[type=range]');
+        for (let i = 0; i < 150; ++i) {
+            slider.value = String(1 + i / 100);
+            slider.dispatchEvent(new Event('input'));
+        }
+        while (changes === 0) await new Promise((resolve) => setTimeout(resolve, 50));
+        return changes;
+    });
+    expect(changes).toBe(1);
 });
 
 test('the copied code compiles in both languages and holds the values', async ({ page, context }, { outputDir }) => {
     await context.grantPermissions(['clipboard-read', 'clipboard-write']);
-    await open(page, '#calmingTime=9.51&meshExtent=33&exponent=77&inkRed=0.125&rain=1');
-    await page.getByText('The look of the water').click();
+    await openPanel(page, '#calmingTime=9.51&meshExtent=33&exponent=77&inkRed=0.125&rain=9');
     const copied = async (language) => {
-        await page.getByRole('button', { name: `Copy as ${language}` }).click();
-        await page.getByText('Copied').first().waitFor();
+        await page.getByTitle(`Copy as ${language}`, { exact: true }).click();
         return page.evaluate(() => navigator.clipboard.readText());
     };
     const output = '33 9.51 77.0 0.125 1.75 true true';

@@ -1,23 +1,28 @@
 // The page draws what the desktop program draws.
 import { execFile } from 'node:child_process';
-import { mkdirSync, readFileSync } from 'node:fs';
+import { mkdirSync, readFileSync, writeFileSync } from 'node:fs';
 import { join } from 'node:path';
 import { promisify } from 'node:util';
 import { PNG } from 'pngjs';
-import { expect, open, pixelsAfter, takeOver, test } from './page.mjs';
+import { expect, open, pixelsAfter, slope, takeOver, test } from './page.mjs';
 
 const root = new URL('../..', import.meta.url).pathname;
 const preview = process.env.TIDEMARK_PREVIEW ?? join(root, 'build/release/preview/tidemark-preview');
 const [width, height] = [270, 480];
 
-test.use({ viewport: { width, height } });
+test.use({ viewport: { width, height }, contextOptions: { reducedMotion: 'reduce' } });  // no drop falls by itself
 
 test('frames of a script equal those of tidemark-preview', async ({ page }, { outputDir }) => {
     const script = join(root, 'scenes/demo.touch');
     mkdirSync(outputDir, { recursive: true });
     // The driver that filters textures exactly, as the browser's does; the faster one has weights of 8 bits, which the
     // two bytes of the ink's texels do not stand.
-    const options = ['--script', script, '--size', `${width}x${height}`, '--seconds', '1.7', '--every', '20', '--out', outputDir];
+    const [ground, light] = [slope(width, height), slope(512, 512)].map(({ name, buffer }) => {
+        writeFileSync(join(outputDir, name), buffer);
+        return { file: join(outputDir, name), url: `data:image/png;base64,${buffer.toString('base64')}` };
+    });
+    const pictures = ['--portrait', ground.file, '--landscape', ground.file, '--light', light.file];
+    const options = [...pictures, '--script', script, '--size', `${width}x${height}`, '--seconds', '1.7', '--every', '20', '--out', outputDir];
     const drawn = promisify(execFile)(preview, options, { env: { ...process.env, GALLIUM_DRIVER: 'softpipe' } });
 
     const actions = ['down', 'up', 'move', 'cancel'];
@@ -26,14 +31,21 @@ test('frames of a script equal those of tidemark-preview', async ({ page }, { ou
         const [time, action, x, y, pressure] = line.split(/\s+/);
         return [Number(time), actions.indexOf(action), pixels(x, width), pixels(y, height), Number(pressure)];
     });
-    await open(page, '#picture=river');
+    await page.addInitScript(() => { Math.random = () => 0; });  // the seed is 1, as the program's
+    await open(page);
+    await page.evaluate(async ([ground, light]) => {
+        const { water } = window.tidemark;
+        Object.assign(water, { light, src: ground });
+        await water.setPicture(ground);
+    }, [ground.url, light.url]);
+    await page.waitForFunction(() => 'drawable' in window.tidemark.water.water.light);
     await takeOver(page);
     const frames = await pixelsAfter(page, (touches) => {
         window.settle();
         const taken = [];
         for (let i = 0, next = 0; i < 102; ++i) {
             for (; next < touches.length && touches[next][0] < ((i + 1) * 1000) / 60; ++next) {
-                window.tidemark.water.touch(...touches[next].slice(1));
+                window.native._touch(...touches[next].slice(1));
             }
             if (i % 20 === 0) taken.push(window.read());
             else window.frames(1);

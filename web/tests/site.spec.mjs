@@ -1,5 +1,5 @@
 // The page as a site: screens, a missing network, and browsers that cannot show it.
-import { difference, calm, expect, flatPixels, open, takeOver, test } from './page.mjs';
+import { difference, expect, flatPixels, open, takeOver, test } from './page.mjs';
 
 // To look at, in build/web/screens.
 const screens = {
@@ -12,12 +12,12 @@ for (const [name, screen] of Object.entries(screens)) {
         test.use(screen);
         test('fills the screen, at most twice as dense as the page', async ({ page }) => {
             await open(page);
-            await calm(page);
-            await expect(page.locator('canvas')).toHaveCSS('opacity', '1');
+            const canvas = page.getByRole('button', { name: /Water/ });
+            await expect(canvas).toHaveCSS('opacity', '1');
             await page.screenshot({ path: `../build/web/screens/${name}.png` });
             const { width, height } = screen.viewport;
             const density = Math.min(screen.deviceScaleFactor ?? 1, 2);
-            expect(await page.locator('canvas').evaluate(({ width, height }) => [width, height])).toEqual([width * density, height * density]);
+            expect(await canvas.evaluate(({ width, height }) => [width, height])).toEqual([width * density, height * density]);
             expect(await page.evaluate(() => document.documentElement.scrollHeight <= innerHeight)).toBe(true);
             for (const tool of await page.locator('#tools button').all()) await expect(tool).toBeInViewport({ ratio: 1 });
             if (screen.hasTouch) await page.touchscreen.tap(width / 2, height / 2);
@@ -49,8 +49,35 @@ test('says in one sentence what the browser lacks', async ({ page }) => {
     const lacks = async (lack, sentence) => {
         await page.addInitScript(lack);
         await page.goto('./');
-        await expect(page.getByRole('alert')).toHaveText(sentence);
+        await expect(page.getByRole('status')).toHaveText(sentence);
     };
     await lacks(() => { HTMLCanvasElement.prototype.getContext = () => null; }, /needs WebGL/);
     await lacks(() => { WebAssembly.validate = () => false; }, /needs WebAssembly with SIMD/);
+});
+
+test('a worker that is gone is told and started anew; of two pictures the last chosen stays', async ({ page }) => {
+    await page.addInitScript(() => {
+        window.works = [];
+        window.Worker = class {
+            postMessage = ({ id }) => window.works.push((bitmap) => this.onmessage({ data: { id, bitmap } }));
+            terminate() {}
+        };
+        window.answer = async (i, side) => window.works.at(i)(side && await createImageBitmap(new ImageData(side, side)));
+    });
+    await page.goto('./');
+    const answer = (i, side) => page.evaluate(([i, side]) => window.answer(i, side), [i, side]);
+    await page.waitForFunction(() => window.works.length > 0);
+    await answer(0);
+    await expect(page.locator('#message.shown')).toHaveText(/painted pictures do not load/);
+    await page.setViewportSize({ width: 500, height: 800 });
+    await page.click('#look');
+    await page.getByRole('button', { name: 'River bed' }).click();
+    await expect(page.locator('body')).toHaveClass('busy');
+    await page.getByRole('button', { name: 'Sandy shore' }).click();
+    await page.waitForFunction(() => window.works.length > 2);
+    await answer(-1, 30);
+    await answer(-2, 20);
+    await expect(page.locator('body')).not.toHaveClass('busy');
+    expect(await page.evaluate(() => window.tidemark.water.water.picture.size())).toEqual([30, 30]);
+    await expect(page.locator('#message')).toHaveText('');
 });

@@ -1,0 +1,12 @@
+// What the bundler and the compiler of the WebAssembly make.
+declare module '*.properties' {
+    const keys: { name: string; value: number; min: number; max: number; whole: boolean }[];
+    export default keys;
+}
+declare module '*.webp' {
+    const bytes: Uint8Array<ArrayBuffer>;
+    export default bytes;
+}
+declare module '*/tidemark-water.js' {
+    export default function createInstance(options: object): Promise<unknown>;
+}

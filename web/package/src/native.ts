@@ -1,0 +1,95 @@
+// The library and its host as WebAssembly: compiled once a page, with an instance for each water, because the library
+// keeps its state in globals.
+import createInstance from '../../../build/web/tidemark-water.js';
+import { WaterError } from './errors.js';
+import { lookKeys, type Look } from './look.js';
+
+// The action codes of the library.
+export enum Touch {
+    down = 0,
+    up = 1,
+    move = 2,
+    cancel = 3,
+}
+
+export enum Frame {
+    resting = 0,
+    waiting = 1,
+    drawn = 2,
+}
+
+// The smallest module with a vector in it: a function that makes one and drops it.
+const vectors = new Uint8Array([
+    0, 97, 115, 109, 1, 0, 0, 0, 1, 4, 1, 96, 0, 0, 3, 2, 1, 0, 10, 9, 1, 7, 0, 65, 0, 253, 15, 26, 11,
+]);
+
+async function fetchModule(): Promise<WebAssembly.Module> {
+    if (typeof WebAssembly !== 'object' || !WebAssembly.validate(vectors)) {
+        throw new WaterError('simd', 'This browser has no WebAssembly with SIMD.');
+    }
+    const url = new URL('tidemark-water.wasm', import.meta.url);
+    const response = await fetch(url).catch(() => null);
+    if (!response?.ok) throw new WaterError('module', `${url} does not load.`);
+    try {
+        // Not streaming: that would ask every server for the right type of content, for a few dozen kilobytes.
+        return await WebAssembly.compile(await response.arrayBuffer());
+    } catch (error) {
+        const text = String(error);
+        if (/CSP|content security|unsafe-eval/i.test(text)) {
+            throw new WaterError('csp', "The content security policy needs script-src 'wasm-unsafe-eval'.");
+        }
+        throw new WaterError('module', `${url} is no module: ${text}`);
+    }
+}
+
+let compiled: Promise<WebAssembly.Module> | undefined;
+
+// A module that did not load is tried again with the next water.
+export function compile(): Promise<WebAssembly.Module> {
+    compiled ??= fetchModule();
+    compiled.catch(() => (compiled = undefined));
+    return compiled;
+}
+
+export type Upload = (background: WebGLTexture, light: WebGLTexture, proportions: number) => void;
+
+interface Instance {
+    HEAP32: Int32Array;
+    HEAPF32: Float32Array;
+    _begin(seed: number): void;
+    _lookToFill(): number;
+    _applyLook(): void;
+    _resize(width: number, height: number): void;
+    _setInk(withInk: boolean): void;
+    _setRain(falling: boolean): void;
+    _clearInk(): void;
+    _touch(action: number, x: number, y: number, pressure: number): void;
+    _splash(x: number, y: number, pressure: number): void;
+    _renewPictures(): void;
+    _renewContext(): void;
+    _frame(seconds: number): number;
+}
+export type Native = Instance & { setLook(look: Look): void };
+
+export async function instantiate(
+    module: WebAssembly.Module, context: WebGLRenderingContext, upload: Upload, seed: number,
+): Promise<Native> {
+    const instance = await createInstance({
+        context,
+        upload,
+        instantiateWasm(imports: WebAssembly.Imports, done: (instance: WebAssembly.Instance) => void) {
+            void WebAssembly.instantiate(module, imports).then(done);
+            return {};
+        },
+    }) as Instance;
+    instance._begin(seed);
+    return Object.assign(instance, {
+        setLook(look: Look) {
+            const place = instance._lookToFill() >> 2;
+            lookKeys.forEach(({ name, whole }, i) => {
+                (whole ? instance.HEAP32 : instance.HEAPF32)[place + i] = look[name]!;
+            });
+            instance._applyLook();
+        },
+    });
+}

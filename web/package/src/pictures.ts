@@ -1,0 +1,129 @@
+// Pictures on their way into textures. They go from the browser's decoder to the GPU, cropped and scaled to the view;
+// what stays in memory is the file as it came, which the browser decodes again after a lost context.
+import { WaterError } from './errors.js';
+import light from './light.webp';
+
+export type Source =
+    | string | URL | Blob | ImageBitmap | HTMLImageElement | HTMLVideoElement | HTMLCanvasElement | OffscreenCanvas;
+
+export interface Picture {
+    drawable: CanvasImageSource;
+    size(): [number, number];
+    /** Whether it may change by itself now. */
+    moving(): boolean;
+    /** Whether it has changed since the last call. */
+    changed(): boolean;
+}
+
+function canvasOf(width: number, height: number): HTMLCanvasElement {
+    const canvas = document.createElement('canvas');
+    canvas.width = width;
+    canvas.height = height;
+    return canvas;
+}
+
+async function loadImage(url: string, blob?: Blob): Promise<HTMLImageElement> {
+    const image = new Image();
+    const away = !blob && new URL(url, document.baseURI).origin !== location.origin && !/^(data|blob):/.test(url);
+    if (away) image.crossOrigin = 'anonymous';
+    image.src = url;
+    const loaded = await new Promise<boolean>((resolve) => {
+        image.onload = () => resolve(true);
+        image.onerror = () => resolve(false);
+    });
+    if (loaded) {
+        await image.decode().catch(() => {});  // refused for some SVGs, which draw all the same
+        return image;
+    }
+    if (blob) throw new WaterError('decode', 'The file is not a picture that this browser can show.');
+    if (away) {
+        const plain = new Image();
+        plain.src = url;
+        const shows = await new Promise((resolve) => {
+            plain.onload = () => resolve(true);
+            plain.onerror = () => resolve(false);
+        });
+        if (shows) throw new WaterError('cross-origin', `The server of ${url} does not allow this page to use it.`);
+        throw new WaterError('load', `${url} does not load.`);
+    }
+    const response = await fetch(url).catch(() => null);
+    if (response?.ok) throw new WaterError('decode', `${url} is not a picture that this browser can show.`);
+    throw new WaterError('load', `${url} does not load.`);
+}
+
+const still = (drawable: CanvasImageSource, size: () => [number, number]): Picture =>
+    ({ drawable, size, moving: () => false, changed: () => false });
+
+export async function loadPicture(source: Source): Promise<Picture> {
+    if (source instanceof HTMLVideoElement) {
+        if (source.readyState < 2) await new Promise((resolve) => source.addEventListener('loadeddata', resolve, { once: true }));
+        let time = -1;
+        return {
+            drawable: source,
+            size: () => [source.videoWidth, source.videoHeight],
+            moving: () => !source.paused && !source.ended,
+            changed: () => source.readyState > 1 && time !== (time = source.currentTime),
+        };
+    }
+    if (source instanceof HTMLCanvasElement || (typeof OffscreenCanvas === 'function' && source instanceof OffscreenCanvas)) {
+        return { drawable: source, size: () => [source.width, source.height], moving: () => true, changed: () => true };
+    }
+    if (source instanceof ImageBitmap) return still(source, () => [source.width, source.height]);
+    let image: HTMLImageElement;
+    if (source instanceof HTMLImageElement) {
+        await source.decode().catch(() => {});
+        image = source;
+    } else if (source instanceof Blob) {
+        const url = URL.createObjectURL(source);
+        image = await loadImage(url, source).finally(() => URL.revokeObjectURL(url));
+    } else {
+        image = await loadImage(String(source));
+    }
+    // A drawing may have proportions and no size.
+    return still(image, () => [image.naturalWidth || 1024, image.naturalHeight || 1024]);
+}
+
+let scratch: HTMLCanvasElement | undefined;
+
+/** Fills `texture` with the middle of the picture in the proportions of width x height. Rows go from the top. */
+export function uploadCover(
+    gl: WebGLRenderingContext, texture: WebGLTexture, picture: Picture, width: number, height: number,
+): void {
+    scratch ??= canvasOf(width, height);
+    if (scratch.width !== width) scratch.width = width;
+    if (scratch.height !== height) scratch.height = height;
+    const [fullWidth, fullHeight] = picture.size();
+    const scale = Math.min(fullWidth / width, fullHeight / height);
+    const context = scratch.getContext('2d', { alpha: false })!;
+    context.imageSmoothingQuality = 'high';
+    if (scale > 0) {
+        context.drawImage(picture.drawable, (fullWidth - width * scale) / 2, (fullHeight - height * scale) / 2,
+            width * scale, height * scale, 0, 0, width, height);
+    }
+    upload(gl, texture, scratch);
+    if (!picture.moving()) scratch.width = scratch.height = 1;
+}
+
+export function upload(gl: WebGLRenderingContext, texture: WebGLTexture, source: TexImageSource): void {
+    gl.bindTexture(gl.TEXTURE_2D, texture);
+    gl.texImage2D(gl.TEXTURE_2D, 0, gl.RGBA, gl.RGBA, gl.UNSIGNED_BYTE, source);
+    gl.bindTexture(gl.TEXTURE_2D, null);
+}
+
+let shipped: Promise<ImageBitmap> | undefined;
+
+/** What the waves throw back: sky with the sun's glitter. */
+export const shippedLight = (): Promise<ImageBitmap> =>
+    (shipped ??= createImageBitmap(new Blob([light], { type: 'image/webp' })));
+
+/** Without a picture: deep water. */
+export function plainPicture(): Picture {
+    const canvas = canvasOf(256, 256);
+    const context = canvas.getContext('2d')!;
+    const depth = context.createRadialGradient(100, 75, 0, 100, 75, 220);
+    depth.addColorStop(0, '#2c7f8f');
+    depth.addColorStop(1, '#0d3d4f');
+    context.fillStyle = depth;
+    context.fillRect(0, 0, 256, 256);
+    return still(canvas, () => [256, 256]);
+}

@@ -1,0 +1,502 @@
+// The water of one canvas: what is chosen flows in, touches come from the pointers, frames out of the loop.
+import { borrow, contextOf, giveBack, offer, type Borrower } from './contexts.js';
+import { WaterError } from './errors.js';
+import { lookOf, presets, type Choices } from './look.js';
+import { compile, Frame, instantiate, Touch, type Native } from './native.js';
+import { loadPicture, plainPicture, shippedLight, upload, uploadCover, type Picture, type Source } from './pictures.js';
+import { followPointers, type Touched } from './pointers.js';
+
+export interface Options extends Choices {
+    /** What lies under the water. Without one it is plain deep water; an empty text waits for setPicture(). */
+    src?: Source | null;
+    /** The same for a canvas that is higher than wide. */
+    srcPortrait?: Source | null;
+    /** What the waves throw back, a square picture; the package's own by default. */
+    light?: Source | null;
+    /** Whether touches drop ink. */
+    ink?: boolean | null;
+    /** What moves the water: "hover", "press" or both, or "none". */
+    interaction?: string | null;
+    /** "auto" keeps to the visitor's wish for reduced motion: then only touches move the water. */
+    motion?: 'auto' | 'full' | 'reduced' | null;
+    /** Whether one drop falls by itself. */
+    firstDrop?: boolean | null;
+}
+
+export interface DropOptions {
+    /** 1 is a touch. */
+    strength?: number;
+    ink?: boolean;
+}
+
+/** Milliseconds; see `Water.cost`. */
+export interface Cost {
+    frame: number;
+    work: number;
+}
+
+const densities = { low: 1, medium: 2, high: 3 };
+const longestSide = 2048;  // as much as a phone draws at full speed
+const shortestSide = 64;
+const parkAfter = 4000;    // milliseconds out of view
+const touchCounts = 3000;  // milliseconds that a touched water is not taken its context
+const lightSide = 512;
+
+// Steady enough to be read.
+const blend = (old: number, value: number) => (old ? old + 0.1 * (value - old) : value);
+
+export class Water extends EventTarget implements Borrower, Touched {
+    /** Settles with the first picture, or fails with a `WaterError`. */
+    readonly ready: Promise<void>;
+    /** Smoothed: from one frame drawn to the next, and of it in the library. */
+    readonly cost: Cost = { frame: 0, work: 0 };
+    /** Whether the water rests; then no frames are asked for. */
+    calm = true;
+
+    private readonly end = new AbortController();
+    private readonly reducedMotion = matchMedia('(prefers-reduced-motion: reduce)');
+    private readonly resized = new ResizeObserver(() => this.fit());
+    private readonly seen = new IntersectionObserver(
+        (entries) => this.setInView(entries.at(-1)!.isIntersecting), { rootMargin: '100px' });
+    private settle!: { resolve: () => void; reject: (error: unknown) => void };
+    private native: Native | undefined;
+    private gl: WebGLRenderingContext | undefined;
+    private lose: WEBGL_lose_context | null = null;
+    private live = false;     // the context is there, and the library in it
+    private opening = false;
+    private failed = false;
+    private parked = false;
+    private shown = false;
+    private inView = false;
+    private paused = false;
+    private asked = 0;
+    private lastFrame = 0;
+    private lastTouch = -touchCounts;
+    private parkTimer = 0;
+    private dropTimer = 0;
+    private given = '';       // the look that the library has
+    private picture: Picture | undefined;
+    private pictureTicket = 0;
+    private pictureSource: Source | null | undefined;
+    private light: Picture | ImageBitmap | undefined;
+    private lightSource: Source | null | undefined;
+
+    /**
+     * @param target where pointers are listened to
+     * @param still shows the last frame while the context is lent to another water
+     */
+    constructor(
+        readonly canvas: HTMLCanvasElement,
+        private options: Options = {},
+        target: EventTarget = canvas,
+        private readonly still?: HTMLCanvasElement,
+    ) {
+        super();
+        this.ready = new Promise((resolve, reject) => (this.settle = { resolve, reject }));
+        this.ready.catch(() => {});
+        const { signal } = this.end;
+        followPointers(target, this, signal);
+        document.addEventListener('visibilitychange', () => this.update(), { signal });
+        this.reducedMotion.addEventListener('change', () => this.apply(), { signal });
+        canvas.addEventListener('webglcontextlost', () => this.contextLost(), { signal });
+        canvas.addEventListener('webglcontextrestored', () => this.contextRestored(), { signal });
+        this.fit();
+        this.resized.observe(canvas);
+        this.seen.observe(canvas);
+        compile().catch((error) => this.fail(error));
+        this.choosePictures();
+    }
+
+    /** Changes what is named. */
+    set(options: Options): void {
+        Object.assign(this.options, options);
+        this.choosePictures();
+        this.apply();
+    }
+
+    /** Settles when the picture is there; of several asked for, the last one stays. */
+    async setPicture(source: Source | null, portrait: Source | null = null): Promise<void> {
+        Object.assign(this.options, { src: source, srcPortrait: portrait });
+        await this.choosePicture();
+    }
+
+    /** A drop at a point of the canvas, in CSS pixels from its top left corner. */
+    drop(x: number, y: number, { strength = 1, ink = false }: DropOptions = {}): void {
+        const [column, row] = this.pixel(x, y);
+        const fall = () => {
+            if (ink) {
+                this.native?._touch(Touch.down, column, row, strength);
+                this.native?._touch(Touch.up, column, row, strength);
+            } else {
+                this.native?._splash(column, row, strength);
+            }
+        };
+        if (this.shown) fall();
+        else this.addEventListener('ready', fall, { once: true, signal: this.end.signal });
+        this.touched();
+    }
+
+    clearInk(): void {
+        this.native?._clearInk();
+        this.wake();
+    }
+
+    /** The water stands still until play(). */
+    pause(): void {
+        this.paused = true;
+        this.update();
+    }
+
+    play(): void {
+        this.paused = false;
+        this.update();
+    }
+
+    toBlob(type = 'image/png', quality?: number): Promise<Blob> {
+        let from = this.canvas;
+        // The canvas is readable only in the task that has drawn.
+        if (!this.drawAgain()) {
+            if (!this.still || this.still.width < shortestSide) return Promise.reject(new Error('no picture yet'));
+            from = this.still;
+        }
+        return new Promise((resolve, reject) =>
+            from.toBlob((blob) => (blob ? resolve(blob) : reject(new Error(`no ${type}`))), type, quality));
+    }
+
+    /** Ends everything; nothing that was made here stays but the canvas. */
+    destroy(): void {
+        if (this.end.signal.aborted) return;
+        this.end.abort();
+        this.resized.disconnect();
+        this.seen.disconnect();
+        cancelAnimationFrame(this.asked);
+        clearTimeout(this.parkTimer);
+        clearTimeout(this.dropTimer);
+        if (!this.gl?.isContextLost()) this.lose?.loseContext();
+        delete (this.canvas as { GLctxObject?: unknown }).GLctxObject;
+        this.canvas.style.visibility = '';
+        this.native = this.gl = this.picture = this.light = undefined;
+        this.live = false;
+        this.settle.reject(new Error('destroyed'));
+        giveBack(this);
+        offer();
+    }
+
+    // What the pointers ask for.
+
+    hovers(): boolean {
+        return this.interactions().includes('hover') && !this.reduced();
+    }
+    presses(): boolean {
+        return this.interactions().includes('press');
+    }
+    touch(action: Touch, clientX: number, clientY: number, pressure: number): void {
+        this.native?._touch(action, ...this.pixelAt(clientX, clientY), pressure);
+        this.touched();
+    }
+    ripple(clientX: number, clientY: number, pressure: number): void {
+        this.native?._splash(...this.pixelAt(clientX, clientY), pressure);
+        this.touched();
+    }
+
+    // What the other waters ask for.
+
+    urgency(): number {
+        if (this.opening) return 5;
+        if (!this.running()) return 0;
+        if (!this.shown) return this.picture ? 4 : 1;
+        if (!this.still || performance.now() - this.lastTouch < touchCounts) return 3;
+        return this.calm ? 1 : 2;
+    }
+    park(): void {
+        if (!this.live) return giveBack(this);
+        const { canvas, still } = this;
+        if (still && this.shown && this.drawAgain()) {
+            still.width = canvas.width;
+            still.height = canvas.height;
+            still.getContext('2d', { alpha: false })!.drawImage(canvas, 0, 0);
+        }
+        canvas.style.visibility = 'hidden';
+        this.live = false;
+        this.parked = true;
+        this.lose?.loseContext();
+        giveBack(this);
+        if (!this.calm && this.running()) this.wake();
+        offer();
+    }
+    resume(): void {
+        this.wake();
+    }
+
+    private interactions(): string[] {
+        return (this.options.interaction ?? 'press').split(/\s+/);
+    }
+    private reduced(): boolean {
+        const { motion } = this.options;
+        return motion === 'reduced' || (motion !== 'full' && this.reducedMotion.matches);
+    }
+    private running(): boolean {
+        return this.inView && !this.paused && !this.failed && !document.hidden && !this.end.signal.aborted;
+    }
+
+    private pixel(x: number, y: number): [number, number] {
+        const { canvas } = this;
+        return [
+            Math.round((x / (canvas.clientWidth || 1)) * canvas.width),
+            Math.round((y / (canvas.clientHeight || 1)) * canvas.height),
+        ];
+    }
+    private pixelAt(clientX: number, clientY: number): [number, number] {
+        const { canvas } = this;
+        const { left, top, width, height } = canvas.getBoundingClientRect();
+        return [
+            Math.round(((clientX - left) / (width || 1)) * canvas.width),
+            Math.round(((clientY - top) / (height || 1)) * canvas.height),
+        ];
+    }
+
+    private fail(error: unknown): void {
+        if (this.end.signal.aborted || this.failed) return;
+        const known = error instanceof WaterError ? error : new WaterError('module', String(error));
+        if (!this.shown) this.settle.reject(known);
+        if (['webgl', 'simd', 'csp', 'module'].includes(known.code)) this.failed = true;
+        this.dispatchEvent(new CustomEvent('error', { detail: known }));
+    }
+
+    private touched(): void {
+        this.lastTouch = performance.now();
+        this.wake();
+    }
+
+    private setInView(inView: boolean): void {
+        this.inView = inView;
+        clearTimeout(this.parkTimer);
+        if (!inView) this.parkTimer = setTimeout(() => this.park(), parkAfter);
+        this.update();
+    }
+
+    // The loop follows from the state.
+    private update(): void {
+        if (!this.running()) {
+            cancelAnimationFrame(this.asked);
+            this.asked = 0;
+            return;
+        }
+        // The still serves until something moves.
+        if (this.parked && this.calm && this.still) return;
+        this.wake();
+    }
+
+    private wake(): void {
+        if (!this.running()) return;
+        if (!this.live) void this.open();
+        else if (this.picture) this.asked ||= requestAnimationFrame(this.draw);
+    }
+
+    private async open(): Promise<void> {
+        if (this.live || this.opening || this.failed || !borrow(this)) return;
+        this.opening = true;
+        try {
+            const [module, light] = await Promise.all([compile(), this.loadLight()]);
+            this.light = light;
+            if (this.end.signal.aborted) return;
+            const held = contextOf(this.canvas);
+            if (!held) throw new WaterError('webgl', 'This browser has no WebGL, or has switched it off.');
+            this.gl = held.gl;
+            this.lose = held.lose;
+            if (held.gl.isContextLost()) await this.restore();
+            if (this.end.signal.aborted) return;
+            if (this.native) {
+                this.native._renewContext();
+            } else {
+                const load = (background: WebGLTexture, shine: WebGLTexture, proportions: number) =>
+                    this.loadTextures(background, shine, proportions);
+                const native = await instantiate(module, held.gl, load, 1 + Math.floor(Math.random() * 1e6));
+                if (this.end.signal.aborted) return;
+                this.native = native;
+                native._resize(this.canvas.width, this.canvas.height);
+            }
+            this.live = true;
+            this.given = '';
+            this.apply();
+        } catch (error) {
+            giveBack(this);
+            this.fail(error);
+        } finally {
+            this.opening = false;
+        }
+        this.update();
+    }
+
+    private restore(): Promise<void> {
+        return new Promise((resolve) => {
+            this.canvas.addEventListener('webglcontextrestored', () => resolve(), { once: true, signal: this.end.signal });
+            // Only after the loss has been told.
+            setTimeout(() => this.gl?.isContextLost() && this.lose?.restoreContext(), 0);
+        });
+    }
+
+    private contextLost(): void {
+        if (!this.live) return;
+        this.live = false;
+        this.dispatchEvent(new Event('contextlost'));
+    }
+    private contextRestored(): void {
+        if (this.live || this.parked || this.opening || !this.native) return;
+        this.native._renewContext();
+        this.live = true;
+        this.dispatchEvent(new Event('contextrestored'));
+        this.wake();
+    }
+
+    private fit(): void {
+        const { canvas } = this;
+        const density = densities[this.options.quality ?? 'medium'] ?? densities.medium;
+        const { clientWidth, clientHeight } = canvas;
+        const scale = Math.min(devicePixelRatio, density, longestSide / Math.max(clientWidth, clientHeight, 1));
+        const width = Math.max(shortestSide, Math.round(clientWidth * scale));
+        const height = Math.max(shortestSide, Math.round(clientHeight * scale));
+        if (width === canvas.width && height === canvas.height) return;
+        canvas.width = width;
+        canvas.height = height;
+        this.choosePictures();
+        this.native?._resize(width, height);
+        this.native?._renewPictures();
+        if (this.live && this.running()) {
+            // At once, or the canvas would show nothing until the next frame.
+            cancelAnimationFrame(this.asked);
+            this.draw(performance.now());
+        } else {
+            this.wake();
+        }
+    }
+
+    private choosePictures(): void {
+        this.choosePicture().catch(() => {});
+        const { light = null } = this.options;
+        if (this.light && light !== this.lightSource) {
+            this.loadLight().then((loaded) => {
+                this.light = loaded;
+                this.native?._renewPictures();
+                this.wake();
+            }, (error) => this.fail(error));
+        }
+    }
+
+    private async loadLight(): Promise<Picture | ImageBitmap> {
+        const { light = null } = this.options;
+        this.lightSource = light;
+        return light ? loadPicture(light) : shippedLight();
+    }
+
+    private async choosePicture(): Promise<void> {
+        const { src = null, srcPortrait = null } = this.options;
+        const source = this.canvas.height > this.canvas.width && srcPortrait ? srcPortrait : src;
+        if (source === this.pictureSource || source === '') return;
+        this.pictureSource = source;
+        const ticket = ++this.pictureTicket;
+        try {
+            const picture = source ? await loadPicture(source) : plainPicture();
+            if (ticket !== this.pictureTicket || this.end.signal.aborted) return;
+            this.picture = picture;
+            if (source instanceof HTMLVideoElement) {
+                for (const type of ['play', 'seeked']) {
+                    source.addEventListener(type, () => this.wake(), { signal: this.end.signal });
+                }
+            }
+        } catch (error) {
+            if (ticket !== this.pictureTicket) return;
+            this.pictureSource = undefined;  // may be tried again
+            this.fail(error);
+            throw error;
+        }
+        this.native?._renewPictures();
+        this.wake();
+    }
+
+    // Called by the library's host in the middle of a frame, with textures of one pixel.
+    private loadTextures(background: WebGLTexture, shine: WebGLTexture, proportions: number): void {
+        const { canvas, gl, light, picture } = this;
+        if (!gl || !picture || !light) return;
+        const longer = Math.max(canvas.width, canvas.height);
+        const shorter = Math.max(1, Math.round(longer * proportions));
+        const upright = canvas.height >= canvas.width;
+        uploadCover(gl, background, picture, upright ? shorter : longer, upright ? longer : shorter);
+        if ('drawable' in light) uploadCover(gl, shine, light, lightSide, lightSide);
+        else upload(gl, shine, light);
+    }
+
+    private apply(): void {
+        const { native, options } = this;
+        if (!native) return;
+        this.fit();
+        const preset = presets[options.preset ?? ''];
+        const rain = this.reduced() ? 0 : options.rain ?? preset?.rain ?? 0;
+        const look = lookOf(options);
+        const text = JSON.stringify(look);
+        if (text !== this.given) native.setLook(look);
+        this.given = text;
+        native._setInk(options.ink ?? preset?.ink ?? false);
+        native._setRain(rain > 0);
+        this.wake();
+    }
+
+    // False where there is nothing to draw on.
+    private drawAgain(): boolean {
+        if (!this.live || !this.native || !this.picture) return false;
+        this.native._renewPictures();
+        // A step later than the last frame, which the host would think too early otherwise.
+        this.lastFrame += 17;
+        return this.native._frame(this.lastFrame / 1000) === Frame.drawn;
+    }
+
+    private readonly draw = (now: number): void => {
+        this.asked = 0;
+        const { native, picture } = this;
+        if (!this.live || !native || !picture || !this.running()) return;
+        const start = performance.now();
+        if (picture.changed()) native._renewPictures();
+        let frame: Frame;
+        try {
+            frame = native._frame(now / 1000);
+        } catch (error) {
+            return this.fail(error);
+        }
+        if (frame === Frame.drawn) {
+            this.cost.frame = blend(this.cost.frame, this.calm ? 0 : now - this.lastFrame);
+            this.cost.work = blend(this.cost.work, performance.now() - start);
+            this.lastFrame = now;
+            this.show();
+        }
+        this.setCalm(frame === Frame.resting);
+        if (!this.calm || picture.moving()) this.wake();
+    };
+
+    private setCalm(calm: boolean): void {
+        if (calm === this.calm) return;
+        this.calm = calm;
+        this.dispatchEvent(new Event(calm ? 'calm' : 'wake'));
+        if (calm) offer();
+    }
+
+    private show(): void {
+        if (this.parked) {
+            this.parked = false;
+            this.canvas.style.visibility = '';
+            if (this.still) this.still.width = this.still.height = 1;
+        }
+        if (this.shown) return;
+        this.shown = true;
+        this.settle.resolve();
+        this.dispatchEvent(new Event('ready'));
+        offer();
+        if (!this.options.firstDrop || this.reduced()) return;
+        const { clientWidth, clientHeight } = this.canvas;
+        this.dropTimer = setTimeout(() => this.drop(0.5 * clientWidth, 0.42 * clientHeight), 700);
+    }
+}
+
+/** Water in a canvas of the page's own. */
+export function createWater(canvas: HTMLCanvasElement, options: Options = {}): Water {
+    return new Water(canvas, { ...options });
+}

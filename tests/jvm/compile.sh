@@ -5,7 +5,7 @@ source=$1
 cd "$2"
 "$source/scripts/android_platform.sh"
 platform=$source/build/android-platform
-rm -rf classes generated resources && mkdir -p classes generated resources
+rm -rf classes framework generated resources && mkdir -p classes generated resources
 java() {
     find "$@" -name '*.java'
 }
@@ -16,7 +16,15 @@ mapfile -t shipped < <(java "$source/android")
 mapfile -t tests < <(java "$source/tests/jvm/java")
 mapfile -t fakes < <(java "$source/tests/jvm/fakes")
 
-"$PYTHON" "$source/tests/jvm/platform/classes_of_api.py" "$platform/api/current.txt" generated "${shipped[@]}" "${fakes[@]}"
+# The framework's own view, without what the platform keeps from apps: tracing and one call.
+mkdir framework
+for class in GLSurfaceView EGLLogWrapper; do
+    sed '/UnsupportedAppUsage/d; /Trace\.trace/d; /android\.os\.Trace/d; s/mEgl10.eglReleaseThread()/false/' \
+        "$platform/opengl/java/android/opengl/$class.java" >framework/$class.java
+done
+
+"$PYTHON" "$source/tests/jvm/platform/classes_of_api.py" "$platform/api/current.txt" generated "${shipped[@]}" framework/*.java \
+    "${fakes[@]}"
 mapfile -t generated < <(java generated)
 "$JAVAC" -nowarn -Xlint:none --release 8 -d classes/platform "${generated[@]}"
 
@@ -31,4 +39,5 @@ sed 's/<manifest /&package="com.zor.android.visualeffect.tidemark.sample" /
 mapfile -t shipped < <(java "$source/android" resources)
 compile --release 8 -parameters -h headers -cp classes/platform -d classes/shipped "${shipped[@]}"
 compile --release 8 -cp classes/platform -d classes/fakes "${fakes[@]}"
+"$JAVAC" -nowarn -Xlint:none --release 8 -cp classes/fakes:classes/platform -d classes/fakes framework/*.java
 compile --release 17 -h headers -cp "classes/fakes:classes/platform:classes/shipped:$JUNIT" -d classes/tests "${tests[@]}"

@@ -3,7 +3,7 @@
 
     classes_of_api.py current.txt OUTPUT SOURCE...
 
-Takes the classes that the sources import and those which these need, and of their members the ones whose names occur in
+Takes the classes that the sources import or have beside them and those which these need, and of their members the ones whose names occur in
 the sources. A method does nothing and returns nothing, zero or null.
 """
 import pathlib
@@ -61,8 +61,10 @@ def taken(name):
 
 
 wanted = set()
+unimported = words - set(re.findall(r"^import .*\.(\w+);", text, re.M))
+of_same_package = {package + "." + word for package in re.findall(r"^package (.*);", text, re.M) for word in unimported}
 due = {name for name in classes if re.search(r"import (static )?" + re.escape(name) + r"[.;]", text)
-       or "." in name and name in text}
+       or name in of_same_package or "." in name and name in text}
 while due - wanted:
     name = (due - wanted).pop()
     wanted.add(name)
@@ -129,6 +131,8 @@ def write(name, indent):
     if " enum " in " " + declaration:
         constants = [m.split()[-1] for m in classes[name][1] if m.startswith("enum_constant")]
         yield f"{indent}    {', '.join(constants)};"
+    if call_of_super(name) and not any(member.startswith("ctor") for member in classes[name][1]):
+        yield f"{indent}    protected {simple}() {{ {call_of_super(name)} }}"
     for member in taken(name):
         if " enum " not in " " + declaration or "valueOf" not in member and "values" not in member:
             yield f"{indent}    {java_of(member, name, is_interface)}"

@@ -2,17 +2,31 @@ package com.zor.android.visualeffect.tidemark;
 
 import java.nio.ByteBuffer;
 
-/** An OpenGL ES 2.0 context without a window, current on the thread that made it. */
+/** OpenGL ES 2.0 without a window. */
 final class GlContext {
     static {
         System.loadLibrary("tidemark_jvm_gl");
     }
 
+    private static long context;
+    private static long surface;
+
     private GlContext() {}
 
+    /** A new context, current on this thread, with a framebuffer of this size. */
     static void open(int width, int height) {
-        String problem = renew(width, height);
-        if (problem != null) throw new IllegalStateException(problem);
+        release();
+        context = createContext();
+        surface = createSurface(width, height);
+        if (!makeCurrent(surface, context)) throw new IllegalStateException("no OpenGL ES 2.0 driver");
+    }
+
+    static void release() {
+        if (context == 0) return;
+        makeCurrent(0, 0);
+        destroySurface(surface);
+        destroyContext(context);
+        context = 0;
     }
 
     /** R, G, B, A, rows from the bottom. */
@@ -27,9 +41,15 @@ final class GlContext {
     /** What the library has logged since the last call, a line each. */
     static native String takeLog();
 
-    static native void release();
+    static native long createContext();
 
-    private static native String renew(int width, int height);
+    static native void destroyContext(long context);
+
+    static native long createSurface(int width, int height);
+
+    static native void destroySurface(long surface);
+
+    static native boolean makeCurrent(long surface, long context);
 
     private static native void readPixels(int width, int height, ByteBuffer rgba);
 }

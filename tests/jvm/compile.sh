@@ -16,10 +16,12 @@ mapfile -t shipped < <(java "$source/android")
 mapfile -t tests < <(java "$source/tests/jvm/java")
 mapfile -t fakes < <(java "$source/tests/jvm/fakes")
 
-# The framework's own view, without what the platform keeps from apps: tracing and one call.
+# The framework's own view, without what the platform keeps from apps (tracing, one call), and its surface comes by the
+# calls of a test.
 mkdir framework
 for class in GLSurfaceView EGLLogWrapper; do
-    sed '/UnsupportedAppUsage/d; /Trace\.trace/d; /android\.os\.Trace/d; s/mEgl10.eglReleaseThread()/false/' \
+    sed '/UnsupportedAppUsage/d; /Trace\.trace/d; /android\.os\.Trace/d; s/mEgl10.eglReleaseThread()/false/
+        /holder.addCallback/d' \
         "$platform/opengl/java/android/opengl/$class.java" >framework/$class.java
 done
 

@@ -9,64 +9,47 @@
 #include "com_zor_android_visualeffect_tidemark_GlContext.h"
 #include "tests/support/log_recorder.h"
 
-struct Driver {
-    EGLDisplay display = eglGetPlatformDisplay(EGL_PLATFORM_SURFACELESS_MESA, EGL_DEFAULT_DISPLAY, nullptr);
-    EGLConfig config = nullptr;
-    Driver() {
-        const EGLint wanted[] = {
-            EGL_SURFACE_TYPE,
-            EGL_PBUFFER_BIT,
-            EGL_RENDERABLE_TYPE,
-            EGL_OPENGL_ES2_BIT,
-            EGL_RED_SIZE,
-            8,
-            EGL_GREEN_SIZE,
-            8,
-            EGL_BLUE_SIZE,
-            8,
-            EGL_ALPHA_SIZE,
-            8,
-            EGL_NONE};
-        EGLint count = 0;
-        eglInitialize(display, nullptr, nullptr);
-        eglChooseConfig(display, wanted, &config, 1, &count);
-    }
-};
+static const EGLDisplay display = eglGetPlatformDisplay(EGL_PLATFORM_SURFACELESS_MESA, EGL_DEFAULT_DISPLAY, nullptr);
 
-static const Driver& driver() {
-    static const Driver theDriver;
-    return theDriver;
+static EGLConfig chooseConfig() {
+    const EGLint wanted[] = {EGL_SURFACE_TYPE, EGL_PBUFFER_BIT, EGL_ALPHA_SIZE, 8, EGL_NONE};
+    EGLConfig config = nullptr;
+    EGLint count = 0;
+    eglInitialize(display, nullptr, nullptr);
+    eglChooseConfig(display, wanted, &config, 1, &count);
+    return config;
 }
 
+static const EGLConfig config = chooseConfig();
 static LogRecorder recorder;
 
 JNIEXPORT jlong JNICALL Java_com_zor_android_visualeffect_tidemark_GlContext_createContext(JNIEnv*, jclass) {
     const EGLint version[] = {EGL_CONTEXT_CLIENT_VERSION, 2, EGL_NONE};
     eglBindAPI(EGL_OPENGL_ES_API);
-    return reinterpret_cast<jlong>(eglCreateContext(driver().display, driver().config, EGL_NO_CONTEXT, version));
+    return reinterpret_cast<jlong>(eglCreateContext(display, config, EGL_NO_CONTEXT, version));
 }
 
 JNIEXPORT void JNICALL
 Java_com_zor_android_visualeffect_tidemark_GlContext_destroyContext(JNIEnv*, jclass, jlong context) {
-    eglDestroyContext(driver().display, reinterpret_cast<EGLContext>(context));
+    eglDestroyContext(display, reinterpret_cast<EGLContext>(context));
 }
 
 JNIEXPORT jlong JNICALL
 Java_com_zor_android_visualeffect_tidemark_GlContext_createSurface(JNIEnv*, jclass, jint width, jint height) {
     const EGLint size[] = {EGL_WIDTH, width, EGL_HEIGHT, height, EGL_NONE};
-    return reinterpret_cast<jlong>(eglCreatePbufferSurface(driver().display, driver().config, size));
+    return reinterpret_cast<jlong>(eglCreatePbufferSurface(display, config, size));
 }
 
 JNIEXPORT void JNICALL
 Java_com_zor_android_visualeffect_tidemark_GlContext_destroySurface(JNIEnv*, jclass, jlong surface) {
-    eglDestroySurface(driver().display, reinterpret_cast<EGLSurface>(surface));
+    eglDestroySurface(display, reinterpret_cast<EGLSurface>(surface));
 }
 
 JNIEXPORT jboolean JNICALL
 Java_com_zor_android_visualeffect_tidemark_GlContext_makeCurrent(JNIEnv*, jclass, jlong surface, jlong context) {
     const EGLSurface target = reinterpret_cast<EGLSurface>(surface);
     eglBindAPI(EGL_OPENGL_ES_API);
-    return eglMakeCurrent(driver().display, target, target, reinterpret_cast<EGLContext>(context)) == EGL_TRUE;
+    return eglMakeCurrent(display, target, target, reinterpret_cast<EGLContext>(context)) == EGL_TRUE;
 }
 
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_GlContext_readPixels(

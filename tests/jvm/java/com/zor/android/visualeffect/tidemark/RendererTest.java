@@ -31,7 +31,7 @@ public final class RendererTest {
     private final Bitmap green = plain(Bitmap.Config.ARGB_8888, GREEN);
     private final Bitmap white = plain(Bitmap.Config.ARGB_8888, 0xffffffff);
     private final List<String> heard = Collections.synchronizedList(new ArrayList<>());
-    private int framesSeen = Screen.frames();
+    private int framesSeen = Screen.frames;
     private int handedOver = Bitmap.locksMade;
 
     @Before
@@ -64,11 +64,11 @@ public final class RendererTest {
         assertEquals("frames of still water", 1, drawUntilRest());
         assertEquals("frames of drawn water", 0, drawUntilRest());
         expectColor(RED);
-        byte[] still = Screen.pixels();
+        byte[] still = Screen.pixels;
         touch(MotionEvent.ACTION_DOWN, 20, 40);
         touch(MotionEvent.ACTION_UP, 20, 40);
         drawFrame();
-        assertTrue("a touch raises a wave", difference(still, Screen.pixels()) > 30);
+        assertTrue("a touch raises a wave", difference(still, Screen.pixels) > 30);
         long before = SystemClock.nanos;
         Screen.refreshRate = 240;
         drawFrame();
@@ -76,7 +76,7 @@ public final class RendererTest {
         assertTrue("without ink no frame waits", SystemClock.nanos - before < 10000000);
         int frames = drawUntilRest();
         assertTrue(frames + " frames of waves", frames > 60 && frames < 480);
-        assertTrue("water at rest looks as before", difference(still, Screen.pixels()) <= 8);
+        assertTrue("water at rest looks as before", difference(still, Screen.pixels) <= 8);
         assertEquals("frames without water", cleared + 1, GLES20.clears);
     }
 
@@ -288,7 +288,7 @@ public final class RendererTest {
 
     // Pixels darker than the background.
     private int inked() {
-        byte[] pixels = Screen.pixels();
+        byte[] pixels = Screen.pixels;
         int dark = 0;
         for (int i = 0; i < pixels.length; i += 4) {
             if ((pixels[i] & 255) < 150) ++dark;
@@ -298,19 +298,19 @@ public final class RendererTest {
 
     private void drawFrame() {
         Screen.goOn(view);
-        framesSeen = Screen.frames();
+        framesSeen = Screen.frames;
     }
 
     private int drawUntilRest() {
         for (int i = 0; Screen.goOn(view) && i < 3000; ++i) continue;
-        int frames = Screen.frames() - framesSeen;
+        int frames = Screen.frames - framesSeen;
         framesSeen += frames;
         return frames;
     }
 
     private void expectColor(int argb) {
         int[] expected = {argb >> 16 & 255, argb >> 8 & 255, argb & 255};
-        byte[] pixels = Screen.pixels();
+        byte[] pixels = Screen.pixels;
         for (int i = 0; i < pixels.length; ++i) {
             if (i % 4 == 3) continue;
             assertTrue((pixels[i] & 255) + " at byte " + i, Math.abs((pixels[i] & 255) - expected[i % 4]) <= 8);

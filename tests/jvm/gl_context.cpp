@@ -1,9 +1,10 @@
-// The native half of GlContext.java: EGL on Mesa's software driver, every surface being a pbuffer.
+// The native half of GlContext.java: EGL on Mesa's software driver, each context with a pbuffer.
 #define EGL_EGLEXT_PROTOTYPES
 #include <EGL/egl.h>
 #include <EGL/eglext.h>
 #include <GLES2/gl2.h>
 
+#include <memory>
 #include <string>
 
 #include "com_zor_android_visualeffect_tidemark_GlContext.h"
@@ -23,33 +24,33 @@ static EGLConfig chooseConfig() {
 static const EGLConfig config = chooseConfig();
 static LogRecorder recorder;
 
-JNIEXPORT jlong JNICALL Java_com_zor_android_visualeffect_tidemark_GlContext_createContext(JNIEnv*, jclass) {
-    const EGLint version[] = {EGL_CONTEXT_CLIENT_VERSION, 2, EGL_NONE};
-    eglBindAPI(EGL_OPENGL_ES_API);
-    return reinterpret_cast<jlong>(eglCreateContext(display, config, EGL_NO_CONTEXT, version));
-}
-
-JNIEXPORT void JNICALL
-Java_com_zor_android_visualeffect_tidemark_GlContext_destroyContext(JNIEnv*, jclass, jlong context) {
-    eglDestroyContext(display, reinterpret_cast<EGLContext>(context));
-}
+struct Target {
+    EGLContext context = EGL_NO_CONTEXT;
+    EGLSurface surface = EGL_NO_SURFACE;
+};
 
 JNIEXPORT jlong JNICALL
-Java_com_zor_android_visualeffect_tidemark_GlContext_createSurface(JNIEnv*, jclass, jint width, jint height) {
+Java_com_zor_android_visualeffect_tidemark_GlContext_create(JNIEnv*, jclass, jint width, jint height) {
     const EGLint size[] = {EGL_WIDTH, width, EGL_HEIGHT, height, EGL_NONE};
-    return reinterpret_cast<jlong>(eglCreatePbufferSurface(display, config, size));
+    const EGLint version[] = {EGL_CONTEXT_CLIENT_VERSION, 2, EGL_NONE};
+    eglBindAPI(EGL_OPENGL_ES_API);
+    const EGLContext context = eglCreateContext(display, config, EGL_NO_CONTEXT, version);
+    return reinterpret_cast<jlong>(new Target{context, eglCreatePbufferSurface(display, config, size)});
 }
 
-JNIEXPORT void JNICALL
-Java_com_zor_android_visualeffect_tidemark_GlContext_destroySurface(JNIEnv*, jclass, jlong surface) {
-    eglDestroySurface(display, reinterpret_cast<EGLSurface>(surface));
+JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_GlContext_destroy(JNIEnv*, jclass, jlong target) {
+    const std::unique_ptr<Target> old(reinterpret_cast<Target*>(target));
+    if (!old) return;
+    eglDestroyContext(display, old->context);
+    eglDestroySurface(display, old->surface);
 }
 
 JNIEXPORT jboolean JNICALL
-Java_com_zor_android_visualeffect_tidemark_GlContext_makeCurrent(JNIEnv*, jclass, jlong surface, jlong context) {
-    const EGLSurface target = reinterpret_cast<EGLSurface>(surface);
+Java_com_zor_android_visualeffect_tidemark_GlContext_makeCurrent(JNIEnv*, jclass, jlong target) {
+    const Target none;
+    const Target& next = target ? *reinterpret_cast<Target*>(target) : none;
     eglBindAPI(EGL_OPENGL_ES_API);
-    return eglMakeCurrent(display, target, target, reinterpret_cast<EGLContext>(context)) == EGL_TRUE;
+    return eglMakeCurrent(display, next.surface, next.surface, next.context) == EGL_TRUE;
 }
 
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_GlContext_readPixels(

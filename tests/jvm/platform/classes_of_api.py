@@ -3,8 +3,9 @@
 
     classes_of_api.py current.txt OUTPUT SOURCE...
 
-Takes the classes that the sources import or have beside them and those which these need, and of their members the ones whose names occur in
-the sources. A method does nothing and returns nothing, zero or null.
+Takes the classes that the sources import or have beside them and those which these need, and of their members the ones
+whose names occur in the sources. A method does nothing and returns nothing, zero or null; or the object that a class
+makes of itself.
 """
 import pathlib
 import re
@@ -118,6 +119,8 @@ def java_of(member, name, abstract_allowed):
     if abstract_allowed and "default" not in head and "static" not in head or "abstract" in head:
         return f"{head}({parameters}){thrown};"
     result = head.split()[-2]
+    if "static" in head and result == name and f"ctor public {simple}()" in classes[name][1]:
+        return f"{head}({parameters}){thrown} {{ return new {simple}(); }}"
     body = "" if result == "void" else f"return {value_of(result).rpartition(' ')[2]};"
     return f"{head}({parameters}){thrown} {{ {body} }}"
 

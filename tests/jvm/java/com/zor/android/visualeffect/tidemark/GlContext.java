@@ -9,23 +9,19 @@ final class GlContext {
     }
 
     private static long context;
-    private static long surface;
 
     private GlContext() {}
 
     /** A new context, current on this thread, with a framebuffer of this size. */
     static void open(int width, int height) {
         release();
-        context = createContext();
-        surface = createSurface(width, height);
-        if (!makeCurrent(surface, context)) throw new IllegalStateException("no OpenGL ES 2.0 driver");
+        context = create(width, height);
+        if (!makeCurrent(context)) throw new IllegalStateException("no OpenGL ES 2.0 driver");
     }
 
     static void release() {
-        if (context == 0) return;
-        makeCurrent(0, 0);
-        destroySurface(surface);
-        destroyContext(context);
+        makeCurrent(0);
+        destroy(context);
         context = 0;
     }
 
@@ -41,15 +37,11 @@ final class GlContext {
     /** What the library has logged since the last call, a line each. */
     static native String takeLog();
 
-    static native long createContext();
+    static native long create(int width, int height);
 
-    static native void destroyContext(long context);
+    static native void destroy(long context);
 
-    static native long createSurface(int width, int height);
-
-    static native void destroySurface(long surface);
-
-    static native boolean makeCurrent(long surface, long context);
+    static native boolean makeCurrent(long context);
 
     private static native void readPixels(int width, int height, ByteBuffer rgba);
 }

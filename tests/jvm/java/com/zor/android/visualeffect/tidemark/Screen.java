@@ -8,14 +8,9 @@ import java.lang.reflect.Proxy;
 import java.util.Set;
 import java.util.concurrent.ConcurrentHashMap;
 
-import javax.microedition.khronos.egl.EGL10;
-import javax.microedition.khronos.egl.EGLConfig;
-import javax.microedition.khronos.egl.EGLContext;
-import javax.microedition.khronos.egl.EGLDisplay;
-import javax.microedition.khronos.egl.EGLSurface;
-import javax.microedition.khronos.opengles.GL;
+import javax.microedition.khronos.egl.*;
 
-// What lies below the framework's GLSurfaceView: windows without a screen. A frame that is shown holds its GL thread
+// What lies below the framework's GLSurfaceView: windows of up to 160 x 160 pixels without a screen. A frame that is shown holds its GL thread
 // until the test lets the next one come.
 final class Screen {
     static volatile int refreshRate = 60;
@@ -26,36 +21,20 @@ final class Screen {
     private static final Set<Thread> HELD = ConcurrentHashMap.newKeySet();
     private static volatile boolean isOpen;
 
-    private static final class Surface extends EGLSurface {
-        final long handle = GlContext.createSurface(width, height);
-    }
-
-    private static final class Context extends EGLContext {
-        final long handle = GlContext.createContext();
-
-        @Override
-        public GL getGL() {
-            return null;
-        }
-    }
-
     static {
         EGLContext.egl = (EGL10) Proxy.newProxyInstance(Screen.class.getClassLoader(), new Class<?>[] {EGL10.class},
                 (self, method, values) -> call(method.getName(), values));
     }
 
-    private static Object call(String name, Object[] values) {
+    private static Object call(String name, Object[] values) throws InterruptedException {
         switch (name) {
             case "eglGetDisplay": return new EGLDisplay() {};
-            case "eglCreateContext": return new Context();
-            case "eglCreateWindowSurface": return new Surface();
+            case "eglCreateContext": return new EGLContext(GlContext.create(160, 160));
+            case "eglCreateWindowSurface": return new EGLSurface() {};
             case "eglGetError": return EGL10.EGL_SUCCESS;
-            case "eglDestroyContext": GlContext.destroyContext(((Context) values[1]).handle); break;
-            case "eglDestroySurface": GlContext.destroySurface(((Surface) values[1]).handle); break;
+            case "eglDestroyContext": GlContext.destroy(((EGLContext) values[1]).handle); break;
             case "eglSwapBuffers": show(); break;
-            case "eglMakeCurrent":
-                boolean none = values[1] == null;
-                return GlContext.makeCurrent(none ? 0 : ((Surface) values[1]).handle, none ? 0 : ((Context) values[3]).handle);
+            case "eglMakeCurrent": return GlContext.makeCurrent(values[3] == null ? 0 : ((EGLContext) values[3]).handle);
             case "eglChooseConfig":
                 if (values[2] != null) ((EGLConfig[]) values[2])[0] = new EGLConfig() {};
                 ((int[]) values[4])[0] = 1;
@@ -64,21 +43,17 @@ final class Screen {
                 int bits = (int) values[2];
                 ((int[]) values[3])[0] = bits >= EGL10.EGL_BLUE_SIZE && bits <= EGL10.EGL_RED_SIZE ? 8 : 0;
                 break;
-            default:  // eglInitialize, eglTerminate
+            default:  // eglInitialize, eglTerminate, eglDestroySurface
         }
         return true;
     }
 
-    private static synchronized void show() {
+    private static synchronized void show() throws InterruptedException {
         pixels = GlContext.pixels(width, height);
         ++frames;
         SystemClock.nanos += 1000000000 / refreshRate;
         HELD.add(Thread.currentThread());
-        try {
-            while (!isOpen && HELD.contains(Thread.currentThread())) Screen.class.wait();
-        } catch (InterruptedException e) {
-            throw new AssertionError(e);
-        }
+        while (!isOpen && HELD.contains(Thread.currentThread())) Screen.class.wait();
         HELD.remove(Thread.currentThread());
     }
 

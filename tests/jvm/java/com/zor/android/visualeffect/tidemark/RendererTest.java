@@ -192,7 +192,7 @@ public final class RendererTest {
         start();
         drawUntilRest();
         TidemarkView newer = new TidemarkView(new Activity());
-        newer.onAttachedToWindow();
+        newer.onStart();  // as a wallpaper does, which has no window
         newer.setPictures(green, green, white);
         Screen.during(newer, () -> showSurface(newer, SHORT, LONG));
         expectColor(GREEN);

@@ -10,14 +10,14 @@ import java.util.concurrent.ConcurrentHashMap;
 
 import javax.microedition.khronos.egl.*;
 
-// What lies below the framework's GLSurfaceView: windows of up to 160 x 160 pixels without a screen. A frame that is shown holds its GL thread
-// until the test lets the next one come.
+// What lies below the framework's GLSurfaceView: windows of up to 160 x 160 pixels without a screen. A frame that is
+// shown holds its GL thread until the test lets the next one come.
 final class Screen {
     static volatile int refreshRate = 60;
-    static volatile int width;
-    static volatile int height;
+    static volatile int width, height;
     static volatile int frames;  // shown so far
     static volatile byte[] pixels;  // of the last one: R, G, B, A, rows from the bottom
+    private static final Set<Thread.State> RESTING = Set.of(Thread.State.WAITING, Thread.State.TERMINATED);
     private static final Set<Thread> HELD = ConcurrentHashMap.newKeySet();
     private static volatile boolean isOpen;
 
@@ -31,7 +31,6 @@ final class Screen {
             case "eglGetDisplay": return new EGLDisplay() {};
             case "eglCreateContext": return new EGLContext(GlContext.create(160, 160));
             case "eglCreateWindowSurface": return new EGLSurface() {};
-            case "eglGetError": return EGL10.EGL_SUCCESS;
             case "eglDestroyContext": GlContext.destroy(((EGLContext) values[1]).handle); break;
             case "eglSwapBuffers": show(); break;
             case "eglMakeCurrent": return GlContext.makeCurrent(values[3] == null ? 0 : ((EGLContext) values[3]).handle);
@@ -84,7 +83,7 @@ final class Screen {
             Field field = GLSurfaceView.class.getDeclaredField("mGLThread");
             field.setAccessible(true);
             Thread thread = (Thread) field.get(view);
-            while (thread.isAlive() && !HELD.contains(thread) && thread.getState() != Thread.State.WAITING) Thread.sleep(1);
+            while (!HELD.contains(thread) && !RESTING.contains(thread.getState())) Thread.sleep(1);
             return thread;
         } catch (ReflectiveOperationException | InterruptedException e) {
             throw new AssertionError(e);

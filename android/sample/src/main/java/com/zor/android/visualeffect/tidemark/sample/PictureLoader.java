@@ -16,7 +16,10 @@ import java.io.FileNotFoundException;
 import java.io.IOException;
 import java.io.InputStream;
 
-/** Lets the user choose a picture, and reads it: four bytes a pixel, upright, and small enough for a texture of every device. */
+/**
+ * Lets the user choose a picture, and reads it: four bytes a pixel, upright, and small enough for a texture of every
+ * device.
+ */
 final class PictureLoader {
     private static final int LONGEST_SIDE = 2048;
 

@@ -17,7 +17,7 @@ if [ "$fix" ]; then
     exit
 fi
 git ls-files '*.cpp' '*.h' | xargs clang-format --dry-run --Werror
-shellcheck -x scripts/*.sh .ci/run tests/arm64/*.sh tests/jvm/*.sh
+shellcheck -x scripts/*.sh .ci/run tests/*.sh tests/*/*.sh
 git ls-files '*.py' | PYTHONPYCACHEPREFIX=build/pycache xargs python3 -m py_compile
 [ ! -d web/node_modules ] || web/node_modules/.bin/tsc --noEmit -p web
 

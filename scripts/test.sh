@@ -4,17 +4,19 @@
 #             sanitizers, and some seconds of fuzzing
 #   --arm64   64-bit Arm: vector arithmetic in the machine code of the loops over many numbers, and results, computed in
 #             an emulator, that equal this machine's bit for bit
+#   --android the library as Android takes it: compiled, linked and sealed for three processors, and run with the
+#             shrunk Java classes
 #   --web     the web page in Chromium
 set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/common.sh
 parts=()
-while [[ "${1-}" =~ ^--(native|arm64|web)$ ]]; do
+while [[ "${1-}" =~ ^--(native|arm64|android|web)$ ]]; do
     parts+=("${BASH_REMATCH[1]}")
     shift
 done
-no_more_arguments "scripts/test.sh [--native] [--arm64] [--web]" "$@"
-[ ${#parts[@]} -gt 0 ] || parts=(native arm64 web)
+no_more_arguments "scripts/test.sh [--native] [--arm64] [--android] [--web]" "$@"
+[ ${#parts[@]} -gt 0 ] || parts=(native arm64 android web)
 
 test_native() {
     install_missing "${build_packages[@]}" "${lint_packages[@]}" "${test_packages[@]}" "${fuzz_packages[@]}"
@@ -26,11 +28,11 @@ test_native() {
     done
     cmake --preset fuzz -DTIDEMARK_WERROR=ON >/dev/null
     cmake --build --preset fuzz
-    ctest --preset release -j "$(nproc)"
+    ctest --preset release -j "$(nproc)" --label-exclude android
     ctest --preset asan -j "$(nproc)"
     ctest --preset fuzz -j "$(nproc)"
     # Java, the screen and long sessions are about contracts which no compiler changes.
-    ctest --preset clang -j "$(nproc)" --exclude-regex "^(jvm|window|endurance)"
+    ctest --preset clang -j "$(nproc)" --exclude-regex "^(android|jvm|window|endurance)"
 }
 
 test_arm64() {
@@ -45,6 +47,13 @@ test_arm64() {
     tests/arm64/vectors.sh build/arm64/results
     diff <(build/arm64-reference/results) <(qemu-aarch64 -L /usr/aarch64-linux-gnu build/arm64/results)
     echo "The results are those of this machine, bit for bit."
+}
+
+test_android() {
+    install_missing "${build_packages[@]}" "${test_packages[@]}" "${android_packages[@]}"
+    cmake --preset release -DTIDEMARK_TESTS=ON -DTIDEMARK_WERROR=ON >/dev/null
+    cmake --build --preset release
+    ctest --preset release -j "$(nproc)" --label-regex android
 }
 
 test_web() {

@@ -1,16 +1,17 @@
 #!/usr/bin/env bash
-# elf_test.sh LIBRARY NATIVES_H: what ships is small, exports the native methods that the header declares and nothing
-# else, needs nothing of the C++ runtime, has no text relocations, and leaves nothing writable that the loader could have
-# sealed.
+# elf_test.sh LIBRARY NATIVES_H [PAGE]: what ships is small, exports the native methods that the header declares and
+# nothing else, needs nothing of the C++ runtime, has no text relocations, leaves nothing writable that the loader could
+# have sealed, and lies in pages of the given size.
 set -euo pipefail
 library=$1
+page=${3-0x1000}
 fail() {
     echo "$library: $*" >&2
     exit 1
 }
-diff <(nm -D --defined-only "$library" | awk '{print $NF}' | sort) <(grep -o 'Java_[A-Za-z0-9_]*' "$2" | sort) ||
+diff <(llvm-nm -D --defined-only "$library" | awk '{print $NF}' | sort) <(grep -o 'Java_[A-Za-z0-9_]*' "$2" | sort) ||
     fail "exports other names (<) than the header declares (>)"
-! nm -D --undefined-only "$library" | awk '{print $NF}' | grep -v '^__cxa_\(atexit\|finalize\)' |
+! llvm-nm -D --undefined-only "$library" | awk '{print $NF}' | grep -v '^__cxa_\(atexit\|finalize\)' |
     grep -E '^(_Zn[wa]|_Zd[la]|_ZT|_ZN?K?St|__cxa_|__gxx|_Unwind)' || fail "needs the C++ runtime"
 dynamic=$(readelf -dW "$library")
 segments=$(readelf -lW "$library")
@@ -18,7 +19,8 @@ segments=$(readelf -lW "$library")
 [[ $dynamic == *BIND_NOW* && $segments == *GNU_RELRO* ]] || fail "not linked with relro and now"
 grep -q 'GNU_STACK.* RW ' <<<"$segments" || fail "the stack can be executed"
 ! grep 'LOAD.* RWE ' <<<"$segments" || fail "writable memory can be executed"
-strip -o "$library.stripped" "$library"
+! grep 'LOAD ' <<<"$segments" | grep -v " $page$" || fail "segments that do not begin with a page of $page"
+llvm-strip -o "$library.stripped" "$library"
 bytes=$(stat -c %s "$library.stripped")
 echo "stripped: $bytes bytes"
-((bytes < 120000)) || fail "more than 120000 bytes stripped"
+((bytes < 90000)) || fail "more than 90000 bytes stripped"

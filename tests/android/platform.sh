@@ -1,0 +1,18 @@
+#!/usr/bin/env bash
+# platform.sh TRIPLE DIRECTORY: stand-ins to link with, whose names are those that the library may use of Android's own
+# libraries at API level 21. None of them is of the C++ runtime.
+set -euo pipefail
+triple=$1
+mkdir -p "$2"
+cd "$2"
+library() {
+    printf 'void %s(void) {}\n' "${@:2}" | clang-14 --target="$triple" -x c -w -fno-builtin -shared -nostdlib \
+        -fuse-ld=lld -Wl,-soname,"$1" -o "$1" -
+}
+mapfile -t gl < <(sed -nE 's/^GL_APICALL .* GL_APIENTRY (gl\w+).*/\1/p' /usr/include/GLES2/gl2.h)
+library libGLESv2.so "${gl[@]}"
+library liblog.so __android_log_print
+library libjnigraphics.so AndroidBitmap_{getInfo,lockPixels,unlockPixels}
+library libm.so exp floorf
+library libc.so __cxa_atexit free lrand48 malloc memcmp memcpy memmove memset realloc strlen \
+    __aeabi_{idiv,memclr,memclr4,memcpy,memcpy4,memmove4}

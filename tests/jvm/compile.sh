@@ -29,6 +29,6 @@ sed 's/<manifest /&package="com.zor.android.visualeffect.tidemark.sample" /
     -o resources/linked.apk --java resources resources/compiled.zip
 
 mapfile -t shipped < <(java "$source/android" resources)
-compile --release 8 -parameters -h headers -cp classes/platform -d classes/shipped "${shipped[@]}"
+compile --release 8 -h headers -cp classes/platform -d classes/shipped "${shipped[@]}"
 compile --release 8 -cp classes/platform -d classes/fakes "${fakes[@]}"
 compile --release 17 -h headers -cp "classes/fakes:classes/platform:classes/shipped:$JUNIT" -d classes/tests "${tests[@]}"

@@ -63,8 +63,8 @@ public final class WholeRunTest {
             String[] words = line.split(" ");
             if (!calls.containsKey(words[0])) continue;  // logged by the library
             journal.append(words[0].equals("frame") ? line.substring(0, line.length() - 1) : line);
-            double[] n = Arrays.stream(words).mapToDouble(word -> word.matches("[\\d.]+|0x.*") ? Double.parseDouble(word) : 0)
-                    .toArray();
+            double[] n = Arrays.stream(words)
+                    .mapToDouble(word -> word.matches("[\\d.]+|0x.*") ? Double.parseDouble(word) : 0).toArray();
             calls.get(words[0]).make(words, n);
             journal.append("\n" + GlContext.takeLog());
         }

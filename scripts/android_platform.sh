@@ -16,6 +16,6 @@ apt=(apt-get -qq -o Dir::Etc::SourceList=/dev/null -o Dir::Etc::SourceParts="$pl
 "${apt[@]}" update
 (cd "$platform" && "${apt[@]}" source --download-only android-platform-frameworks-base)
 tar -x -f "$platform"/android-platform-frameworks-base_*.orig.tar.* -C "$platform" \
-    api/current.txt opengl/java/android/opengl/{GLSurfaceView,EGLLogWrapper}.java
+    api/current.txt opengl/java/android/opengl/GLSurfaceView.java
 rm -rf "$platform"/{apt,parts,lists,android-platform-frameworks-base_*}
 touch "$platform/complete"

@@ -6,8 +6,8 @@
     build_packages=(cmake g++ ninja-build openjdk-17-jdk-headless libgles-dev libegl-dev libegl-mesa0 libgl1-mesa-dri
         libstb-dev libcli11-dev libglfw3-dev ffmpeg)
     lint_packages=(clang clang-format clang-tidy git python3 shellcheck)
-    test_packages=(clang libgtest-dev junit4 aapt android-framework-res python3 glslang-tools binutils llvm valgrind xvfb
-        xauth xdotool)
+    test_packages=(clang libgtest-dev junit4 libjetbrains-annotations-java aapt android-framework-res python3
+        glslang-tools binutils llvm valgrind xvfb xauth xdotool)
     fuzz_packages=(clang libclang-rt-dev llvm)
     arm64_packages=(g++-aarch64-linux-gnu qemu-user)
     android_packages=(clang lld llvm libc++-14-dev libc6-dev-arm64-cross libc6-dev-armel-cross android-liblog-dev

@@ -27,7 +27,7 @@ has_version() {
     grep -qF "$2" "$1" || { echo "$1 lacks $2" >&2 && exit 1; }
 }
 has_version android/tidemark/build.gradle "version = '$version'"
-has_version android/sample/build.gradle "versionName '$version'"
+has_version android/sample/build.gradle "versionName = '$version'"
 has_version web/package.json "\"version\": \"$version\""
 has_version CHANGELOG.md "## [$version]"
 

@@ -5,7 +5,7 @@ source=$1
 cd "$2"
 "$source/scripts/android_platform.sh"
 platform=$source/build/android-platform
-rm -rf classes generated resources && mkdir -p classes generated resources
+rm -rf classes framework generated resources && mkdir -p classes generated resources
 java() {
     find "$@" -name '*.java'
 }
@@ -14,7 +14,13 @@ compile() {
 }
 mapfile -t shipped < <(java "$source/android")
 mapfile -t tests < <(java "$source/tests/jvm/java")
-mapfile -t fakes < <(java "$source/tests/jvm/fakes")
+
+# The framework's own view, without what it keeps from apps: tracing and names of errors. Its surface comes by a test.
+mkdir framework
+sed '/UnsupportedAppUsage/d; /Trace\.trace/d; /android\.os\.Trace/d; /holder.addCallback/d
+    s/EGLLogWrapper.getErrorString(error)/error/' \
+    "$platform/opengl/java/android/opengl/GLSurfaceView.java" >framework/GLSurfaceView.java
+mapfile -t fakes < <(java "$source/tests/jvm/fakes" framework)
 
 "$PYTHON" "$source/tests/jvm/platform/classes_of_api.py" "$platform/api/current.txt" generated "${shipped[@]}" "${fakes[@]}"
 mapfile -t generated < <(java generated)
@@ -24,11 +30,13 @@ mapfile -t generated < <(java generated)
 sed 's/<manifest /&package="com.zor.android.visualeffect.tidemark.sample" /
     s/<application/<uses-sdk android:minSdkVersion="21" android:targetSdkVersion="29" \/>&/' \
     "$source/android/sample/src/main/AndroidManifest.xml" >resources/manifest.xml
-"$AAPT2" compile --dir "$source/android/sample/src/main/res" -o resources/compiled.zip
+for module in tidemark sample; do
+    "$AAPT2" compile --dir "$source/android/$module/src/main/res" -o resources/$module.zip
+done
 "$AAPT2" link -I /usr/share/android-framework-res/framework-res.apk --manifest resources/manifest.xml \
-    -o resources/linked.apk --java resources resources/compiled.zip
+    -o resources/linked.apk --java resources --extra-packages com.zor.android.visualeffect.tidemark resources/*.zip
 
 mapfile -t shipped < <(java "$source/android" resources)
-compile --release 8 -h headers -cp classes/platform -d classes/shipped "${shipped[@]}"
+compile --release 8 -h headers -cp "classes/platform:$ANNOTATIONS" -d classes/shipped "${shipped[@]}"
 compile --release 8 -cp classes/platform -d classes/fakes "${fakes[@]}"
 compile --release 17 -h headers -cp "classes/fakes:classes/platform:classes/shipped:$JUNIT" -d classes/tests "${tests[@]}"

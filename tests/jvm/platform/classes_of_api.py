@@ -3,8 +3,9 @@
 
     classes_of_api.py current.txt OUTPUT SOURCE...
 
-Takes the classes that the sources import and those which these need, and of their members the ones whose names occur in
-the sources. A method does nothing and returns nothing, zero or null.
+Takes the classes that the sources import or have beside them and those which these need, and of their members the ones
+whose names occur in the sources. A method does nothing and returns nothing, zero or null; or the object that a class
+makes of itself.
 """
 import pathlib
 import re
@@ -61,8 +62,10 @@ def taken(name):
 
 
 wanted = set()
+unimported = words - set(re.findall(r"^import .*\.(\w+);", text, re.M))
+of_same_package = {package + "." + word for package in re.findall(r"^package (.*);", text, re.M) for word in unimported}
 due = {name for name in classes if re.search(r"import (static )?" + re.escape(name) + r"[.;]", text)
-       or "." in name and name in text}
+       or name in of_same_package or "." in name and name in text}
 while due - wanted:
     name = (due - wanted).pop()
     wanted.add(name)
@@ -116,6 +119,8 @@ def java_of(member, name, abstract_allowed):
     if abstract_allowed and "default" not in head and "static" not in head or "abstract" in head:
         return f"{head}({parameters}){thrown};"
     result = head.split()[-2]
+    if "static" in head and result == name and f"ctor public {simple}()" in classes[name][1]:
+        return f"{head}({parameters}){thrown} {{ return new {simple}(); }}"
     body = "" if result == "void" else f"return {value_of(result).rpartition(' ')[2]};"
     return f"{head}({parameters}){thrown} {{ {body} }}"
 
@@ -129,6 +134,8 @@ def write(name, indent):
     if " enum " in " " + declaration:
         constants = [m.split()[-1] for m in classes[name][1] if m.startswith("enum_constant")]
         yield f"{indent}    {', '.join(constants)};"
+    if call_of_super(name) and not any(member.startswith("ctor") for member in classes[name][1]):
+        yield f"{indent}    protected {simple}() {{ {call_of_super(name)} }}"
     for member in taken(name):
         if " enum " not in " " + declaration or "valueOf" not in member and "values" not in member:
             yield f"{indent}    {java_of(member, name, is_interface)}"

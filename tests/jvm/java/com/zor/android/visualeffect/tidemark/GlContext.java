@@ -2,17 +2,27 @@ package com.zor.android.visualeffect.tidemark;
 
 import java.nio.ByteBuffer;
 
-/** An OpenGL ES 2.0 context without a window, current on the thread that made it. */
+/** OpenGL ES 2.0 without a window. */
 final class GlContext {
     static {
         System.loadLibrary("tidemark_jvm_gl");
     }
 
+    private static long context;
+
     private GlContext() {}
 
+    /** A new context, current on this thread, with a framebuffer of this size. */
     static void open(int width, int height) {
-        String problem = renew(width, height);
-        if (problem != null) throw new IllegalStateException(problem);
+        release();
+        context = create(width, height);
+        if (!makeCurrent(context)) throw new IllegalStateException("no OpenGL ES 2.0 driver");
+    }
+
+    static void release() {
+        makeCurrent(0);
+        destroy(context);
+        context = 0;
     }
 
     /** R, G, B, A, rows from the bottom. */
@@ -27,9 +37,11 @@ final class GlContext {
     /** What the library has logged since the last call, a line each. */
     static native String takeLog();
 
-    static native void release();
+    static native long create(int width, int height);
 
-    private static native String renew(int width, int height);
+    static native void destroy(long context);
+
+    static native boolean makeCurrent(long context);
 
     private static native void readPixels(int width, int height, ByteBuffer rgba);
 }

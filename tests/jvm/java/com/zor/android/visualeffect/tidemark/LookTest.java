@@ -7,6 +7,7 @@ import static org.junit.Assert.assertTrue;
 import org.junit.Test;
 
 import java.io.ByteArrayInputStream;
+import java.io.ByteArrayOutputStream;
 import java.io.IOException;
 import java.lang.reflect.Field;
 import java.lang.reflect.Modifier;
@@ -33,7 +34,9 @@ public final class LookTest {
             assertEquals(name, field.getName());
             assertEquals(name, Double.parseDouble(found.group(4)), valueOf(field, new Look()), 1e-6);
             for (String limit : List.of(found.group(1), found.group(2))) {
-                assertEquals(name, Double.parseDouble(limit), valueOf(field, load(name + " = " + limit)), 1e-6);
+                ByteArrayOutputStream stored = new ByteArrayOutputStream();
+                load(name + " = " + limit).toProperties().store(stored, null);
+                assertEquals(name, Double.parseDouble(limit), valueOf(field, load(stored.toString())), 1e-6);
             }
             for (String refused : List.of("-1", "1" + found.group(2), found.group(4) + "f", "NaN")) {
                 expectRefusal(name, name + " = " + refused);

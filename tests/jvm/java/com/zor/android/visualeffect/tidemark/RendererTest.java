@@ -5,6 +5,7 @@ import static org.junit.Assert.assertThrows;
 import static org.junit.Assert.assertTrue;
 
 import android.app.Activity;
+import android.content.res.TypedArray;
 import android.graphics.Bitmap;
 import android.opengl.GLES20;
 import android.os.SystemClock;
@@ -14,9 +15,9 @@ import org.junit.After;
 import org.junit.Before;
 import org.junit.Test;
 
-import java.util.ArrayList;
 import java.util.Arrays;
 import java.util.List;
+import java.util.Vector;
 
 /** The view and its renderer, from the touch to the screen: when they draw, when they rest, and what they show. */
 public final class RendererTest {
@@ -25,13 +26,15 @@ public final class RendererTest {
     private static final int RED = 0xffc04030;
     private static final int GREEN = 0xff40a050;
 
-    private final TidemarkView view = new TidemarkView(new Activity());
+    private final Activity activity = new Activity();
+    private final TidemarkView view = new TidemarkView(activity);
+    private final ActivityFollower follower = new ActivityFollower(activity, view);
     private final Bitmap red = plain(Bitmap.Config.ARGB_8888, RED);
     private final Bitmap green = plain(Bitmap.Config.ARGB_8888, GREEN);
     private final Bitmap white = plain(Bitmap.Config.ARGB_8888, 0xffffffff);
-    private final List<String> heard = new ArrayList<>();
-    private int width;
-    private int height;
+    private final List<String> heard = new Vector<>();
+    private int framesSeen = Screen.frames;
+    private int handedOver = Bitmap.locksMade;
 
     @Before
     public void attach() {
@@ -51,30 +54,31 @@ public final class RendererTest {
 
     @After
     public void release() {
-        view.onDetachedFromWindow();
-        GlContext.release();
+        Screen.during(view, view::onDetachedFromWindow);
     }
 
     @Test
     public void drawsWhileSomethingMoves() {
         int cleared = GLES20.clears;
-        view.renderer.onDrawFrame(null);
-        start();
+        surface(SHORT, LONG);
+        assertEquals("frames without water", 1, drawUntilRest());
+        view.setPictures(red, green, white);
         assertEquals("frames of still water", 1, drawUntilRest());
         assertEquals("frames of drawn water", 0, drawUntilRest());
         expectColor(RED);
-        byte[] still = GlContext.pixels(width, height);
+        byte[] still = Screen.pixels;
         touch(MotionEvent.ACTION_DOWN, 20, 40);
         touch(MotionEvent.ACTION_UP, 20, 40);
         drawFrame();
-        assertTrue("a touch raises a wave", difference(still, GlContext.pixels(width, height)) > 30);
+        assertTrue("a touch raises a wave", difference(still, Screen.pixels) > 30);
         long before = SystemClock.nanos;
-        view.renderer.onDrawFrame(null);
+        Screen.refreshRate = 240;
+        drawFrame();
+        Screen.refreshRate = 60;
         assertTrue("without ink no frame waits", SystemClock.nanos - before < 10000000);
         int frames = drawUntilRest();
         assertTrue(frames + " frames of waves", frames > 60 && frames < 480);
-        assertTrue("water at rest looks as before", difference(still, GlContext.pixels(width, height)) <= 8);
-        drawFrame();
+        assertTrue("water at rest looks as before", difference(still, Screen.pixels) <= 8);
         assertEquals("frames without water", cleared + 1, GLES20.clears);
     }
 
@@ -82,12 +86,6 @@ public final class RendererTest {
     public void aRotationShowsTheOtherPicture() {
         start();
         drawUntilRest();
-        surface(LONG, SHORT);
-        assertEquals("frames after a rotation", 1, drawUntilRest());
-        expectColor(GREEN);
-
-        // A window that changes its size keeps its context.
-        surface(LONG, LONG);
         resize(SHORT, SHORT);
         drawUntilRest();
         resize(LONG, SHORT);
@@ -106,10 +104,13 @@ public final class RendererTest {
         drawStroke();
         assertTrue("ink along a stroke", inked() > 100);
 
-        view.onStop();
-        drawFrame();
-        surface(SHORT, LONG);
-        view.onStart();
+        view.setPreserveEGLContextOnPause(false);
+        stop();
+        drawUntilRest();
+        view.clearInk();
+        follower.onActivityStarted(new Activity());
+        assertEquals("frames of a stopped activity", 0, drawUntilRest());
+        restart();
         touch(MotionEvent.ACTION_MOVE, 60, 100);
         assertTrue("ink that never rests", drawUntilRest() < 600);
         expectColor(RED);
@@ -130,10 +131,8 @@ public final class RendererTest {
         view.setInk(true);
         drawUntilRest();
         drawStroke();
-        view.onStop();
-        view.onStart();
-        resize(SHORT, LONG);
-        drawFrame();
+        stop();
+        restart();
         assertTrue("ink goes on after a pause that kept the context", inked() > 100);
         view.setInk(false);
         view.setInk(true);
@@ -162,9 +161,9 @@ public final class RendererTest {
     }
 
     private void expectHandOvers(int expected, String after) {
-        int before = Bitmap.locksMade;
         drawUntilRest();
-        assertEquals("hand-overs after " + after, expected, Bitmap.locksMade - before);
+        assertEquals("hand-overs after " + after, expected, Bitmap.locksMade - handedOver);
+        handedOver = Bitmap.locksMade;
     }
 
     @Test
@@ -180,13 +179,12 @@ public final class RendererTest {
     public void whatIsSetWhileTheViewIsAwayIsKept() {
         start();
         drawUntilRest();
-        view.onDetachedFromWindow();
-        view.setPictures(green, green, white);
-        view.queue.clear();
+        Screen.during(view, view::onDetachedFromWindow);
+        view.setPictures(green, red, white);
         view.onAttachedToWindow();
-        surface(SHORT, LONG);
+        surface(LONG, SHORT);
         drawUntilRest();
-        expectColor(GREEN);
+        expectColor(RED);
     }
 
     @Test
@@ -194,19 +192,15 @@ public final class RendererTest {
         start();
         drawUntilRest();
         TidemarkView newer = new TidemarkView(new Activity());
-        newer.onAttachedToWindow();
+        newer.onStart();  // as a wallpaper does, which has no window
         newer.setPictures(green, green, white);
-        GlContext.open(SHORT, LONG);
-        newer.renderer.onSurfaceCreated(null, null);
-        newer.renderer.onSurfaceChanged(null, SHORT, LONG);
-        newer.renderer.onDrawFrame(null);
+        Screen.during(newer, () -> showSurface(newer, SHORT, LONG));
         expectColor(GREEN);
         touch(MotionEvent.ACTION_DOWN, 20, 40);
         int handedOver = Bitmap.locksMade;
-        drawFrame();
+        drawUntilRest();
         assertEquals("hand-overs of an older view", handedOver, Bitmap.locksMade);
-        expectColor(GREEN);
-        newer.onDetachedFromWindow();
+        Screen.during(newer, newer::onDetachedFromWindow);
         touch(MotionEvent.ACTION_UP, 20, 40);
         drawUntilRest();
         expectColor(RED);
@@ -240,22 +234,57 @@ public final class RendererTest {
         expectColor(RED);
     }
 
+    @Test
+    public void aLayoutSaysWhatTheViewShows() {
+        start();
+        ViewAttributes.apply(new TypedArray() {
+            @Override
+            public boolean getBoolean(int index, boolean usual) {
+                return index == R.styleable.TidemarkView_ink;
+            }
+        }, view);
+        drawUntilRest();
+        drawStroke();
+        assertTrue("ink of a layout", inked() > 100);
+    }
+
     private void start() {
         surface(SHORT, LONG);
         view.setPictures(red, green, white);
     }
 
+    // A first surface, or one after the view was out of its window, where its thread and its context end.
     private void surface(int width, int height) {
-        GlContext.open(width, height);
-        view.renderer.onSurfaceCreated(null, null);
-        resize(width, height);
+        Screen.during(view, () -> {
+            view.onDetachedFromWindow();
+            view.onAttachedToWindow();
+            showSurface(view, width, height);
+        });
+    }
+
+    private static void showSurface(TidemarkView view, int width, int height) {
+        Screen.width = width;
+        Screen.height = height;
+        view.surfaceCreated(null);
+        view.surfaceChanged(null, 0, width, height);
     }
 
     private void resize(int width, int height) {
-        this.width = width;
-        this.height = height;
-        view.renderer.onSurfaceChanged(null, width, height);
-        view.renderRequested = true;  // as GLSurfaceView does for a new surface
+        Screen.during(view, () -> showSurface(view, width, height));
+    }
+
+    private void stop() {
+        Screen.during(view, () -> {
+            follower.onActivityStopped(activity);
+            view.surfaceDestroyed(null);
+        });
+    }
+
+    private void restart() {
+        Screen.during(view, () -> {
+            follower.onActivityStarted(activity);
+            showSurface(view, Screen.width, Screen.height);
+        });
     }
 
     private void touch(int action, float x, float y) {
@@ -273,7 +302,7 @@ public final class RendererTest {
 
     // Pixels darker than the background.
     private int inked() {
-        byte[] pixels = GlContext.pixels(width, height);
+        byte[] pixels = Screen.pixels;
         int dark = 0;
         for (int i = 0; i < pixels.length; i += 4) {
             if ((pixels[i] & 255) < 150) ++dark;
@@ -282,20 +311,20 @@ public final class RendererTest {
     }
 
     private void drawFrame() {
-        view.renderRequested = false;
-        SystemClock.nanos += 1000000000 / 60;
-        view.renderer.onDrawFrame(null);
+        Screen.goOn(view);
+        framesSeen = Screen.frames;
     }
 
     private int drawUntilRest() {
-        int frames = 0;
-        for (; view.renderRequested && frames < 3000; ++frames) drawFrame();
+        for (int i = 0; Screen.goOn(view) && i < 3000; ++i) continue;
+        int frames = Screen.frames - framesSeen;
+        framesSeen += frames;
         return frames;
     }
 
     private void expectColor(int argb) {
         int[] expected = {argb >> 16 & 255, argb >> 8 & 255, argb & 255};
-        byte[] pixels = GlContext.pixels(width, height);
+        byte[] pixels = Screen.pixels;
         for (int i = 0; i < pixels.length; ++i) {
             if (i % 4 == 3) continue;
             assertTrue((pixels[i] & 255) + " at byte " + i, Math.abs((pixels[i] & 255) - expected[i % 4]) <= 8);

@@ -43,10 +43,18 @@ public final class JniTidemarkRender {
      */
     public native void transferPortraitBGBitmap(Bitmap bitmap);
 
-    /** As {@link #transferPortraitBGBitmap}, for landscape. */
+    /**
+     * As {@link #transferPortraitBGBitmap}, for landscape.
+     *
+     * @param bitmap likewise
+     */
     public native void transferLandscapeBGBitmap(Bitmap bitmap);
 
-    /** As {@link #transferPortraitBGBitmap}, for the light on the waves, of any proportions. */
+    /**
+     * As {@link #transferPortraitBGBitmap}, for the light on the waves.
+     *
+     * @param bitmap likewise, of any proportions
+     */
     public native void transferWaterBitmap(Bitmap bitmap);
 
     /**
@@ -76,8 +84,10 @@ public final class JniTidemarkRender {
      * @param positions receives x, y, z of every vertex in model units; 3 * vertexCount floats
      * @param indices receives two triangles a cell, as unsigned vertex numbers; 6 * (N - 1) * (N - 1) shorts
      * @param vertexCount vertices to fill, N * N
-     * @param meshSizeWidth extent along x in model units, at least 1; meshSizeHeight likewise
-     * @param numDetailsWidth vertices along x, N; numDetailsHeight too
+     * @param meshSizeWidth extent along x in model units, at least 1
+     * @param meshSizeHeight likewise along y
+     * @param numDetailsWidth vertices along x, N
+     * @param numDetailsHeight too
      */
     public native void initWaters(float[] positions, short[] indices, int vertexCount, int meshSizeWidth,
             int meshSizeHeight, int numDetailsWidth, int numDetailsHeight);
@@ -89,8 +99,10 @@ public final class JniTidemarkRender {
      *
      * @param velocity speeds in model units a step
      * @param height heights in model units; kept within -100 to 100
-     * @param xStart first x, at least 1; yStart likewise
-     * @param xEnd one past the last x, at most N - 1; yEnd likewise
+     * @param xStart first x, at least 1
+     * @param yStart first y, likewise
+     * @param xEnd one past the last x, at most N - 1
+     * @param yEnd one past the last y, likewise
      * @param stride elements from one y to the next, N
      * @param rowCount ignored; N
      * @param checkCalm whether to look for calm
@@ -106,10 +118,12 @@ public final class JniTidemarkRender {
      * on the far sides stay as they are. On the mesh a counts down a column and b across the columns.
      *
      * @param field heights (or speeds) in model units, countA * countB floats, element {@code b * countA + a}
-     * @param extentA range of posA, in any unit, at least 1; extentB likewise
-     * @param countA elements along a, N; countB likewise
-     * @param posA where, -extentA / 2 to extentA / 2; beyond it, the part of the cone inside the field is added; posB
-     *     likewise
+     * @param extentA range of posA, in any unit, at least 1
+     * @param extentB likewise of posB
+     * @param countA elements along a, N
+     * @param countB likewise along b
+     * @param posA where, -extentA / 2 to extentA / 2; beyond it, the part of the cone inside the field is added
+     * @param posB likewise
      * @param amplitude a third of the cone's height; negative for a hollow
      */
     public native void ripple(float[] field, int extentA, int extentB, int countA, int countB, float posA, float posB,
@@ -133,16 +147,21 @@ public final class JniTidemarkRender {
      * @param positions from {@link #initWaters}
      * @param heightAttribs for each vertex its height and those of the vertices to its right and above it, 3 floats
      * @param indices from {@link #initWaters}
-     * @param positionFloats floats of {@code positions}, 3 * N * N; heightFloats likewise
+     * @param positionFloats floats of {@code positions}, 3 * N * N
+     * @param heightFloats likewise
      * @param indexCount shorts of {@code indices}, 6 * (N - 1) * (N - 1)
      * @param mvp from model units to clip space, 16 floats, column by column; it must not turn or tilt the mesh
-     * @param meshSizeWidth extent along x in model units that the picture covers, at least 1; meshSizeHeight likewise
-     * @param numDetailsWidth vertices along x, N; numDetailsHeight too
+     * @param meshSizeWidth extent along x in model units that the picture covers, at least 1
+     * @param meshSizeHeight likewise along y
+     * @param numDetailsWidth vertices along x, N
+     * @param numDetailsHeight too
      * @param refractiveIndex of the water, 1 for no bending
      * @param alphaMix share of the light's picture on a wave, 0 to 1
      * @param alphaScale1 factor on that share, 0 to 1
      * @param alphaScale2 factor on the other share; not read by the shaders of today
-     * @param inkRed ink colour, with inkGreen and inkBlue, 0 to 0.75; more brightens instead of darkening
+     * @param inkRed of the ink's colour, 0 to 0.75; more brightens instead of darkening
+     * @param inkGreen likewise
+     * @param inkBlue likewise
      * @param fresnelRatio extra light on slopes that face the light
      * @param specularRatio strength of the highlights; the picture takes up to 5.5 of it, with ink up to 4.5
      * @param exponent sharpness of the highlights

@@ -1,5 +1,7 @@
 package com.zor.android.visualeffect.tidemark;
 
+import org.jetbrains.annotations.NotNull;
+
 /**
  * Water on a screen that is looked at: takes what happens (touches, another size, other pictures, another look) and
  * draws a frame when something has changed.
@@ -14,6 +16,7 @@ public final class LiveWater {
         RESTING,
         /** Nothing to draw yet. */
         WAITING,
+        /** The framebuffer holds another picture. */
         DRAWN
     }
 
@@ -28,52 +31,93 @@ public final class LiveWater {
     private int texturesDue;  // besides those handed over
     private double proportions;  // to which the backgrounds were last cropped
 
-    /** {@code seed} fixes where the rain falls. */
-    public LiveWater(JniTidemarkRender library, Look look, int seed) {
+    /**
+     * Water that has no size and no pictures yet.
+     *
+     * @param library whose calls it makes
+     * @param look is copied
+     * @param seed fixes where the rain falls
+     */
+    public LiveWater(@NotNull JniTidemarkRender library, @NotNull Look look, int seed) {
         host = new WaterHost(library, look, 1, 1, seed);
     }
 
     /**
      * Nothing is drawn before the first pictures. Hands over only those that are other bitmaps than the last ones; they
      * must stay alive and unchanged.
+     *
+     * @param pictures with the bitmaps
      */
-    public void setPictures(Pictures pictures) {
+    public void setPictures(@NotNull Pictures pictures) {
         handOverDue |= pictures.newSince(this.pictures);
         this.pictures = pictures;
     }
 
-    /** In pixels, each at least 1. The ink is lost, the water stays. */
+    /**
+     * For a view of another size. The ink is lost, the water stays.
+     *
+     * @param width pixels, at least 1
+     * @param height likewise
+     */
     public void resize(int width, int height) {
         host.resize(width, height);
         clock.rest();
         setUpDue = true;
     }
 
-    public void setLook(Look look) {
+    /**
+     * Takes over all values; the water and the ink stay.
+     *
+     * @param look is copied
+     */
+    public void setLook(@NotNull Look look) {
         host.setLook(look);
     }
 
-    /** Whether touches drop ink; they do not at first. A switch ends the stroke that is being drawn. */
+    /**
+     * Switches the ink; it is off at first. A switch ends the stroke that is being drawn.
+     *
+     * @param withInk whether touches drop ink
+     */
     public void setInk(boolean withInk) {
         if (withInk == this.withInk) return;
         this.withInk = withInk;
         setUpDue = true;
     }
 
+    /**
+     * Switches the rain; it is off at first.
+     *
+     * @param falling whether it rains
+     */
     public void setRain(boolean falling) {
         host.rain(falling);
     }
 
+    /** Lets all ink vanish with the next frame. */
     public void clearInk() {
         host.clearInk();
     }
 
-    /** One touch event, as {@link WaterHost#touch} takes it. */
+    /**
+     * One touch event.
+     *
+     * @param action one of {@link WaterHost}'s
+     * @param x pixels from the left edge of the view
+     * @param y pixels from its top edge
+     * @param pressure around 1
+     */
     public void touch(int action, int x, int y, float pressure) {
         host.touch(action, x, y, pressure);
     }
 
-    /** A ripple without a finger, as {@link WaterHost#splash} takes it. */
+    /**
+     * The ripple of a finger that comes down, without a finger and without ink.
+     *
+     * @param x pixels from the left edge of the view
+     * @param y pixels from its top edge
+     * @param pressure around 1
+     */
     public void splash(int x, int y, float pressure) {
         host.splash(x, y, pressure);
     }
@@ -89,21 +133,32 @@ public final class LiveWater {
         texturesDue = Pictures.ALL;
     }
 
-    /** What the processor spent on the last frame, in seconds; frames that take long make the mesh coarser. */
+    /**
+     * Frames that take long make the mesh coarser, where the look leaves it to the host.
+     *
+     * @param seconds that the processor spent on the last frame
+     */
     public void noteWork(double seconds) {
         host.noteWork(seconds);
     }
 
-    /** Whether there is nothing to draw until the next call that changes something. */
+    /**
+     * Whether a frame would show anything new.
+     *
+     * @return true when there is nothing to draw until the next call that changes something
+     */
     public boolean isResting() {
         if (pictures == null) return true;
         return !setUpDue && handOverDue == 0 && host.isResting();
     }
 
     /**
-     * Brings the water to the time {@code now}, in seconds of any steady clock, and draws it into the current
-     * framebuffer where it has changed.
+     * Brings the water to the time {@code now} and draws it into the current framebuffer where it has changed.
+     *
+     * @param now seconds of any steady clock
+     * @return what it did
      */
+    @NotNull
     public Frame frame(double now) {
         if (isResting()) {
             clock.rest();

@@ -5,7 +5,7 @@ import java.io.InputStream;
 import java.util.Properties;
 
 /** The numbers of a file, each taken once. */
-final class LookFile {
+final class LookFile implements Look.Values {
     private static final String WHOLE = "[-+]?\\d+";
     private static final String REAL = "[-+]?(\\d+\\.?\\d*|\\.\\d+)([eE][-+]?\\d+)?";
 
@@ -15,11 +15,13 @@ final class LookFile {
         left.load(text);
     }
 
-    int whole(String key, int usual, int least, int most) {
+    @Override
+    public int whole(String key, int usual, int least, int most) {
         return (int) take(key, WHOLE, usual, least, most);
     }
 
-    float real(String key, float usual, float least, float most) {
+    @Override
+    public float real(String key, float usual, float least, float most) {
         return take(key, REAL, usual, least, most);
     }
 

@@ -2,13 +2,19 @@ package com.zor.android.visualeffect.tidemark;
 
 import android.graphics.Bitmap;
 
+import org.jetbrains.annotations.NotNull;
+
 /** The three pictures of the effect. The backgrounds may be larger or of other proportions than the view. */
 public final class Pictures {
-    /** Some of the three, as a sum. */
+    /** Of the numbers that say which pictures, as a sum. */
     public static final int PORTRAIT = 1;
+    /** Of these. */
     public static final int LANDSCAPE = 2;
+    /** Both. */
     public static final int BACKGROUNDS = 3;
+    /** On the waves. */
     public static final int LIGHT = 4;
+    /** All three. */
     public static final int ALL = 7;
 
     private final Bitmap portrait;
@@ -16,8 +22,15 @@ public final class Pictures {
     private final Bitmap light;
     private final Object library;  // another one when the library has lost the pictures
 
-    /** What the water lies over in portrait and in landscape, and the light on the waves. */
-    public Pictures(Bitmap portrait, Bitmap landscape, Bitmap light) {
+    /**
+     * Keeps the bitmaps themselves.
+     *
+     * @param portrait what the water lies over in an upright view
+     * @param landscape and in a wide one
+     * @param light on the waves, of any proportions
+     * @throws IllegalArgumentException for a bitmap that is null or recycled
+     */
+    public Pictures(@NotNull Bitmap portrait, @NotNull Bitmap landscape, @NotNull Bitmap light) {
         this.portrait = usable(portrait, "portrait");
         this.landscape = usable(landscape, "landscape");
         this.light = usable(light, "light");

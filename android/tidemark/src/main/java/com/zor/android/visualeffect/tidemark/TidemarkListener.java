@@ -1,7 +1,10 @@
 package com.zor.android.visualeffect.tidemark;
 
+import org.jetbrains.annotations.NotNull;
+
 /** Hears on the main thread what becomes of the water. */
 public interface TidemarkListener {
+    /** Why the view stays empty, or as it was. */
     enum Failure {
         /** The device has no OpenGL ES 2.0. */
         NO_OPENGL,
@@ -14,6 +17,11 @@ public interface TidemarkListener {
     /** A frame was shown after which nothing moves: the next one comes when something changes. */
     default void onCalm() {}
 
-    /** Nothing else tells the app: the view stays empty, or as it was. */
-    default void onFailure(Failure failure, String message) {}
+    /**
+     * Nothing else tells the app.
+     *
+     * @param failure what to act upon
+     * @param message what to log, in English
+     */
+    default void onFailure(@NotNull Failure failure, @NotNull String message) {}
 }

@@ -7,6 +7,9 @@ import android.os.Looper;
 import android.os.SystemClock;
 import android.util.Log;
 
+import org.jetbrains.annotations.NotNull;
+import org.jetbrains.annotations.Nullable;
+
 import java.util.ArrayList;
 import java.util.List;
 import java.util.Queue;
@@ -46,29 +49,49 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
     private int width;
     private int height;
 
-    /** {@code requestRender} asks for one frame, as the method of that name of {@code GLSurfaceView} does. */
-    public TidemarkRenderer(Runnable requestRender) {
+    /**
+     * With no pictures yet, without ink and rain.
+     *
+     * @param requestRender asks for one frame, as the method of that name of {@code GLSurfaceView} does
+     */
+    public TidemarkRenderer(@NotNull Runnable requestRender) {
         this.requestRender = requestRender;
     }
 
-    /** Null for nobody. */
-    public void setListener(TidemarkListener listener) {
+    /**
+     * Hears on the main thread when the water is calm and what fails.
+     *
+     * @param listener null for nobody
+     */
+    public void setListener(@Nullable TidemarkListener listener) {
         this.listener = listener;
     }
 
-    /** The bitmaps must stay unchanged while they are shown. */
-    public void setPictures(Pictures pictures) {
+    /**
+     * Shows other pictures with the next frame.
+     *
+     * @param pictures whose bitmaps must stay unchanged while they are shown
+     */
+    public void setPictures(@NotNull Pictures pictures) {
         newPictures.set(pictures);
         requestRender.run();
     }
 
-    /** Another mesh begins with flat water. */
-    public void setLook(Look look) {
+    /**
+     * Takes over all values; the water and the ink stay.
+     *
+     * @param look is copied
+     */
+    public void setLook(@NotNull Look look) {
         Look copy = look.clone();
         change(water -> water.setLook(copy));
     }
 
-    /** Whether touches drop ink; they do not at first. */
+    /**
+     * Switches the ink; it is off at first.
+     *
+     * @param withInk whether touches drop ink
+     */
     public void setInk(boolean withInk) {
         change(water -> water.setInk(withInk));
     }
@@ -78,17 +101,34 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
         change(LiveWater::clearInk);
     }
 
-    /** Whether it rains; it does not at first. */
+    /**
+     * Switches the rain; it is off at first.
+     *
+     * @param falling whether it rains
+     */
     public void setRain(boolean falling) {
         change(water -> water.setRain(falling));
     }
 
-    /** One touch event, as {@link WaterHost#touch} takes it. */
+    /**
+     * One touch event.
+     *
+     * @param action as in {@code MotionEvent}: 0 down, 1 up, 2 move, 3 cancel
+     * @param x pixels from the left edge of the view
+     * @param y pixels from its top edge
+     * @param pressure around 1
+     */
     public void touch(int action, int x, int y, float pressure) {
         change(water -> water.touch(action, x, y, pressure));
     }
 
-    /** A splash without a finger, as {@link WaterHost#splash} takes it. */
+    /**
+     * A splash without a finger; it drops no ink.
+     *
+     * @param x pixels from the left edge of the view
+     * @param y pixels from its top edge
+     * @param strength 1 for that of a finger that comes down
+     */
     public void ripple(int x, int y, float strength) {
         change(water -> water.splash(x, y, strength));
     }

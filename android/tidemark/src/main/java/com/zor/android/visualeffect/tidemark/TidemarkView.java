@@ -1,16 +1,25 @@
 package com.zor.android.visualeffect.tidemark;
 
+import android.app.Activity;
 import android.app.ActivityManager;
 import android.content.Context;
+import android.content.res.TypedArray;
 import android.graphics.Bitmap;
 import android.opengl.GLSurfaceView;
 import android.util.AttributeSet;
 import android.view.MotionEvent;
 import android.view.ViewConfiguration;
 
+import org.jetbrains.annotations.NotNull;
+import org.jetbrains.annotations.Nullable;
+
 /**
- * Rippling water over a picture, which answers to touches. Put it into a layout, give it pictures, and call
- * {@link #onStart} and {@link #onStop} with the activity's own. Use it on the main thread. What is set while the view is not shown takes effect when it is.
+ * Rippling water over a picture, which answers to touches. Put it into a layout, give it pictures, and let it
+ * {@link #followLifecycle follow the activity}. Use it on the main thread. What is set while the view is not shown takes
+ * effect when it is.
+ *
+ * <p>A layout may say {@code app:portrait}, {@code app:landscape} and {@code app:light} (drawables that are bitmaps),
+ * {@code app:look} (a raw resource that {@link Look#load} reads), {@code app:ink} and {@code app:rain}.
  *
  * <p>Of several views the newest one draws, since the library serves a single effect. An older one rests, and goes on
  * when the newer one is stopped or taken out of its window.
@@ -27,14 +36,35 @@ public class TidemarkView extends GLSurfaceView {
     private float downX;
     private float downY;
 
-    public TidemarkView(Context context) {
+    /**
+     * For code.
+     *
+     * @param context the activity, or another one
+     */
+    public TidemarkView(@NotNull Context context) {
         this(context, null);
     }
 
-    public TidemarkView(Context context, AttributeSet attributes) {
+    /**
+     * For layouts.
+     *
+     * @param context the activity, or another one
+     * @param attributes of the layout; null for none
+     */
+    public TidemarkView(@NotNull Context context, @Nullable AttributeSet attributes) {
         super(context, attributes);
         canDraw = !isInEditMode() && hasOpenGl(context);
-        if (!canDraw) return;
+        if (canDraw) prepareSurface();
+        if (attributes == null) return;
+        TypedArray given = context.obtainStyledAttributes(attributes, R.styleable.TidemarkView);
+        try {
+            ViewAttributes.apply(given, this);
+        } finally {
+            given.recycle();
+        }
+    }
+
+    private void prepareSurface() {
         setEGLContextClientVersion(2);
         setEGLConfigChooser(8, 8, 8, 0, 0, 0);
         setPreserveEGLContextOnPause(true);
@@ -42,30 +72,44 @@ public class TidemarkView extends GLSurfaceView {
         setRenderMode(RENDERMODE_WHEN_DIRTY);
     }
 
-    /** Hears on the main thread when the water is calm and what fails; null for nobody. */
-    public void setListener(TidemarkListener listener) {
+    /**
+     * Hears on the main thread when the water is calm and what fails.
+     *
+     * @param listener null for nobody
+     */
+    public void setListener(@Nullable TidemarkListener listener) {
         renderer.setListener(listener);
         if (canDraw || isInEditMode()) return;
         renderer.report(TidemarkListener.Failure.NO_OPENGL, "this device has no OpenGL ES 2.0");
     }
 
     /**
-     * What the water lies over in portrait and in landscape, and the light on the waves. The backgrounds are cropped to
-     * the view; no side may be longer than the device's largest texture, 2048 pixels being safe everywhere. Keep the
-     * bitmaps unchanged while the view uses them.
+     * Shows other pictures. The backgrounds are cropped to the view; no side may be longer than the device's largest
+     * texture, 2048 pixels being safe everywhere. Keep the bitmaps unchanged while the view uses them.
      *
+     * @param portrait what the water lies over in an upright view
+     * @param landscape and in a wide one
+     * @param light on the waves, of any proportions
      * @throws IllegalArgumentException for a bitmap that is null or recycled
      */
-    public void setPictures(Bitmap portrait, Bitmap landscape, Bitmap light) {
+    public void setPictures(@NotNull Bitmap portrait, @NotNull Bitmap landscape, @NotNull Bitmap light) {
         renderer.setPictures(new Pictures(portrait, landscape, light));
     }
 
-    /** How the water looks and moves from now on. Another mesh begins with flat water. */
-    public void setLook(Look look) {
+    /**
+     * Changes how the water looks and moves; the water and the ink stay.
+     *
+     * @param look is copied
+     */
+    public void setLook(@NotNull Look look) {
         renderer.setLook(look);
     }
 
-    /** Whether touches drop ink; they do not at first. */
+    /**
+     * Switches the ink; it is off at first.
+     *
+     * @param withInk whether touches drop ink
+     */
     public void setInk(boolean withInk) {
         renderer.setInk(withInk);
     }
@@ -75,7 +119,11 @@ public class TidemarkView extends GLSurfaceView {
         renderer.clearInk();
     }
 
-    /** Whether it rains; it does not at first. */
+    /**
+     * Switches the rain; it is off at first.
+     *
+     * @param falling whether it rains
+     */
     public void setRain(boolean falling) {
         renderer.setRain(falling);
     }
@@ -91,7 +139,17 @@ public class TidemarkView extends GLSurfaceView {
         renderer.ripple(Math.round(x), Math.round(y), strength);
     }
 
-    /** With the activity's own {@code onStart}, or the fragment's. */
+    /**
+     * Calls {@link #onStart} and {@link #onStop} with the activity's own from now on, until it is destroyed. Call it in
+     * {@code onCreate}.
+     *
+     * @param activity in whose window the view is
+     */
+    public void followLifecycle(@NotNull Activity activity) {
+        activity.getApplication().registerActivityLifecycleCallbacks(new ActivityFollower(activity, this));
+    }
+
+    /** With the activity's own {@code onStart}, or the fragment's; {@link #followLifecycle} spares you the call. */
     public void onStart() {
         isStopped = false;
         if (canDraw) super.onResume();
@@ -121,7 +179,7 @@ public class TidemarkView extends GLSurfaceView {
     public final void onResume() {}
 
     @Override
-    public boolean onTouchEvent(MotionEvent event) {
+    public boolean onTouchEvent(@NotNull MotionEvent event) {
         finger.follow(event);
         switch (event.getActionMasked()) {
             case MotionEvent.ACTION_DOWN:

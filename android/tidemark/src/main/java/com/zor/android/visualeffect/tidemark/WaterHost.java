@@ -1,5 +1,7 @@
 package com.zor.android.visualeffect.tidemark;
 
+import org.jetbrains.annotations.NotNull;
+
 /**
  * What an app does around the library: owns the mesh arrays, the view, the transform and the lighting values, turns
  * touches and rain into ripples, steps water and ink in time and tells when there is nothing new to draw.
@@ -8,10 +10,13 @@ package com.zor.android.visualeffect.tidemark;
  * same pictures as the host in C++ with the same calls: keep every sum in its order and in its precision.
  */
 public final class WaterHost {
-    /** The action codes of {@code android.view.MotionEvent}. */
+    /** This and those below: the action codes of {@code android.view.MotionEvent}. */
     public static final int DOWN = 0;
+    /** The finger leaves. */
     public static final int UP = 1;
+    /** It has moved. */
     public static final int MOVE = 2;
+    /** It is somebody else's from now on. */
     public static final int CANCEL = 3;
 
     private static final double INK_STEPS_PER_SECOND = 60;
@@ -60,8 +65,16 @@ public final class WaterHost {
     private float[] heightAttribs;
     private final float[] mvp = new float[16];
 
-    /** {@code seed} fixes where the rain falls. The view is width x height pixels, each at least 1. */
-    public WaterHost(JniTidemarkRender library, Look look, int width, int height, int seed) {
+    /**
+     * Flat water that is not set up.
+     *
+     * @param library whose calls it makes
+     * @param look is copied
+     * @param width of the view in pixels, at least 1
+     * @param height likewise
+     * @param seed fixes where the rain falls
+     */
+    public WaterHost(@NotNull JniTidemarkRender library, @NotNull Look look, int width, int height, int seed) {
         this.library = library;
         this.look = look.clone();
         chance = new RainChance(seed);
@@ -72,6 +85,9 @@ public final class WaterHost {
     /**
      * {@link #setUp} must follow, and before it another hand-over of the backgrounds where the proportions have changed.
      * The water stays.
+     *
+     * @param width of the view in pixels, at least 1
+     * @param height likewise
      */
     public void resize(int width, int height) {
         this.width = width;
@@ -80,15 +96,20 @@ public final class WaterHost {
         fit();
     }
 
-    /** Takes over all values; the water and the ink stay. */
-    public void setLook(Look look) {
+    /**
+     * Takes over all values; the water and the ink stay.
+     *
+     * @param look is copied
+     */
+    public void setLook(@NotNull Look look) {
         this.look = look.clone();
         fit();
     }
 
     /**
-     * What the processor spent on a frame, in seconds: where the look leaves the mesh to the host, it gets coarser when
-     * frames take long.
+     * Where the look leaves the mesh to the host, it gets coarser when frames take long.
+     *
+     * @param seconds that the processor spent on a frame
      */
     public void noteWork(double seconds) {
         quality.noteWork(seconds);
@@ -147,7 +168,11 @@ public final class WaterHost {
         return result;
     }
 
-    /** Shorter by longer side of what the backgrounds are cropped to in portrait and in landscape. */
+    /**
+     * Of what the backgrounds are cropped to in portrait and in landscape.
+     *
+     * @return shorter by longer side
+     */
     public double proportions() {
         return (double) Math.min(pictureWidth, pictureHeight) / Math.max(pictureWidth, pictureHeight);
     }
@@ -155,15 +180,19 @@ public final class WaterHost {
     /**
      * Hands pictures over, of which the library keeps copies; before {@link #setUp} or {@link #loadTextures}.
      *
+     * @param pictures with the bitmaps
      * @param which a sum of {@link Pictures}' numbers
      */
-    public void handOver(Pictures pictures, int which) {
+    public void handOver(@NotNull Pictures pictures, int which) {
         pictures.handOver(library, which, Math.min(pictureWidth, pictureHeight), Math.max(pictureWidth, pictureHeight));
     }
 
     /**
      * Sets the library up in the current context, with or without ink. A new context needs all textures; one that goes
      * on, with another size or mode, keeps those that it has.
+     *
+     * @param withInk whether touches drop ink
+     * @param textures a sum of {@link Pictures}' numbers
      */
     public void setUp(boolean withInk, int textures) {
         library.onInitSetting(width, height, withInk);
@@ -177,7 +206,11 @@ public final class WaterHost {
         changed = true;
     }
 
-    /** Shows pictures handed over since {@link #setUp}; the water and the ink stay as they are. */
+    /**
+     * Shows pictures handed over since {@link #setUp}; the water and the ink stay as they are.
+     *
+     * @param which a sum of {@link Pictures}' numbers
+     */
     public void loadTextures(int which) {
         if ((which & Pictures.PORTRAIT) != 0) library.onLoadPortraitBGTextures();
         if ((which & Pictures.LANDSCAPE) != 0) library.onLoadLandscapeBGTextures();
@@ -191,9 +224,13 @@ public final class WaterHost {
     }
 
     /**
-     * One touch event: pixels from the top left corner of the view, one of the actions above, pressure around 1. A
-     * stroke begins with the finger's coming down. This, {@link #advance} and {@link #clearInk} do nothing before the
-     * first {@link #setUp}.
+     * One touch event. A stroke begins with the finger's coming down. This, {@link #advance} and {@link #clearInk} do
+     * nothing before the first {@link #setUp}.
+     *
+     * @param action one of those above
+     * @param x pixels from the left edge of the view
+     * @param y pixels from its top edge
+     * @param pressure around 1
      */
     public void touch(int action, int x, int y, float pressure) {
         if (!isSetUp) return;
@@ -205,7 +242,13 @@ public final class WaterHost {
         inkSteps = look.framesToFade;
     }
 
-    /** Raises the ripple of a finger of this pressure that comes down, without a finger and without ink. */
+    /**
+     * Raises the ripple of a finger that comes down, without a finger and without ink.
+     *
+     * @param x pixels from the left edge of the view
+     * @param y pixels from its top edge
+     * @param pressure around 1
+     */
     public void splash(int x, int y, float pressure) {
         if (!isSetUp) return;
         float modelX = ((float) x / width - 0.5f) * visibleWidth;
@@ -213,7 +256,11 @@ public final class WaterHost {
         raiseRipple(modelX, modelY, look.touchAmplitude * pressure);
     }
 
-    /** Lets rain fall, {@code look.rainDropsPerSecond} drops a second, until it is switched off. */
+    /**
+     * Lets rain fall, {@code look.rainDropsPerSecond} drops a second, until it is switched off.
+     *
+     * @param falling whether it rains
+     */
     public void rain(boolean falling) {
         raining = falling;
     }
@@ -226,8 +273,11 @@ public final class WaterHost {
     }
 
     /**
-     * Advances the water by {@code seconds} and says whether there is something to draw: while ink lives, when a step of
-     * it is due, as each frame moves it; otherwise when the picture has changed since the last draw.
+     * Lets time pass over the water.
+     *
+     * @param seconds since the last call
+     * @return whether there is something to draw: while ink lives, when a step of it is due, as each frame moves it;
+     *     otherwise when the picture has changed since the last draw
      */
     public boolean advance(double seconds) {
         if (!isSetUp) return false;
@@ -251,7 +301,11 @@ public final class WaterHost {
         return Math.max((int) Math.floor(due + 0.5), 0);
     }
 
-    /** Whether the picture stays as it is, however much time passes, until the next call that changes something. */
+    /**
+     * Whether time changes anything.
+     *
+     * @return true when the picture stays as it is, however much time passes, until the next call that changes something
+     */
     public boolean isResting() {
         return !changed && !raining && calmSteps >= look.stepsToRest && !inkMoves();
     }

@@ -1,7 +1,6 @@
 package com.zor.android.visualeffect.tidemark.sample;
 
 import android.app.Activity;
-import android.content.ActivityNotFoundException;
 import android.content.Intent;
 import android.graphics.Bitmap;
 import android.net.Uri;
@@ -26,6 +25,7 @@ public final class MainActivity extends Activity {
         super.onCreate(savedState);
         setContentView(R.layout.main);
         water = findViewById(R.id.water);
+        water.followLifecycle(this);
         new Thread(this::showSand).start();
 
         CompoundButton ink = findViewById(R.id.ink);
@@ -35,19 +35,9 @@ public final class MainActivity extends Activity {
         Button clear = findViewById(R.id.clear);
         clear.setOnClickListener(button -> water.clearInk());
         Button picture = findViewById(R.id.picture);
-        picture.setOnClickListener(button -> pickPicture());
-    }
-
-    @Override
-    protected void onStart() {
-        super.onStart();
-        water.onStart();
-    }
-
-    @Override
-    protected void onStop() {
-        water.onStop();
-        super.onStop();
+        picture.setOnClickListener(button -> {
+            if (light != null) PictureLoader.choose(this, PICK_PICTURE);
+        });
     }
 
     // Takes up to a second.
@@ -59,18 +49,6 @@ public final class MainActivity extends Activity {
             light = net;
             water.setPictures(portrait, landscape, light);
         });
-    }
-
-    private void pickPicture() {
-        if (light == null) return;
-        Intent pick = new Intent(Intent.ACTION_OPEN_DOCUMENT);
-        pick.addCategory(Intent.CATEGORY_OPENABLE);
-        pick.setType("image/*");
-        try {
-            startActivityForResult(pick, PICK_PICTURE);
-        } catch (ActivityNotFoundException e) {
-            complain(R.string.no_picker);
-        }
     }
 
     @Override
@@ -88,11 +66,7 @@ public final class MainActivity extends Activity {
                 if (light != null) water.setPictures(picture, picture, light);
             });
         } catch (IOException | SecurityException e) {
-            runOnUiThread(() -> complain(R.string.unreadable));
+            runOnUiThread(() -> Toast.makeText(this, R.string.unreadable, Toast.LENGTH_LONG).show());
         }
-    }
-
-    private void complain(int text) {
-        Toast.makeText(this, text, Toast.LENGTH_LONG).show();
     }
 }

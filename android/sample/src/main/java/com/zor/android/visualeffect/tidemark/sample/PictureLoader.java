@@ -1,22 +1,41 @@
 package com.zor.android.visualeffect.tidemark.sample;
 
+import android.app.Activity;
+import android.content.ActivityNotFoundException;
 import android.content.ContentResolver;
+import android.content.Intent;
 import android.graphics.Bitmap;
 import android.graphics.BitmapFactory;
 import android.graphics.Matrix;
 import android.media.ExifInterface;
 import android.net.Uri;
 import android.os.Build;
+import android.widget.Toast;
 
 import java.io.FileNotFoundException;
 import java.io.IOException;
 import java.io.InputStream;
 
-/** Reads a picture of the user's: four bytes a pixel, upright, and small enough for a texture of every device. */
+/**
+ * Lets the user choose a picture, and reads it: four bytes a pixel, upright, and small enough for a texture of every
+ * device.
+ */
 final class PictureLoader {
     private static final int LONGEST_SIDE = 2048;
 
     private PictureLoader() {}
+
+    /** The activity hears of it in {@code onActivityResult}. */
+    static void choose(Activity activity, int request) {
+        Intent pick = new Intent(Intent.ACTION_OPEN_DOCUMENT);
+        pick.addCategory(Intent.CATEGORY_OPENABLE);
+        pick.setType("image/*");
+        try {
+            activity.startActivityForResult(pick, request);
+        } catch (ActivityNotFoundException e) {
+            Toast.makeText(activity, R.string.no_picker, Toast.LENGTH_LONG).show();
+        }
+    }
 
     static Bitmap load(ContentResolver resolver, Uri uri) throws IOException {
         BitmapFactory.Options options = new BitmapFactory.Options();

@@ -37,6 +37,6 @@ done
     -o resources/linked.apk --java resources --extra-packages com.zor.android.visualeffect.tidemark resources/*.zip
 
 mapfile -t shipped < <(java "$source/android" resources)
-compile --release 8 -parameters -h headers -cp "classes/platform:$ANNOTATIONS" -d classes/shipped "${shipped[@]}"
+compile --release 8 -h headers -cp "classes/platform:$ANNOTATIONS" -d classes/shipped "${shipped[@]}"
 compile --release 8 -cp classes/platform -d classes/fakes "${fakes[@]}"
 compile --release 17 -h headers -cp "classes/fakes:classes/platform:classes/shipped:$JUNIT" -d classes/tests "${tests[@]}"

@@ -4,7 +4,6 @@
 #include <algorithm>
 #include <cmath>
 #include <iostream>
-#include <limits>
 #include <random>
 #include <span>
 #include <tuple>
@@ -122,21 +121,4 @@ TEST_F(LongRun, aDayNeitherGrowsNorSlowsDownNorLeavesTheNumbers) {
     EXPECT_EQ(atFirst.size(), 2U * 3) << "two views, each without ink, with it and with more of it";
     EXPECT_TRUE(atFirst == atLast);
     std::cout << frames << " frames, " << blocks << " blocks\n";
-}
-
-// The counters of frames at the end of their type.
-TEST_F(LongRun, aFingerMayRestForYears) {
-    constexpr int kLast = std::numeric_limits<int>::max();
-    water.touch(TouchAction::down, 120, 120, 1.0f);
-    water.touch(TouchAction::move, 121, 120, 1.0f);
-    step = count = kLast - 1;
-    rest(3);
-    EXPECT_EQ(step, kLast) << "a tap";
-    EXPECT_EQ(count, kLast + std::int64_t{2} - (std::int64_t{1} << 32)) << "which nobody reads begins again";
-    water.touch(TouchAction::move, 140, 120, 1.0f);
-    drag_step = kLast - 1;
-    rest(3);
-    EXPECT_EQ(drag_step, kLast) << "a drag";
-    water.touch(TouchAction::up, 140, 120, 1.0f);
-    EXPECT_EQ(state, kIdle);
 }

@@ -203,36 +203,3 @@ TEST_F(Live, longFramesMakeTheMeshCoarser) {
     EXPECT_EQ(bytes[0], 164 * 164 * 12) << "cells of 6 pixels";
     EXPECT_EQ(bytes[1], 123 * 123 * 12);
 }
-
-TEST_F(Live, picturesAreExchangedUnderTheInk) {
-    constexpr int width = 240;
-    constexpr int height = 320;
-    renewContext(width, height);
-    water.resize(width, height);
-    water.setInk(true);
-    next();
-    const auto redBesideTouch = [] { return readPixels(width, height)[height / 2 * width + width / 2 + 12][0]; };
-    const int clear = redBesideTouch();
-    water.touch(TouchAction::down, width / 2, height / 2, 1.0f);
-    water.touch(TouchAction::up, width / 2, height / 2, 1.0f);
-    for (int i = 0; i < 24; ++i) next();
-    water.setPictures(pictures(1));
-    next();
-    EXPECT_LT(redBesideTouch(), clear - 20) << "the ink is still there";
-    water.clearInk();
-    next();
-    EXPECT_NEAR(redBesideTouch(), clear, 6);
-}
-
-TEST_F(Live, aLostContextBringsTheLastPicturesBack) {
-    next();
-    const auto first = seen();
-    water.setPictures(pictures(3));
-    next();
-    const auto second = seen();
-    ASSERT_NE(first, second);
-    renewContext(kWidth, kHeight);
-    water.renewContext();
-    EXPECT_EQ(next(), Frame::drawn);
-    EXPECT_EQ(seen(), second);
-}

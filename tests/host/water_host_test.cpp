@@ -89,32 +89,6 @@ TEST_F(Host, ringsAreRoundOnTheScreenAndComeToRest) {
     EXPECT_FALSE(host.advance(1.0));
 }
 
-// Red grows to the right and green downwards, so that each shows one direction of the slopes.
-TEST_F(Host, wavesBendThePictureSidewaysAsTheyBendItUpAndDown) {
-    constexpr int side = 192;
-    Look look;
-    look.alphaMix = look.fresnelRatio = 0.0f;
-    look.meshVertices = 32;
-    WaterHost host = start(side, side, 1, false, look);
-    host.draw();
-    const auto flat = readPixels(side, side);
-    host.touch(TouchAction::down, side / 2, side / 2, 1.0f);
-    host.advance(8.0 / 60);
-    host.draw();
-    const auto ring = readPixels(side, side);
-    const auto bent = [&](int right, int down, std::size_t channel) {
-        const auto i = static_cast<std::size_t>((side / 2 - down) * side + side / 2 + right);
-        return ring[i][channel] - flat[i][channel];
-    };
-    // A slope is that to the right and the upper neighbour, so the profiles lie a cell of 6 pixels apart.
-    int most = 0;
-    for (int way = -48; way <= 48; ++way) {
-        EXPECT_NEAR(bent(way, 0, 0), bent(0, way + 6, 1), 5) << way;
-        most = std::max(most, bent(way, 0, 0));
-    }
-    EXPECT_GE(most, 8);
-}
-
 TEST_F(Host, theFrameRateDoesNotChangeTheWater) {
     const auto after = [this](double frame, int frames) {
         WaterHost host = start(kShort, kLong);
@@ -144,17 +118,6 @@ TEST_F(Host, rainFallsWhereItsSeedSaysAndSurvivesALostContext) {
     EXPECT_EQ(rained(5, false), once);
     EXPECT_NE(rained(6, false), once);
     EXPECT_EQ(rained(5, true), once) << "all state of the water is the host's";
-}
-
-TEST_F(Host, aResizeTurnsTheViewAndKeepsTheWater) {
-    WaterHost host = start(kShort, kLong);
-    host.draw();
-    renewContext(kLong, kShort);
-    host.resize(kLong, kShort);
-    host.setUp(false);
-    ASSERT_TRUE(host.advance(0.0));
-    host.draw();
-    expectMiddleOf(readPixels(kLong, kShort), kLong, kShort, landscape);
 }
 
 // Without ripples, so that nothing but the ink asks for frames and changes the picture.

@@ -11,6 +11,8 @@
 
 namespace {
 
+// What apps hand over.
+static_assert(kActionDown == 0 && kActionUp == 1 && kActionMove == 2 && kActionCancel == 3);
 constexpr int kOther = 9;
 
 // One event, and what it leaves behind.

@@ -16,9 +16,10 @@ TEST(Vectors, roundAndCompareLikeTheShaders) {
 }
 
 TEST(Samplers, spanTheTextureAndNeverLeaveIt) {
-    std::vector<float> texels(12, 1.0f);
+    std::vector<float> texels(13, 1.0f);
     texels.front() = 0.0f;
-    texels.back() = 5.0f;
+    texels[11] = 5.0f;
+    texels.back() = kNan;  // which no weight hides
     const Texture<float> t = {texels.data(), 4, 3};
     for (const float x : {kNan, -1e30f, 0.0f, 0.4f, 1.0f, 3e38f}) {
         const bool first = !(x > 0.0f), last = x >= 1.0f;

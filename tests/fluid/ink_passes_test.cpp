@@ -110,6 +110,15 @@ TEST_F(InkPasses, injectionAddsWhatTheKernelAdds) {
                 largestDifference(densityOf(engine.Density.Pong), expected), 0.5 / 255 + (isExact() ? 1e-3 : 2e-3));
         }
     }
+    // What lies at the very ends of a segment is beside it.
+    kernel.Scale = kernel.normal = Vec2(0, 1);
+    kernel.previous = Vec2(0);
+    kernel.len = 4;
+    float ink = 0;
+    for (const float y : {0.0f, 2.0f, 4.0f}) {
+        kernel.shaderMain(Vec4(0, y, 0, 0), ink);
+        EXPECT_EQ(ink > before[0], y == 2) << y;
+    }
     const Segment none = segmentBetween({5, 7}, {5, 7});
     EXPECT_EQ((std::array{none.normal.x, none.normal.y, none.length}), (std::array{0.0f, 0.0f, 1.0f}));
 }

@@ -1,4 +1,4 @@
-// import 'tidemark-water/react' teaches React's JSX the element.
+// import 'tidemark-water/react' is the same module, and teaches React's JSX the element.
 import type { DetailedHTMLProps, HTMLAttributes } from 'react';
 import type { Options, WaterElement } from './dist/index.js';
 

@@ -45,16 +45,6 @@ test('opens without a network once it has been loaded, and no two pictures look 
     for (const [a, b] of [[0, 1], [1, 2], [0, 2]]) expect(difference(seen[a], seen[b])).toBeGreaterThan(15);
 });
 
-test('says in one sentence what the browser lacks', async ({ page }) => {
-    const lacks = async (lack, sentence) => {
-        await page.addInitScript(lack);
-        await page.goto('./');
-        await expect(page.getByRole('status')).toHaveText(sentence);
-    };
-    await lacks(() => { HTMLCanvasElement.prototype.getContext = () => null; }, /needs WebGL/);
-    await lacks(() => { WebAssembly.validate = () => false; }, /needs WebAssembly with SIMD/);
-});
-
 test('a worker that is gone is told and started anew; of two pictures the last chosen stays', async ({ page }) => {
     await page.addInitScript(() => {
         window.works = [];

@@ -214,10 +214,10 @@ export class WaterElement extends Base {
                     if (property === 'look' && typeof value === 'object') {
                         this.own.look = value as Look;
                         this.changed();
-                    } else if (value === null || value === undefined || value === '') {
+                    } else if (value === null || value === undefined) {
                         this.removeAttribute(name);
                     } else if (kind === 'flag') {
-                        this.setAttribute(name, value ? '' : 'off');
+                        this.setAttribute(name, value || value === '' ? '' : 'off');
                     } else {
                         this.setAttribute(name, String(value));
                     }

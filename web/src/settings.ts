@@ -14,7 +14,7 @@ export interface Settings {
 }
 
 const usualInk = '#0d2673';
-const usualPreset = 'as-shipped';
+const usualPreset = 'clear-lake';
 
 // A preset is a whole look.
 export function withPreset(preset: string): Omit<Settings, 'picture'> {

@@ -26,11 +26,9 @@ test('200 waters come and go, and leave nothing', async ({ page }) => {
     await page.addInitScript(() => {
         window.memories = [];
         const { instantiate } = WebAssembly;
-        WebAssembly.instantiate = async (...given) => {
-            const instance = await instantiate(...given);
-            window.memories.push(new WeakRef(Object.values(instance.exports).find((part) => part instanceof WebAssembly.Memory)));
-            return instance;
-        };
+        const memoryOf = ({ exports }) => Object.values(exports).find((part) => part instanceof WebAssembly.Memory);
+        WebAssembly.instantiate = (...given) => instantiate(...given).then(
+            (instance) => (window.memories.push(new WeakRef(memoryOf(instance))), instance));
     });
     await show(page, script);
     const client = await page.context().newCDPSession(page);
@@ -53,8 +51,7 @@ test('200 waters come and go, and leave nothing', async ({ page }) => {
     const after = await leftAfter(190);
     expect(after.memories.length).toBe(200);
     expect(after.memories.filter(Boolean).length).toBeLessThan(3);
-    expect(after.JSEventListeners).toBeLessThanOrEqual(before.JSEventListeners);
-    expect(after.Nodes).toBeLessThanOrEqual(before.Nodes);
+    for (const kind of ['JSEventListeners', 'Nodes']) expect(after[kind], kind).toBeLessThanOrEqual(before[kind]);
     expect(after.JSHeapUsedSize - before.JSHeapUsedSize).toBeLessThan(190 * 1000);
 });
 
@@ -118,14 +115,12 @@ test('a canvas of the page shows a source that moves, and gives its picture out;
             source.fillRect(0, 0, 8, 8);
             await water.ready;
             await new Promise((resolve) => setTimeout(resolve, 300));
-            const small = new OffscreenCanvas(1, 1).getContext('2d');
-            small.drawImage(await createImageBitmap(await water.toBlob()), 0, 0, 1, 1);
-            return small.getImageData(0, 0, 1, 1).data[0];
+            source.drawImage(await createImageBitmap(await water.toBlob()), 0, 0, 8, 8);
+            return source.getImageData(4, 4, 1, 1).data[0];
         };
         return [await redOf('red'), await redOf('black')];
     });
-    expect(reds[0]).toBeGreaterThan(200);
-    expect(reds[1]).toBeLessThan(40);
+    expect(reds.map((red) => red > 100)).toEqual([true, false]);
 });
 
 test('the packed package works in a fresh project, with and without a bundler', async ({ page }, { outputDir }) => {
@@ -142,8 +137,7 @@ test('the packed package works in a fresh project, with and without a bundler', 
     for (const name of ['plain', 'background', 'dist/react', 'dist/vue', 'esbuild', 'iframe']) {
         await show(page, '', { folder: outputDir, at: `http://pond.test/${name}.html` });
         const inside = name === 'iframe' ? page.frameLocator('iframe') : page;
-        if (name === 'esbuild') await page.waitForFunction(() => document.querySelector('canvas').width > 300);
-        else await inside.locator('tidemark-water[shown]').first().waitFor();
+        await inside.locator(name === 'esbuild' ? 'canvas[width="952"]' : 'tidemark-water[shown]').first().waitFor();
         await page.waitForTimeout(1200);
         await page.screenshot({ path: `../build/web/screens/${name.replace('/', '-')}.png` });
     }

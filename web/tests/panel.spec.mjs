@@ -59,7 +59,7 @@ test('a link brings the same look, and a bad one the nearest', async ({ page }) 
 
     await page.evaluate(() => { location.hash = 'ringSpeed=9&meshExtent=1e9&calmingTime=x&exponent=&picture=toString&preset=valueOf&inkColor=red&rain=-1'; });
     await expect.poll(() => settings(page)).toMatchObject(
-        { picture: 'pool', preset: 'as-shipped', inkColor: '#0d2673', rain: 0, look: { ringSpeed: 1, meshExtent: 64 } });
+        { picture: 'pool', preset: 'clear-lake', inkColor: '#0d2673', rain: 0, look: { ringSpeed: 1, meshExtent: 64 } });
     await page.getByRole('button', { name: 'Honey' }).click();
     expect(await settings(page)).toMatchObject({ preset: 'honey', inkColor: '#994d05', look: {} });
 });

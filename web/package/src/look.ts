@@ -26,14 +26,14 @@ export interface Preset {
 
 /** What each changes of the defaults. */
 export const presets: Readonly<Record<string, Preset>> = {
-    'as-shipped': { title: 'Clear lake', look: {} },
+    'clear-lake': { title: 'Clear lake', look: {} },
     'summer-rain': { title: 'Summer rain', look: { calmingTime: 3.6 }, ink: false, rain: 16 },
     'heavy-glass': {
         title: 'Heavy glass',
         look: { refractiveIndex: 2.4, calmingTime: 2.5, ringSpeed: 0.2, exponent: 120, specularRatio: 8 },
         ink: false,
     },
-    'quick-silver': {
+    quicksilver: {
         title: 'Quicksilver',
         look: { alphaMix: 0.8, alphaScale1: 0.8, fresnelRatio: 1.2, specularRatio: 6, exponent: 60, touchAmplitude: 3, calmingTime: 10 },
         ink: false,

@@ -108,7 +108,7 @@ test('a canvas of the page shows a source that moves, and gives its picture out;
     await show(page, '<canvas style="width: 100px; height: 100px"></canvas>');
     const reds = await page.evaluate(async () => {
         const { createWater } = await import('./tidemark-water.js');
-        const source = new OffscreenCanvas(8, 8).getContext('2d');
+        const source = new OffscreenCanvas(8, 8).getContext('2d', { willReadFrequently: true });
         const water = createWater(document.querySelector('canvas'), { src: source.canvas });
         const redOf = async (color) => {
             source.fillStyle = color;

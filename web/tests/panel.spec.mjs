@@ -112,6 +112,7 @@ std::printf("%d %.2f %.1f %.3f %.2f %s %s", look.meshExtent, look.calmingTime, l
         ${await copied('Java')}
         System.out.print(look.meshExtent + " " + look.calmingTime + " " + look.exponent + " " + look.inkRed + " "
             + look.refractiveIndex + " " + withInk + " " + raining); } }`);
-    run('javac', '-d', '.', '-sourcepath', join(root, 'android/tidemark/src/main/java'), 'Copied.java');
+    run('javac', '-d', '.', '-cp', '/usr/share/java/org.jetbrains.annotations-java8.jar', '-sourcepath',
+        join(root, 'android/tidemark/src/main/java'), 'Copied.java');
     expect(run('java', '-cp', '.', 'com.zor.android.visualeffect.tidemark.Copied')).toBe(output);
 });

@@ -107,11 +107,11 @@ std::printf("%d %.2f %.1f %.3f %.2f %s %s", look.meshExtent, look.calmingTime, l
     expect(run(join(outputDir, 'copied'))).toBe(output);
 
     copyFileSync(join(root, 'host/look.properties'), join(folder, 'look.properties'));
-    const packaged = 'package com.zor.android.visualeffect.tidemark;';
-    writeFileSync(join(outputDir, 'Copied.java'), `${packaged} class Copied { public static void main(String[] arguments) {
+    writeFileSync(join(outputDir, 'Copied.java'), `package com.zor.android.visualeffect.tidemark; class Copied { public static void main(String[] arguments) {
         ${await copied('Java')}
         System.out.print(look.meshExtent + " " + look.calmingTime + " " + look.exponent + " " + look.inkRed + " "
             + look.refractiveIndex + " " + withInk + " " + raining); } }`);
-    run('javac', '-d', '.', '-sourcepath', join(root, 'android/tidemark/src/main/java'), 'Copied.java');
+    const path = `${root}android/tidemark/src/main/java:/usr/share/java/org.jetbrains.annotations-java8.jar`;
+    run('javac', '-d', '.', '-cp', path, 'Copied.java');
     expect(run('java', '-cp', '.', 'com.zor.android.visualeffect.tidemark.Copied')).toBe(output);
 });

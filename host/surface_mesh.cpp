@@ -5,74 +5,108 @@
 
 namespace {
 
-std::size_t product(int a, int b) {
-    return static_cast<std::size_t>(a) * static_cast<std::size_t>(b);
+std::ptrdiff_t at(int line, int length) {
+    return std::ptrdiff_t{line} * length;
 }
 
-// One column of the mesh from four of the lattice.
-void blend(
-    const float* weights, const float* a, const float* b, const float* c, const float* d, int count,
-    float* __restrict out) {
+// Lines are turned in groups of four.
+int padded(int lines) {
+    return (lines + 3) / 4 * 4;
+}
+
+std::vector<float> field(int lines, int length) {
+    return std::vector<float>(static_cast<std::size_t>(at(lines, length)));
+}
+
+void advance(const float* heights, const float* velocity, float since, int count, float* __restrict out) {
+    for (int i = 0; i < count; ++i) out[i] = heights[i] + since * velocity[i];
+}
+
+// Makes columns of rows, or rows of columns.
+void turn(const float* __restrict in, int lines, int length, float* __restrict out) {
+    for (int line = 0; line < lines; line += 4) {
+        for (int i = 0; i < length; ++i) {
+            for (int k = 0; k < 4; ++k) out[at(i, lines) + line + k] = in[at(line + k, length) + i];
+        }
+    }
+}
+
+// One line of values between the lines `cell` and `cell` + 1; beyond the edge the last line goes on.
+void blend(const std::vector<float>& lines, int length, int cell, const float* weights, float* __restrict out) {
+    const int last = static_cast<int>(lines.size()) / length - 1;
+    const auto line = [&](int i) { return lines.data() + at(std::clamp(i, 0, last), length); };
+    const float* const a = line(cell - 1);
+    const float* const b = line(cell);
+    const float* const c = line(cell + 1);
+    const float* const d = line(cell + 2);
     const float wa = weights[0];
     const float wb = weights[1];
     const float wc = weights[2];
     const float wd = weights[3];
-    for (int i = 0; i < count; ++i) out[i] = wa * a[i] + wb * b[i] + wc * c[i] + wd * d[i];
+    for (int i = 0; i < length; ++i) out[i] = wa * a[i] + wb * b[i] + wc * c[i] + wd * d[i];
+}
+
+void interleave(
+    const float* __restrict a, const float* __restrict b, const float* __restrict c, int count, float* __restrict out) {
+    for (int i = 0; i < count; ++i) {
+        out[3 * i] = a[i];
+        out[3 * i + 1] = b[i];
+        out[3 * i + 2] = c[i];
+    }
 }
 
 }  // namespace
 
-SurfaceMesh::SurfaceMesh(int points, int vertices)
-    : points_(points),
-      vertices_(vertices),
-      column_(static_cast<std::size_t>(points) + 4),
-      own_(product(points, vertices)),
-      upper_(product(points, vertices)),
-      heights_(static_cast<std::size_t>(vertices)),
-      rights_(static_cast<std::size_t>(vertices)),
-      uppers_(static_cast<std::size_t>(vertices)) {
-    for (int i = 0; i < vertices; ++i) {
+SurfaceMesh::Axis SurfaceMesh::axis(int points, int vertices, double share) {
+    const int first = std::max(static_cast<int>((vertices - 1) * (1.0 - share) / 2), 0);
+    Axis axis = {{first, vertices - 2 * first}, 0, 0, {}};
+    for (int i = first; i < vertices - first; ++i) {
         const double place = static_cast<double>(i) * (points - 1) / (vertices - 1);
         const int cell = std::min(static_cast<int>(place), points - 2);
         const auto t = static_cast<float>(place - cell);
-        places_.push_back(
+        axis.places.push_back(
             {cell,
              {(1.0f - t) * (1.0f - t) * (1.0f - t) / 6.0f, ((3.0f * t - 6.0f) * t * t + 4.0f) / 6.0f,
               (((3.0f - 3.0f * t) * t + 3.0f) * t + 1.0f) / 6.0f, t * t * t / 6.0f}});
     }
+    // With the neighbours two cells before and three behind.
+    axis.from = std::max(axis.places.front().cell - 2, 0);
+    axis.points = std::min(axis.places.back().cell + 4, points) - axis.from;
+    for (Place& place : axis.places) place.cell -= axis.from;
+    return axis;
 }
 
-const float* SurfaceMesh::row(const std::vector<float>& of, int column) const {
-    return of.data() + product(std::clamp(column, 0, points_ - 1), vertices_);
+SurfaceMesh::SurfaceMesh(int points, int vertices, double width, double height)
+    : points_(points), columns_(axis(points, vertices, width)), rows_(axis(points, vertices, height)) {
+    const int columns = padded(columns_.points);
+    const int rows = padded(rows_.seen.count);
+    lattice_ = field(columns, rows_.points);
+    latticeRows_ = field(rows_.points, columns);
+    ownRows_ = upperRows_ = field(rows, columns);
+    own_ = upper_ = field(columns, rows);
+    heights_ = rights_ = uppers_ = field(1, rows);
 }
 
-void SurfaceMesh::gather(const float* heights, float* attribs) {
-    for (int c = 0; c < points_; ++c) {
-        const float* const column = heights + product(c, points_);
-        std::copy_n(column, points_, column_.begin() + 2);
-        column_[0] = column_[1] = column[0];
-        column_[column_.size() - 2] = column_[column_.size() - 1] = column[points_ - 1];
-        float* const own = own_.data() + product(c, vertices_);
-        float* const upper = upper_.data() + product(c, vertices_);
-        for (int r = 0; r < vertices_; ++r) {
-            const Place& p = places_[static_cast<std::size_t>(r)];
-            const float* const h = column_.data() + p.cell;
-            own[r] = p.weights[0] * h[1] + p.weights[1] * h[2] + p.weights[2] * h[3] + p.weights[3] * h[4];
-            upper[r] = p.weights[0] * h[0] + p.weights[1] * h[1] + p.weights[2] * h[2] + p.weights[3] * h[3];
-        }
+void SurfaceMesh::gather(const float* heights, const float* velocity, float since, float* attribs) {
+    const int columns = padded(columns_.points);
+    const int rows = padded(rows_.seen.count);
+    for (int c = 0; c < columns; ++c) {
+        const auto first = at(columns_.from + std::min(c, columns_.points - 1), points_) + rows_.from;
+        advance(heights + first, velocity + first, since, rows_.points, lattice_.data() + at(c, rows_.points));
     }
-    for (const Place& p : places_) {
-        const auto across = [&](const std::vector<float>& from, int shift, std::vector<float>& to) {
-            const int c = p.cell + shift;
-            blend(p.weights, row(from, c - 1), row(from, c), row(from, c + 1), row(from, c + 2), vertices_, to.data());
-        };
-        across(own_, 0, heights_);
-        across(own_, 1, rights_);
-        across(upper_, 0, uppers_);
-        for (std::size_t r = 0; r < heights_.size(); ++r, attribs += 3) {
-            attribs[0] = heights_[r];
-            attribs[1] = rights_[r];
-            attribs[2] = uppers_[r];
-        }
+    turn(lattice_.data(), columns, rows_.points, latticeRows_.data());
+    for (int r = 0; r < rows_.seen.count; ++r) {
+        const Place& p = rows_.places[static_cast<std::size_t>(r)];
+        blend(latticeRows_, columns, p.cell, p.weights, ownRows_.data() + at(r, columns));
+        blend(latticeRows_, columns, p.cell - 1, p.weights, upperRows_.data() + at(r, columns));
+    }
+    turn(ownRows_.data(), rows, columns, own_.data());
+    turn(upperRows_.data(), rows, columns, upper_.data());
+    for (const Place& p : columns_.places) {
+        blend(own_, rows, p.cell, p.weights, heights_.data());
+        blend(own_, rows, p.cell + 1, p.weights, rights_.data());
+        blend(upper_, rows, p.cell, p.weights, uppers_.data());
+        interleave(heights_.data(), rights_.data(), uppers_.data(), rows_.seen.count, attribs);
+        attribs += at(3, rows_.seen.count);
     }
 }

@@ -6,31 +6,44 @@
 
 class SurfaceMesh {
 public:
-    // `vertices` a side, over a lattice of `points` a side; each at least 2.
-    SurfaceMesh(int points, int vertices);
+    // A square of `vertices` a side over a lattice of `points` a side, each at least 2, of which only a middle part is
+    // seen: `width` and `height` are its shares of a side, above 0.
+    SurfaceMesh(int points, int vertices, double width, double height);
 
-    // For each vertex, column by column from the left and each column from the top: its height, and the heights one
-    // cell of the lattice to the right and above, of which the renderer takes the slope. Beyond the edge the surface
-    // goes on level. `heights`: points * points values in the same order; `attribs`: 3 * vertices * vertices.
-    // A bicubic B-spline (de Boor, A practical guide to splines, 1978): its slopes bend smoothly, where a surface
-    // through the very heights would show the lattice in every crest.
-    void gather(const float* heights, float* attribs);
+    // The vertices along an axis that what is seen takes.
+    struct Seen {
+        int first, count;
+    };
+    Seen columns() const { return columns_.seen; }
+    Seen rows() const { return rows_.seen; }
+
+    // For each vertex that is seen, column by column from the left and each column from the top: its height, and the
+    // heights one cell of the lattice to the right and above, of which the renderer takes the slope. Beyond the edge
+    // the surface goes on level. `heights`, `velocity`: points * points values in the same order, and what each height
+    // gains a step; `since`: steps passed since then; `attribs`: 3 values a vertex. A bicubic B-spline (de Boor, A
+    // practical guide to splines, 1978): its slopes bend smoothly, where a surface through the very heights would show
+    // the lattice in every crest.
+    void gather(const float* heights, const float* velocity, float since, float* attribs);
 
 private:
-    // Where a vertex lies along an axis: between points `cell` and `cell` + 1. The weights are those of the four points
-    // around it.
+    // Where a vertex lies along an axis: between points `cell` and `cell` + 1 of those that are read. The weights are
+    // those of the four points around it.
     struct Place {
         int cell;
         float weights[4];
     };
-
-    const float* row(const std::vector<float>& of, int column) const;
+    struct Axis {
+        Seen seen;
+        int from, points;           // of the lattice, that are read
+        std::vector<Place> places;  // of the vertices that are seen
+    };
+    static Axis axis(int points, int vertices, double share);
 
     int points_;
-    int vertices_;
-    std::vector<Place> places_;
-    std::vector<float> column_;                     // of the lattice, with two points more at either end
-    std::vector<float> own_;                        // the lattice's columns at the mesh's rows
-    std::vector<float> upper_;                      // one cell above them
+    Axis columns_, rows_;
+    std::vector<float> lattice_;                    // as it is at that time
+    std::vector<float> latticeRows_;                // row by row
+    std::vector<float> ownRows_, upperRows_;        // the lattice's columns at the mesh's rows, and one cell above them
+    std::vector<float> own_, upper_;                // column by column
     std::vector<float> heights_, rights_, uppers_;  // a column of the mesh
 };

@@ -2,6 +2,8 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstdlib>
+#include <utility>
 
 #include "host/native_names.h"
 #include "platform/desktop_bitmap.h"
@@ -78,13 +80,15 @@ void WaterHost::fit() {
         velocity_.values = resampled(velocity_.values, old.points, lattice_.points);
         heights_.values = resampled(heights_.values, old.points, lattice_.points);
     }
-    const int vertices = wantedVertices();
-    if (lattice_.points != old.points || lattice_.extent != old.extent || vertices != vertices_) makeMesh(vertices);
-
     const float pixel =
         static_cast<float>(lattice_.extent) / look_.pictureZoom / static_cast<float>(std::max(width_, height_));
-    visibleWidth_ = pixel * static_cast<float>(width_);
-    visibleHeight_ = pixel * static_cast<float>(height_);
+    const float oldWidth = std::exchange(visibleWidth_, pixel * static_cast<float>(width_));
+    const float oldHeight = std::exchange(visibleHeight_, pixel * static_cast<float>(height_));
+    const int vertices = wantedVertices();
+    if (lattice_.points != old.points || lattice_.extent != old.extent || vertices != vertices_ ||
+        visibleWidth_ != oldWidth || visibleHeight_ != oldHeight) {
+        makeMesh(vertices);
+    }
     pictureWidth_ = static_cast<int>(std::ceil(visibleWidth_));
     pictureHeight_ = static_cast<int>(std::ceil(visibleHeight_));
     mvp_.values = {2.0f / visibleWidth_, 0, 0, 0, 0, 2.0f / visibleHeight_, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1};
@@ -92,14 +96,41 @@ void WaterHost::fit() {
 }
 
 void WaterHost::makeMesh(int vertices) {
-    const auto side = static_cast<std::size_t>(vertices);
     vertices_ = vertices;
-    mesh_ = SurfaceMesh(lattice_.points, vertices);
-    positions_ = FloatArray(3 * side * side);
-    indices_ = ShortArray(6 * (side - 1) * (side - 1));
-    heightAttribs_ = FloatArray(3 * side * side);
+    mesh_ = SurfaceMesh(
+        lattice_.points, vertices, double{visibleWidth_} / lattice_.extent, double{visibleHeight_} / lattice_.extent);
     isGathered_ = false;
     isMeshFilled_ = false;
+}
+
+// Takes from the library's square what the view shows.
+void WaterHost::fillMesh() {
+    const auto side = static_cast<std::size_t>(vertices_);
+    FloatArray positions(3 * side * side);
+    ShortArray indices(6 * (side - 1) * (side - 1));
+    native::initWaters(
+        hostEnvironment(), nullptr, &positions, &indices, vertices_ * vertices_, lattice_.extent, lattice_.extent,
+        vertices_, vertices_);
+    const auto [firstColumn, columns] = mesh_.columns();
+    const auto [firstRow, rows] = mesh_.rows();
+    const int vertices = columns * rows;
+    positions_ = FloatArray(3 * static_cast<std::size_t>(vertices));
+    heightAttribs_ = FloatArray(positions_.values.size());
+    for (int c = 0; c < columns; ++c) {
+        std::copy_n(
+            positions.values.begin() + 3 * ((firstColumn + c) * vertices_ + firstRow), 3 * rows,
+            positions_.values.begin() + 3 * c * rows);
+    }
+    indices_.values.clear();
+    // The library lays the cells row by row.
+    for (int r = 0; r < rows - 1; ++r) {
+        const auto* const line = indices.values.data() + 6 * ((firstRow + r) * (vertices_ - 1) + firstColumn);
+        for (int i = 0; i < 6 * (columns - 1); ++i) {
+            const auto [column, row] = std::div(static_cast<std::uint16_t>(line[i]), vertices_);
+            indices_.values.push_back(static_cast<jshort>((column - firstColumn) * rows + row - firstRow));
+        }
+    }
+    isMeshFilled_ = true;
 }
 
 double WaterHost::proportions() const {
@@ -239,27 +270,15 @@ void WaterHost::raiseRipple(float x, float y, float amplitude) {
 void WaterHost::gatherHeights() {
     const bool moves = calmSteps_ < look_.stepsToRest;
     const auto since = static_cast<float>(dueSteps_);
-    if (!moves || std::abs(since) < kAtStep) {
-        if (!isGathered_) mesh_.gather(heights_.values.data(), heightAttribs_.values.data());
-        isGathered_ = true;
-        return;
-    }
-    between_.resize(heights_.values.size());
-    for (std::size_t i = 0; i < between_.size(); ++i) {
-        between_[i] = heights_.values[i] + since * velocity_.values[i];
-    }
-    mesh_.gather(between_.data(), heightAttribs_.values.data());
-    isGathered_ = false;
+    const bool atStep = !moves || std::abs(since) < kAtStep;
+    if (atStep && isGathered_) return;
+    mesh_.gather(heights_.values.data(), velocity_.values.data(), atStep ? 0.0f : since, heightAttribs_.values.data());
+    isGathered_ = atStep;
 }
 
 void WaterHost::draw() {
     JNIEnv* const env = hostEnvironment();
-    if (!isMeshFilled_) {
-        native::initWaters(
-            env, nullptr, &positions_, &indices_, vertices_ * vertices_, lattice_.extent, lattice_.extent, vertices_,
-            vertices_);
-        isMeshFilled_ = true;
-    }
+    if (!isMeshFilled_) fillMesh();
     gatherHeights();
     int frames = 1;
     if (inkMoves()) {

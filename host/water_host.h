@@ -86,6 +86,7 @@ private:
     void fit();
     int wantedVertices() const { return look_.meshVertices > 1 ? look_.meshVertices : quality_.vertices(); }
     void makeMesh(int vertices);
+    void fillMesh();
     void raiseTouchRipples(TouchAction action, int x, int y, float amplitude);
     void stepWater();
     void dropRain();
@@ -106,9 +107,9 @@ private:
     int calmSteps_;          // calm steps in a row
     double dueSteps_ = 0.0;  // of the water that the time passed so far still asks for; below 0 when it is ahead
     double dueInkSteps_ = 0.0;
-    bool isGathered_ = false;    // the mesh has the heights of the lattice
-    bool isMeshFilled_ = false;  // by the library
-    float touchX_ = 0.0f;        // where the finger raised its last ripple, model units
+    bool isGathered_ = false;  // the mesh has the heights of the lattice
+    bool isMeshFilled_ = false;
+    float touchX_ = 0.0f;  // where the finger raised its last ripple, model units
     float touchY_ = 0.0f;
 
     // The part of the square mesh that the view shows, in model units, and the whole numbers at or above it, which
@@ -121,11 +122,10 @@ private:
     WaveLattice lattice_;
     FloatArray velocity_{0};
     FloatArray heights_{0};
-    std::vector<float> between_;  // heights at a time between two steps
 
     MeshQuality quality_;
-    SurfaceMesh mesh_{2, 2};
-    int vertices_ = 0;  // of the mesh, along each side
+    SurfaceMesh mesh_{2, 2, 1.0, 1.0};
+    int vertices_ = 0;  // of the mesh, along each side of the square
     FloatArray positions_{0};
     ShortArray indices_{0};
     FloatArray heightAttribs_{0};

@@ -5,82 +5,118 @@ package com.zor.android.visualeffect.tidemark;
  * than the waves, and change without a jump.
  */
 final class SurfaceMesh {
-    private final int points;
-    private final int vertices;
+    /** An axis of the square, of which a middle part is seen. */
+    static final class Axis {
+        /** The vertices that what is seen takes. */
+        final int first;
+        final int count;
 
-    // Where a vertex lies along an axis: between the points cell and cell + 1, with the weights of the four around it.
-    private final int[] cells;
-    private final float[][] weights;
+        // Where each of them lies: between the points cell and cell + 1 of those that are read, with the weights of the
+        // four around it.
+        private final int[] cells;
+        private final float[][] weights;
+        private final int from;  // of the lattice, that are read
+        private final int points;
 
-    private final float[] column;  // of the lattice, with two points more at either end
-    private final float[][] own;  // the lattice's columns at the mesh's rows
-    private final float[][] upper;  // one cell above them
-
-    /** {@code vertices} a side, over a lattice of {@code points} a side; each at least 2. */
-    SurfaceMesh(int points, int vertices) {
-        this.points = points;
-        this.vertices = vertices;
-        cells = new int[vertices];
-        weights = new float[vertices][];
-        column = new float[points + 4];
-        own = new float[points][vertices];
-        upper = new float[points][vertices];
-        for (int i = 0; i < vertices; ++i) {
-            double place = (double) i * (points - 1) / (vertices - 1);
-            cells[i] = Math.min((int) place, points - 2);
-            float t = (float) (place - cells[i]);
-            weights[i] = new float[] {(1 - t) * (1 - t) * (1 - t) / 6, ((3 * t - 6) * t * t + 4) / 6,
-                (((3 - 3 * t) * t + 3) * t + 1) / 6, t * t * t / 6};
+        private Axis(int points, int vertices, double share) {
+            first = Math.max((int) ((vertices - 1) * (1 - share) / 2), 0);
+            count = vertices - 2 * first;
+            cells = new int[count];
+            weights = new float[count][];
+            for (int i = 0; i < count; ++i) {
+                double place = (double) (first + i) * (points - 1) / (vertices - 1);
+                cells[i] = Math.min((int) place, points - 2);
+                float t = (float) (place - cells[i]);
+                weights[i] = new float[] {(1 - t) * (1 - t) * (1 - t) / 6, ((3 * t - 6) * t * t + 4) / 6,
+                    (((3 - 3 * t) * t + 3) * t + 1) / 6, t * t * t / 6};
+            }
+            // With the neighbours two cells before and three behind.
+            from = Math.max(cells[0] - 2, 0);
+            this.points = Math.min(cells[count - 1] + 4, points) - from;
+            for (int i = 0; i < count; ++i) cells[i] -= from;
         }
+    }
+
+    final Axis columns;
+    final Axis rows;
+    private final int points;
+    private final float[][] lattice;  // row by row, as it is at that time
+    private final float[] ownRow;  // the lattice's columns at a row of the mesh
+    private final float[] upperRow;  // and one cell above it
+    private final float[][] own;  // of all rows, column by column
+    private final float[][] upper;
+    private final float[] heights;  // a column of the mesh
+    private final float[] rights;
+    private final float[] uppers;
+
+    /**
+     * A square of {@code vertices} a side over a lattice of {@code points} a side, each at least 2, of which only a
+     * middle part is seen: {@code width} and {@code height} are its shares of a side, above 0.
+     */
+    SurfaceMesh(int points, int vertices, double width, double height) {
+        this.points = points;
+        columns = new Axis(points, vertices, width);
+        rows = new Axis(points, vertices, height);
+        lattice = new float[rows.points][columns.points];
+        ownRow = new float[columns.points];
+        upperRow = new float[columns.points];
+        own = new float[columns.points][rows.count];
+        upper = new float[columns.points][rows.count];
+        heights = new float[rows.count];
+        rights = new float[rows.count];
+        uppers = new float[rows.count];
     }
 
     /**
-     * For each vertex, column by column from the left and each column from the top: its height, and the heights one cell
-     * of the lattice to the right and above, of which the renderer takes the slope. Beyond the edge the surface goes on
-     * level. A bicubic B-spline (de Boor, A practical guide to splines, 1978): its slopes bend smoothly, where a surface
-     * through the very heights would show the lattice in every crest.
+     * For each vertex that is seen, column by column from the left and each column from the top: its height, and the
+     * heights one cell of the lattice to the right and above, of which the renderer takes the slope. Beyond the edge the
+     * surface goes on level. A bicubic B-spline (de Boor, A practical guide to splines, 1978): its slopes bend smoothly,
+     * where a surface through the very heights would show the lattice in every crest.
      *
-     * @param heights points * points values in the same order
-     * @param attribs receives 3 * vertices * vertices
+     * @param waves points * points heights in the same order
+     * @param velocity what each of them gains a step
+     * @param since steps passed since then
+     * @param attribs receives 3 values a vertex
      */
-    void gather(float[] heights, float[] attribs) {
-        for (int c = 0; c < points; ++c) {
-            System.arraycopy(heights, c * points, column, 2, points);
-            column[0] = column[1] = column[2];
-            column[points + 2] = column[points + 3] = column[points + 1];
-            for (int r = 0; r < vertices; ++r) {
-                float[] w = weights[r];
-                int h = cells[r];
-                own[c][r] = w[0] * column[h + 1] + w[1] * column[h + 2] + w[2] * column[h + 3] + w[3] * column[h + 4];
-                upper[c][r] = w[0] * column[h] + w[1] * column[h + 1] + w[2] * column[h + 2] + w[3] * column[h + 3];
+    void gather(float[] waves, float[] velocity, float since, float[] attribs) {
+        for (int c = 0; c < columns.points; ++c) {
+            int line = (columns.from + c) * points + rows.from;
+            for (int r = 0; r < rows.points; ++r) lattice[r][c] = waves[line + r] + since * velocity[line + r];
+        }
+        for (int r = 0; r < rows.count; ++r) {
+            blend(lattice, rows.cells[r], rows.weights[r], ownRow);
+            blend(lattice, rows.cells[r] - 1, rows.weights[r], upperRow);
+            for (int c = 0; c < columns.points; ++c) {
+                own[c][r] = ownRow[c];
+                upper[c][r] = upperRow[c];
             }
         }
-        for (int c = 0; c < vertices; ++c) {
-            int first = 3 * c * vertices;
-            blend(own, c, 0, attribs, first);
-            blend(own, c, 1, attribs, first + 1);
-            blend(upper, c, 0, attribs, first + 2);
+        for (int c = 0, out = 0; c < columns.count; ++c) {
+            blend(own, columns.cells[c], columns.weights[c], heights);
+            blend(own, columns.cells[c] + 1, columns.weights[c], rights);
+            blend(upper, columns.cells[c], columns.weights[c], uppers);
+            for (int r = 0; r < rows.count; ++r, out += 3) {
+                attribs[out] = heights[r];
+                attribs[out + 1] = rights[r];
+                attribs[out + 2] = uppers[r];
+            }
         }
     }
 
-    // One column of the mesh from four of the lattice, into every third float.
-    private void blend(float[][] of, int vertex, int shift, float[] attribs, int first) {
-        int cell = cells[vertex] + shift;
-        float[] w = weights[vertex];
-        float w0 = w[0];
-        float w1 = w[1];
-        float w2 = w[2];
-        float w3 = w[3];
-        float[] a = of[within(cell - 1)];
-        float[] b = of[within(cell)];
-        float[] c = of[within(cell + 1)];
-        float[] d = of[within(cell + 2)];
-        for (int r = 0, out = first; r < vertices; ++r, out += 3) {
-            attribs[out] = w0 * a[r] + w1 * b[r] + w2 * c[r] + w3 * d[r];
-        }
+    // One line of values between the lines cell and cell + 1; beyond the edge the last line goes on.
+    private static void blend(float[][] lines, int cell, float[] weights, float[] out) {
+        float[] a = line(lines, cell - 1);
+        float[] b = line(lines, cell);
+        float[] c = line(lines, cell + 1);
+        float[] d = line(lines, cell + 2);
+        float wa = weights[0];
+        float wb = weights[1];
+        float wc = weights[2];
+        float wd = weights[3];
+        for (int i = 0; i < out.length; ++i) out[i] = wa * a[i] + wb * b[i] + wc * c[i] + wd * d[i];
     }
 
-    private int within(int column) {
-        return Math.max(0, Math.min(column, points - 1));
+    private static float[] line(float[][] lines, int i) {
+        return lines[Math.max(0, Math.min(i, lines.length - 1))];
     }
 }

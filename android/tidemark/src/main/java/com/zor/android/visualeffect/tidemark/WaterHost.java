@@ -41,7 +41,7 @@ public final class WaterHost {
     private double dueSteps;  // of the water that the time passed so far still asks for; below 0 when it is ahead
     private double dueInkSteps;
     private boolean isGathered;  // the mesh has the heights of the lattice
-    private boolean isMeshFilled;  // by the library
+    private boolean isMeshFilled;
     private float touchX;  // where the finger raised its last ripple, model units
     private float touchY;
 
@@ -55,11 +55,10 @@ public final class WaterHost {
     private WaveLattice lattice;
     private float[] velocity = {};
     private float[] heights = {};
-    private float[] between = {};  // heights at a time between two steps
 
     private final MeshQuality quality = new MeshQuality();
     private SurfaceMesh mesh;
-    private int vertices;  // of the mesh, along each side
+    private int vertices;  // of the mesh, along each side of the square
     private float[] positions;
     private short[] indices;
     private float[] heightAttribs;
@@ -130,12 +129,16 @@ public final class WaterHost {
             velocity = resampled(velocity, oldPoints, lattice.points);
             heights = resampled(heights, oldPoints, lattice.points);
         }
-        int wanted = wantedVertices();
-        if (lattice.points != oldPoints || lattice.extent != oldExtent || wanted != vertices) makeMesh(wanted);
-
+        float oldWidth = visibleWidth;
+        float oldHeight = visibleHeight;
         float pixel = lattice.extent / look.pictureZoom / Math.max(width, height);
         visibleWidth = pixel * width;
         visibleHeight = pixel * height;
+        int wanted = wantedVertices();
+        if (lattice.points != oldPoints || lattice.extent != oldExtent || wanted != vertices || visibleWidth != oldWidth
+                || visibleHeight != oldHeight) {
+            makeMesh(wanted);
+        }
         pictureWidth = (int) Math.ceil(visibleWidth);
         pictureHeight = (int) Math.ceil(visibleHeight);
         mvp[0] = 2 / visibleWidth;
@@ -147,12 +150,40 @@ public final class WaterHost {
 
     private void makeMesh(int side) {
         vertices = side;
-        mesh = new SurfaceMesh(lattice.points, side);
-        positions = new float[3 * side * side];
-        indices = new short[6 * (side - 1) * (side - 1)];
-        heightAttribs = new float[3 * side * side];
+        mesh = new SurfaceMesh(lattice.points, side, (double) visibleWidth / lattice.extent,
+                (double) visibleHeight / lattice.extent);
         isGathered = false;
         isMeshFilled = false;
+    }
+
+    // Takes from the library's square what the view shows.
+    private void fillMesh() {
+        float[] allPositions = new float[3 * vertices * vertices];
+        short[] allIndices = new short[6 * (vertices - 1) * (vertices - 1)];
+        library.initWaters(allPositions, allIndices, vertices * vertices, lattice.extent, lattice.extent, vertices,
+                vertices);
+        int firstColumn = mesh.columns.first;
+        int columns = mesh.columns.count;
+        int firstRow = mesh.rows.first;
+        int rows = mesh.rows.count;
+        positions = new float[3 * columns * rows];
+        heightAttribs = new float[positions.length];
+        for (int c = 0; c < columns; ++c) {
+            System.arraycopy(allPositions, 3 * ((firstColumn + c) * vertices + firstRow), positions, 3 * c * rows,
+                    3 * rows);
+        }
+        indices = new short[6 * (columns - 1) * (rows - 1)];
+        int cells = 6 * (columns - 1);
+        // The library lays the cells row by row.
+        for (int r = 0; r < rows - 1; ++r) {
+            int line = 6 * ((firstRow + r) * (vertices - 1) + firstColumn);
+            for (int i = 0; i < cells; ++i) {
+                int corner = allIndices[line + i] & 0xffff;
+                indices[r * cells + i] =
+                        (short) ((corner / vertices - firstColumn) * rows + corner % vertices - firstRow);
+            }
+        }
+        isMeshFilled = true;
     }
 
     // A field on a lattice of another size, by its nearest values.
@@ -316,11 +347,7 @@ public final class WaterHost {
      * next one late.
      */
     public void draw() {
-        if (!isMeshFilled) {
-            library.initWaters(positions, indices, vertices * vertices, lattice.extent, lattice.extent, vertices,
-                    vertices);
-            isMeshFilled = true;
-        }
+        if (!isMeshFilled) fillMesh();
         gatherHeights();
         int frames = 1;
         if (inkMoves()) {
@@ -396,14 +423,9 @@ public final class WaterHost {
     private void gatherHeights() {
         boolean moves = calmSteps < look.stepsToRest;
         float since = (float) dueSteps;
-        if (!moves || Math.abs(since) < AT_STEP) {
-            if (!isGathered) mesh.gather(heights, heightAttribs);
-            isGathered = true;
-            return;
-        }
-        if (between.length != heights.length) between = new float[heights.length];
-        for (int i = 0; i < between.length; ++i) between[i] = heights[i] + since * velocity[i];
-        mesh.gather(between, heightAttribs);
-        isGathered = false;
+        boolean atStep = !moves || Math.abs(since) < AT_STEP;
+        if (atStep && isGathered) return;
+        mesh.gather(heights, velocity, atStep ? 0 : since, heightAttribs);
+        isGathered = atStep;
     }
 }

@@ -8,12 +8,12 @@ import { expect, open, pixelsAfter, slope, takeOver, test } from './page.mjs';
 
 const root = new URL('../..', import.meta.url).pathname;
 const preview = process.env.TIDEMARK_PREVIEW ?? join(root, 'build/release/preview/tidemark-preview');
-const [width, height] = [270, 480];
+const [width, height] = [135, 240];
 
 test.use({ viewport: { width, height }, contextOptions: { reducedMotion: 'reduce' } });  // no drop falls by itself
 
 test('frames of a script equal those of tidemark-preview', async ({ page }, { outputDir }) => {
-    const script = join(root, 'scenes/demo.touch');
+    const script = join(root, 'scenes/curl.touch');
     mkdirSync(outputDir, { recursive: true });
     // The driver that filters textures exactly, as the browser's does; the faster one has weights of 8 bits, which the
     // two bytes of the ink's texels do not stand.
@@ -22,7 +22,7 @@ test('frames of a script equal those of tidemark-preview', async ({ page }, { ou
         return { file: join(outputDir, name), url: `data:image/png;base64,${buffer.toString('base64')}` };
     });
     const pictures = ['--portrait', ground.file, '--landscape', ground.file, '--light', light.file];
-    const options = [...pictures, '--script', script, '--size', `${width}x${height}`, '--seconds', '1.7', '--every', '20', '--out', outputDir];
+    const options = [...pictures, '--script', script, '--size', `${width}x${height}`, '--seconds', '0.8', '--every', '12', '--out', outputDir];
     const drawn = promisify(execFile)(preview, options, { env: { ...process.env, GALLIUM_DRIVER: 'softpipe' } });
 
     const actions = ['down', 'up', 'move', 'cancel'];
@@ -43,11 +43,11 @@ test('frames of a script equal those of tidemark-preview', async ({ page }, { ou
     const frames = await pixelsAfter(page, (touches) => {
         window.settle();
         const taken = [];
-        for (let i = 0, next = 0; i < 102; ++i) {
+        for (let i = 0, next = 0; i < 48; ++i) {
             for (; next < touches.length && touches[next][0] < ((i + 1) * 1000) / 60; ++next) {
                 window.native._touch(...touches[next].slice(1));
             }
-            if (i % 20 === 0) taken.push(window.read());
+            if (i % 12 === 0) taken.push(window.read());
             else window.frames(1);
         }
         return taken;
@@ -59,6 +59,6 @@ test('frames of a script equal those of tidemark-preview', async ({ page }, { ou
         for (let at = 0; at < frame.length; at += 4) {
             if ([0, 1, 2].some((c) => Math.abs(frame[at + c] - reference[at + c]) > 2)) ++apart;
         }
-        expect(apart / (width * height), `frame ${20 * i}`).toBeLessThan(0.01);
+        expect(apart / (width * height), `frame ${12 * i}`).toBeLessThan(0.01);
     }
 });

@@ -158,6 +158,14 @@ TEST_F(InkPasses, advectionCarriesWhatTheKernelCarries) {
                 largestDifference(densityOf(engine.Density.Pong), everyTexel(kernel, 0.0f)), isExact() ? 0.016 : 1.0);
         }
     }
+    kernel.drag = 1;
+    std::array<float, 3> carried;
+    for (const int i : {0, 1, 2}) {
+        kernel.center = kernel.Scale * Vec2(12, 20) + Vec2(79.0f + static_cast<float>(i), 0);
+        kernel.shaderMain(Vec4(12, 20, 0, 0), carried[static_cast<std::size_t>(i)]);
+    }
+    EXPECT_NE(carried[0], carried[1]);
+    EXPECT_EQ(carried[1], carried[2]) << "beyond 80 pixels, and at 80, the touch does not matter";
 }
 
 TEST_F(InkPasses, injectionKeepsAwayFromTheEdgesButRecordsTheStroke) {

@@ -138,7 +138,6 @@ test('the packed package works in a fresh project, with and without a bundler', 
         await show(page, '', { folder: outputDir, at: `http://pond.test/${name}.html` });
         const inside = name === 'iframe' ? page.frameLocator('iframe') : page;
         await inside.locator(name === 'esbuild' ? 'canvas[width="952"]' : 'tidemark-water[shown]').first().waitFor();
-        await page.waitForTimeout(1200);
-        await page.screenshot({ path: `../build/web/screens/${name.replace('/', '-')}.png` });
+        await page.screenshot({ animations: 'disabled', path: `../build/web/screens/${name.replace('/', '-')}.png` });
     }
 });

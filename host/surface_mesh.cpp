@@ -1,6 +1,7 @@
 #include "host/surface_mesh.h"
 
 #include <algorithm>
+#include <cmath>
 #include <cstddef>
 
 namespace {
@@ -64,7 +65,7 @@ void multiplySlopes(
 
 // Of each cell between two columns: 1 where its waves run to the lower right or the upper left, else 0.
 void compareSlopes(const float* __restrict left, const float* __restrict right, int count, int* __restrict out) {
-    for (int i = 0; i < count; ++i) out[i] = left[i] + left[i + 1] + right[i] + right[i + 1] < 0.0f;
+    for (int i = 0; i < count; ++i) out[i] = std::signbit(left[i] + left[i + 1] + right[i] + right[i + 1]);
 }
 
 }  // namespace

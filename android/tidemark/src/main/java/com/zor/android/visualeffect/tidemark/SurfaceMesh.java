@@ -141,7 +141,7 @@ final class SurfaceMesh {
         int cell = 6 * (column - 1) * cells;
         int topRight = column * rows.count;
         for (int r = 0; r < cells; ++r, ++topRight, cell += 6) {
-            int turned = left[r] + left[r + 1] + right[r] + right[r + 1] < 0 ? 1 : 0;
+            int turned = Float.floatToRawIntBits(left[r] + left[r + 1] + right[r] + right[r + 1]) >>> 31;
             indices[cell + 2] = (short) (topRight + 1 - turned);
             indices[cell + 3] = (short) (topRight - rows.count + turned);
         }

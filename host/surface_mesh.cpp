@@ -1,6 +1,7 @@
 #include "host/surface_mesh.h"
 
 #include <algorithm>
+#include <cmath>
 #include <cstddef>
 
 namespace {
@@ -55,6 +56,18 @@ void interleave(
     }
 }
 
+// The product of both slopes of each vertex.
+void multiplySlopes(
+    const float* __restrict h, const float* __restrict right, const float* __restrict upper, int count,
+    float* __restrict out) {
+    for (int i = 0; i < count; ++i) out[i] = (h[i] - right[i]) * (h[i] - upper[i]);
+}
+
+// Of each cell between two columns: 1 where its waves run to the lower right or the upper left, else 0.
+void compareSlopes(const float* __restrict left, const float* __restrict right, int count, int* __restrict out) {
+    for (int i = 0; i < count; ++i) out[i] = std::signbit(left[i] + left[i + 1] + right[i] + right[i + 1]);
+}
+
 }  // namespace
 
 SurfaceMesh::Axis SurfaceMesh::axis(int points, int vertices, double share) {
@@ -84,10 +97,42 @@ SurfaceMesh::SurfaceMesh(int points, int vertices, double width, double height)
     latticeRows_ = field(rows_.points, columns);
     ownRows_ = upperRows_ = field(rows, columns);
     own_ = upper_ = field(columns, rows);
-    heights_ = rights_ = uppers_ = field(1, rows);
+    heights_ = rights_ = uppers_ = slopes_ = slopesBefore_ = field(1, rows);
+    turned_.resize(heights_.size());
 }
 
-void SurfaceMesh::gather(const float* heights, const float* velocity, float since, float* attribs) {
+void SurfaceMesh::layCells(std::int16_t* indices) const {
+    const int rows = rows_.seen.count;
+    for (int c = 0; c < columns_.seen.count - 1; ++c) {
+        for (int r = 0; r < rows - 1; ++r) {
+            const int topLeft = c * rows + r;
+            const int topRight = topLeft + rows;
+            for (const int i : {topLeft, topLeft + 1, topRight + 1, topLeft, topRight + 1, topRight}) {
+                *indices++ = static_cast<std::int16_t>(i);
+            }
+        }
+    }
+}
+
+// Chooses the diagonals of the cells that end at a column of the mesh.
+void SurfaceMesh::turnDiagonals(int column, std::int16_t* indices) {
+    const int rows = rows_.seen.count;
+    const int cells = rows - 1;
+    slopes_.swap(slopesBefore_);
+    multiplySlopes(heights_.data(), rights_.data(), uppers_.data(), rows, slopes_.data());
+    if (column == 0) return;
+    compareSlopes(slopesBefore_.data(), slopes_.data(), cells, turned_.data());
+    std::int16_t* cell = indices + 6 * at(column - 1, cells);
+    int topRight = column * rows;
+    for (int r = 0; r < cells; ++r, ++topRight, cell += 6) {
+        const int turned = turned_[static_cast<std::size_t>(r)];
+        cell[2] = static_cast<std::int16_t>(topRight + 1 - turned);
+        cell[3] = static_cast<std::int16_t>(topRight - rows + turned);
+    }
+}
+
+void SurfaceMesh::gather(
+    const float* heights, const float* velocity, float since, float* attribs, std::int16_t* indices) {
     const int columns = padded(columns_.points);
     const int rows = padded(rows_.seen.count);
     for (int c = 0; c < columns; ++c) {
@@ -102,11 +147,13 @@ void SurfaceMesh::gather(const float* heights, const float* velocity, float sinc
     }
     turn(ownRows_.data(), rows, columns, own_.data());
     turn(upperRows_.data(), rows, columns, upper_.data());
-    for (const Place& p : columns_.places) {
+    for (int c = 0; c < columns_.seen.count; ++c) {
+        const Place& p = columns_.places[static_cast<std::size_t>(c)];
         blend(own_, rows, p.cell, p.weights, heights_.data());
         blend(own_, rows, p.cell + 1, p.weights, rights_.data());
         blend(upper_, rows, p.cell, p.weights, uppers_.data());
         interleave(heights_.data(), rights_.data(), uppers_.data(), rows_.seen.count, attribs);
         attribs += at(3, rows_.seen.count);
+        turnDiagonals(c, indices);
     }
 }

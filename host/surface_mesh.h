@@ -2,6 +2,7 @@
 // finer than the waves, and change without a jump.
 #pragma once
 
+#include <cstdint>
 #include <vector>
 
 class SurfaceMesh {
@@ -17,13 +18,21 @@ public:
     Seen columns() const { return columns_.seen; }
     Seen rows() const { return rows_.seen; }
 
+    // The two triangles of each cell that is seen, column by column: 6 * (columns - 1) * (rows - 1) vertices.
+    void layCells(std::int16_t* indices) const;
+
     // For each vertex that is seen, column by column from the left and each column from the top: its height, and the
     // heights one cell of the lattice to the right and above, of which the renderer takes the slope. Beyond the edge
-    // the surface goes on level. `heights`, `velocity`: points * points values in the same order, and what each height
-    // gains a step; `since`: steps passed since then; `attribs`: 3 values a vertex. A bicubic B-spline (de Boor, A
-    // practical guide to splines, 1978): its slopes bend smoothly, where a surface through the very heights would show
-    // the lattice in every crest.
-    void gather(const float* heights, const float* velocity, float since, float* attribs);
+    // the surface goes on level. A bicubic B-spline (de Boor, A practical guide to splines, 1978): its slopes bend
+    // smoothly, where a surface through the very heights would show the lattice in every crest.
+    //
+    // Also turns the diagonal of each cell along its waves, as one across would cut a crest into teeth. Which way they
+    // run is the sign of the mixed element of the structure tensor (Bigun and Granlund, Optimal orientation detection
+    // of linear symmetry, 1987).
+    //
+    // `heights`, `velocity`: points * points values in the same order, and what each gains a step; `since`: steps
+    // passed since then; `attribs`: 3 values a vertex; `indices`: as laid by layCells().
+    void gather(const float* heights, const float* velocity, float since, float* attribs, std::int16_t* indices);
 
 private:
     // Where a vertex lies along an axis: between points `cell` and `cell` + 1 of those that are read. The weights are
@@ -38,6 +47,7 @@ private:
         std::vector<Place> places;  // of the vertices that are seen
     };
     static Axis axis(int points, int vertices, double share);
+    void turnDiagonals(int column, std::int16_t* indices);
 
     int points_;
     Axis columns_, rows_;
@@ -46,4 +56,6 @@ private:
     std::vector<float> ownRows_, upperRows_;        // the lattice's columns at the mesh's rows, and one cell above them
     std::vector<float> own_, upper_;                // column by column
     std::vector<float> heights_, rights_, uppers_;  // a column of the mesh
+    std::vector<float> slopes_, slopesBefore_;      // the products of both slopes in this column and in the one before
+    std::vector<int> turned_;                       // which of the cells between them
 };

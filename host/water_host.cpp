@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <cmath>
-#include <cstdlib>
 #include <utility>
 
 #include "host/native_names.h"
@@ -103,7 +102,7 @@ void WaterHost::makeMesh(int vertices) {
     isMeshFilled_ = false;
 }
 
-// Takes from the library's square what the view shows.
+// Takes from the library's square what the view shows, with cells whose diagonals can be turned.
 void WaterHost::fillMesh() {
     const auto side = static_cast<std::size_t>(vertices_);
     FloatArray positions(3 * side * side);
@@ -121,15 +120,8 @@ void WaterHost::fillMesh() {
             positions.values.begin() + 3 * ((firstColumn + c) * vertices_ + firstRow), 3 * rows,
             positions_.values.begin() + 3 * c * rows);
     }
-    indices_.values.clear();
-    // The library lays the cells row by row.
-    for (int r = 0; r < rows - 1; ++r) {
-        const auto* const line = indices.values.data() + 6 * ((firstRow + r) * (vertices_ - 1) + firstColumn);
-        for (int i = 0; i < 6 * (columns - 1); ++i) {
-            const auto [column, row] = std::div(static_cast<std::uint16_t>(line[i]), vertices_);
-            indices_.values.push_back(static_cast<jshort>((column - firstColumn) * rows + row - firstRow));
-        }
-    }
+    indices_ = ShortArray(6 * static_cast<std::size_t>((columns - 1) * (rows - 1)));
+    mesh_.layCells(indices_.values.data());
     isMeshFilled_ = true;
 }
 
@@ -272,7 +264,9 @@ void WaterHost::gatherHeights() {
     const auto since = static_cast<float>(dueSteps_);
     const bool atStep = !moves || std::abs(since) < kAtStep;
     if (atStep && isGathered_) return;
-    mesh_.gather(heights_.values.data(), velocity_.values.data(), atStep ? 0.0f : since, heightAttribs_.values.data());
+    mesh_.gather(
+        heights_.values.data(), velocity_.values.data(), atStep ? 0.0f : since, heightAttribs_.values.data(),
+        indices_.values.data());
     isGathered_ = atStep;
 }
 

@@ -19,15 +19,20 @@ no_more_arguments "scripts/test.sh [--native] [--arm64] [--android] [--web]" "$@
 [ ${#parts[@]} -gt 0 ] || parts=(native arm64 android web)
 
 test_native() {
-    install_missing "${build_packages[@]}" "${lint_packages[@]}" "${test_packages[@]}" "${fuzz_packages[@]}"
+    install_missing "${build_packages[@]}" "${lint_packages[@]}" "${test_packages[@]}" "${fuzz_packages[@]}" \
+        "${bench_packages[@]}"
     scripts/lint.sh
     local preset
     for preset in release asan clang; do
         cmake --preset "$preset" -DTIDEMARK_TESTS=ON -DTIDEMARK_WERROR=ON >/dev/null
         cmake --build --preset "$preset"
     done
+    cmake --preset release -DTIDEMARK_BENCH=ON >/dev/null
+    cmake --build --preset release
     cmake --preset fuzz -DTIDEMARK_WERROR=ON >/dev/null
     cmake --build --preset fuzz
+    # The benchmarks' forms agree with the library's, and each runs; how fast, scripts/bench.sh measures.
+    build/release/bench/tidemark_bench --benchmark_min_time=0 >/dev/null
     ctest --preset release -j "$(nproc)" --label-exclude android
     # The driver's precision changes nothing that a sanitizer sees, and another compiler nothing but numbers.
     ctest --preset asan -j "$(nproc)" --exclude-regex "^(half|exact)"

@@ -29,7 +29,8 @@ Ring ringAfterHalfASecond(const Look& look, int width, int height, int vertices)
         stepWaves(velocity.data(), heights.data(), {1, 1, n - 1, n - 1, n}, false, lattice.damping, lattice.waveSpeed);
     }
     std::vector<float> attribs(static_cast<std::size_t>(3 * vertices * vertices));
-    SurfaceMesh(n, vertices, 1.0, 1.0).gather(heights.data(), velocity.data(), 0.0f, attribs.data());
+    std::vector<std::int16_t> indices(2 * attribs.size());
+    SurfaceMesh(n, vertices, 1.0, 1.0).gather(heights.data(), velocity.data(), 0.0f, attribs.data(), indices.data());
     Ring ring = {0.0, 0.0f};
     for (int i = 0; i < vertices * vertices; ++i) {
         const float h = attribs[static_cast<std::size_t>(3 * i)];
@@ -82,7 +83,11 @@ TEST(SurfaceMesh, isLevelBeyondItsEdgeAndKeepsSlopes) {
     }
     constexpr int kVertices = 31;  // a vertex on every point and between
     std::vector<float> attribs(3 * kVertices * kVertices);
-    SurfaceMesh(kPoints, kVertices, 1.0, 1.0).gather(heights.data(), heights.data(), 0.0f, attribs.data());
+    std::vector<std::int16_t> indices(2 * attribs.size());
+    SurfaceMesh mesh(kPoints, kVertices, 1.0, 1.0);
+    mesh.layCells(indices.data());
+    mesh.gather(heights.data(), heights.data(), 0.0f, attribs.data(), indices.data());
+    EXPECT_EQ(std::pair(indices[2], indices[3]), std::pair(indices[5], indices[1])) << "the diagonal runs level";
     const float* const middle = attribs.data() + 3 * (15 * kVertices + 15);
     EXPECT_NEAR(middle[0], 7.5f * 3.0f, 1e-4f);
     EXPECT_NEAR(middle[1] - middle[0], 2.0f, 1e-4f) << "the neighbour to the right";

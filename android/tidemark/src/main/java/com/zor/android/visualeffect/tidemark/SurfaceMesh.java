@@ -48,6 +48,8 @@ final class SurfaceMesh {
     private final float[] heights;  // a column of the mesh
     private final float[] rights;
     private final float[] uppers;
+    private float[] slopes;  // the products of both slopes in this column
+    private float[] slopesBefore;  // and in the one before
 
     /**
      * A square of {@code vertices} a side over a lattice of {@code points} a side, each at least 2, of which only a
@@ -65,6 +67,24 @@ final class SurfaceMesh {
         heights = new float[rows.count];
         rights = new float[rows.count];
         uppers = new float[rows.count];
+        slopes = new float[rows.count];
+        slopesBefore = new float[rows.count];
+    }
+
+    /** The two triangles of each cell that is seen, column by column. */
+    short[] layCells() {
+        short[] indices = new short[6 * (columns.count - 1) * (rows.count - 1)];
+        int i = 0;
+        for (int c = 0; c < columns.count - 1; ++c) {
+            for (int r = 0; r < rows.count - 1; ++r) {
+                int topLeft = c * rows.count + r;
+                int topRight = topLeft + rows.count;
+                for (int corner : new int[] {topLeft, topLeft + 1, topRight + 1, topLeft, topRight + 1, topRight}) {
+                    indices[i++] = (short) corner;
+                }
+            }
+        }
+        return indices;
     }
 
     /**
@@ -73,12 +93,17 @@ final class SurfaceMesh {
      * surface goes on level. A bicubic B-spline (de Boor, A practical guide to splines, 1978): its slopes bend smoothly,
      * where a surface through the very heights would show the lattice in every crest.
      *
+     * <p>Also turns the diagonal of each cell along its waves, as one across would cut a crest into teeth. Which way they
+     * run is the sign of the mixed element of the structure tensor (Bigun and Granlund, Optimal orientation detection of
+     * linear symmetry, 1987).
+     *
      * @param waves points * points heights in the same order
      * @param velocity what each of them gains a step
      * @param since steps passed since then
      * @param attribs receives 3 values a vertex
+     * @param indices as laid by {@link #layCells}
      */
-    void gather(float[] waves, float[] velocity, float since, float[] attribs) {
+    void gather(float[] waves, float[] velocity, float since, float[] attribs, short[] indices) {
         for (int c = 0; c < columns.points; ++c) {
             int line = (columns.from + c) * points + rows.from;
             for (int r = 0; r < rows.points; ++r) lattice[r][c] = waves[line + r] + since * velocity[line + r];
@@ -100,6 +125,25 @@ final class SurfaceMesh {
                 attribs[out + 1] = rights[r];
                 attribs[out + 2] = uppers[r];
             }
+            turnDiagonals(c, indices);
+        }
+    }
+
+    // Chooses the diagonals of the cells that end at a column of the mesh.
+    private void turnDiagonals(int column, short[] indices) {
+        float[] left = slopes;
+        float[] right = slopesBefore;
+        slopes = right;
+        slopesBefore = left;
+        for (int r = 0; r < right.length; ++r) right[r] = (heights[r] - rights[r]) * (heights[r] - uppers[r]);
+        if (column == 0) return;
+        int cells = rows.count - 1;
+        int cell = 6 * (column - 1) * cells;
+        int topRight = column * rows.count;
+        for (int r = 0; r < cells; ++r, ++topRight, cell += 6) {
+            int turned = Float.floatToRawIntBits(left[r] + left[r + 1] + right[r] + right[r + 1]) >>> 31;
+            indices[cell + 2] = (short) (topRight + 1 - turned);
+            indices[cell + 3] = (short) (topRight - rows.count + turned);
         }
     }
 

@@ -156,7 +156,7 @@ public final class WaterHost {
         isMeshFilled = false;
     }
 
-    // Takes from the library's square what the view shows.
+    // Takes from the library's square what the view shows, with cells whose diagonals can be turned.
     private void fillMesh() {
         float[] allPositions = new float[3 * vertices * vertices];
         short[] allIndices = new short[6 * (vertices - 1) * (vertices - 1)];
@@ -172,17 +172,7 @@ public final class WaterHost {
             System.arraycopy(allPositions, 3 * ((firstColumn + c) * vertices + firstRow), positions, 3 * c * rows,
                     3 * rows);
         }
-        indices = new short[6 * (columns - 1) * (rows - 1)];
-        int cells = 6 * (columns - 1);
-        // The library lays the cells row by row.
-        for (int r = 0; r < rows - 1; ++r) {
-            int line = 6 * ((firstRow + r) * (vertices - 1) + firstColumn);
-            for (int i = 0; i < cells; ++i) {
-                int corner = allIndices[line + i] & 0xffff;
-                indices[r * cells + i] =
-                        (short) ((corner / vertices - firstColumn) * rows + corner % vertices - firstRow);
-            }
-        }
+        indices = mesh.layCells();
         isMeshFilled = true;
     }
 
@@ -425,7 +415,7 @@ public final class WaterHost {
         float since = (float) dueSteps;
         boolean atStep = !moves || Math.abs(since) < AT_STEP;
         if (atStep && isGathered) return;
-        mesh.gather(heights, velocity, atStep ? 0 : since, heightAttribs);
+        mesh.gather(heights, velocity, atStep ? 0 : since, heightAttribs, indices);
         isGathered = atStep;
     }
 }

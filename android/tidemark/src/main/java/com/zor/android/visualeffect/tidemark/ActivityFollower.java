@@ -4,24 +4,28 @@ import android.app.Activity;
 import android.app.Application;
 import android.os.Bundle;
 
-/** Starts and stops a view with its activity. */
+import java.lang.ref.WeakReference;
+
+/** Starts and stops a view with its activity, and does not keep one in memory that the activity has dropped. */
 final class ActivityFollower implements Application.ActivityLifecycleCallbacks {
     private final Activity activity;
-    private final TidemarkView view;
+    private final WeakReference<TidemarkView> view;
 
     ActivityFollower(Activity activity, TidemarkView view) {
         this.activity = activity;
-        this.view = view;
+        this.view = new WeakReference<>(view);
     }
 
     @Override
     public void onActivityStarted(Activity started) {
-        if (started == activity) view.onStart();
+        TidemarkView water = view.get();
+        if (started == activity && water != null) water.onStart();
     }
 
     @Override
     public void onActivityStopped(Activity stopped) {
-        if (stopped == activity) view.onStop();
+        TidemarkView water = view.get();
+        if (stopped == activity && water != null) water.onStop();
     }
 
     @Override

@@ -19,6 +19,7 @@ final class Screen {
     static volatile byte[] pixels;  // of the last one: R, G, B, A, rows from the bottom
     private static final Set<Thread.State> RESTING = Set.of(Thread.State.WAITING, Thread.State.TERMINATED);
     private static final Set<Thread> HELD = ConcurrentHashMap.newKeySet();
+    static volatile boolean isLost;  // the context, as the next frame is shown
     private static volatile boolean isOpen;
 
     static {
@@ -32,7 +33,8 @@ final class Screen {
             case "eglCreateContext": return new EGLContext(GlContext.create(160, 160));
             case "eglCreateWindowSurface": return new EGLSurface() {};
             case "eglDestroyContext": GlContext.destroy(((EGLContext) values[1]).handle); break;
-            case "eglSwapBuffers": show(); break;
+            case "eglSwapBuffers": show(); return !isLost;
+            case "eglGetError": isLost = false; return EGL11.EGL_CONTEXT_LOST;
             case "eglMakeCurrent": return GlContext.makeCurrent(values[3] == null ? 0 : ((EGLContext) values[3]).handle);
             case "eglChooseConfig":
                 if (values[2] != null) ((EGLConfig[]) values[2])[0] = new EGLConfig() {};

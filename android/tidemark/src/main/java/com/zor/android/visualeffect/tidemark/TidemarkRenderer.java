@@ -31,12 +31,22 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
         void apply(LiveWater water);
     }
 
+    private interface News {
+        void reach(TidemarkListener listener);
+    }
+
     private static final String TAG = "Tidemark";
+
+    // Seconds. With a look that lets no time pass, ink would wait for ever, and the main thread for this one.
+    private static final double LONGEST_WAIT = 0.1;
 
     // The library serves one effect. The lock is held for every call of it, since each view has its own GL thread.
     private static final List<TidemarkRenderer> SHOWN = new ArrayList<>();  // the newest last
-    private static TidemarkRenderer owner;  // whose pictures and objects the library has
+    private static volatile TidemarkRenderer newest;  // of these
+    private static Object owner;  // the mark of whose pictures and objects the library has
 
+    // The renderer itself would keep its view and its activity in memory.
+    private final Object mark = new Object();
     private final Runnable requestRender;
     private final Queue<Change> changes = new ConcurrentLinkedQueue<>();
     private final AtomicReference<Pictures> newPictures = new AtomicReference<>();
@@ -74,7 +84,7 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
      */
     public void setPictures(@NotNull Pictures pictures) {
         newPictures.set(pictures);
-        requestRender.run();
+        askForFrame();
     }
 
     /**
@@ -111,7 +121,7 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
     }
 
     /**
-     * One touch event.
+     * One touch event. While another renderer draws, or none, it only ends what began before.
      *
      * @param action as in {@code MotionEvent}: 0 down, 1 up, 2 move, 3 cancel
      * @param x pixels from the left edge of the view
@@ -119,18 +129,19 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
      * @param pressure around 1
      */
     public void touch(int action, int x, int y, float pressure) {
-        change(water -> water.touch(action, x, y, pressure));
+        boolean isEnd = action == WaterHost.UP || action == WaterHost.CANCEL;
+        if (isEnd || newest == this) change(water -> water.touch(action, x, y, pressure));
     }
 
     /**
-     * A splash without a finger; it drops no ink.
+     * A splash without a finger; it drops no ink. Nothing while another renderer draws, or none.
      *
      * @param x pixels from the left edge of the view
      * @param y pixels from its top edge
      * @param strength 1 for that of a finger that comes down
      */
     public void ripple(int x, int y, float strength) {
-        change(water -> water.splash(x, y, strength));
+        if (newest == this) change(water -> water.splash(x, y, strength));
     }
 
     /** From now on this renderer draws, and others rest until it hides. */
@@ -139,16 +150,18 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
             SHOWN.remove(this);
             if (!SHOWN.isEmpty()) Log.w(TAG, "one view at a time: the older one rests while a newer one is shown");
             SHOWN.add(this);
+            newest = this;
         }
         requestRender.run();
     }
 
-    /** Draws no longer, and lets the one that was shown before go on. */
+    /** Asks for no more frames, and lets the one that was shown before go on. */
     public void hide() {
         synchronized (SHOWN) {
-            boolean wasNewest = isNewest();
             SHOWN.remove(this);
-            if (wasNewest && !SHOWN.isEmpty()) SHOWN.get(SHOWN.size() - 1).requestRender.run();
+            if (newest != this) return;
+            newest = SHOWN.isEmpty() ? null : SHOWN.get(SHOWN.size() - 1);
+            if (newest != null) newest.requestRender.run();
         }
     }
 
@@ -169,26 +182,34 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
 
     @Override
     public void onDrawFrame(GL10 gl) {
+        double start = seconds();
         LiveWater.Frame frame;
-        while ((frame = tryFrame()) == LiveWater.Frame.WAITING) SystemClock.sleep(1);
-        if (frame == LiveWater.Frame.RESTING) GLES20.glClear(GLES20.GL_COLOR_BUFFER_BIT);  // nothing to show
+        while ((frame = tryFrame()) == LiveWater.Frame.WAITING && seconds() < start + LONGEST_WAIT) {
+            SystemClock.sleep(1);
+        }
+        if (frame != LiveWater.Frame.DRAWN) GLES20.glClear(GLES20.GL_COLOR_BUFFER_BIT);  // nothing to show
     }
 
     void report(TidemarkListener.Failure failure, String message) {
         Log.e(TAG, message);
-        TidemarkListener heard = listener;
-        if (heard != null) onMainThread(() -> heard.onFailure(failure, message));
+        tell(heard -> heard.onFailure(failure, message));
     }
 
     private void change(Change change) {
         changes.add(change);
-        requestRender.run();
+        askForFrame();
+    }
+
+    // One that rests would have to clear its surface, and shows its last picture as long as nobody asks.
+    private void askForFrame() {
+        if (newest == this) requestRender.run();
     }
 
     private LiveWater.Frame tryFrame() {
         synchronized (SHOWN) {
-            if (!isNewest() || !isReady()) return LiveWater.Frame.RESTING;
-            if (owner != this) takeOver();
+            // What was asked for before a newer one came can still be drawn until that one does.
+            if (newest != this && owner != mark || !isReady()) return LiveWater.Frame.RESTING;
+            if (owner != mark) takeOver();
             takeChanges();
             // The surface shows its buffer after every call, so every call has to fill it.
             water.redraw();
@@ -196,7 +217,11 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
             LiveWater.Frame frame = water.frame(start);
             if (frame == LiveWater.Frame.DRAWN) {
                 water.noteWork(seconds() - start);
-                askForNextFrame();
+                if (!water.isResting()) {
+                    askForFrame();
+                } else {
+                    tell(TidemarkListener::onCalm);
+                }
             }
             return frame;
         }
@@ -204,10 +229,6 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
 
     private static double seconds() {
         return SystemClock.elapsedRealtimeNanos() * 1.0e-9;
-    }
-
-    private boolean isNewest() {
-        return !SHOWN.isEmpty() && SHOWN.get(SHOWN.size() - 1) == this;
     }
 
     // Loads the library, which the layout editor and an app's tests on a desktop do not have.
@@ -229,7 +250,7 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
             water.renewContext();
             if (pictures != null) water.setPictures(pictures = pictures.asNew());
         }
-        owner = this;
+        owner = mark;
     }
 
     private void takeChanges() {
@@ -250,17 +271,12 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
         water.setPictures(handedIn);
     }
 
-    private void askForNextFrame() {
-        boolean isResting = water.isResting();
-        TidemarkListener heard = listener;
-        if (!isResting) {
-            requestRender.run();
-        } else if (heard != null) {
-            onMainThread(heard::onCalm);
-        }
-    }
-
-    private static void onMainThread(Runnable call) {
-        new Handler(Looper.getMainLooper()).post(call);
+    // A listener that was taken away meanwhile hears nothing.
+    private void tell(News news) {
+        if (listener == null) return;
+        new Handler(Looper.getMainLooper()).post(() -> {
+            TidemarkListener heard = listener;
+            if (heard != null) news.reach(heard);
+        });
     }
 }

@@ -8,6 +8,7 @@ import android.graphics.Bitmap;
 import android.opengl.GLSurfaceView;
 import android.util.AttributeSet;
 import android.view.MotionEvent;
+import android.view.SurfaceHolder;
 import android.view.ViewConfiguration;
 
 import org.jetbrains.annotations.NotNull;
@@ -21,8 +22,8 @@ import org.jetbrains.annotations.Nullable;
  * <p>A layout may say {@code app:portrait}, {@code app:landscape} and {@code app:light} (drawables that are bitmaps),
  * {@code app:look} (a raw resource that {@link Look#load} reads), {@code app:ink} and {@code app:rain}.
  *
- * <p>Of several views the newest one draws, since the library serves a single effect. An older one rests, and goes on
- * when the newer one is stopped or taken out of its window.
+ * <p>Of several views that are seen the newest one draws, since the library serves a single effect. An older one rests,
+ * and goes on when the newer one is stopped, hidden or taken out of its window.
  */
 public class TidemarkView extends GLSurfaceView {
     private static final int OPENGL_ES_2 = 0x20000;
@@ -31,7 +32,7 @@ public class TidemarkView extends GLSurfaceView {
     private final FirstFinger finger = new FirstFinger(renderer::touch);
     private boolean canDraw;  // not in a layout editor
     private boolean isStopped;
-    private boolean isDetached;
+    private boolean hasSurface;
     private boolean mayBeClick;
     private float downX;
     private float downY;
@@ -54,7 +55,11 @@ public class TidemarkView extends GLSurfaceView {
     public TidemarkView(@NotNull Context context, @Nullable AttributeSet attributes) {
         super(context, attributes);
         canDraw = !isInEditMode() && hasOpenGl(context);
-        if (canDraw) prepareSurface();
+        if (canDraw) {
+            prepareSurface();
+        } else {
+            getHolder().removeCallback(this);  // there is no thread to tell of a surface
+        }
         if (attributes == null) return;
         TypedArray given = context.obtainStyledAttributes(attributes, R.styleable.TidemarkView);
         try {
@@ -67,6 +72,7 @@ public class TidemarkView extends GLSurfaceView {
     private void prepareSurface() {
         setEGLContextClientVersion(2);
         setEGLConfigChooser(8, 8, 8, 0, 0, 0);
+        setEGLContextFactory(new ContextFactory(this::requestRender));
         setPreserveEGLContextOnPause(true);
         setRenderer(renderer);
         setRenderMode(RENDERMODE_WHEN_DIRTY);
@@ -129,7 +135,7 @@ public class TidemarkView extends GLSurfaceView {
     }
 
     /**
-     * A splash without a finger; it drops no ink.
+     * A splash without a finger; it drops no ink. Nothing while the view is not shown.
      *
      * @param x pixels from the left edge of the view
      * @param y pixels from its top edge
@@ -152,8 +158,8 @@ public class TidemarkView extends GLSurfaceView {
     /** With the activity's own {@code onStart}, or the fragment's; {@link #followLifecycle} spares you the call. */
     public void onStart() {
         isStopped = false;
+        showOrHide();
         if (canDraw) super.onResume();
-        if (!isDetached) renderer.show();
     }
 
     /**
@@ -161,9 +167,8 @@ public class TidemarkView extends GLSurfaceView {
      * they were, unless the device takes the context away.
      */
     public void onStop() {
-        finger.lift();
         isStopped = true;
-        renderer.hide();
+        showOrHide();
         if (canDraw) super.onPause();
     }
 
@@ -205,18 +210,33 @@ public class TidemarkView extends GLSurfaceView {
     }
 
     @Override
-    protected void onAttachedToWindow() {
-        super.onAttachedToWindow();
-        isDetached = false;
-        if (!isStopped) renderer.show();
+    public void surfaceCreated(SurfaceHolder holder) {
+        hasSurface = true;
+        showOrHide();
+        super.surfaceCreated(holder);
+    }
+
+    @Override
+    public void surfaceDestroyed(SurfaceHolder holder) {
+        hasSurface = false;
+        showOrHide();
+        super.surfaceDestroyed(holder);
     }
 
     @Override
     protected void onDetachedFromWindow() {
-        finger.lift();
-        isDetached = true;
-        renderer.hide();
+        hasSurface = false;
+        showOrHide();
         super.onDetachedFromWindow();
+    }
+
+    private void showOrHide() {
+        if (hasSurface && !isStopped) {
+            renderer.show();
+        } else {
+            finger.lift();
+            renderer.hide();
+        }
     }
 
     private boolean isNearDown(MotionEvent event) {

@@ -1,7 +1,5 @@
 #include "host/live_water.h"
 
-#include <utility>
-
 LiveWater::LiveWater(const Look& look, std::uint32_t seed) : host_(look, 1, 1, seed) {}
 
 void LiveWater::setPictures(Pictures pictures) {
@@ -31,6 +29,7 @@ void LiveWater::prepare() {
     proportions_ = host_.proportions();
     host_.handOver(pictures_, handOverDue_);
     const unsigned textures = handOverDue_ | texturesDue_;
+    prepared_ |= setUpDue_ || textures;
     if (setUpDue_) {
         host_.setUp(withInk_, textures);
     } else {

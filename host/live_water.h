@@ -5,6 +5,7 @@
 #pragma once
 
 #include <cstdint>
+#include <utility>
 
 #include "host/frame_clock.h"
 #include "host/look.h"
@@ -51,8 +52,11 @@ public:
     // Shorter by longer side of what the backgrounds are cropped to.
     double proportions() const { return host_.proportions(); }
 
-    // What the processor spent on the last frame, in seconds; frames that take long make the mesh coarser.
-    void noteWork(double seconds) { host_.noteWork(seconds); }
+    // What the processor spent on the last frame, in seconds; frames that take long make the mesh coarser. One that set
+    // the library up or took pictures over says nothing of the next ones.
+    void noteWork(double seconds) {
+        if (!std::exchange(prepared_, false)) host_.noteWork(seconds);
+    }
 
     // Does what frame() does before it draws: sets the library up and loads what was handed over, where that is due.
     void prepare();
@@ -72,4 +76,5 @@ private:
     unsigned handOverDue_ = 0;
     unsigned texturesDue_ = 0;  // besides those handed over
     double proportions_ = 0.0;  // to which the backgrounds were last cropped
+    bool prepared_ = false;     // what was due, since the last noteWork()
 };

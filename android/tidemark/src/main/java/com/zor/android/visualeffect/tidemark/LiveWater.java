@@ -30,6 +30,7 @@ public final class LiveWater {
     private int handOverDue;
     private int texturesDue;  // besides those handed over
     private double proportions;  // to which the backgrounds were last cropped
+    private boolean prepared;  // what was due, since the last noteWork()
 
     /**
      * Water that has no size and no pictures yet.
@@ -134,12 +135,14 @@ public final class LiveWater {
     }
 
     /**
-     * Frames that take long make the mesh coarser, where the look leaves it to the host.
+     * Frames that take long make the mesh coarser, where the look leaves it to the host. One that set the library up or
+     * took pictures over says nothing of the next ones.
      *
      * @param seconds that the processor spent on the last frame
      */
     public void noteWork(double seconds) {
-        host.noteWork(seconds);
+        if (!prepared) host.noteWork(seconds);
+        prepared = false;
     }
 
     /**
@@ -176,6 +179,7 @@ public final class LiveWater {
         proportions = host.proportions();
         host.handOver(pictures, handOverDue);
         int textures = handOverDue | texturesDue;
+        prepared |= setUpDue || textures != 0;
         if (setUpDue) {
             host.setUp(withInk, textures);
         } else {

@@ -8,8 +8,8 @@ import javax.microedition.khronos.egl.EGLContext;
 import javax.microedition.khronos.egl.EGLDisplay;
 
 /**
- * Contexts of OpenGL ES 2.0. When one is lost as a frame is shown, the platform makes another for the next frame only, and
- * water at rest would ask for none.
+ * Contexts of OpenGL ES 2.0. When one is lost as a frame is shown, the platform makes another for the next frame only,
+ * and water at rest would ask for none.
  */
 final class ContextFactory implements GLSurfaceView.EGLContextFactory {
     private static final int EGL_CONTEXT_CLIENT_VERSION = 0x3098;

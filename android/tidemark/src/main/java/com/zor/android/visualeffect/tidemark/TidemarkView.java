@@ -22,8 +22,8 @@ import org.jetbrains.annotations.Nullable;
  * <p>A layout may say {@code app:portrait}, {@code app:landscape} and {@code app:light} (drawables that are bitmaps),
  * {@code app:look} (a raw resource that {@link Look#load} reads), {@code app:ink} and {@code app:rain}.
  *
- * <p>Of several views that are seen the newest one draws, since the library serves a single effect. An older one rests,
- * and goes on when the newer one is stopped, hidden or taken out of its window.
+ * <p>Of several views that are seen the newest one draws, since the library serves a single effect. An older one
+ * rests, and goes on when the newer one is stopped, hidden or taken out of its window.
  */
 public class TidemarkView extends GLSurfaceView {
     private static final int OPENGL_ES_2 = 0x20000;

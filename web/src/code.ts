@@ -1,13 +1,14 @@
 // The chosen values for a page of one's own and for the hosts.
 import { defaultLook, lookKeys, lookOf } from 'tidemark-water';
-import { defaultSettings, type Settings } from './settings';
+import { defaultSettings, withPreset, type Settings } from './settings';
 
 // What an element or a canvas is told.
 function choices({ preset, ink, inkColor, rain, look }: Settings): Record<string, unknown> {
+    const usual = withPreset(preset);
     return {
         ...(preset !== defaultSettings().preset && { preset }),
-        ...(ink && { ink, ...(inkColor !== defaultSettings().inkColor && { inkColor }) }),
-        ...(rain > 0 && { rain }),
+        ...(ink && { ink, ...(inkColor !== usual.inkColor && { inkColor }) }),
+        ...(rain !== usual.rain && { rain }),
         ...(Object.keys(look).length > 0 && { look }),
     };
 }

@@ -101,7 +101,7 @@ async function takePhotos(files: File[]): Promise<void> {
     if (files.length === 0) return;
     photos = files;
     settings.picture = 'photo';
-    shown = shown === 'photo' ? null : shown;
+    if (shown === 'photo') void showPicture();
     apply();
 }
 function toggle(name: 'ink' | 'rain'): void {

@@ -94,7 +94,7 @@ export function makePanel(root: HTMLElement, settings: Settings, changed: () => 
     const copies = Object.entries({ HTML: toHtml, JavaScript: toJavaScript, Java: toJava, 'C++': toCpp }).map(([language, text]) => {
         const button = make('button', { type: 'button', title: `Copy as ${language}` }, language);
         button.onclick = async () => {
-            const copied = await navigator.clipboard.writeText(text(settings)).then(() => true, () => false);
+            const copied = await navigator.clipboard?.writeText(text(settings)).then(() => true, () => false);  // on plain HTTP there is none
             button.textContent = copied ? 'Copied' : 'Not allowed';
             setTimeout(() => (button.textContent = language), 1500);
         };

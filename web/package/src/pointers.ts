@@ -46,12 +46,13 @@ export function followPointers(target: EventTarget, water: Touched, signal: Abor
         drawing = null;
         send(action, event);
     };
+    // Of the window before anybody can stop them, or a stroke would never end.
     const listen = (on: EventTarget, type: string, call: (event: PointerEvent) => void) =>
-        on.addEventListener(type, call as EventListener, { signal, passive: true });
+        on.addEventListener(type, call as EventListener, { signal, passive: true, capture: on === window });
 
     listen(target, 'pointerdown', (event) => {
         if (!water.presses() || event.button !== 0) return;
-        if (drawing === null) {
+        if (drawing === null || drawing === event.pointerId) {
             drawing = event.pointerId;
             send(Touch.down, event);
         } else {
@@ -70,6 +71,7 @@ export function followPointers(target: EventTarget, water: Touched, signal: Abor
     // A stroke goes on beyond the edges.
     listen(window, 'pointermove', (event) => {
         if (event.pointerId !== drawing) return;
+        if (event.buttons === 0) return end(Touch.up)(event);
         const steps = event.getCoalescedEvents?.() ?? [];
         for (const step of steps.length > 0 ? steps : [event]) {
             if (step.timeStamp - lastTime >= shortestInterval) send(Touch.move, step);

@@ -74,15 +74,18 @@ export type Native = Instance & { setLook(look: Look): void };
 export async function instantiate(
     module: WebAssembly.Module, context: WebGLRenderingContext, upload: Upload, seed: number,
 ): Promise<Native> {
-    const instance = await createInstance({
-        context,
-        upload,
-        instantiateWasm(imports: WebAssembly.Imports, done: (instance: WebAssembly.Instance) => void) {
-            void WebAssembly.instantiate(module, imports).then(done);
-            return {};
-        },
+    const instance = await new Promise<unknown>((resolve, reject) => {
+        createInstance({
+            context,
+            upload,
+            instantiateWasm(imports: WebAssembly.Imports, done: (instance: WebAssembly.Instance) => void) {
+                WebAssembly.instantiate(module, imports).then(done, reject);
+                return {};
+            },
+        }).then(resolve, reject);
     }) as Instance;
     instance._begin(seed);
+    delete (context.canvas as { GLctxObject?: unknown }).GLctxObject;  // the canvas may outlive the water
     return Object.assign(instance, {
         setLook(look: Look) {
             const place = instance._lookToFill() >> 2;

@@ -6,7 +6,7 @@ declare module 'react' {
     namespace JSX {
         interface IntrinsicElements {
             'tidemark-water': DetailedHTMLProps<HTMLAttributes<WaterElement>, WaterElement> &
-                Omit<Options, 'src' | 'srcPortrait' | 'light'> & { src?: string; srcPortrait?: string; light?: string };
+                Omit<Options, 'src' | 'srcPortrait' | 'light'> & { src?: string; srcPortrait?: string; light?: string; label?: string };
         }
     }
 }

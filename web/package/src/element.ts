@@ -36,12 +36,22 @@ canvas:focus-visible + i { visibility: visible; }
 ::slotted([slot='fallback']) { position: absolute; inset: 0; z-index: -2; width: 100%; height: 100%; object-fit: cover; }
 :host([shown]) ::slotted([slot='fallback']) { visibility: hidden; transition: visibility 0s 0.6s; }
 `;
-let sheet: CSSStyleSheet | undefined;
+const sheets = new WeakMap<Document, CSSStyleSheet>();
+
+// Not a <style>, which a strict content security policy refuses. A document takes only its own.
+function sheetOf(document: Document): CSSStyleSheet {
+    const known = sheets.get(document);
+    if (known) return known;
+    const sheet = new (document.defaultView ?? globalThis as unknown as Window & typeof globalThis).CSSStyleSheet();
+    sheet.replaceSync(css);
+    sheets.set(document, sheet);
+    return sheet;
+}
 
 function parse(kind: string, text: string | null): unknown {
     if (text === null) return null;
     if (kind === 'flag') return !['false', 'off', '0', 'no'].includes(text);
-    if (kind === 'number') return text === '' || Number.isNaN(Number(text)) ? usualRain : Number(text);
+    if (kind === 'number') return text === '' ? usualRain : Number(text) || 0;
     if (kind !== 'json') return text;
     try {
         return JSON.parse(text);
@@ -66,11 +76,12 @@ export class WaterElement extends Base {
 
     /** What draws; null while the element is not in a document. */
     water: Water | null = null;
-    private canvas: HTMLCanvasElement | undefined;
-    private marker: HTMLElement | undefined;
-    private own: { src?: Source | null; srcPortrait?: Source | null; look?: Look | null } = {};
-    private due = false;
-    private at: [number, number] = [0.5, 0.5];  // where a key drops, as shares of the size
+    // Frameworks set every property that is there, so these are not.
+    #canvas: HTMLCanvasElement | undefined;
+    #marker: HTMLElement | undefined;
+    #own: { src?: Source | null; srcPortrait?: Source | null; look?: Look | null } = {};
+    #due = false;
+    #at: [number, number] = [0.5, 0.5];  // where a key drops, as shares of the size
 
     connectedCallback(): void {
         if (this.water) return;
@@ -81,10 +92,10 @@ export class WaterElement extends Base {
             delete (this as Record<string, unknown>)[property];
             (this as Record<string, unknown>)[property] = value;
         }
-        const [canvas, still] = this.build();
-        this.water = new Water(canvas, this.choices(), this, still);
-        for (const type of events) this.water.addEventListener(type, (event) => this.tell(event));
-        this.name();
+        const [canvas, still] = this.#build();
+        this.water = new Water(canvas, this.#choices(), this, still);
+        for (const type of events) this.water.addEventListener(type, (event) => this.#tell(event));
+        this.#name();
     }
 
     disconnectedCallback(): void {
@@ -92,10 +103,15 @@ export class WaterElement extends Base {
         queueMicrotask(() => this.isConnected || this.destroy());
     }
 
+    // Another document has other style sheets.
+    adoptedCallback(): void {
+        this.destroy();
+    }
+
     attributeChangedCallback(name: string): void {
-        if (name === 'src' || name === 'src-portrait') this.own.src = this.own.srcPortrait = undefined;
-        if (name === 'look') this.own.look = undefined;
-        this.changed();
+        if (name === 'src' || name === 'src-portrait') this.#own.src = this.#own.srcPortrait = undefined;
+        if (name === 'look') this.#own.look = undefined;
+        this.#changed();
     }
 
     drop(x: number, y: number, options?: DropOptions): void {
@@ -111,8 +127,8 @@ export class WaterElement extends Base {
         this.water?.play();
     }
     async setPicture(source: Source | null, portrait: Source | null = null): Promise<void> {
-        this.own.src = source;
-        this.own.srcPortrait = portrait;
+        this.#own.src = source;
+        this.#own.srcPortrait = portrait;
         await this.water?.setPicture(source, portrait);
     }
     toBlob(type?: string, quality?: number): Promise<Blob> {
@@ -126,79 +142,76 @@ export class WaterElement extends Base {
         this.removeAttribute('shown');
     }
 
-    private build(): [HTMLCanvasElement, HTMLCanvasElement] {
+    #build(): [HTMLCanvasElement, HTMLCanvasElement] {
         const root = this.shadowRoot ?? this.attachShadow({ mode: 'open' });
-        // Not a <style>, which a strict content security policy refuses.
-        if (!sheet) {
-            sheet = new CSSStyleSheet();
-            sheet.replaceSync(css);
-        }
-        root.adoptedStyleSheets = [sheet];
+        root.adoptedStyleSheets = [sheetOf(this.ownerDocument)];
+        this.removeAttribute('shown');  // of a copy
         const fallback = document.createElement('slot');
         fallback.name = 'fallback';
+        fallback.addEventListener('slotchange', () => this.#changed());
         const still = document.createElement('canvas');
         still.width = still.height = 1;
-        still.ariaHidden = 'true';
+        still.setAttribute('aria-hidden', 'true');
         const canvas = document.createElement('canvas');
-        canvas.addEventListener('keydown', (event) => this.press(event));
-        this.marker = document.createElement('i');
-        root.replaceChildren(fallback, still, canvas, this.marker, document.createElement('slot'));
-        this.canvas = canvas;
-        this.mark();
+        canvas.addEventListener('keydown', (event) => this.#press(event));
+        this.#marker = document.createElement('i');
+        root.replaceChildren(fallback, still, canvas, this.#marker, document.createElement('slot'));
+        this.#canvas = canvas;
+        this.#mark();
         return [canvas, still];
     }
 
-    private tell(event: Event): void {
+    #tell(event: Event): void {
         if (event.type === 'ready') this.setAttribute('shown', '');
         this.dispatchEvent(new CustomEvent(event.type, { detail: (event as CustomEvent<WaterError>).detail }));
     }
 
-    private changed(): void {
-        if (this.due || !this.water) return;
-        this.due = true;
+    #changed(): void {
+        if (this.#due || !this.water) return;
+        this.#due = true;
         queueMicrotask(() => {
-            this.due = false;
-            this.water?.set(this.choices());
-            this.name();
+            this.#due = false;
+            this.water?.set(this.#choices());
+            this.#name();
         });
     }
 
-    private choices(): Options {
+    #choices(): Options {
         const options: Record<string, unknown> = {};
         for (const { property } of Object.values(attributes)) options[property] = this[property];
         // A picture for browsers without water is one for those with it.
         const image = this.querySelector<HTMLImageElement>('img[slot=fallback]');
         options.src ??= image?.currentSrc || image?.src;
-        for (const [key, value] of Object.entries(this.own)) if (value !== undefined) options[key] = value;
+        for (const [key, value] of Object.entries(this.#own)) if (value !== undefined) options[key] = value;
         return options as Options;
     }
 
-    private name(): void {
-        const { canvas } = this;
+    #name(): void {
+        const canvas = this.#canvas;
         if (!canvas) return;
         const pressed = !(this.interaction ?? 'press').includes('none');
-        canvas.role = pressed ? 'button' : 'img';
-        canvas.ariaLabel = this.label ?? (pressed ? 'Water: press to let a drop fall' : 'Water');
+        canvas.setAttribute('role', pressed ? 'button' : 'img');
+        canvas.setAttribute('aria-label', this.label ?? (pressed ? 'Water: press to let a drop fall' : 'Water'));
         canvas.tabIndex = pressed ? 0 : -1;
     }
 
-    private press(event: KeyboardEvent): void {
+    #press(event: KeyboardEvent): void {
         const step = { ArrowLeft: [-1, 0], ArrowRight: [1, 0], ArrowUp: [0, -1], ArrowDown: [0, 1] }[event.key];
         const dropped = event.key === 'Enter' || event.key === ' ';
         if ((!step && !dropped) || event.ctrlKey || event.metaKey || event.altKey) return;
         event.preventDefault();
         const { clientWidth, clientHeight } = this;
         if (step) {
-            this.at = this.at.map((share, i) => Math.min(0.96, Math.max(0.04, share + 0.06 * step[i]!))) as [number, number];
-            this.mark();
+            this.#at = this.#at.map((share, i) => Math.min(0.96, Math.max(0.04, share + 0.06 * step[i]!))) as [number, number];
+            this.#mark();
         } else {
-            this.drop(this.at[0] * clientWidth, this.at[1] * clientHeight, { ink: Boolean(this.ink) });
+            this.drop(this.#at[0] * clientWidth, this.#at[1] * clientHeight, { ink: true });
         }
     }
 
-    private mark(): void {
-        this.marker!.style.left = `${100 * this.at[0]}%`;
-        this.marker!.style.top = `${100 * this.at[1]}%`;
+    #mark(): void {
+        this.#marker!.style.left = `${100 * this.#at[0]}%`;
+        this.#marker!.style.top = `${100 * this.#at[1]}%`;
     }
 
     static {
@@ -207,19 +220,20 @@ export class WaterElement extends Base {
                 configurable: true,
                 enumerable: true,
                 get(this: WaterElement) {
-                    if (property === 'look' && this.own.look) return this.own.look;
+                    if (property === 'look' && this.#own.look) return this.#own.look;
                     return parse(kind, this.getAttribute(name));
                 },
                 set(this: WaterElement, value: unknown) {
-                    if (property === 'look' && typeof value === 'object') {
-                        this.own.look = value as Look;
-                        this.changed();
+                    if (property === 'look' && value && typeof value === 'object') {
+                        this.#own.look = value as Look;
+                        this.#changed();
                     } else if (value === null || value === undefined) {
                         this.removeAttribute(name);
+                        this.attributeChangedCallback(name);  // what was no attribute goes as well
                     } else if (kind === 'flag') {
                         this.setAttribute(name, value || value === '' ? '' : 'off');
                     } else {
-                        this.setAttribute(name, String(value));
+                        this.setAttribute(name, kind === 'number' && value === true ? '' : String(value));
                     }
                 },
             });

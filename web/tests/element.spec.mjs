@@ -2,6 +2,7 @@
 import { execFileSync } from 'node:child_process';
 import { cpSync, existsSync, readFileSync } from 'node:fs';
 import { join } from 'node:path';
+import { PNG } from 'pngjs';
 import { expect, slope, test } from './page.mjs';
 
 const dist = new URL('../package/dist/', import.meta.url).pathname;
@@ -87,6 +88,21 @@ for (const [code, body, options, lack] of [
         problems.length = 0;  // the browser's own words on it
     });
 }
+
+test('what fails is told once, and a paused water shows another picture at another size', async ({ page }) => {
+    await show(page, `${script}<tidemark-water light="words.png"><img slot="fallback" src="pond.png" alt=""></tidemark-water>`);
+    await expect(element(page).locator('canvas').last()).toHaveCSS('opacity', '1');
+    expect(await element(page).evaluate(async (water, codes = []) => {
+        water.addEventListener('error', ({ detail }) => codes.push(detail.code));
+        water.pause();
+        await water.setPicture(new File(['words'], 'words.png')).catch(() => (water.rain = 3));
+        await new Promise((resolve) => setTimeout(resolve, 100));
+        await water.setPicture('pond.png');
+        return codes;
+    })).toEqual(['decode']);
+    await page.setViewportSize({ width: 300, height: 300 });
+    await expect.poll(async () => PNG.sync.read(await element(page).screenshot()).data[4 * 270]).toBeGreaterThan(150);
+});
 
 test('in a shadow root content is clicked and rippled, keys drop, and motion keeps to the wish', async ({ page }) => {
     await page.emulateMedia({ reducedMotion: 'reduce' });

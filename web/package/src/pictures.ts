@@ -24,7 +24,13 @@ function canvasOf(width: number, height: number): HTMLCanvasElement {
 
 async function loadImage(url: string, blob?: Blob): Promise<HTMLImageElement> {
     const image = new Image();
-    const away = !blob && new URL(url, document.baseURI).origin !== location.origin && !/^(data|blob):/.test(url);
+    let address: URL;
+    try {
+        address = new URL(url, document.baseURI);
+    } catch {
+        throw new WaterError('load', `${url} is no address.`);
+    }
+    const away = !blob && address.origin !== location.origin && !/^(data|blob):/.test(address.href);
     if (away) image.crossOrigin = 'anonymous';
     image.src = url;
     const loaded = await new Promise<boolean>((resolve) => {
@@ -54,9 +60,41 @@ async function loadImage(url: string, blob?: Blob): Promise<HTMLImageElement> {
 const still = (drawable: CanvasImageSource, size: () => [number, number]): Picture =>
     ({ drawable, size, moving: () => false, changed: () => false });
 
+/** Throws for what a texture would refuse in the middle of a frame. */
+function probe(picture: Picture): Picture {
+    const context = canvasOf(1, 1).getContext('2d', { willReadFrequently: true });
+    const [width, height] = picture.size();
+    if (!context || !width || !height) return picture;
+    try {
+        context.drawImage(picture.drawable, 0, 0, 1, 1, 0, 0, 1, 1);
+    } catch {
+        throw new WaterError('decode', 'The picture is broken.');
+    }
+    try {
+        context.getImageData(0, 0, 1, 1);
+    } catch {
+        throw new WaterError('cross-origin', 'The server of the picture does not allow this page to use it.');
+    }
+    return picture;
+}
+
+async function loadVideo(video: HTMLVideoElement): Promise<void> {
+    if (video.readyState > 1) return;
+    await new Promise<unknown>((resolve, reject) => {
+        const fail = () => reject(new WaterError('load', `${video.currentSrc} does not load.`));
+        if (video.error) fail();
+        video.addEventListener('loadeddata', resolve, { once: true });
+        video.addEventListener('error', fail, { once: true });
+    });
+}
+
 export async function loadPicture(source: Source): Promise<Picture> {
+    return probe(await load(source));
+}
+
+async function load(source: Source): Promise<Picture> {
     if (source instanceof HTMLVideoElement) {
-        if (source.readyState < 2) await new Promise((resolve) => source.addEventListener('loadeddata', resolve, { once: true }));
+        await loadVideo(source);
         let time = -1;
         return {
             drawable: source,

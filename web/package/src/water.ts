@@ -69,6 +69,8 @@ export class Water extends EventTarget implements Borrower, Touched {
     private shown = false;
     private inView = false;
     private paused = false;
+    private stale = true;     // a frame is due, even while it is paused
+    private lost = false;     // the browser has taken the context
     private asked = 0;
     private lastFrame = 0;
     private lastTouch = -touchCounts;
@@ -98,6 +100,7 @@ export class Water extends EventTarget implements Borrower, Touched {
         followPointers(target, this, signal);
         document.addEventListener('visibilitychange', () => this.update(), { signal });
         this.reducedMotion.addEventListener('change', () => this.apply(), { signal });
+        addEventListener('resize', () => this.fit(), { signal });  // also another pixel density
         canvas.addEventListener('webglcontextlost', () => this.contextLost(), { signal });
         canvas.addEventListener('webglcontextrestored', () => this.contextRestored(), { signal });
         this.fit();
@@ -117,7 +120,7 @@ export class Water extends EventTarget implements Borrower, Touched {
     /** Settles when the picture is there; of several asked for, the last one stays. */
     async setPicture(source: Source | null, portrait: Source | null = null): Promise<void> {
         Object.assign(this.options, { src: source, srcPortrait: portrait });
-        await this.choosePicture();
+        await this.choosePicture(true);
     }
 
     /** A drop at a point of the canvas, in CSS pixels from its top left corner. */
@@ -173,7 +176,6 @@ export class Water extends EventTarget implements Borrower, Touched {
         clearTimeout(this.parkTimer);
         clearTimeout(this.dropTimer);
         if (!this.gl?.isContextLost()) this.lose?.loseContext();
-        delete (this.canvas as { GLctxObject?: unknown }).GLctxObject;
         this.canvas.style.visibility = '';
         this.native = this.gl = this.picture = this.light = undefined;
         this.live = false;
@@ -209,9 +211,11 @@ export class Water extends EventTarget implements Borrower, Touched {
         return this.calm ? 1 : 2;
     }
     park(): void {
+        if (this.opening) return;  // and then it waits for its time again
         if (!this.live) return giveBack(this);
         const { canvas, still } = this;
-        if (still && this.shown && this.drawAgain()) {
+        this.stale = !still || !this.shown || !this.drawAgain();
+        if (still && !this.stale) {
             still.width = canvas.width;
             still.height = canvas.height;
             still.getContext('2d', { alpha: false })!.drawImage(canvas, 0, 0);
@@ -236,7 +240,7 @@ export class Water extends EventTarget implements Borrower, Touched {
         return motion === 'reduced' || (motion !== 'full' && this.reducedMotion.matches);
     }
     private running(): boolean {
-        return this.inView && !this.paused && !this.failed && !document.hidden && !this.end.signal.aborted;
+        return this.inView && (!this.paused || this.stale) && !this.failed && !document.hidden && !this.end.signal.aborted;
     }
 
     private pixel(x: number, y: number): [number, number] {
@@ -283,22 +287,21 @@ export class Water extends EventTarget implements Borrower, Touched {
             return;
         }
         // The still serves until something moves.
-        if (this.parked && this.calm && this.still) return;
+        if (this.parked && this.calm && !this.stale) return;
         this.wake();
     }
 
     private wake(): void {
-        if (!this.running()) return;
+        if (!this.running() || this.lost) return;
         if (!this.live) void this.open();
-        else if (this.picture) this.asked ||= requestAnimationFrame(this.draw);
+        else if (this.picture && this.light) this.asked ||= requestAnimationFrame(this.draw);
     }
 
     private async open(): Promise<void> {
         if (this.live || this.opening || this.failed || !borrow(this)) return;
         this.opening = true;
         try {
-            const [module, light] = await Promise.all([compile(), this.loadLight()]);
-            this.light = light;
+            const module = await compile();
             if (this.end.signal.aborted) return;
             const held = contextOf(this.canvas);
             if (!held) throw new WaterError('webgl', 'This browser has no WebGL, or has switched it off.');
@@ -319,6 +322,7 @@ export class Water extends EventTarget implements Borrower, Touched {
             this.live = true;
             this.given = '';
             this.apply();
+            if (!this.inView) this.setInView(false);
         } catch (error) {
             giveBack(this);
             this.fail(error);
@@ -339,12 +343,13 @@ export class Water extends EventTarget implements Borrower, Touched {
     private contextLost(): void {
         if (!this.live) return;
         this.live = false;
+        this.lost = true;
         this.dispatchEvent(new Event('contextlost'));
     }
     private contextRestored(): void {
-        if (this.live || this.parked || this.opening || !this.native) return;
-        this.native._renewContext();
-        this.live = true;
+        if (!this.lost) return;
+        this.lost = false;
+        this.stale = true;
         this.dispatchEvent(new Event('contextrestored'));
         this.wake();
     }
@@ -353,7 +358,8 @@ export class Water extends EventTarget implements Borrower, Touched {
         const { canvas } = this;
         const density = densities[this.options.quality ?? 'medium'] ?? densities.medium;
         const { clientWidth, clientHeight } = canvas;
-        const scale = Math.min(devicePixelRatio, density, longestSide / Math.max(clientWidth, clientHeight, 1));
+        if (!clientWidth || !clientHeight) return;  // not laid out now
+        const scale = Math.min(devicePixelRatio, density, longestSide / Math.max(clientWidth, clientHeight));
         const width = Math.max(shortestSide, Math.round(clientWidth * scale));
         const height = Math.max(shortestSide, Math.round(clientHeight * scale));
         if (width === canvas.width && height === canvas.height) return;
@@ -361,7 +367,7 @@ export class Water extends EventTarget implements Borrower, Touched {
         canvas.height = height;
         this.choosePictures();
         this.native?._resize(width, height);
-        this.native?._renewPictures();
+        this.renewPictures();
         if (this.live && this.running()) {
             // At once, or the canvas would show nothing until the next frame.
             cancelAnimationFrame(this.asked);
@@ -373,26 +379,27 @@ export class Water extends EventTarget implements Borrower, Touched {
 
     private choosePictures(): void {
         this.choosePicture().catch(() => {});
-        const { light = null } = this.options;
-        if (this.light && light !== this.lightSource) {
-            this.loadLight().then((loaded) => {
-                this.light = loaded;
-                this.native?._renewPictures();
-                this.wake();
-            }, (error) => this.fail(error));
-        }
+        this.chooseLight().catch((error) => this.fail(error));
     }
 
-    private async loadLight(): Promise<Picture | ImageBitmap> {
-        const { light = null } = this.options;
-        this.lightSource = light;
-        return light ? loadPicture(light) : shippedLight();
+    private async chooseLight(): Promise<void> {
+        const { light: source = null } = this.options;
+        if (source === this.lightSource) return;
+        this.lightSource = source;
+        const isLast = () => source === this.lightSource && !this.end.signal.aborted;
+        const loaded = source && await loadPicture(source).catch((error) => isLast() && this.fail(error));
+        const light = loaded || (source && this.light) || await shippedLight();
+        if (!isLast()) return;
+        this.light = light;
+        this.renewPictures();
+        this.wake();
     }
 
-    private async choosePicture(): Promise<void> {
+    // A picture that did not load is tried again only when it is asked for anew.
+    private async choosePicture(anew = false): Promise<void> {
         const { src = null, srcPortrait = null } = this.options;
         const source = this.canvas.height > this.canvas.width && srcPortrait ? srcPortrait : src;
-        if (source === this.pictureSource || source === '') return;
+        if ((source === this.pictureSource && !anew) || source === '') return;
         this.pictureSource = source;
         const ticket = ++this.pictureTicket;
         try {
@@ -406,12 +413,16 @@ export class Water extends EventTarget implements Borrower, Touched {
             }
         } catch (error) {
             if (ticket !== this.pictureTicket) return;
-            this.pictureSource = undefined;  // may be tried again
             this.fail(error);
             throw error;
         }
-        this.native?._renewPictures();
+        this.renewPictures();
         this.wake();
+    }
+
+    private renewPictures(): void {
+        this.native?._renewPictures();
+        this.stale = true;
     }
 
     // Called by the library's host in the middle of a frame, with textures of one pixel.
@@ -436,6 +447,7 @@ export class Water extends EventTarget implements Borrower, Touched {
         const text = JSON.stringify(look);
         if (text !== this.given) native.setLook(look);
         this.given = text;
+        this.stale = true;
         native._setInk(options.ink ?? preset?.ink ?? false);
         native._setRain(rain > 0);
         this.wake();
@@ -443,7 +455,7 @@ export class Water extends EventTarget implements Borrower, Touched {
 
     // False where there is nothing to draw on.
     private drawAgain(): boolean {
-        if (!this.live || !this.native || !this.picture) return false;
+        if (!this.live || this.failed || !this.native || !this.picture || !this.light) return false;
         this.native._renewPictures();
         // A step later than the last frame, which the host would think too early otherwise.
         this.lastFrame += 17;
@@ -453,7 +465,7 @@ export class Water extends EventTarget implements Borrower, Touched {
     private readonly draw = (now: number): void => {
         this.asked = 0;
         const { native, picture } = this;
-        if (!this.live || !native || !picture || !this.running()) return;
+        if (!this.live || !native || !picture || !this.light || !this.running()) return;
         const start = performance.now();
         if (picture.changed()) native._renewPictures();
         let frame: Frame;
@@ -462,6 +474,7 @@ export class Water extends EventTarget implements Borrower, Touched {
         } catch (error) {
             return this.fail(error);
         }
+        if (frame !== Frame.waiting) this.stale = false;
         if (frame === Frame.drawn) {
             this.cost.frame = blend(this.cost.frame, this.calm ? 0 : now - this.lastFrame);
             this.cost.work = blend(this.cost.work, performance.now() - start);

@@ -49,7 +49,7 @@ TEST_F(Host, aFlatSurfaceShowsThePhotoUndistortedAndFillingTheView) {
     expectMiddleOf(readPixels(kLong, kShort), kLong, kShort, landscape);
 }
 
-TEST_F(Host, ringsAreRoundOnTheScreenAndComeToRest) {
+TEST_F(Host, ringsAreRoundOnTheScreen) {
     WaterHost host = start(kShort, kLong);
     ASSERT_TRUE(host.advance(0.0)) << "the first frame is always drawn";
     host.draw();
@@ -78,15 +78,6 @@ TEST_F(Host, ringsAreRoundOnTheScreenAndComeToRest) {
     EXPECT_NEAR(right - left, top - bottom, 3);
     EXPECT_NEAR((left + right) / 2, kShort / 2, 2);
     EXPECT_NEAR((bottom + top) / 2, kLong / 2, 2);
-
-    double seconds = 0.0;
-    while (host.advance(1.0 / 60) && seconds < 20.0) {
-        host.draw();
-        seconds += 1.0 / 60;
-    }
-    EXPECT_GT(seconds, 1.0);
-    EXPECT_LT(seconds, 8.0) << "waves die within a few seconds";
-    EXPECT_FALSE(host.advance(1.0));
 }
 
 TEST_F(Host, theFrameRateDoesNotChangeTheWater) {

@@ -8,8 +8,8 @@
 
 inline int copiesOut = 0;  // not yet released
 
-template <class Array, class Element, class Reference>
-Element* copyElements(JNIEnv*, Reference reference, jboolean*) {
+template <class Array, class Element>
+Element* copyElements(JNIEnv*, auto reference, jboolean*) {
     const auto& values = static_cast<Array*>(reference)->values;
     auto* const copy = new Element[values.size()];
     std::ranges::copy(values, copy);
@@ -17,8 +17,8 @@ Element* copyElements(JNIEnv*, Reference reference, jboolean*) {
     return copy;
 }
 
-template <class Array, class Element, class Reference>
-void copyBack(JNIEnv*, Reference reference, Element* copy, jint mode) {
+template <class Array>
+void copyBack(JNIEnv*, auto reference, auto* copy, jint mode) {
     auto& values = static_cast<Array*>(reference)->values;
     if (mode != JNI_ABORT) std::copy_n(copy, values.size(), values.begin());
     delete[] copy;
@@ -26,11 +26,11 @@ void copyBack(JNIEnv*, Reference reference, Element* copy, jint mode) {
 }
 
 inline JNIEnv* copyingEnvironment() {
-    static JNINativeInterface_ table;
-    table.GetFloatArrayElements = copyElements<FloatArray, jfloat, jfloatArray>;
-    table.GetShortArrayElements = copyElements<ShortArray, jshort, jshortArray>;
-    table.ReleaseFloatArrayElements = copyBack<FloatArray, jfloat, jfloatArray>;
-    table.ReleaseShortArrayElements = copyBack<ShortArray, jshort, jshortArray>;
+    static JNINativeInterface_ table = {};
+    table.GetFloatArrayElements = copyElements<FloatArray, jfloat>;
+    table.GetShortArrayElements = copyElements<ShortArray, jshort>;
+    table.ReleaseFloatArrayElements = copyBack<FloatArray>;
+    table.ReleaseShortArrayElements = copyBack<ShortArray>;
     static JNIEnv environment = {&table};
     return &environment;
 }

@@ -9,15 +9,25 @@ export interface Painted {
     bitmap?: ImageBitmap;  // none where it failed
 }
 
-const loaded: Promise<Painter | null> = createPainter({ locateFile: () => url }).catch(() => null);
+interface Task {
+    id: number;
+    painting: Painting;
+    width: number;
+    height: number;
+}
 
-onmessage = async ({ data }: MessageEvent<{ id: number; painting: Painting; width: number; height: number }>) => {
-    const { id, painting, width, height } = data;
+const loaded: Promise<Painter> = createPainter({ locateFile: () => url });
+loaded.catch(() => {});  // told with the first task
+
+async function paint({ painting, width, height }: Task): Promise<ImageBitmap> {
     const module = await loaded;
-    if (!module) return postMessage({ id });
-    const paint = { pool: module._paintTiledPool, river: module._paintRiverBed, shore: module._paintSandyShore }[painting];
-    const place = paint(width, height);
+    const fill = { pool: module._paintTiledPool, river: module._paintRiverBed, shore: module._paintSandyShore }[painting];
+    const place = fill(width, height);
     const pixels = new Uint8ClampedArray(module.HEAPU8.slice(place, place + 4 * width * height).buffer);
-    const bitmap = await createImageBitmap(new ImageData(pixels, width, height));
-    postMessage({ id, bitmap }, { transfer: [bitmap] });
-};
+    return createImageBitmap(new ImageData(pixels, width, height));
+}
+
+onmessage = ({ data }: MessageEvent<Task>) => paint(data).then(
+    (bitmap) => postMessage({ id: data.id, bitmap }, { transfer: [bitmap] }),
+    () => postMessage({ id: data.id }),
+);

@@ -4,11 +4,14 @@
 #include <benchmark/benchmark.h>
 
 #include <algorithm>
+#include <cstdint>
 #include <string>
 #include <vector>
 
 #include "bench/frame_scene.h"
+#include "bench/surface.h"
 #include "fluid/fluid.h"
+#include "host/surface_mesh.h"
 #include "jni/globals.h"
 #include "jni/ink_frame.h"
 #include "tests/support/counting_gl.h"
@@ -32,6 +35,19 @@ void frames(benchmark::State& run, Scene kind, int vertices, int width, int heig
     run.counters["calls"] = calls / kCounted;
     run.counters["bytes"] = static_cast<double>(use.bytes) / kCounted;
     run.counters["allocations"] = static_cast<double>(allocations) / kCounted;
+}
+
+// What a mesh takes from the usual lattice under waves, where a view of 9 : 16 shows it.
+void meshHeights(benchmark::State& run, int vertices) {
+    const Surface waves(128);
+    SurfaceMesh mesh(waves.n, vertices, 9.0 / 16, 1.0);
+    const auto seen = static_cast<std::size_t>(mesh.columns().count * mesh.rows().count);
+    std::vector<float> attribs(3 * seen);
+    std::vector<std::int16_t> indices(6 * seen);
+    for (auto _ : run) {
+        mesh.gather(waves.height.data(), waves.velocity.data(), 0.0f, attribs.data(), indices.data());
+        benchmark::ClobberMemory();
+    }
 }
 
 // The ink's part of a frame, `age` frames after a fast drag has ended.
@@ -77,6 +93,10 @@ void addFrames(Scene scene, int vertices, int width, int height) {
 void registerFrames() {
     for (const Scene scene : {Scene::water, Scene::idleInk, Scene::drag}) addFrames(scene, 128, 1080, 1920);
     for (const int n : {64, 96, 192, 256}) addFrames(Scene::water, n, 1080, 1920);
+    for (const int n : {64, 96, 128, 192, 256}) {
+        benchmark::RegisterBenchmark(("mesh heights/" + std::to_string(n)).c_str(), meshHeights, n)
+            ->Unit(benchmark::kMicrosecond);
+    }
     addFrames(Scene::drag, 128, 540, 960);
     addFrames(Scene::drag, 128, 2160, 3840);
     for (const int age : {10, 500, 1000, 2000, 3000}) {

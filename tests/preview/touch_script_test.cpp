@@ -2,9 +2,7 @@
 
 #include <gtest/gtest.h>
 
-#include <cmath>
 #include <filesystem>
-#include <map>
 #include <sstream>
 
 static std::optional<std::vector<TouchEvent>> parse(const std::string& text, std::string& error) {
@@ -47,25 +45,17 @@ TEST(TouchScript, NamesTheLineThatIsWrong) {
 }
 
 TEST(TouchScript, ShippedScenesAreWholeGesturesInsideTheView) {
-    std::map<std::string, double> longest;  // move of each scene, in pixels
     for (const auto& entry : std::filesystem::directory_iterator(TIDEMARK_SCENES_PATH)) {
         std::string error;
         const auto events = loadTouchScript(entry.path().string(), error);
         ASSERT_TRUE(events) << error;
-        double& way = longest[entry.path().stem()];
         bool down = false;
-        int lastX = 0, lastY = 0;
         for (const TouchEvent& event : *events) {
             const int x = event.x.pixels(1080), y = event.y.pixels(1920);
             EXPECT_TRUE(x >= 0 && x < 1080 && y >= 0 && y < 1920) << entry.path() << " at " << event.timeMs;
             EXPECT_EQ(event.action == TouchAction::down, !down) << entry.path() << " at " << event.timeMs;
             down = event.action == TouchAction::down || event.action == TouchAction::move;
-            if (event.action == TouchAction::move) way = std::max(way, std::hypot(x - lastX, y - lastY));
-            lastX = x, lastY = y;
         }
         EXPECT_FALSE(down) << entry.path();
     }
-    EXPECT_LE(longest.at("slow"), 2.0);
-    EXPECT_TRUE(longest.at("medium") > 2.0 && longest.at("medium") <= 10.0) << longest.at("medium");
-    EXPECT_GT(longest.at("fast"), 10.0);
 }

@@ -202,4 +202,8 @@ TEST_F(Live, longFramesMakeTheMeshCoarser) {
     }
     EXPECT_EQ(bytes[0], 162 * 92 * 12) << "cells of 6 pixels, as many as the view shows";
     EXPECT_EQ(bytes[1], 123 * 69 * 12);
+    GLint triangles;
+    glBindBuffer(GL_ELEMENT_ARRAY_BUFFER, fluid.i_buf);
+    glGetBufferParameteriv(GL_ELEMENT_ARRAY_BUFFER, GL_BUFFER_SIZE, &triangles);
+    EXPECT_EQ(triangles, 122 * 68 * 12) << "no index too many";
 }

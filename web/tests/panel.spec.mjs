@@ -78,19 +78,21 @@ test('the copied code compiles in both languages and holds the values', async ({
 
     writeFileSync(join(outputDir, 'copied.cpp'), `#include "host/look.h"
 #include <cstdio>
-int main() {
-${await copied('C++')}
-std::printf("%d %.2f %.1f %.3f %.2f %s %s", look.meshExtent, look.calmingTime, look.exponent, look.inkRed,
-    look.refractiveIndex, withInk ? "true" : "false", raining ? "true" : "false");
-}`);
+struct Water {
+    void setLook(const Look& look) { std::printf("%d %.2f %.1f %.3f %.2f", look.meshExtent, look.calmingTime, look.exponent, look.inkRed, look.refractiveIndex); }
+    void setInk(bool withInk) { std::printf(withInk ? " true" : " false"); }
+    void setRain(bool falling) { std::printf(falling ? " true" : " false"); }
+};
+int main() { Water water; ${await copied('C++')} }`);
     run('g++', '-std=c++20', '-I', join(root, 'build/web/generated'), 'copied.cpp', '-o', 'copied');
     expect(run(join(outputDir, 'copied'))).toBe(output);
 
     copyFileSync(join(root, 'host/look.properties'), join(folder, 'look.properties'));
-    writeFileSync(join(outputDir, 'Copied.java'), `package com.zor.android.visualeffect.tidemark; class Copied { public static void main(String[] arguments) {
-        ${await copied('Java')}
-        System.out.print(look.meshExtent + " " + look.calmingTime + " " + look.exponent + " " + look.inkRed + " "
-            + look.refractiveIndex + " " + withInk + " " + raining); } }`);
+    writeFileSync(join(outputDir, 'Copied.java'), `package com.zor.android.visualeffect.tidemark; class Copied {
+        void setLook(Look look) { System.out.print(look.meshExtent + " " + look.calmingTime + " " + look.exponent + " " + look.inkRed + " " + look.refractiveIndex); }
+        void setInk(boolean withInk) { System.out.print(" " + withInk); }
+        void setRain(boolean falling) { System.out.print(" " + falling); }
+        public static void main(String[] arguments) { Copied water = new Copied(); ${await copied('Java')} } }`);
     const path = `${root}android/tidemark/src/main/java:/usr/share/java/org.jetbrains.annotations-java8.jar`;
     run('javac', '-d', '.', '-cp', path, 'Copied.java');
     expect(run('java', '-cp', '.', 'com.zor.android.visualeffect.tidemark.Copied')).toBe(output);

@@ -13,7 +13,7 @@
     android_packages=(clang lld llvm libc++-14-dev libc6-dev-arm64-cross libc6-dev-armel-cross android-liblog-dev
         android-platform-frameworks-native-headers android-libnativehelper-dev proguard-cli)
     web_packages=(cmake ninja-build openjdk-17-jdk-headless emscripten)
-    web_test_packages=(chromium libjetbrains-annotations-java)
+    web_test_packages=(chromium firefox-esr webkit2gtk-driver xvfb xauth libjetbrains-annotations-java)
     bench_packages=(clang libbenchmark-dev libeigen3-dev python3)
 }
 

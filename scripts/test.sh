@@ -6,7 +6,7 @@
 #             an emulator, that equal this machine's bit for bit
 #   --android the library as Android takes it: compiled, linked and sealed for three processors, and run with the
 #             shrunk Java classes
-#   --web     the package for web pages and the playground, in Chromium
+#   --web     the package for web pages and the playground, in Chromium, and the playground in Firefox and WebKitGTK
 set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/common.sh

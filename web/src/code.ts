@@ -28,20 +28,17 @@ export function toJavaScript(settings: Settings): string {
     return `import { createWater } from 'tidemark-water';\ncreateWater(document.querySelector('canvas'), ${JSON.stringify(options, null, 4)});\n`;
 }
 
-function assignments(settings: Settings): string {
+// For a `water` that is an Android view or a host in C++.
+function statements(settings: Settings): string {
     const usual = defaultLook();
     const look = lookOf(settings);
-    return lookKeys
-        .filter(({ name }) => look[name] !== usual[name])
-        .map(({ name, whole }) => {
-            const text = String(Number(look[name]!.toFixed(4)));
-            return `look.${name} = ${whole ? text : `${text.includes('.') ? text : `${text}.0`}f`};\n`;
-        })
-        .join('');
+    const assignments = lookKeys.filter(({ name }) => look[name] !== usual[name]).map(({ name, whole }) => {
+        const text = String(Number(look[name]!.toFixed(4)));
+        return `look.${name} = ${whole ? text : `${text.includes('.') ? text : `${text}.0`}f`};\n`;
+    });
+    return `${assignments.join('')}water.setLook(look);\nwater.setInk(${settings.ink});\nwater.setRain(${settings.rain > 0});\n`;
 }
 
-export const toCpp = (settings: Settings): string =>
-    `Look look;\n${assignments(settings)}const bool withInk = ${settings.ink};\nconst bool raining = ${settings.rain > 0};\n`;
+export const toCpp = (settings: Settings): string => `Look look;\n${statements(settings)}`;
 
-export const toJava = (settings: Settings): string =>
-    `Look look = new Look();\n${assignments(settings)}boolean withInk = ${settings.ink};\nboolean raining = ${settings.rain > 0};\n`;
+export const toJava = (settings: Settings): string => `Look look = new Look();\n${statements(settings)}`;

@@ -1,0 +1,107 @@
+// The playground in engines that Playwright does not drive as Debian ships them, on a screen of their own.
+import { spawn } from 'node:child_process';
+import { writeFileSync } from 'node:fs';
+import { expect, test } from '@playwright/test';
+import { PNG } from 'pngjs';
+import puppeteer from 'puppeteer-core';
+import { Builder, By } from 'selenium-webdriver';
+
+// Software graphics work in neither engine's sandbox.
+const env = { ...process.env, LIBGL_ALWAYS_SOFTWARE: '1', WEBKIT_DISABLE_SANDBOX_THIS_IS_DANGEROUS: '1' };
+
+const watch = () => {
+    window.problems = [];
+    console.error = console.warn = onerror = (...words) => window.problems.push(words.join(' '));
+    onunhandledrejection = ({ reason }) => window.problems.push(String(reason));
+};
+
+async function firefox() {
+    const extraPrefsFirefox = { 'webgl.force-enabled': true, 'webgl.disable-fail-if-major-performance-caveat': true, 'security.sandbox.content.level': 0 };
+    const browser = await puppeteer.launch({ browser: 'firefox', executablePath: '/usr/bin/firefox-esr', headless: false, env, extraPrefsFirefox });
+    const [page] = await browser.pages();
+    await page.evaluateOnNewDocument(watch);
+    return {
+        resize: (width, height) => page.setViewport({ width, height }),
+        show: (url) => page.goto(url),
+        run: (action) => page.evaluate(action),
+        async drag(y, from, to) {
+            await page.mouse.move(from, y);
+            await page.mouse.down();
+            await page.mouse.move(to, y, { steps: 3 });
+            await page.mouse.up();
+        },
+        pick: async (file) => (await page.$('#files')).uploadFile(file),
+        look: async () => Buffer.from(await page.screenshot()),
+        close: () => browser.close(),
+    };
+}
+
+async function webkit() {
+    const server = spawn('WebKitWebDriver', ['--port=4812', '--replace-on-new-session'], { env });
+    const options = { binary: '/usr/lib/x86_64-linux-gnu/webkit2gtk-4.1/MiniBrowser', args: ['--automation', '--enable-webgl=true'] };
+    const capabilities = { browserName: 'MiniBrowser', 'webkitgtk:browserOptions': options };
+    const connect = () => new Builder().usingServer('http://127.0.0.1:4812').withCapabilities(capabilities).build();
+    let driver;
+    await expect(async () => { driver = await connect(); }).toPass();
+    return {
+        resize: (width, height) => driver.manage().window().setRect({ x: 0, y: 0, width, height }),
+        show: async (url) => (await driver.get(url), driver.executeScript(watch)),  // no earlier in this driver
+        run: (action) => driver.executeScript(action),
+        drag: (y, from, to) => driver.actions().move({ x: from, y }).press().move({ x: to, y }).release().perform(),
+        pick: async (file) => (await driver.findElement(By.id('files'))).sendKeys(file),
+        look: async () => Buffer.from(await driver.takeScreenshot(), 'base64'),
+        close: () => driver.quit().finally(() => server.kill()),
+    };
+}
+
+for (const [name, start] of Object.entries({ firefox, webkit })) {
+    test(`the playground in ${name}`, async ({ baseURL }, info) => {
+        const engine = await start();
+        try {
+            const { run, look } = engine;
+            const message = () => run(() => document.querySelector('#message').textContent);
+            const calm = () => run(() => window.tidemark.water.water.calm);
+            // The least of a line across the water.
+            const red = async () => {
+                const { width, data } = PNG.sync.read(await look());
+                return Math.min(...Array.from({ length: 200 }, (_, x) => data[4 * (300 * width + 80 + x)]));
+            };
+            for (const [size, ...extent] of [['desktop', 1200, 900], ['phone', 390, 844]]) {
+                await engine.resize(...extent);
+                await engine.show(baseURL);
+                await expect.poll(() => run(() => document.querySelector('#water[shown]') !== null)).toBe(true);
+                await new Promise((resolve) => setTimeout(resolve, 1500));
+                writeFileSync(`../build/web/screens/${name}-${size}.png`, await look());
+            }
+            const photo = info.outputPath('photo.svg');
+            writeFileSync(photo, '<svg xmlns="http://www.w3.org/2000/svg" viewBox="0 0 9 9"><path fill="#ffc080" d="M0 0h9v9H0z"/></svg>');
+            await engine.pick(photo);
+            await expect.poll(calm).toBe(true);
+            expect(await red()).toBeGreaterThan(240);
+            await engine.drag(500, 200, 200);
+            await expect.poll(calm).toBe(false);
+            // The ink fades within a second, which is a few frames here.
+            await expect(async () => {
+                await engine.drag(300, 100, 260);
+                expect(await red()).toBeLessThan(150);
+            }).toPass({ timeout: 20_000 });
+
+            // WebKit refuses more than a hundred addresses in ten seconds.
+            await run(() => {
+                const slider = document.querySelector('[aria-label=Rain]');
+                for (let i = 0; i < 180; ++i) Object.assign(slider, { value: i % 60 }).dispatchEvent(new Event('input'));
+            });
+            await expect.poll(() => run(() => location.hash)).toBe('#rain=59');
+
+            await run(() => window.tidemark.water.water.lose.loseContext());
+            await expect.poll(message).toMatch(/come back/);
+            await run(() => window.tidemark.water.water.lose.restoreContext());
+            await expect.poll(message).toBe('');
+            await run(() => Object.assign(window.tidemark.water, { rain: 0 }).clearInk());
+            await expect.poll(red).toBeGreaterThan(240);
+            expect(await run(() => window.problems)).toEqual([]);
+        } finally {
+            await engine.close();
+        }
+    });
+}

@@ -160,27 +160,3 @@ TEST_F(Host, inkBloomsInItsColorFadesAndIsClearedAtOnce) {
     host.draw();
     EXPECT_EQ(readPixels(width, height), clear) << "a switch ends the stroke that it interrupts";
 }
-
-TEST_F(Host, inkAndWaterSwitchInAnyOrderAcrossLostContexts) {
-    constexpr int width = 240;
-    constexpr int height = 320;
-    const auto inkAfter = [this](std::initializer_list<int> setUps) {
-        // Negative: the context is lost before.
-        WaterHost host = start(width, height, 1, false);
-        for (const int mode : setUps) {
-            if (mode < 0) renewContext(width, height);
-            host.setUp(std::abs(mode) == 2);
-        }
-        host.touch(TouchAction::down, width / 2, height / 2, 1.0f);
-        for (int i = 0; i < 8; ++i) {
-            host.advance(1.0 / 60);
-            host.draw();
-        }
-        return readPixels(width, height);
-    };
-    const auto expected = inkAfter({2});
-    EXPECT_EQ(inkAfter({-2}), expected);
-    EXPECT_EQ(inkAfter({2, -1, 2}), expected);
-    EXPECT_EQ(inkAfter({2, 1, -2}), expected);
-    EXPECT_EQ(inkAfter({2, -1, -2, 1, 2, -2}), expected);
-}

@@ -1,4 +1,4 @@
-// What the page does with pointers, photos and a lost context.
+// What the page does with pointers and photos. Lost contexts: engines.spec.mjs.
 import { difference, expect, flatPixels, open, pixelsAfter, slope, takeOver, test } from './page.mjs';
 
 function expectMiddleOf(pixels, view, [width, height]) {
@@ -97,16 +97,4 @@ test('keys and buttons switch the ink, and clear it', async ({ page }) => {
     const clear = difference(await pixelsAfter(page, drawn), flat);
     expect(inked).toBeGreaterThan(1.2 * clear);
     expect(cleared).toBeLessThan(inked);
-});
-
-test('a lost context is told and survived', async ({ page }) => {
-    await page.emulateMedia({ reducedMotion: 'reduce' });  // no drop falls by itself
-    await open(page);
-    await takeOver(page);
-    const flat = await flatPixels(page);
-    await page.evaluate(() => window.tidemark.water.water.lose.loseContext());
-    await expect(page.getByRole('status')).toHaveText(/come back/);
-    await page.evaluate(() => window.tidemark.water.water.lose.restoreContext());
-    await expect(page.getByRole('status')).toHaveText('');
-    expect(difference(await flatPixels(page), flat)).toBeLessThan(0.3);
 });

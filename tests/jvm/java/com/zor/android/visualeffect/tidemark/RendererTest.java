@@ -89,17 +89,6 @@ public final class RendererTest {
     }
 
     @Test
-    public void aRotationShowsTheOtherPicture() {
-        start();
-        drawUntilRest();
-        resize(SHORT, SHORT);
-        drawUntilRest();
-        resize(LONG, SHORT);
-        drawUntilRest();
-        expectColor(GREEN);
-    }
-
-    @Test
     public void inkShowsAndFadesAndComesBackAfterALostContext() {
         start();
         view.setInk(true);

@@ -5,8 +5,13 @@ const waiting = new Map<number, { resolve(bitmap: ImageBitmap): void; reject(err
 let lastId = 0;
 let worker: Worker | undefined;
 
+declare global {
+    var painter: Worker | null | undefined;  // which the built page starts before its scripts are there
+}
+
 function startWorker(): Worker {
-    const started = new Worker(new URL('./painter.ts', import.meta.url), { type: 'module' });
+    const started = globalThis.painter ?? new Worker(new URL('./painter.ts', import.meta.url), { type: 'module' });
+    globalThis.painter = null;
     const fail = () => {
         for (const { reject } of waiting.values()) reject(new Error('The painted pictures do not load. Please try again.'));
         waiting.clear();

@@ -10,11 +10,11 @@ if [ "${1-}" = --asan ]; then
     shift
 fi
 no_more_arguments "scripts/endurance.sh [--asan]" "$@"
-install_missing "${build_packages[@]}" "${test_packages[@]}"
+install_missing "${build_packages[@]}" "${test_packages[@]}" "${fuzz_packages[@]}"
 
 cmake --preset "$preset" -DTIDEMARK_TESTS=ON -DTIDEMARK_WERROR=ON >/dev/null
 cmake --build --preset "$preset" --target tidemark_endurance tidemark_counting_tests
-# As in CMakePresets.json. The leak checker's own guess at where a thread's variables lie crashes it on some addresses.
-export TIDEMARK_ENDURANCE=full ASAN_OPTIONS=allocator_may_return_null=1:intercept_tls_get_addr=0
+# As in CMakePresets.json.
+export TIDEMARK_ENDURANCE=full ASAN_OPTIONS=allocator_may_return_null=1
 "build/$preset/tests/endurance/tidemark_endurance"
 "build/$preset/tests/tidemark_counting_tests" --gtest_filter='LongRun.*'

@@ -6,7 +6,8 @@ const port = 4811;
 export default defineConfig({
     testDir: '.',
     outputDir: '../../build/web/test-results',
-    workers: 1,
+    workers: 2,
+    fullyParallel: true,
     timeout: 90_000,
     expect: { timeout: 20_000 },
     use: {

@@ -3,7 +3,7 @@ import './style.css';
 import { WaterError, type ErrorCode, type WaterElement } from 'tidemark-water';
 import { makePanel } from './panel';
 import { paint } from './pictures';
-import { fromHash, toHash, type PictureName, type Settings } from './settings';
+import { fromHash, toHash, type Settings } from './settings';
 
 const element = <T extends HTMLElement>(id: string) => document.querySelector<T>(`#${id}`)!;
 const water = element<WaterElement>('water');
@@ -12,7 +12,7 @@ const settings: Settings = fromHash(location.hash);
 const usualRain = 14;
 
 let photos: File[] = [];
-let shown: PictureName | 'src' | null = null;
+let shown: Settings['picture'] | null = null;
 let lastTicket = 0;  // of the picture asked for last
 let repaintDue = 0;
 let addressDue = 0;
@@ -56,7 +56,7 @@ async function showPicture(): Promise<void> {
             const turned = second && (await isPortrait(first!));
             if (!isLast()) return;
             await water.setPicture(turned ? second : first!, (turned ? first : second) ?? null);
-        } else {
+        } else if (shown !== 'src') {
             const density = Math.min(devicePixelRatio, 2, 2048 / Math.max(water.clientWidth, water.clientHeight));
             const bitmap = await paint(shown, Math.round(water.clientWidth * density), Math.round(water.clientHeight * density));
             if (isLast()) await water.setPicture(bitmap);
@@ -64,7 +64,7 @@ async function showPicture(): Promise<void> {
     } catch (error) {
         if (!isLast()) return;
         shown = before;
-        if (before && before !== 'src') settings.picture = before;
+        if (before) settings.picture = before;
         // The element has told its own errors.
         if (!(error instanceof WaterError)) say(String((error as Error).message));
         panel.refresh();
@@ -76,14 +76,14 @@ async function showPicture(): Promise<void> {
 
 const apply = () => {
     if (settings.picture === 'photo' && photos.length === 0) {
-        settings.picture = shown && shown !== 'src' ? shown : 'pool';
+        settings.picture = shown ?? 'pool';
         element('files').click();
     }
     const { preset, ink, inkColor, rain, look } = settings;
     Object.assign(water, { preset, ink, inkColor, rain, look: { ...look } });
     element('ink').ariaPressed = String(ink);
     element('rain').ariaPressed = String(rain > 0);
-    if (settings.picture !== shown && !(shown === 'src' && settings.picture === 'pool')) void showPicture();
+    if (settings.picture !== shown) void showPicture();
     panel.refresh();
     // Some browsers refuse more than a hundred changes in ten seconds.
     clearTimeout(addressDue);
@@ -145,7 +145,7 @@ addEventListener('drop', (event) => {
     void takePhotos([...event.dataTransfer!.files]);
 });
 addEventListener('hashchange', () => {
-    Object.assign(settings, fromHash(location.hash), shown === 'photo' ? { picture: 'photo' } : {});
+    Object.assign(settings, fromHash(location.hash), shown === 'photo' || shown === 'src' ? { picture: shown } : {});
     apply();
 });
 // Painted pictures fit one size; until the next is painted the last one serves, cropped.
@@ -156,8 +156,7 @@ addEventListener('resize', () => {
 
 water.addEventListener('pointerdown', hideHint);
 water.addEventListener('ready', () => setTimeout(hideHint, 9000));
-water.addEventListener('error', (event) => {
-    const { code, message } = (event as Event as CustomEvent<WaterError>).detail;
+water.addEventListener('error', ({ detail: { code, message } }) => {
     say(sentences[code] ?? message, ['webgl', 'simd', 'csp', 'module'].includes(code));
 });
 water.addEventListener('contextlost', () => say('The browser took the graphics away. They come back by themselves.', true));
@@ -169,7 +168,7 @@ setInterval(() => {
 if (asked.get('ui') === '0') document.body.classList.add('bare');
 const src = asked.get('src');
 if (src) {
-    shown = 'src';
+    settings.picture = shown = 'src';
     water.src = src;
 }
 togglePanel(!matchMedia('(max-width: 900px), (max-height: 560px)').matches);

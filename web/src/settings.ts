@@ -5,7 +5,7 @@ export const pictureNames = { pool: 'Tiled pool', river: 'River bed', shore: 'Sa
 export type PictureName = keyof typeof pictureNames;
 
 export interface Settings {
-    picture: PictureName;
+    picture: PictureName | 'src';  // of the address
     preset: string;
     ink: boolean;
     inkColor: string;
@@ -29,7 +29,7 @@ export function toHash(settings: Settings): string {
     const words = new URLSearchParams();
     if (settings.preset !== usualPreset) words.set('preset', settings.preset);
     // A photo stays with its owner.
-    if (settings.picture !== usual.picture && settings.picture !== 'photo') words.set('picture', settings.picture);
+    if (settings.picture !== usual.picture && !['photo', 'src'].includes(settings.picture)) words.set('picture', settings.picture);
     if (settings.ink !== usual.ink) words.set('ink', settings.ink ? '1' : '0');
     if (settings.inkColor !== usual.inkColor) words.set('inkColor', settings.inkColor);
     if (settings.rain !== usual.rain) words.set('rain', String(settings.rain));

@@ -115,28 +115,64 @@ test('in a shadow root content is clicked and rippled, keys drop, and motion kee
     await calm(false);
     await expect(page.getByText('Buy!')).toBeVisible();
     await calm(true);
-    await page.getByRole('button', { name: /Water/ }).press('Enter');
+    const canvas = page.getByRole('button', { name: /Water/ });
+    for (const key of ['ArrowLeft', 'ArrowUp', 'ArrowUp', 'Enter']) await canvas.press(key);
+    await expect(element(page).locator('i')).toHaveAttribute('style', 'left: 44%; top: 38%;');
     await calm(false);
 });
 
-test('a canvas of the page shows a source that moves, and gives its picture out; a server imports the module', async ({ page }) => {
+test('canvases of the page show a canvas and a video that move, and give pictures out; a server imports the module', async ({ page }) => {
     execFileSync('node', ['-e', "import('./tidemark-water.js')"], { cwd: dist });
-    await show(page, '<canvas style="width: 100px; height: 100px"></canvas>');
-    const reds = await page.evaluate(async () => {
+    await show(page, '<canvas style="width: 100px; height: 100px"></canvas>'.repeat(2));
+    const [reds, codes] = await page.evaluate(async () => {
         const { createWater } = await import('./tidemark-water.js');
-        const source = new OffscreenCanvas(8, 8).getContext('2d', { willReadFrequently: true });
-        const water = createWater(document.querySelector('canvas'), { src: source.canvas });
-        const redOf = async (color) => {
-            source.fillStyle = color;
-            source.fillRect(0, 0, 8, 8);
-            await water.ready;
-            await new Promise((resolve) => setTimeout(resolve, 300));
-            source.drawImage(await createImageBitmap(await water.toBlob()), 0, 0, 8, 8);
-            return source.getImageData(4, 4, 1, 1).data[0];
-        };
-        return [await redOf('red'), await redOf('black')];
+        const source = document.createElement('canvas').getContext('2d');
+        const video = Object.assign(document.createElement('video'), { srcObject: source.canvas.captureStream(), muted: true });
+        const scratch = new OffscreenCanvas(8, 8).getContext('2d', { willReadFrequently: true });
+        const canvases = document.querySelectorAll('canvas');
+        const waters = [source.canvas, video].map((src, i) => createWater(canvases[i], { src }));
+        const reds = [];
+        for (const color of ['red', 'black']) {
+            const paint = setInterval(() => (source.fillStyle = color, source.fillRect(0, 0, 999, 999)), 20);
+            await video.play();
+            for (const water of waters) {
+                await water.ready;
+                await new Promise((resolve) => setTimeout(resolve, 500));
+                scratch.drawImage(await createImageBitmap(await water.toBlob()), 0, 0, 8, 8);
+                reds.push(scratch.getImageData(4, 4, 1, 1).data[0]);
+            }
+            clearInterval(paint);
+        }
+        const codes = [];
+        waters[0].addEventListener('error', ({ detail }) => codes.push(detail.code));
+        const foreign = Object.assign(new Image(), { src: 'http://other.test/pond.png' });
+        await foreign.decode();
+        source.drawImage(foreign, 0, 0);
+        await new Promise((resolve) => setTimeout(resolve, 300));
+        return [reds, codes];
     });
-    expect(reds.map((red) => red > 100)).toEqual([true, false]);
+    expect(reds.map((red) => red > 100)).toEqual([true, true, false, false]);
+    expect(codes).toEqual(['cross-origin']);
+});
+
+test('a high element shows the portrait, and off screen a still picture until it is touched again', async ({ page }) => {
+    const [wide, high] = [[80, 40], [40, 80]];
+    const files = { 'wide.png': slope(...wide).buffer, 'high.png': slope(...high).buffer };
+    await show(page, `${script}<tidemark-water src="wide.png" src-portrait="high.png" style="height: 40vw"></tidemark-water><p style="margin: 3000px">`, { files });
+    await element(page).and(page.locator('[shown]')).waitFor();
+    const size = () => element(page).evaluate(({ water }) => water.picture.size());
+    const live = () => element(page).evaluate(({ water }) => water.live);
+    expect(await size()).toEqual(wide);
+    await element(page).evaluate(({ style }) => { style.height = '280px'; });
+    await expect.poll(size).toEqual(high);
+    await page.evaluate(() => scrollTo(0, 2000));
+    await expect.poll(live).toBe(false);
+    await page.evaluate(() => scrollTo(0, 0));
+    const red = async (x) => PNG.sync.read(await element(page).screenshot()).data[4 * x];
+    await expect.poll(async () => (await red(170)) - (await red(20))).toBeGreaterThan(100);
+    expect(await live()).toBe(false);
+    await element(page).click();
+    await expect.poll(live).toBe(true);
 });
 
 test('the packed package works in a fresh project, with and without a bundler', async ({ page }, { outputDir }) => {

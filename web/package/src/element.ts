@@ -2,7 +2,7 @@
 import { WaterError } from './errors.js';
 import type { Look } from './look.js';
 import type { Source } from './pictures.js';
-import { Water, type DropOptions, type Options } from './water.js';
+import { Water, type DropOptions, type Options, type WaterEvents } from './water.js';
 
 // Attributes and the properties that go with them.
 const attributes: Record<string, { property: keyof Options | 'label'; kind: 'text' | 'flag' | 'number' | 'json' }> = {
@@ -24,7 +24,8 @@ const events = ['ready', 'error', 'calm', 'wake', 'contextlost', 'contextrestore
 const usualRain = 6;
 
 const css = `
-:host { display: block; position: relative; isolation: isolate; overflow: hidden; min-height: 160px; touch-action: pan-y; }
+:host { display: block; position: relative; isolation: isolate; overflow: hidden; min-height: 160px;
+    touch-action: pan-y pinch-zoom; }
 :host([hidden]) { display: none; }
 canvas { position: absolute; inset: 0; z-index: -1; width: 100%; height: 100%; opacity: 0; transition: opacity 0.5s;
     user-select: none; -webkit-user-select: none; -webkit-touch-callout: none; outline: none; touch-action: inherit; }
@@ -69,6 +70,10 @@ export interface WaterElement extends Omit<Options, 'src' | 'srcPortrait' | 'lig
     light: string | null;
     /** What assistive technology calls the water. */
     label: string | null;
+
+    addEventListener<Type extends keyof WaterEvents>(
+        type: Type, listener: (this: WaterElement, event: WaterEvents[Type]) => unknown, options?: boolean | AddEventListenerOptions): void;
+    addEventListener(type: string, listener: EventListenerOrEventListenerObject | null, options?: boolean | AddEventListenerOptions): void;
 }
 
 export class WaterElement extends Base {

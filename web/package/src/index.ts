@@ -5,7 +5,7 @@ export { WaterError, type ErrorCode } from './errors.js';
 export { defaultLook, lookKeys, lookOf, presets, type Choices, type Look, type LookKey, type Preset, type Quality } from './look.js';
 export { Touch } from './native.js';
 export type { Source } from './pictures.js';
-export { createWater, Water, type DropOptions, type Options } from './water.js';
+export { createWater, Water, type DropOptions, type Options, type WaterEvents } from './water.js';
 
 declare global {
     interface HTMLElementTagNameMap {

@@ -138,7 +138,12 @@ export function uploadCover(
         context.drawImage(picture.drawable, (fullWidth - width * scale) / 2, (fullHeight - height * scale) / 2,
             width * scale, height * scale, 0, 0, width, height);
     }
-    upload(gl, texture, scratch);
+    try {
+        upload(gl, texture, scratch);
+    } catch {  // a canvas that was drawn on since
+        scratch = undefined;
+        throw new WaterError('cross-origin', 'The picture holds what this page may not use.');
+    }
     if (!picture.moving()) scratch.width = scratch.height = 1;
 }
 

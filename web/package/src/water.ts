@@ -29,13 +29,17 @@ export interface DropOptions {
     ink?: boolean;
 }
 
+export interface WaterEvents extends Record<'ready' | 'calm' | 'wake' | 'contextlost' | 'contextrestored', Event> {
+    error: CustomEvent<WaterError>;
+}
+
 /** Milliseconds; see `Water.cost`. */
 export interface Cost {
     frame: number;
     work: number;
 }
 
-const densities = { low: 1, medium: 2, high: 3 };
+const densities = new Map([['low', 1], ['medium', 2], ['high', 3]]);
 const longestSide = 2048;  // as much as a phone draws at full speed
 const shortestSide = 64;
 const parkAfter = 4000;    // milliseconds out of view
@@ -44,6 +48,12 @@ const lightSide = 512;
 
 // Steady enough to be read.
 const blend = (old: number, value: number) => (old ? old + 0.1 * (value - old) : value);
+
+export interface Water {
+    addEventListener<Type extends keyof WaterEvents>(
+        type: Type, listener: (this: Water, event: WaterEvents[Type]) => unknown, options?: boolean | AddEventListenerOptions): void;
+    addEventListener(type: string, listener: EventListenerOrEventListenerObject | null, options?: boolean | AddEventListenerOptions): void;
+}
 
 export class Water extends EventTarget implements Borrower, Touched {
     /** Settles with the first picture, or fails with a `WaterError`. */
@@ -356,7 +366,7 @@ export class Water extends EventTarget implements Borrower, Touched {
 
     private fit(): void {
         const { canvas } = this;
-        const density = densities[this.options.quality ?? 'medium'] ?? densities.medium;
+        const density = densities.get(this.options.quality ?? 'medium') ?? 2;
         const { clientWidth, clientHeight } = canvas;
         if (!clientWidth || !clientHeight) return;  // not laid out now
         const scale = Math.min(devicePixelRatio, density, longestSide / Math.max(clientWidth, clientHeight));
@@ -432,7 +442,13 @@ export class Water extends EventTarget implements Borrower, Touched {
         const longer = Math.max(canvas.width, canvas.height);
         const shorter = Math.max(1, Math.round(longer * proportions));
         const upright = canvas.height >= canvas.width;
-        uploadCover(gl, background, picture, upright ? shorter : longer, upright ? longer : shorter);
+        const cover = (shown: Picture) => uploadCover(gl, background, shown, upright ? shorter : longer, upright ? longer : shorter);
+        try {
+            cover(picture);
+        } catch (error) {
+            cover((this.picture = plainPicture()));
+            this.fail(error);
+        }
         if ('drawable' in light) uploadCover(gl, shine, light, lightSide, lightSide);
         else upload(gl, shine, light);
     }

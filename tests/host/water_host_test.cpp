@@ -11,11 +11,11 @@ protected:
     static constexpr int kLong = 96;
     static constexpr int kShort = 54;
 
-    WaterHost start(int width, int height, std::uint32_t seed = 1, bool withInk = false, const Look& look = {}) {
+    WaterHost start(int width, int height, bool withInk = false, const Look& look = {}) {
         renewContext(width, height);
         resetGestures();
         srand48(1);
-        WaterHost host(look, width, height, seed);
+        WaterHost host(look, width, height, 1);
         host.handOver({portrait, landscape, smoothPicture(16, 16, 3)});
         host.setUp(withInk);
         return host;
@@ -93,24 +93,6 @@ TEST_F(Host, theFrameRateDoesNotChangeTheWater) {
     EXPECT_EQ(after(60.0, 1), after(0.25, 1)) << "a pause is cut to the longest frame";
 }
 
-TEST_F(Host, rainFallsWhereItsSeedSaysAndSurvivesALostContext) {
-    const auto rained = [this](std::uint32_t seed, bool loseContext) {
-        WaterHost host = start(kShort, kLong, seed);
-        host.rain(true);
-        for (int i = 0; i < 90; ++i) host.advance(1.0 / 60);
-        if (loseContext) {
-            renewContext(kShort, kLong);
-            host.setUp(false);
-        }
-        host.draw();
-        return readPixels(kShort, kLong);
-    };
-    const auto once = rained(5, false);
-    EXPECT_EQ(rained(5, false), once);
-    EXPECT_NE(rained(6, false), once);
-    EXPECT_EQ(rained(5, true), once) << "all state of the water is the host's";
-}
-
 // Without ripples, so that nothing but the ink asks for frames and changes the picture.
 TEST_F(Host, inkBloomsInItsColorFadesAndIsClearedAtOnce) {
     constexpr int width = 150;
@@ -119,7 +101,7 @@ TEST_F(Host, inkBloomsInItsColorFadesAndIsClearedAtOnce) {
     look.touchAmplitude = 0.0f;
     look.stepsToRest = 1;
     look.meshVertices = 16;
-    WaterHost host = start(width, height, 1, true, look);
+    WaterHost host = start(width, height, true, look);
     host.draw();
     const auto clear = readPixels(width, height);
     const auto at = [](int x, int y) { return static_cast<std::size_t>(y * width + x); };

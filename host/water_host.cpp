@@ -279,13 +279,14 @@ void WaterHost::draw() {
         frames = std::clamp(takeSteps(dueInkSteps_), 1, kMostInkSteps);
         dueInkSteps_ = std::clamp(dueInkSteps_, -0.5, 0.5);
     }
-    for (int i = 0; i < frames; ++i) {
+    for (int i = 1; i <= frames; ++i) {
+        // Only the last one is seen. The others move the ink below a mesh of nothing.
+        const auto sizeOf = [&](const auto& array) { return i == frames ? static_cast<jint>(array.values.size()) : 0; };
         native::onDrawFrame(
-            env, nullptr, &positions_, &heightAttribs_, &indices_, static_cast<jint>(positions_.values.size()),
-            static_cast<jint>(heightAttribs_.values.size()), static_cast<jint>(indices_.values.size()), &mvp_,
-            pictureWidth_, pictureHeight_, vertices_, vertices_, look_.refractiveIndex, look_.alphaMix,
-            look_.alphaScale1, look_.alphaScale2, look_.inkRed, look_.inkGreen, look_.inkBlue, look_.fresnelRatio,
-            look_.specularRatio, look_.exponent, width_ > height_);
+            env, nullptr, &positions_, &heightAttribs_, &indices_, sizeOf(positions_), sizeOf(heightAttribs_),
+            sizeOf(indices_), &mvp_, pictureWidth_, pictureHeight_, vertices_, vertices_, look_.refractiveIndex,
+            look_.alphaMix, look_.alphaScale1, look_.alphaScale2, look_.inkRed, look_.inkGreen, look_.inkBlue,
+            look_.fresnelRatio, look_.specularRatio, look_.exponent, width_ > height_);
         if (inkSteps_ > 0) --inkSteps_;
     }
     changed_ = false;

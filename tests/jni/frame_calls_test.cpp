@@ -2,6 +2,7 @@
 #include <gtest/gtest.h>
 
 #include "fluid/ink_presets.h"
+#include "host/water_host.h"
 #include "jni/gesture.h"
 #include "jni/globals.h"
 #include "tests/support/counting_gl.h"
@@ -67,4 +68,18 @@ TEST_F(FrameCalls, areThoseOfTheTable) {
         expectFrame(kAdded);
     }
     EXPECT_EQ(fluid.DragMode, kFastDrag);
+}
+
+TEST_F(FrameCalls, ofALateFrameDrawTheWaterOnce) {
+    WaterHost host(Look{}, 480, 800, 1);
+    host.setUp(true);
+    host.touch(TouchAction::down, 240, 400, 1.0f);
+    const auto bytesOf = [&host](int steps) {
+        host.advance(steps / 60.0);
+        host.draw();
+        return takeGlUse().bytes;
+    };
+    bytesOf(1);
+    const std::size_t once = bytesOf(1);
+    EXPECT_LE(bytesOf(4), once + 3 * (2 * kQuadBytes + kGridBytes));
 }

@@ -345,11 +345,13 @@ public final class WaterHost {
             frames = Math.max(1, Math.min(steps, MOST_INK_STEPS));
             dueInkSteps = Math.max(-0.5, Math.min(dueInkSteps - steps, 0.5));
         }
-        for (int i = 0; i < frames; ++i) {
-            library.onDrawFrame(positions, heightAttribs, indices, positions.length, heightAttribs.length,
-                    indices.length, mvp, pictureWidth, pictureHeight, vertices, vertices, look.refractiveIndex,
-                    look.alphaMix, look.alphaScale1, look.alphaScale2, look.inkRed, look.inkGreen, look.inkBlue,
-                    look.fresnelRatio, look.specularRatio, look.exponent, width > height);
+        for (int i = 1; i <= frames; ++i) {
+            // Only the last one is seen. The others move the ink below a mesh of nothing.
+            int seen = i == frames ? 1 : 0;
+            library.onDrawFrame(positions, heightAttribs, indices, seen * positions.length,
+                    seen * heightAttribs.length, seen * indices.length, mvp, pictureWidth, pictureHeight, vertices,
+                    vertices, look.refractiveIndex, look.alphaMix, look.alphaScale1, look.alphaScale2, look.inkRed,
+                    look.inkGreen, look.inkBlue, look.fresnelRatio, look.specularRatio, look.exponent, width > height);
             if (inkSteps > 0) --inkSteps;
         }
         changed = false;

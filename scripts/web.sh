@@ -14,9 +14,10 @@ install_missing "${web_packages[@]}"
 # A Node that does not come from Debian brings its own.
 command -v npm >/dev/null || install_missing npm
 
+[ web/node_modules -nt web/package-lock.json ] || npm --prefix web ci --no-audit --no-fund &
 cmake --preset web >/dev/null
 cmake --build --preset web
+wait $!
 cd web
-[ node_modules -nt package-lock.json ] || npm ci --no-audit --no-fund
 npm run --silent build
 [ ! "$serve" ] || exec npm run --silent serve

@@ -85,10 +85,10 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
     JNIEnv* env, jobject, jint x, jint y, jint action, jfloat pressure);
 
 // Draws one frame over the whole view and clears nothing: without ink into the current framebuffer, with ink into
-// framebuffer 0, which the ink's passes bind. With ink, each call is also one step of the ink. From the first touch on,
-// a step whose latest touch lies inside the margin along the edges draws two numbers of the process's lrand48: seed it
-// with srand48 to repeat a recording. positions and heightAttribs hold 3 floats a vertex, indices unsigned vertex
-// numbers, mvp 16 floats by columns.
+// framebuffer 0, which the ink's passes bind. With ink, each call is also one step of the ink, and with counts of 0
+// nothing else. From the first touch on, a step whose latest touch lies inside the margin along the edges draws two
+// numbers of the process's lrand48: seed it with srand48 to repeat a recording. positions and heightAttribs hold 3
+// floats a vertex, indices unsigned vertex numbers, mvp 16 floats by columns.
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onDrawFrame(
     JNIEnv* env, jobject, jfloatArray positions, jfloatArray heightAttribs, jshortArray indices, jint positionFloats,
     jint heightFloats, jint indexCount, jfloatArray mvp, jint meshSizeWidth, jint meshSizeHeight, jint numDetailsWidth,

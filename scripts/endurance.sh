@@ -1,15 +1,15 @@
 #!/usr/bin/env bash
 # Runs the endurance tests at their full lengths: a day of simulated use, a thousand lost contexts. As shipped, or with
-# --asan under the sanitizers. Takes minutes.
+# --sanitizers under the sanitizers. Takes minutes.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/common.sh
 preset=release
-if [ "${1-}" = --asan ]; then
-    preset=asan
+if [ "${1-}" = --sanitizers ]; then
+    preset=sanitizers
     shift
 fi
-no_more_arguments "scripts/endurance.sh [--asan]" "$@"
+no_more_arguments "scripts/endurance.sh [--sanitizers]" "$@"
 install_missing "${build_packages[@]}" "${test_packages[@]}" "${fuzz_packages[@]}"
 
 cmake --preset "$preset" -DTIDEMARK_TESTS=ON -DTIDEMARK_WERROR=ON >/dev/null

@@ -25,8 +25,8 @@ test_native() {
     local options=(-DTIDEMARK_TESTS=ON -DTIDEMARK_WERROR=ON)
     cmake --preset release "${options[@]}" -DTIDEMARK_BENCH=ON >/dev/null
     cmake --build --preset release
-    cmake --preset asan "${options[@]}" >/dev/null
-    cmake --build --preset asan
+    cmake --preset sanitizers "${options[@]}" >/dev/null
+    cmake --build --preset sanitizers
     cmake --preset clang "${options[@]}" >/dev/null
     cmake --build --preset clang --target TidemarkEffect tidemark_{,counting_,gl_,host_}tests
     cmake --preset fuzz -DTIDEMARK_WERROR=ON >/dev/null
@@ -35,7 +35,7 @@ test_native() {
     build/release/bench/tidemark_bench --benchmark_min_time=0 >/dev/null
     ctest --preset release -j "$(nproc)" --label-exclude android
     # The driver's precision changes nothing that a sanitizer sees, and another optimizer nothing but numbers.
-    ctest --preset asan -j "$(nproc)" --exclude-regex "^(half|exact)"
+    ctest --preset sanitizers -j "$(nproc)" --exclude-regex "^(half|exact)"
     ctest --preset fuzz -j "$(nproc)"
     ctest --preset clang -j "$(nproc)" --tests-regex "^(driverless|counting|full|elf)"
 }

@@ -31,7 +31,10 @@ function completeSite() {
 // What the scripts will ask for, asked for with the page, and the painter already started: round trips less until the
 // first picture.
 function hurry() {
-    const start = (file) => `painter = new Worker('./${file}', { type: 'module' }); painter.onerror = () => { painter = null; };`;
+    const start = (file) => `if (!location.search.includes('src=')) {
+        painter = new Worker('./${file}', { type: 'module' });
+        painter.onerror = () => { painter = null; };
+    }`;
     const hint = (file) => (file.includes('painter')
         ? { rel: 'prefetch', href: `./${file}` }  // by the worker
         : { rel: 'preload', as: 'fetch', crossorigin: true, href: `./${file}` });

@@ -50,7 +50,7 @@ TEST_F(Setup, logsEveryStepAndEveryObjectThatItReplaces) {
 TEST_F(Setup, sizesFollowTheViewAndParametersHaveTheirValues) {
     engine.InitializeSetting(320, 200, false);
     EXPECT_EQ(std::pair(engine.ScreenWidth, engine.ScreenHeight), std::pair(320, 200));
-    EXPECT_EQ(engine.InkColor.g, 1.0f);
+    EXPECT_EQ((std::array{engine.InkColor.r, engine.InkColor.g, engine.InkColor.b}), (std::array{1.0f, 1.0f, 1.0f}));
     EXPECT_EQ(engine.ClearInkValue, 0.0f) << "nothing of the ink is set without it";
     for (const auto& [view, grid, ink] :
          {std::tuple(std::pair(1085, 1920), std::pair(90, 160), std::pair(256, 512)),

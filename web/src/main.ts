@@ -3,15 +3,15 @@ import './style.css';
 import { WaterError, type ErrorCode, type WaterElement } from 'tidemark-water';
 import { makePanel } from './panel';
 import { paint } from './pictures';
-import { fromHash, toHash, type Settings } from './settings';
+import { fromHash, src, toHash, type Settings } from './settings';
 
 const element = <T extends HTMLElement>(id: string) => document.querySelector<T>(`#${id}`)!;
 const water = element<WaterElement>('water');
-const asked = new URLSearchParams(location.search);
 const settings: Settings = fromHash(location.hash);
 const usualRain = 14;
 
 let photos: File[] = [];
+let asked: Settings['picture'] | null = null;
 let shown: Settings['picture'] | null = null;
 let lastTicket = 0;  // of the picture asked for last
 let repaintDue = 0;
@@ -47,24 +47,26 @@ async function isPortrait(file: File): Promise<boolean> {
 async function showPicture(): Promise<void> {
     const ticket = ++lastTicket;
     const isLast = () => ticket === lastTicket;
-    const before = shown;
-    shown = settings.picture;
+    asked = settings.picture;
     const busy = window.setTimeout(() => document.body.classList.add('busy'), 150);
     try {
-        if (shown === 'photo') {
+        if (asked === 'photo') {
             const [first, second] = photos;
             const turned = second && (await isPortrait(first!));
             if (!isLast()) return;
             await water.setPicture(turned ? second : first!, (turned ? first : second) ?? null);
-        } else if (shown !== 'src') {
+        } else if (asked === 'src') {
+            await water.setPicture(src);
+        } else {
             const density = Math.min(devicePixelRatio, 2, 2048 / Math.max(water.clientWidth, water.clientHeight));
-            const bitmap = await paint(shown, Math.round(water.clientWidth * density), Math.round(water.clientHeight * density));
+            const bitmap = await paint(asked, Math.round(water.clientWidth * density), Math.round(water.clientHeight * density));
             if (isLast()) await water.setPicture(bitmap);
         }
+        if (isLast()) shown = asked;
     } catch (error) {
         if (!isLast()) return;
-        shown = before;
-        if (before) settings.picture = before;
+        asked = shown;
+        if (shown) settings.picture = shown;
         // The element has told its own errors.
         if (!(error instanceof WaterError)) say(String((error as Error).message));
         panel.refresh();
@@ -76,14 +78,14 @@ async function showPicture(): Promise<void> {
 
 const apply = () => {
     if (settings.picture === 'photo' && photos.length === 0) {
-        settings.picture = shown ?? 'pool';
+        settings.picture = asked ?? 'pool';
         element('files').click();
     }
     const { preset, ink, inkColor, rain, look } = settings;
     Object.assign(water, { preset, ink, inkColor, rain, look: { ...look } });
     element('ink').ariaPressed = String(ink);
     element('rain').ariaPressed = String(rain > 0);
-    if (settings.picture !== shown) void showPicture();
+    if (settings.picture !== asked) void showPicture();
     panel.refresh();
     // Some browsers refuse more than a hundred changes in ten seconds.
     clearTimeout(addressDue);
@@ -101,7 +103,7 @@ async function takePhotos(files: File[]): Promise<void> {
     if (files.length === 0) return;
     photos = files;
     settings.picture = 'photo';
-    if (shown === 'photo') void showPicture();
+    if (asked === 'photo') void showPicture();
     apply();
 }
 function toggle(name: 'ink' | 'rain'): void {
@@ -145,13 +147,13 @@ addEventListener('drop', (event) => {
     void takePhotos([...event.dataTransfer!.files]);
 });
 addEventListener('hashchange', () => {
-    Object.assign(settings, fromHash(location.hash), shown === 'photo' || shown === 'src' ? { picture: shown } : {});
+    Object.assign(settings, fromHash(location.hash), asked === 'photo' ? { picture: asked } : {});
     apply();
 });
 // Painted pictures fit one size; until the next is painted the last one serves, cropped.
 addEventListener('resize', () => {
     clearTimeout(repaintDue);
-    if (shown && shown !== 'photo' && shown !== 'src') repaintDue = window.setTimeout(showPicture, 250);
+    if (asked && asked !== 'photo' && asked !== 'src') repaintDue = window.setTimeout(showPicture, 250);
 });
 
 water.addEventListener('pointerdown', hideHint);
@@ -165,12 +167,7 @@ setInterval(() => {
     if (!element('panel').hidden && water.water) panel.showStatus(water.water);
 }, 500);
 
-if (asked.get('ui') === '0') document.body.classList.add('bare');
-const src = asked.get('src');
-if (src) {
-    settings.picture = shown = 'src';
-    water.src = src;
-}
+if (new URLSearchParams(location.search).get('ui') === '0') document.body.classList.add('bare');
 togglePanel(!matchMedia('(max-width: 900px), (max-height: 560px)').matches);
 apply();
 // For the browser's console.

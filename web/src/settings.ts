@@ -5,7 +5,7 @@ export const pictureNames = { pool: 'Tiled pool', river: 'River bed', shore: 'Sa
 export type PictureName = keyof typeof pictureNames;
 
 export interface Settings {
-    picture: PictureName | 'src';  // of the address
+    picture: PictureName | 'src';
     preset: string;
     ink: boolean;
     inkColor: string;
@@ -13,6 +13,10 @@ export interface Settings {
     look: Look;    // what differs from the preset
 }
 
+// A picture of its own, which the page's address brings.
+export const src = new URLSearchParams(location.search).get('src');
+
+const usualPicture = src ? 'src' : 'pool';
 const usualInk = '#0d2673';
 const usualPreset = 'clear-lake';
 
@@ -22,14 +26,14 @@ export function withPreset(preset: string): Omit<Settings, 'picture'> {
     return { preset, ink, inkColor, rain, look: {} };
 }
 
-export const defaultSettings = (): Settings => ({ picture: 'pool', ...withPreset(usualPreset) });
+export const defaultSettings = (): Settings => ({ picture: usualPicture, ...withPreset(usualPreset) });
 
 export function toHash(settings: Settings): string {
-    const usual = { picture: 'pool', ...withPreset(settings.preset) };
+    const usual = { picture: usualPicture, ...withPreset(settings.preset) };
     const words = new URLSearchParams();
     if (settings.preset !== usualPreset) words.set('preset', settings.preset);
     // A photo stays with its owner.
-    if (settings.picture !== usual.picture && !['photo', 'src'].includes(settings.picture)) words.set('picture', settings.picture);
+    if (settings.picture !== usual.picture && settings.picture !== 'photo') words.set('picture', settings.picture);
     if (settings.ink !== usual.ink) words.set('ink', settings.ink ? '1' : '0');
     if (settings.inkColor !== usual.inkColor) words.set('inkColor', settings.inkColor);
     if (settings.rain !== usual.rain) words.set('rain', String(settings.rain));

@@ -48,7 +48,9 @@ test('opens without a network once it has been loaded, and no two pictures look 
 test('a worker that is gone is told and started anew; of two pictures the last chosen stays', async ({ page }) => {
     await page.addInitScript(() => {
         window.works = [];
+        window.started = [];
         window.Worker = class {
+            constructor(url) { window.started.push(url); }
             postMessage = ({ id }) => window.works.push((bitmap) => this.onmessage({ data: { id, bitmap } }));
             terminate() {}
         };
@@ -57,6 +59,7 @@ test('a worker that is gone is told and started anew; of two pictures the last c
     await page.goto('./');
     const answer = (i, side) => page.evaluate(([i, side]) => window.answer(i, side), [i, side]);
     await page.waitForFunction(() => window.works.length > 0);
+    expect(await page.evaluate(() => window.started)).toEqual([expect.stringMatching(/^\.\/assets\/painter/)]);  // by the page
     await answer(0);
     await expect(page.locator('#message.shown')).toHaveText(/painted pictures do not load/);
     await page.setViewportSize({ width: 500, height: 800 });

@@ -64,6 +64,8 @@ function parse(kind: string, text: string | null): unknown {
 // A server that imports this has no elements.
 const Base = (globalThis.HTMLElement ?? class {}) as typeof HTMLElement;
 
+type ElementEvents = Omit<HTMLElementEventMap, keyof WaterEvents> & WaterEvents;
+
 export interface WaterElement extends Omit<Options, 'src' | 'srcPortrait' | 'light'> {
     src: string | null;
     srcPortrait: string | null;
@@ -71,9 +73,12 @@ export interface WaterElement extends Omit<Options, 'src' | 'srcPortrait' | 'lig
     /** What assistive technology calls the water. */
     label: string | null;
 
-    addEventListener<Type extends keyof WaterEvents>(
-        type: Type, listener: (this: WaterElement, event: WaterEvents[Type]) => unknown, options?: boolean | AddEventListenerOptions): void;
+    addEventListener<Type extends keyof ElementEvents>(
+        type: Type, listener: (this: WaterElement, event: ElementEvents[Type]) => unknown, options?: boolean | AddEventListenerOptions): void;
     addEventListener(type: string, listener: EventListenerOrEventListenerObject | null, options?: boolean | AddEventListenerOptions): void;
+    removeEventListener<Type extends keyof ElementEvents>(
+        type: Type, listener: (this: WaterElement, event: ElementEvents[Type]) => unknown, options?: boolean | EventListenerOptions): void;
+    removeEventListener(type: string, listener: EventListenerOrEventListenerObject | null, options?: boolean | EventListenerOptions): void;
 }
 
 export class WaterElement extends Base {

@@ -53,6 +53,9 @@ export interface Water {
     addEventListener<Type extends keyof WaterEvents>(
         type: Type, listener: (this: Water, event: WaterEvents[Type]) => unknown, options?: boolean | AddEventListenerOptions): void;
     addEventListener(type: string, listener: EventListenerOrEventListenerObject | null, options?: boolean | AddEventListenerOptions): void;
+    removeEventListener<Type extends keyof WaterEvents>(
+        type: Type, listener: (this: Water, event: WaterEvents[Type]) => unknown, options?: boolean | EventListenerOptions): void;
+    removeEventListener(type: string, listener: EventListenerOrEventListenerObject | null, options?: boolean | EventListenerOptions): void;
 }
 
 export class Water extends EventTarget implements Borrower, Touched {
@@ -442,14 +445,16 @@ export class Water extends EventTarget implements Borrower, Touched {
         const longer = Math.max(canvas.width, canvas.height);
         const shorter = Math.max(1, Math.round(longer * proportions));
         const upright = canvas.height >= canvas.width;
-        const cover = (shown: Picture) => uploadCover(gl, background, shown, upright ? shorter : longer, upright ? longer : shorter);
-        try {
-            cover(picture);
-        } catch (error) {
-            cover((this.picture = plainPicture()));
-            this.fail(error);
-        }
-        if ('drawable' in light) uploadCover(gl, shine, light, lightSide, lightSide);
+        const cover = (part: 'picture' | 'light', texture: WebGLTexture, shown: Picture, width: number, height: number) => {
+            try {
+                uploadCover(gl, texture, shown, width, height);
+            } catch (error) {
+                uploadCover(gl, texture, (this[part] = plainPicture()), width, height);
+                queueMicrotask(() => this.fail(error));  // who hears of it may call in, which is not for the middle of a frame
+            }
+        };
+        cover('picture', background, picture, upright ? shorter : longer, upright ? longer : shorter);
+        if ('drawable' in light) cover('light', shine, light, lightSide, lightSide);
         else upload(gl, shine, light);
     }
 

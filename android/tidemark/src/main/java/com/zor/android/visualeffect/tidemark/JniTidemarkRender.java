@@ -142,7 +142,8 @@ public final class JniTidemarkRender {
 
     /**
      * Draws one frame over the whole view, without clearing it: without ink into the current framebuffer, with ink into
-     * framebuffer 0. With ink this is also one step of the ink: draw at 60 frames a second.
+     * framebuffer 0. With ink this is also one step of the ink, of which 60 are due a second, and with counts
+     * of 0 nothing else.
      *
      * @param positions from {@link #initWaters}
      * @param heightAttribs for each vertex its height and those of the vertices to its right and above it, 3 floats

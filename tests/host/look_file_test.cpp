@@ -16,12 +16,6 @@ TEST(LookFile, ChangesWhatItNamesAndNothingElse) {
     EXPECT_EQ(look->damping, 0.95f);
     EXPECT_EQ(look->meshVertices, 64);
     EXPECT_EQ(look->waveSpeed, Look{}.waveSpeed);
-
-    const std::optional<Look> shipped = loadLook(TIDEMARK_LOOK_PATH, error);
-    ASSERT_TRUE(shipped) << error;
-    EXPECT_EQ(shipped->framesToFade, Look{}.framesToFade);
-    EXPECT_FALSE(loadLook("no.look", error));
-    EXPECT_NE(error.find("no.look"), std::string::npos) << error;
 }
 
 TEST(LookFile, NamesTheLineThatIsWrong) {

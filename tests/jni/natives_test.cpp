@@ -53,14 +53,3 @@ TEST(Natives, fillWhatHasElementsBesideWhatHasNone) {
     native::initWaters(&sparing, nullptr, &one, &noCells, 1, 2, 2, 3, 1);
     EXPECT_EQ(one.values[0], -1.0f);
 }
-
-TEST(Natives, moveAnswersWhetherTheWaterIsCalm) {
-    FloatArray velocity(9), height(9);
-    velocity.values[4] = 1.0f;
-    const auto move = [&](jboolean check) {
-        return native::move(copyingEnvironment(), nullptr, &velocity, &height, 1, 1, 2, 2, 3, 3, check, 0.5f, 0.0f);
-    };
-    EXPECT_EQ(move(JNI_TRUE), JNI_FALSE);
-    EXPECT_EQ(velocity.values[4], 0.5f);
-    EXPECT_EQ(move(JNI_FALSE), JNI_TRUE);
-}

@@ -109,6 +109,7 @@ TEST_F(Program, RefusesBadInputInOneLineAndLeavesNothing) {
         {"--script none.touch", "none.touch: No such file"},
         {"--script /", "cannot read the touch script /"},
         {"--look ../bad.look", "bad.look:2: "},
+        {"--look no.look", "no.look: No such file"},
         {"--out /proc/frames", "/proc/frames"},
         {"--out made/for/it --video water.avi", "does not end in .mp4, .webp or .gif"},
         {"--out made --video /proc/water.mp4", "/proc/water.mp4"},

@@ -1,4 +1,4 @@
-// What the page does with pointers and photos. Lost contexts: engines.spec.mjs.
+// What the page does with pointers and photos. Lost contexts are tried in the other engines.
 import { difference, expect, flatPixels, open, pixelsAfter, slope, takeOver, test } from './page.mjs';
 
 function expectMiddleOf(pixels, view, [width, height]) {

@@ -174,6 +174,8 @@ test('a high element shows the portrait, and off screen a still picture until it
     expect(await size()).toEqual(wide);
     await element(page).evaluate(({ style }) => { style.height = '280px'; });
     await expect.poll(size).toEqual(high);
+    // Water that still moves goes on when it is back.
+    await expect.poll(() => element(page).evaluate(({ water: { calm, stale, asked } }) => calm && !stale && !asked)).toBe(true);
     await page.evaluate(() => scrollTo(0, 2000));
     await expect.poll(live).toBe(false);
     await page.evaluate(() => scrollTo(0, 0));

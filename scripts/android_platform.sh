@@ -1,9 +1,8 @@
 #!/usr/bin/env bash
-# Puts what the Android checks take from the platform's sources into build/android-platform: the list of its public API,
-# and GLSurfaceView. Debian has them in a source package; nothing of this machine's apt changes.
+# android_platform.sh FOLDER: downloads what the Android checks need of the platform's sources into FOLDER: the list of its
+# public API, and GLSurfaceView. Debian has them in a source package. The machine's apt configuration does not change.
 set -euo pipefail
-cd "$(dirname "$0")/.."
-platform=$PWD/build/android-platform
+platform=$1
 [ ! -f "$platform/complete" ] || exit 0
 rm -rf "$platform"
 mkdir -p "$platform"/{apt,parts,lists}

@@ -9,7 +9,7 @@ install_missing "${build_packages[@]}" "${bench_packages[@]}"
 declare -A compilers=([gcc]=g++ [clang]=clang++)
 for name in gcc clang; do
     cmake --preset release -B "build/bench-$name" -DCMAKE_CXX_COMPILER="${compilers[$name]}" \
-        -DTIDEMARK_BENCH=ON -DTIDEMARK_TESTS=OFF >/dev/null
+        -DTIDEMARK_TESTS=OFF >/dev/null
     cmake --build "build/bench-$name" --target tidemark_bench tidemark_bench_driver
 done
 

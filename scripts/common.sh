@@ -3,7 +3,7 @@
 
 # shellcheck disable=SC2034  # the scripts use them
 {
-    build_packages=(cmake g++ ninja-build openjdk-17-jdk-headless libgles-dev libegl-dev libegl-mesa0 libgl1-mesa-dri
+    build_packages=(cmake g++ make ninja-build openjdk-17-jdk-headless libgles-dev libegl-dev libegl-mesa0 libgl1-mesa-dri
         libstb-dev libcli11-dev libglfw3-dev ffmpeg)
     lint_packages=(clang clang-format clang-tidy git python3 shellcheck)
     test_packages=(clang libgtest-dev junit4 libjetbrains-annotations-java aapt android-framework-res python3
@@ -34,6 +34,11 @@ no_more_arguments() {
         exit
     fi
     refuse "$usage" "unknown argument $1"
+}
+
+# configure_program: makes build/release ready to build the desktop program, without what only tests and benchmarks need.
+configure_program() {
+    [ -f build/release/build.ninja ] || cmake --preset release -DTIDEMARK_TESTS=OFF -DTIDEMARK_BENCH=OFF >/dev/null
 }
 
 # install_missing PACKAGE...: installs the Debian packages that are not there, as root or through sudo.

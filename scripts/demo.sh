@@ -6,7 +6,7 @@ cd "$(dirname "$0")/.."
 source scripts/common.sh
 [ "${1-}" != --help ] || no_more_arguments "scripts/demo.sh [OPTION OF build/release/preview/tidemark-preview]..." "$@"
 install_missing "${build_packages[@]}"
-[ -f build/release/build.ninja ] || cmake --preset release -DTIDEMARK_TESTS=OFF >/dev/null
+configure_program
 cmake --build --preset release --target tidemark-preview
 build/release/preview/tidemark-preview --script scenes/demo.touch --size 720x1280 \
     --out out --every 30 --video out/demo.mp4 "$@"

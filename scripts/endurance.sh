@@ -12,7 +12,7 @@ fi
 no_more_arguments "scripts/endurance.sh [--sanitizers]" "$@"
 install_missing "${build_packages[@]}" "${test_packages[@]}" "${fuzz_packages[@]}"
 
-cmake --preset "$preset" -DTIDEMARK_TESTS=ON -DTIDEMARK_WERROR=ON >/dev/null
+cmake --preset "$preset" -DTIDEMARK_BENCH=OFF -DTIDEMARK_WERROR=ON >/dev/null
 cmake --build --preset "$preset" --target tidemark_endurance tidemark_counting_tests
 # As in CMakePresets.json.
 export TIDEMARK_ENDURANCE=full ASAN_OPTIONS=allocator_may_return_null=1

@@ -5,7 +5,7 @@ cd "$(dirname "$0")/.."
 source scripts/common.sh
 no_more_arguments "scripts/picture.sh" "$@"
 install_missing "${build_packages[@]}"
-[ -f build/release/build.ninja ] || cmake --preset release -DTIDEMARK_TESTS=OFF >/dev/null
+configure_program
 cmake --build --preset release --target tidemark-preview
 preview=build/release/preview/tidemark-preview
 

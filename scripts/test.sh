@@ -22,15 +22,15 @@ test_native() {
     install_missing "${build_packages[@]}" "${lint_packages[@]}" "${test_packages[@]}" "${fuzz_packages[@]}" \
         "${bench_packages[@]}"
     scripts/lint.sh
-    local options=(-DTIDEMARK_TESTS=ON -DTIDEMARK_WERROR=ON)
-    cmake --preset release "${options[@]}" -DTIDEMARK_BENCH=ON >/dev/null
+    cmake --preset release -DTIDEMARK_WERROR=ON >/dev/null
     cmake --build --preset release
-    cmake --preset sanitizers "${options[@]}" >/dev/null
+    cmake --preset sanitizers -DTIDEMARK_WERROR=ON >/dev/null
     cmake --build --preset sanitizers
-    cmake --preset clang "${options[@]}" >/dev/null
+    cmake --preset clang -DTIDEMARK_WERROR=ON >/dev/null
     cmake --build --preset clang --target TidemarkEffect tidemark_{,counting_,gl_,host_}tests
     cmake --preset fuzz -DTIDEMARK_WERROR=ON >/dev/null
     cmake --build --preset fuzz
+    tests/plain_build_test.sh build/plain
     # The benchmarks' forms agree with the library's, and each runs; how fast, scripts/bench.sh measures.
     build/release/bench/tidemark_bench --benchmark_min_time=0 >/dev/null
     ctest --preset release -j "$(nproc)" --label-exclude android
@@ -56,14 +56,14 @@ test_arm64() {
 
 test_android() {
     install_missing "${build_packages[@]}" "${test_packages[@]}" "${android_packages[@]}"
-    cmake --preset release -DTIDEMARK_TESTS=ON -DTIDEMARK_WERROR=ON >/dev/null
+    cmake --preset release -DTIDEMARK_BENCH=OFF -DTIDEMARK_WERROR=ON >/dev/null
     cmake --build --preset release
     ctest --preset release -j "$(nproc)" --label-regex android
 }
 
 test_web() {
     install_missing "${build_packages[@]}" "${web_test_packages[@]}"
-    [ -f build/release/build.ninja ] || cmake --preset release -DTIDEMARK_TESTS=OFF >/dev/null
+    configure_program
     cmake --build --preset release --target tidemark-preview
     scripts/web.sh --build
     npm --prefix web test

@@ -1,10 +1,10 @@
 #!/usr/bin/env bash
-# compile.sh SOURCE BINARY: the classes that ship, against the platform's API and resources, and the tests
+# compile.sh SOURCE BINARY: compiles the classes that ship, against the platform's API and resources, and the tests.
 set -euo pipefail
 source=$1
 cd "$2"
-"$source/scripts/android_platform.sh"
-platform=$source/build/android-platform
+platform=$PWD/android-platform
+"$source/scripts/android_platform.sh" "$platform"
 rm -rf classes framework generated resources && mkdir -p classes generated resources
 java() {
     find "$@" -name '*.java'

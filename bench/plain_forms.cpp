@@ -12,7 +12,7 @@ namespace {
 bool wave(float* v, float* h, const WaveRegion& region, bool checkCalm, float damping, float waveSpeed) {
     const auto [xStart, yStart, xEnd, yEnd, stride] = region;
     static std::vector<float> copy;
-    copy.resize(static_cast<std::size_t>((yEnd + 1) * stride));
+    copy.resize(static_cast<std::size_t>(yEnd * stride + xEnd));
     float* const s = copy.data();
 
     bool calm = true;
@@ -30,7 +30,8 @@ bool wave(float* v, float* h, const WaveRegion& region, bool checkCalm, float da
             h[i] = std::max(std::min(h[i] + v[i], 100.0f), -100.0f);
         }
     }
-    std::copy(h + (yStart - 1) * stride, h + (yEnd + 1) * stride, s + (yStart - 1) * stride);
+    const int first = (yStart - 1) * stride + xStart;
+    std::copy(h + first, h + yEnd * stride + xEnd, s + first);
     const float k = damping == 0.94f ? 0.068f : 0.018f;
     for (int y = yStart; y < yEnd; ++y) {
         for (int i = y * stride + xStart; i < y * stride + xEnd; ++i) {

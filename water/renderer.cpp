@@ -26,10 +26,10 @@ void drawWater(
     const WaterObjects& objects, int viewWidth, int viewHeight, const WaterMesh& mesh, const WaterLight& light,
     const WaterInk* ink) {
     const GLuint program = objects.program;
-    if (!program || !objects.positions) {
-        // Drawing without the buffers of a set-up would read address 0.
+    if (!objects.positions) {
+        // Without a buffer bound, the attributes' offsets would be addresses, and the draw would read address 0.
         static bool reported = false;
-        if (!reported) LOG_ERROR("Ripple_Render() without a set-up");
+        if (!reported) LOG_ERROR("Ripple_Render() without the buffers of onInitSetting()");
         reported = true;
         return;
     }

@@ -1,5 +1,6 @@
 #include "water/waves.h"
 
+#include <algorithm>
 #include <cmath>
 #include <cstddef>
 #include <cstring>
@@ -67,11 +68,11 @@ void integrate(const float* height, const float* velocity, float* integrated, in
     });
 }
 
-// The height before smoothing is the copy's own centre: the host's array is only written.
-void smooth(float* height, const float* copy, std::ptrdiff_t copyStride, int width, float k) {
+// Smooths one row: height <- k * laplacian(copy) + centre, where `centre` holds the heights before smoothing.
+void smooth(float* height, const float* copy, const float* centre, std::ptrdiff_t copyStride, int width, float k) {
     forGroups(0, width, [=](auto lanes, int x) {
         using F = decltype(lanes);
-        store(laplacian<F>(copy + x, copyStride) * k + load<F>(copy + x), height + x);
+        store(laplacian<F>(copy + x, copyStride) * k + load<F>(centre + x), height + x);
     });
 }
 
@@ -99,29 +100,43 @@ bool stepWaves(
     while (checkCalm && calm && row < rows) calm = pass(std::true_type{}, row++);
     while (row < rows) pass(std::false_type{}, row++);
 
-    // Whole groups a row, so that three of the four neighbours and every store lie on the borders of groups: a load
-    // across two cache lines costs two.
-    const std::ptrdiff_t copyStride = (std::ptrdiff_t{width} + 2 + 3) / 4 * 4;
-    float* const copies = snapshot.reserve(static_cast<std::size_t>(copyStride) * (static_cast<std::size_t>(rows) + 2));
+    // Rows that fill the stride are neighbours of each other in memory: the vertex left of a row is the last one of the
+    // row before, which this step moves too. Their copies must lie as they do. Other rows are copied one by one, in
+    // whole groups, so that three of the four neighbours and every store lie on the borders of groups: a load across
+    // two cache lines costs two.
+    const bool isContiguous = stride > 0 && width >= stride;
+    const std::ptrdiff_t copyStride = isContiguous ? stride : (std::ptrdiff_t{width} + 2 + 3) / 4 * 4;
+    const std::ptrdiff_t copied = copyStride * (rows + 1) + std::max<std::ptrdiff_t>(copyStride, width);
+    float* const copies = snapshot.reserve(static_cast<std::size_t>(copied));
     float* const s = copies ? copies + copyStride : nullptr;
+    const std::size_t rowBytes = static_cast<std::size_t>(width) * sizeof(float);
     for (row = 0; row < rows; ++row) {
         float* const heights = h + row * stride;
-        integrate(heights, v + row * stride, s ? s + row * copyStride : heights, width);
+        float* const copy = s ? s + row * copyStride : heights;
+        integrate(heights, v + row * stride, copy, width);
+        if (isContiguous && s) std::memcpy(heights, copy, rowBytes);
     }
     if (!s) return calm;
 
-    const std::size_t rowBytes = static_cast<std::size_t>(width) * sizeof(float);
-    std::memcpy(s - copyStride, h - stride, rowBytes);
-    std::memcpy(s + rows * copyStride, h + rows * stride, rowBytes);
-    for (row = 0; row < rows; ++row) {
-        s[row * copyStride - 1] = h[row * stride - 1];
-        s[row * copyStride + width] = h[row * stride + width];
+    if (isContiguous) {
+        const std::ptrdiff_t end = (rows - 1) * stride + width;
+        std::copy_n(h - stride, stride, s - stride);
+        std::copy_n(h + end, stride, s + end);
+    } else {
+        std::memcpy(s - copyStride, h - stride, rowBytes);
+        std::memcpy(s + rows * copyStride, h + rows * stride, rowBytes);
+        for (row = 0; row < rows; ++row) {
+            s[row * copyStride - 1] = h[row * stride - 1];
+            s[row * copyStride + width] = h[row * stride + width];
+        }
     }
 
     // By contract exactly this damping smooths more.
     const float k = damping == 0.94f ? 0.068f : 0.018f;
     for (row = 0; row < rows; ++row) {
-        smooth(h + row * stride, s + row * copyStride, copyStride, width, k);
+        float* const heights = h + row * stride;
+        const float* const copy = s + row * copyStride;
+        smooth(heights, copy, isContiguous ? heights : copy, copyStride, width, k);
     }
     return calm;
 }

@@ -31,13 +31,14 @@ bool same(const std::vector<float>& a, const std::vector<float>& b) {
 
 }  // namespace
 
-// Exact, as grouped and single vertices add in the same order. The untouched rest is the guard.
+// Exact, as grouped and single vertices add in the same order. The untouched rest is the guard. Rows of 20 and more
+// fill the stride, so that their ends are neighbours of each other.
 TEST(Waves, everyWidthAndOffsetTakesThePlainStep) {
     std::mt19937 random(1);
     std::uniform_real_distribution<float> height(-120.0f, 120.0f);
     const float wild[] = {kNan, kInfinity, -kInfinity};
-    for (int first = 1; first <= 4; ++first) {
-        for (int width = 0; width <= 14; ++width) {
+    for (int first = 0; first <= 4; ++first) {
+        for (const int width : {0, 1, 2, 3, 4, 5, 6, 7, 8, 9, 10, 11, 12, 13, 14, kStride - 1, kStride, kStride + 3}) {
             for (const bool isWild : {false, true}) {
                 for (const float damping : {0.94f, 0.95f}) {
                     SCOPED_TRACE(testing::Message() << width << " from " << first << ", damping " << damping);

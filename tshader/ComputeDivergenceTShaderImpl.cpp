@@ -48,28 +48,18 @@ void ComputeDivergenceTShaderImpl::run() {
             }
             store(divergence, out + x);
         };
-        const auto border = [&](int i) {
+        const vec2* velocity = Velocity.row(j);
+        const vec2* below = Velocity.row(std::max(j - 1, 0));
+        const vec2* above = Velocity.row(std::min(j + 1, height - 1));
+        const auto texels = [=]<class F>(F, int left, int x, int right) {
             write(
                 centralDifferences(
-                    Velocity.clamped(i - 1, j).x, Velocity.clamped(i + 1, j).x, Velocity.clamped(i, j - 1).y,
-                    Velocity.clamped(i, j + 1).y, halfInvCellSize),
-                i);
+                    loadPairs<F>(velocity + left).x, loadPairs<F>(velocity + right).x, loadPairs<F>(below + x).y,
+                    loadPairs<F>(above + x).y, halfInvCellSize),
+                x);
         };
-        int i = 0;
-        if (j > 0 && j < height - 1) {
-            const vec2* velocity = Velocity.row(j);
-            const vec2* below = Velocity.row(j - 1);
-            const vec2* above = Velocity.row(j + 1);
-            border(i++);
-            forGroups(1, width - 1, [=]<class F>(F, int x) {
-                write(
-                    centralDifferences(
-                        loadPairs<F>(velocity + x - 1).x, loadPairs<F>(velocity + x + 1).x, loadPairs<F>(below + x).y,
-                        loadPairs<F>(above + x).y, halfInvCellSize),
-                    x);
-            });
-            i = std::max(i, width - 1);
-        }
-        for (; i < width; ++i) border(i);
+        texels(0.0f, 0, 0, std::min(1, width - 1));
+        forGroups(1, width - 1, [=](auto lanes, int x) { texels(lanes, x - 1, x, x + 1); });
+        if (width > 1) texels(0.0f, width - 2, width - 1, width - 1);
     }
 }

@@ -32,26 +32,16 @@ void SubtractGradientTShaderImpl::run() {
     for (int j = 0; j < height; ++j) {
         const vec2* velocity = Velocity.row(j);
         vec2* out = output.row(j);
-        const auto border = [&](int i) {
+        const float* pressure = Pressure.row(j);
+        const float* below = Pressure.row(std::max(j - 1, 0));
+        const float* above = Pressure.row(std::min(j + 1, height - 1));
+        const auto texels = [=]<class F>(F, int left, int x, int right) {
             const auto slope = gradient(
-                Pressure.clamped(i - 1, j), Pressure.clamped(i + 1, j), Pressure.clamped(i, j - 1),
-                Pressure.clamped(i, j + 1), scale);
-            subtractPairs(velocity + i, slope, out + i);
+                load<F>(pressure + left), load<F>(pressure + right), load<F>(below + x), load<F>(above + x), scale);
+            subtractPairs(velocity + x, slope, out + x);
         };
-        int i = 0;
-        if (j > 0 && j < height - 1) {
-            const float* pressure = Pressure.row(j);
-            const float* below = Pressure.row(j - 1);
-            const float* above = Pressure.row(j + 1);
-            border(i++);
-            forGroups(1, width - 1, [=]<class F>(F, int x) {
-                const auto slope = gradient(
-                    load<F>(pressure + x - 1), load<F>(pressure + x + 1), load<F>(below + x), load<F>(above + x),
-                    scale);
-                subtractPairs(velocity + x, slope, out + x);
-            });
-            i = std::max(i, width - 1);
-        }
-        for (; i < width; ++i) border(i);
+        texels(0.0f, 0, 0, std::min(1, width - 1));
+        forGroups(1, width - 1, [=](auto lanes, int x) { texels(lanes, x - 1, x, x + 1); });
+        if (width > 1) texels(0.0f, width - 2, width - 1, width - 1);
     }
 }

@@ -20,6 +20,7 @@ public:
 
     // The C allocator: where the C++ runtime is linked statically, its own would bring the unwinder along.
     static void* operator new(std::size_t size) noexcept { return std::malloc(size); }
+    static void* operator new(std::size_t, void* place) noexcept { return place; }
     static void operator delete(void* kernel) { std::free(kernel); }
 
     // fragCoord.xy is the fragment in output pixels; texel (i, j) has its centre at (i + 0.5, j + 0.5).

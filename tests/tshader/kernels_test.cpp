@@ -99,7 +99,12 @@ TEST(Kernels, doWhatThePlainLoopsDoAtEverySizeAndTouch) {
     }
 }
 
-TEST(Kernels, doNothingWithoutTexels) {
+TEST(Kernels, canBePlacedAndDoNothingWithoutTexels) {
+    alignas(JacobiTShaderImpl) unsigned char place[sizeof(JacobiTShaderImpl)];
+    auto* const placed = new (place) JacobiTShaderImpl;
+    placed->run();
+    EXPECT_EQ(placed->name[0], '\0');
+    placed->~JacobiTShaderImpl();
     InkGrid(0, 36).wholeFrame(kLibrary);
     InkGrid(36, 0).wholeFrame(kLibrary);
 }

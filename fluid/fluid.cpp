@@ -46,7 +46,7 @@ void Fluid::ResetState() {
 
 void Fluid::CreateQuad() {
     LOG_INFO("CreateQuad");
-    deleteGroup(glObjects(), "quadvbo");
+    deleteGroup(glObjects(), kQuadBuffer);
     glGenBuffers(1, &quadvbo);
 }
 
@@ -56,19 +56,19 @@ void Fluid::DrawQuad() {
 
 void Fluid::LoadPortraitBGTextures(AndroidBitmapInfo info, void* pixels) {
     LOG_INFO("LoadPortraitBGTextures");
-    deleteGroup(glObjects(), "portraitBG");
+    deleteGroup(glObjects(), kPortraitTexture);
     makePictureTexture(portraitBG, info, pixels);
 }
 
 void Fluid::LoadLandscapeBGTextures(AndroidBitmapInfo info, void* pixels) {
     LOG_INFO("LoadLandscapeBGTextures");
-    deleteGroup(glObjects(), "landscapeBG");
+    deleteGroup(glObjects(), kLandscapeTexture);
     makePictureTexture(landscapeBG, info, pixels);
 }
 
 // By contract without a line of its own.
 void Fluid::LoadWaterTextures(AndroidBitmapInfo info, void* pixels) {
-    deleteGroup(glObjects(), "environment");
+    deleteGroup(glObjects(), kEnvironmentTexture);
     makePictureTexture(environment, info, pixels);
 }
 

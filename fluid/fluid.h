@@ -67,8 +67,8 @@ public:
 
     // One step of the ink simulation, with the parameters that the last frame left: moves the velocity field on the
     // CPU, uploads it, and carries the ink along it on the GPU. `frame` is not read. Draws two numbers of lrand48 when
-    // the touch lies inside the margin. Without the CPU buffers it only resets the state. Leaves the viewport at the
-    // ink's size and framebuffer 0 bound.
+    // the touch lies inside the margin. Needs the CPU buffers. Leaves the viewport at the ink's size and framebuffer 0
+    // bound.
     void Update(int frame);
     // Adds ink along the segment (x1, y1) to (x2, y2), screen pixels with y downwards: mode 2 a band, any other a disc
     // at its end. Only records the stroke while the touch lies within BoundaryMargin of an edge.
@@ -165,27 +165,27 @@ public:
     std::array<GlObject, 22> glObjects() {
         using enum GlKind;
         return {
-            {{"ripple_program", shader, &ripple_vertexShader},
-             {"ripple_program", shader, &ripple_fragmentShader},
-             {"ripple_program", program, &ripple_program},
-             {"advect_density_program", shader, &advect_density_vertexShader},
-             {"advect_density_program", shader, &advect_density_fragmentShader},
-             {"advect_density_program", program, &advect_density_program},
-             {"addInk_program", shader, &addInk_vertexShader},
-             {"addInk_program", shader, &addInk_fragmentShader},
-             {"addInk_program", program, &addInk_program},
-             {"Velocity.Ping.FboHandle", framebuffer, &Velocity.Ping.FboHandle},
-             {"Velocity.Ping.FboHandle", texture, &Velocity.Ping.TextureHandle},
-             {"Density.Ping.FboHandle", framebuffer, &Density.Ping.FboHandle},
-             {"Density.Ping.FboHandle", texture, &Density.Ping.TextureHandle},
-             {"Density.Ping.FboHandle", framebuffer, &Density.Pong.FboHandle},
-             {"Density.Ping.FboHandle", texture, &Density.Pong.TextureHandle},
-             {"quadvbo", buffer, &quadvbo},
-             {"v_buf", buffer, &v_buf},
-             {"h_buf", buffer, &h_buf},
-             {"i_buf", buffer, &i_buf},
-             {"portraitBG", texture, &portraitBG},
-             {"landscapeBG", texture, &landscapeBG},
-             {"environment", texture, &environment}}};
+            {{kRippleProgram, shader, &ripple_vertexShader},
+             {kRippleProgram, shader, &ripple_fragmentShader},
+             {kRippleProgram, program, &ripple_program},
+             {kAdvectDensityProgram, shader, &advect_density_vertexShader},
+             {kAdvectDensityProgram, shader, &advect_density_fragmentShader},
+             {kAdvectDensityProgram, program, &advect_density_program},
+             {kAddInkProgram, shader, &addInk_vertexShader},
+             {kAddInkProgram, shader, &addInk_fragmentShader},
+             {kAddInkProgram, program, &addInk_program},
+             {kVelocityTarget, framebuffer, &Velocity.Ping.FboHandle},
+             {kVelocityTarget, texture, &Velocity.Ping.TextureHandle},
+             {kDensityTargets, framebuffer, &Density.Ping.FboHandle},
+             {kDensityTargets, texture, &Density.Ping.TextureHandle},
+             {kDensityTargets, framebuffer, &Density.Pong.FboHandle},
+             {kDensityTargets, texture, &Density.Pong.TextureHandle},
+             {kQuadBuffer, buffer, &quadvbo},
+             {kPositionBuffer, buffer, &v_buf},
+             {kHeightBuffer, buffer, &h_buf},
+             {kIndexBuffer, buffer, &i_buf},
+             {kPortraitTexture, texture, &portraitBG},
+             {kLandscapeTexture, texture, &landscapeBG},
+             {kEnvironmentTexture, texture, &environment}}};
     }
 };

@@ -24,7 +24,7 @@ void Fluid::AdvectDensity(Surface_ velocitySurface, Surface_ source, Surface_ de
     ResetState();
 }
 
-void Fluid::AddInk(Surface_ source, Surface_ destination, int mode, Vector_ previous, Vector_ current, float impulse) {
+void Fluid::AddInk(Surface_ source, Surface_ destination, int mode, Vector_ previous, Vector_ current, float) {
     const GLuint program = addInk_program;
     const Segment segment = segmentBetween(previous, current);
     glViewport(0, 0, InkWidth, InkHeight);
@@ -34,7 +34,7 @@ void Fluid::AddInk(Surface_ source, Surface_ destination, int mode, Vector_ prev
     setUniform(program, "normal", segment.normal.x, segment.normal.y);
     setUniform(program, "len", segment.length);
     setUniform(program, "Radius", Radius);
-    setUniform(program, "ImpulseDensity", impulse);
+    setUniform(program, "ImpulseDensity", ImpulseDensity);  // By contract the member, not the argument.
     setUniform(program, "Scale", static_cast<float>(ScreenWidth), static_cast<float>(ScreenHeight));
     setUniform(program, "mode", mode);
     setUniform(program, "Source", 0);
@@ -48,8 +48,7 @@ void Fluid::Inject(int mode, float x1, float y1, float x2, float y2, Color_ colo
     recordStroke(*this, x1, y1, x2, y2);
     InkColor = color;
     const Touch touch = latestTouch(*this);
-    // Without the buffers nothing would ever carry this ink away.
-    if (!isInside(*this, touch.x, touch.y, BoundaryMargin) || !VelocityTex.data) return;
+    if (!isInside(*this, touch.x, touch.y, BoundaryMargin)) return;
     AddInk(Density.Ping, Density.Pong, mode, Previous, Current, ImpulseDensity);
     SwapSurfaces(&Density);
 }

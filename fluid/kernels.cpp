@@ -90,7 +90,7 @@ void Fluid::SubtractGradient(Texture<vec2> velocity, Texture<float> pressure, Te
 void Fluid::Perturb(float x0, float y0, float x1, float y1) {
     recordStroke(*this, x0, y0, x1, y1);
     const Touch touch = latestTouch(*this);
-    if (!isInside(*this, touch.x, touch.y, BoundaryMargin) || !VelocityTex.data) return;
+    if (!isInside(*this, touch.x, touch.y, BoundaryMargin)) return;
     const FlushDenormals flush;
     AddVelocity(VelocityTex, VelocityTexTemp, Previous, Current);
     std::swap(VelocityTex, VelocityTexTemp);

@@ -16,8 +16,7 @@ struct Program {
     GLuint& fragmentShader;
 };
 
-void build(Program made, const char* announcement, const char* vertexSource, const char* fragmentSource) {
-    LOG_INFO("%s zorCreateShaderProgram()", announcement);
+void build(Program made, const char* vertexSource, const char* fragmentSource) {
     made.vertexShader = zorloadShaderScript(GL_VERTEX_SHADER, vertexSource);
     made.fragmentShader = zorloadShaderScript(GL_FRAGMENT_SHADER, fragmentSource);
     made.program = zorCreateShaderProgram(made.vertexShader, made.fragmentShader);
@@ -53,11 +52,11 @@ void Fluid::InitializeSetting(int width, int height, bool withInk) {
         BoundaryMargin = kSetUpMargin;
     }
     const auto objects = glObjects();
-    deleteGroup(objects, "v_buf");
+    deleteGroup(objects, kPositionBuffer);
     glGenBuffers(1, &v_buf);
-    deleteGroup(objects, "h_buf");
+    deleteGroup(objects, kHeightBuffer);
     glGenBuffers(1, &h_buf);
-    deleteGroup(objects, "i_buf");
+    deleteGroup(objects, kIndexBuffer);
     glGenBuffers(1, &i_buf);
 }
 
@@ -65,10 +64,10 @@ void Fluid::InitializeGPU(bool withInk) {
     LOG_INFO("InitializeGPU");
     if (withInk) LOG_INFO("bInk is true");
     const auto objects = glObjects();
-    deleteGroup(objects, "ripple_program");
-    // By contract "ripple_vertextShader".
+    deleteGroup(objects, kRippleProgram);
+    LOG_INFO("ripple_vertextShader zorCreateShaderProgram()");  // By contract "vertext".
     build(
-        {ripple_program, ripple_vertexShader, ripple_fragmentShader}, "ripple_vertextShader", kWaterVert,
+        {ripple_program, ripple_vertexShader, ripple_fragmentShader}, kWaterVert,
         withInk ? kWaterInkFrag : kWaterPlainFrag);
     if (!withInk) {
         // A set-up for ink leaves its target bound, which the water would draw into if no ink frame has followed.
@@ -76,12 +75,14 @@ void Fluid::InitializeGPU(bool withInk) {
         return;
     }
 
-    deleteGroup(objects, "advect_density_program");
+    deleteGroup(objects, kAdvectDensityProgram);
+    LOG_INFO("advect_density_program zorCreateShaderProgram()");
     build(
-        {advect_density_program, advect_density_vertexShader, advect_density_fragmentShader}, "advect_density_program",
-        kQuadVert, kAdvectDensityFrag);
-    deleteGroup(objects, "addInk_program");
-    build({addInk_program, addInk_vertexShader, addInk_fragmentShader}, "addInk_program", kQuadVert, kAddInkFrag);
+        {advect_density_program, advect_density_vertexShader, advect_density_fragmentShader}, kQuadVert,
+        kAdvectDensityFrag);
+    deleteGroup(objects, kAddInkProgram);
+    LOG_INFO("addInk_program zorCreateShaderProgram()");
+    build({addInk_program, addInk_vertexShader, addInk_fragmentShader}, kQuadVert, kAddInkFrag);
 
     setName(AdvectVelocityKernel, "AdvectVelocity");
     setName(AdvectDensityKernel, "AdvectDensity");
@@ -91,9 +92,9 @@ void Fluid::InitializeGPU(bool withInk) {
     setName(AddInkKernel, "AddInk");
     setName(AddVelocityKernel, "AddVelocity");
 
-    deleteGroup(objects, "Velocity.Ping.FboHandle");
+    deleteGroup(objects, kVelocityTarget);
     Velocity.Ping = CreateSurface(GridWidth, GridHeight);
-    deleteGroup(objects, "Density.Ping.FboHandle");
+    deleteGroup(objects, kDensityTargets);
     Density = CreateData(InkWidth, InkHeight);
     allocateBuffers(*this);
     CreateQuad();

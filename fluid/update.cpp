@@ -8,6 +8,7 @@
 #include "fluid/touch.h"
 #include "gl/targets.h"
 #include "tshader/flush_denormals.h"
+#include "tshader/groups.h"
 #include "tshader/velocity_packing.h"
 
 namespace {
@@ -42,6 +43,20 @@ float jittered(int position) {
         static_cast<double>(static_cast<float>(position)) + (0.5 - static_cast<double>(random)) * 10.0);
 }
 
+// Sets to 0 what the solver could not hold in a float. A touch of enormous pressure makes a source so strong that the
+// pressure overflows, and a velocity that is not a number would spread over the field and stay in it.
+void stillOverflows(const Texture<vec2>& velocity) {
+    constexpr float kFastest = 1.0e38f;
+    for (int j = 0; j < velocity.height; ++j) {
+        float* const row = reinterpret_cast<float*>(velocity.row(j));
+        forGroups(0, 2 * velocity.width, [=](auto lanes, int i) {
+            using F = decltype(lanes);
+            const F speed = load<F>(row + i);
+            store((speed <= kFastest) & (speed >= -kFastest) ? speed : F{}, row + i);
+        });
+    }
+}
+
 // Takes out of the field what the source at the touch and the field itself pile up (Stam, Stable Fluids, 1999).
 void project(Fluid& f, const Touch& touch) {
     const float x = jittered(touch.x);
@@ -54,13 +69,13 @@ void project(Fluid& f, const Touch& touch) {
     }
     f.SubtractGradient(f.VelocityTex, f.PressureTex, f.VelocityTexTemp);
     std::swap(f.VelocityTex, f.VelocityTexTemp);
+    stillOverflows(f.VelocityTex);
 }
 
 void upload(const Texture<vec2>& velocity, const Surface_& surface) {
-    if (velocity.empty()) return;  // a view smaller than a cell
     const auto texels = static_cast<std::size_t>(velocity.width) * static_cast<std::size_t>(velocity.height);
     unsigned char* const bytes = staging.reserve(4 * texels);
-    if (!bytes) return;
+    if (!bytes && texels) return;
     packVelocity(velocity.data, texels, bytes);
     glBindTexture(GL_TEXTURE_2D, surface.TextureHandle);
     glTexImage2D(GL_TEXTURE_2D, 0, GL_RGBA, surface.Width, surface.Height, 0, GL_RGBA, GL_UNSIGNED_BYTE, bytes);
@@ -70,8 +85,6 @@ void upload(const Texture<vec2>& velocity, const Surface_& surface) {
 
 // By contract the frame is not read.
 void Fluid::Update(int) {
-    // A set-up leaves the ink's framebuffer bound, which the water must not draw into.
-    if (!VelocityTex.data) return ResetState();
     const Touch touch = latestTouch(*this);
     {
         // A field that fades away ends in denormals.

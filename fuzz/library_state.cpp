@@ -18,14 +18,7 @@ constexpr unsigned kModes = ~0x3fU;  // all but the flags of past operations
 
 unsigned hostModes = 0;
 
-struct HandedOver {
-    AndroidBitmapInfo& info;
-    std::uint8_t*& pixels;
-};
-const HandedOver pictures[] = {
-    {bmp_portrait_bg_info, bmp_portrait_bg_Pixels},
-    {bmp_landscape_bg_info, bmp_landscapebg_Pixels},
-    {bmp_water_Info, bmp_water_Pixels}};
+BitmapSlot* const slots[] = {&portraitSlot, &landscapeSlot, &waterSlot};
 
 // Divided instead of multiplied: once counted in bytes, the product of two sides may be beyond 64 bits.
 void requireRoom(const void* block, std::uint64_t bytesOfOne, std::uint64_t width, std::uint64_t height) {
@@ -48,17 +41,18 @@ void requireSoundGrid(const Texture<T>& grid) {
 void resetLibrary() {
     __android_log_set_logger([](const __android_log_message*) {});
     resetGestures();
-    for (const auto& [info, pixels] : pictures) {
-        std::free(std::exchange(pixels, nullptr));
-        info = {};
+    for (BitmapSlot* const slot : slots) {
+        std::free(std::exchange(slot->pixels, nullptr));
+        slot->bytes = 0;
+        slot->info = {};
     }
     srand48(1);
     hostModes = _mm_getcsr() & kModes;
 }
 
 void requireSoundLibrary() {
-    for (const auto& [info, pixels] : pictures) {
-        if (pixels) requireRoom(pixels, 4, info.width, info.height);
+    for (const BitmapSlot* const slot : slots) {
+        if (slot->pixels) requireRoom(slot->pixels, 4, slot->info.width, slot->info.height);
     }
     requireSoundGrid(fluid.VelocityTex);
     requireSoundGrid(fluid.VelocityTexTemp);

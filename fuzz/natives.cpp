@@ -89,8 +89,12 @@ void transfer(Values& values) {
     bitmap.info.stride = strideOf(values, bitmap.info.width);
     bitmap.info.format = values.number(1, 8);
     const bool fails = values.below(16) >= 13;
-    // A stride of 0 says that the rows are packed.
-    const Wide rowBytes = bitmap.info.stride ? Wide{bitmap.info.stride} : Wide{bitmap.info.width} * 4;
+    // Rows are packed, unless the record is that of one of Android's narrow formats.
+    const bool isNarrow = bitmap.info.format == ANDROID_BITMAP_FORMAT_RGB_565 ||
+                          bitmap.info.format == ANDROID_BITMAP_FORMAT_RGBA_4444 ||
+                          bitmap.info.format == ANDROID_BITMAP_FORMAT_A_8;
+    const Wide packed = Wide{bitmap.info.width} * 4;
+    const Wide rowBytes = isNarrow ? std::min(packed, Wide{bitmap.info.stride}) : packed;
     const bool fits = bitmap.info.height == 0 || rowBytes <= kLargestBitmap / Wide{bitmap.info.height};
     std::vector<std::uint8_t> pixels(fits ? static_cast<std::size_t>(rowBytes * bitmap.info.height) : 0);
     pixels.reserve(1);

@@ -1,21 +1,14 @@
 #include "gl/objects.h"
 
 #include <algorithm>
-#include <string_view>
 
 #include "base/log.h"
 
 namespace {
 
-// Shaders and programs share their names.
-bool shareNames(GlKind a, GlKind b) {
-    const auto space = [](GlKind kind) { return kind == GlKind::shader ? GlKind::program : kind; };
-    return space(a) == space(b);
-}
-
 bool isHeldOnce(std::span<const GlObject> all, const GlObject& object) {
     return std::count_if(all.begin(), all.end(), [&object](const GlObject& other) {
-               return shareNames(other.kind, object.kind) && *other.name == *object.name;
+               return other.kind == object.kind && *other.name == *object.name;
            }) == 1;
 }
 
@@ -36,13 +29,13 @@ void deleteObject(GlKind kind, GLuint name) {
 
 }  // namespace
 
-void deleteGroup(std::span<const GlObject> all, const char* group) {
-    const auto isInGroup = [group](const GlObject& object) { return std::string_view(object.group) == group; };
+void deleteGroup(std::span<const GlObject> all, GlGroup group) {
+    const auto isInGroup = [group](const GlObject& object) { return object.group == group; };
     const auto first = std::find_if(all.begin(), all.end(), [&](const GlObject& object) {
         return isInGroup(object) && object.kind != GlKind::shader;
     });
     if (first == all.end() || !*first->name) return;
-    LOG_INFO("glDelete %s = %u", group, *first->name);
+    LOG_INFO(group, *first->name);
     for (const GlObject& object : all) {
         if (!isInGroup(object)) continue;
         if (*object.name && isHeldOnce(all, object)) deleteObject(object.kind, *object.name);

@@ -1,6 +1,6 @@
 #include "jni/bitmaps.h"
 
-#include <cstddef>
+#include <algorithm>
 #include <cstdlib>
 #include <cstring>
 
@@ -13,6 +13,10 @@ std::uint8_t* bmp_portrait_bg_Pixels;
 std::uint8_t* bmp_landscapebg_Pixels;
 std::uint8_t* bmp_water_Pixels;
 
+BitmapSlot portraitSlot = {bmp_portrait_bg_info, bmp_portrait_bg_Pixels};
+BitmapSlot landscapeSlot = {bmp_landscape_bg_info, bmp_landscapebg_Pixels};
+BitmapSlot waterSlot = {bmp_water_Info, bmp_water_Pixels};
+
 namespace {
 
 // Frees the copies when the library unloads.
@@ -24,39 +28,67 @@ const struct CopyOwner {
     }
 } copyOwner;
 
+// Bytes of a texture of the slot's size; SIZE_MAX where no block can have as many.
+std::size_t textureBytes(const AndroidBitmapInfo& info) {
+    const std::uint64_t texels = std::uint64_t{info.width} * info.height;
+    return texels < SIZE_MAX / 4 ? static_cast<std::size_t>(texels) * 4 : SIZE_MAX;
+}
+
+// Bytes that the platform has locked. By contract stride and format do not change what is uploaded, but a bitmap of an
+// 8-bit or 16-bit format ends early, and reading beyond it may crash.
+std::size_t lockedBytes(const AndroidBitmapInfo& info) {
+    const bool isNarrow = info.format == ANDROID_BITMAP_FORMAT_RGB_565 ||
+                          info.format == ANDROID_BITMAP_FORMAT_RGBA_4444 || info.format == ANDROID_BITMAP_FORMAT_A_8;
+    const std::uint64_t bytes = std::uint64_t{info.stride} * info.height;
+    return isNarrow && info.stride / 4 < info.width ? static_cast<std::size_t>(std::min<std::uint64_t>(bytes, SIZE_MAX))
+                                                    : SIZE_MAX;
+}
+
+void drop(BitmapSlot& slot) {
+    std::free(slot.pixels);
+    slot.pixels = nullptr;
+    slot.bytes = 0;
+}
+
+// Makes the copy `bytes` long, zero beyond its first `kept` bytes, and returns whether there was memory for it. If not,
+// the earlier pixels stay where they are enough for the slot's size.
+bool resize(BitmapSlot& slot, std::size_t bytes, std::size_t kept) {
+    void* const block = bytes < SIZE_MAX ? std::realloc(slot.pixels, std::max<std::size_t>(bytes, 1)) : nullptr;
+    if (!block) {
+        LOG_ERROR("cannot copy a bitmap of %u x %u", slot.info.width, slot.info.height);
+        if (slot.bytes < bytes) drop(slot);
+        return false;
+    }
+    slot.pixels = static_cast<std::uint8_t*>(block);
+    std::memset(slot.pixels + kept, 0, bytes - kept);
+    slot.bytes = bytes;
+    return true;
+}
+
 }  // namespace
 
-void transferBitmap(JNIEnv* env, jobject bitmap, AndroidBitmapInfo& info, std::uint8_t*& pixels) {
-    AndroidBitmapInfo handed = {};
-    int result = AndroidBitmap_getInfo(env, bitmap, &handed);
+void transferBitmap(JNIEnv* env, jobject bitmap, BitmapSlot& slot) {
+    int result = AndroidBitmap_getInfo(env, bitmap, &slot.info);
+    void* locked = nullptr;
     if (result < 0) {
         LOG_ERROR("AndroidBitmap_getInfo () failed! error = % d", result);  // By contract "% d".
-        return;
-    }
-    // Formats of fewer than 32 bits have shorter rows, beyond which we would read. A platform that does not tell is
-    // trusted.
-    if (handed.stride && handed.stride / 4 < handed.width) {
-        LOG_ERROR("not a 32-bit bitmap: %u bytes for %u pixels", handed.stride, handed.width);
-        return;
-    }
-    void* locked = nullptr;
-    result = AndroidBitmap_lockPixels(env, bitmap, &locked);
-    if (result < 0) {
-        LOG_ERROR("AndroidBitmap_lockPixels () failed! error = % d", result);
-        return;
-    }
-    // Copied, not kept locked: a host that recycles its bitmap early cannot pull the pixels from under us, and
-    // after a lost context the textures are loaded again without another hand-over. Costs one picture of memory. The
-    // size is stored together with the copy, so that it never belongs to other pixels.
-    const std::uint64_t wanted = std::uint64_t{handed.width} * handed.height * 4;
-    const auto bytes = static_cast<std::size_t>(wanted);
-    void* const copy = locked && wanted == bytes ? std::realloc(pixels, bytes ? bytes : 1) : nullptr;
-    if (copy) {
-        pixels = static_cast<std::uint8_t*>(copy);
-        info = handed;
-        std::memcpy(pixels, locked, bytes);
     } else {
-        LOG_ERROR("cannot copy a bitmap of %u x %u", handed.width, handed.height);
+        result = AndroidBitmap_lockPixels(env, bitmap, &locked);
+        if (result < 0) LOG_ERROR("AndroidBitmap_lockPixels () failed! error = % d", result);
+    }
+    const std::size_t bytes = textureBytes(slot.info);
+    if (result < 0) {
+        // The earlier pixels may be fewer than the size that the platform has just written.
+        if (slot.pixels && slot.bytes < bytes) resize(slot, bytes, slot.bytes);
+        return;
+    }
+    // Copied, not kept locked: a host that recycles its bitmap early cannot pull the pixels from under us, and after a
+    // lost context the textures are loaded again without another hand-over. Costs one picture of memory.
+    if (locked) {
+        const std::size_t copied = std::min(bytes, lockedBytes(slot.info));
+        if (resize(slot, bytes, copied)) std::memcpy(slot.pixels, locked, copied);
+    } else {
+        drop(slot);
     }
     AndroidBitmap_unlockPixels(env, bitmap);
 }

@@ -16,17 +16,17 @@ extern "C" {
 
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferPortraitBGBitmap(
     JNIEnv* env, jobject, jobject bitmap) {
-    transferBitmap(env, bitmap, bmp_portrait_bg_info, bmp_portrait_bg_Pixels);
+    transferBitmap(env, bitmap, portraitSlot);
 }
 
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferLandscapeBGBitmap(
     JNIEnv* env, jobject, jobject bitmap) {
-    transferBitmap(env, bitmap, bmp_landscape_bg_info, bmp_landscapebg_Pixels);
+    transferBitmap(env, bitmap, landscapeSlot);
 }
 
 JNIEXPORT void JNICALL
 Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferWaterBitmap(JNIEnv* env, jobject, jobject bitmap) {
-    transferBitmap(env, bitmap, bmp_water_Info, bmp_water_Pixels);
+    transferBitmap(env, bitmap, waterSlot);
 }
 
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onInitSetting(
@@ -62,20 +62,13 @@ Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onLoadWaterTextures
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_initWaters(
     JNIEnv* env, jobject, jfloatArray positions, jshortArray indices, jint vertexCount, jint meshSizeWidth,
     jint meshSizeHeight, jint numDetailsWidth, jint numDetailsHeight) {
-    // A virtual machine may have no address for an array without elements, which the other fill must not miss.
-    const bool noVertices = vertexCount < 1;
-    const bool noCells = numDetailsWidth < 2 || numDetailsHeight < 2;
-    jfloat* const p = pin(env, positions);
-    jshort* const i = p || noVertices ? pin(env, indices) : nullptr;
-    if ((p || noVertices) && (i || noCells)) {
+    const int cells = numDetailsWidth > 1 && numDetailsHeight > 1;  // at least
+    const auto fill = [=](bool complete, jfloat* p, jshort* i) {
+        if (!complete) return;
         if (p) fillPositions(p, vertexCount, meshSizeWidth, meshSizeHeight, numDetailsWidth, numDetailsHeight);
         if (i) fillIndices(i, numDetailsWidth, numDetailsHeight);
-    } else {
-        static bool reported = false;
-        reportMissingArray("initWaters", reported);
-    }
-    if (p) release(env, positions, p);
-    if (i) release(env, indices, i);
+    };
+    withPinned(env, "initWaters", fill, Argument{positions, vertexCount}, Argument{indices, cells});
 }
 
 // By contract rowCount is not read.
@@ -83,20 +76,20 @@ JNIEXPORT jint JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
     JNIEnv* env, jobject, jfloatArray velocity, jfloatArray height, jint xStart, jint yStart, jint xEnd, jint yEnd,
     jint stride, jint, jboolean checkCalm, jfloat damping, jfloat waveSpeed) {
     bool calm = true;
-    const auto advance = [=, &calm](jfloat* v, jfloat* h) {
-        calm = stepWaves(v, h, {xStart, yStart, xEnd, yEnd, stride}, checkCalm, damping, waveSpeed);
+    const auto advance = [=, &calm](bool complete, jfloat* v, jfloat* h) {
+        if (complete) calm = stepWaves(v, h, {xStart, yStart, xEnd, yEnd, stride}, checkCalm, damping, waveSpeed);
     };
-    withPinned(env, "move", advance, velocity, height);
+    withPinned(env, "move", advance, Argument{velocity, 1}, Argument{height, 1});
     return calm;
 }
 
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_ripple(
     JNIEnv* env, jobject, jfloatArray field, jint extentA, jint extentB, jint countA, jint countB, jfloat posA,
     jfloat posB, jfloat amplitude) {
-    const auto add = [=](jfloat* values) {
-        addRipple({values, extentA, extentB, countA, countB}, posA, posB, amplitude);
+    const auto add = [=](bool complete, jfloat* values) {
+        if (complete) addRipple({values, extentA, extentB, countA, countB}, posA, posB, amplitude);
     };
-    withPinned(env, "ripple", add, field);
+    withPinned(env, "ripple", add, Argument{field, 1});
 }
 
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onTouch(
@@ -111,14 +104,17 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
     jfloat inkRed, jfloat inkGreen, jfloat inkBlue, jfloat fresnelRatio, jfloat specularRatio, jfloat exponent,
     jboolean landscape) {
     glViewport(0, 0, SCREEN_WIDTH, SCREEN_HEIGHT);
-    const auto draw = [=](const jfloat* p, const jfloat* h, const jfloat* m, const jshort* i) {
+    const auto draw = [=](bool complete, const jfloat* p, const jfloat* h, const jfloat* m, const jshort* i) {
         if (bWithInk) stepInk({inkRed, inkGreen, inkBlue});
+        if (!complete) return;
         fluid.Ripple_Render(
             p, h, i, positionFloats, heightFloats, indexCount, m, meshSizeWidth, meshSizeHeight, numDetailsWidth,
             numDetailsHeight, refractiveIndex, alphaMix, alphaScale1, alphaScale2, fresnelRatio, specularRatio,
             exponent, bWithInk, landscape);
     };
-    withPinned(env, "onDrawFrame", draw, positions, heightAttribs, mvp, indices);
+    withPinned(
+        env, "onDrawFrame", draw, Argument{positions, positionFloats}, Argument{heightAttribs, heightFloats},
+        Argument{mvp, 16}, Argument{indices, indexCount});
 }
 
 JNIEXPORT jint JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_getClearInkValue(JNIEnv*, jobject) {

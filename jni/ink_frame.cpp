@@ -1,6 +1,5 @@
 #include "jni/ink_frame.h"
 
-#include <algorithm>
 #include <limits>
 
 #include "base/wrapping.h"
@@ -14,8 +13,10 @@ void countFrame(int& frames) {
     if (frames < std::numeric_limits<int>::max()) ++frames;
 }
 
-// Far beyond any digitizer. A source near the end of a float's range would leave a flow of which nothing is a number.
-constexpr float kHeaviestTouch = 1.0e30f;
+// Whether the last set-up had memory for the flow. Without it nothing would carry ink away, so none is injected.
+bool hasFlow() {
+    return fluid.VelocityTex.data != nullptr;
+}
 
 // The renderer divides by the colour, which must not be 0.
 Color_ offsetColor(Color_ color) {
@@ -32,10 +33,12 @@ void stepTap(Color_ color) {
     preset.sourceStrength *= step < acc_step ? frame : 0.0f;
     fluid.apply(preset);
     if (step < sim_step) {
-        fluid.Inject(
-            kTap, static_cast<float>(wrappingDifference(POSITION_X, DX)),
-            static_cast<float>(wrappingDifference(POSITION_Y, DY)), static_cast<float>(POSITION_X),
-            static_cast<float>(POSITION_Y), color);
+        if (hasFlow()) {
+            fluid.Inject(
+                kTap, static_cast<float>(wrappingDifference(POSITION_X, DX)),
+                static_cast<float>(wrappingDifference(POSITION_Y, DY)), static_cast<float>(POSITION_X),
+                static_cast<float>(POSITION_Y), color);
+        }
         fluid.BackwardStepSize = kTapBackwardStep * frame;
     }
     countFrame(step);
@@ -58,13 +61,12 @@ void stepDrag(Color_ color) {
     } else if (isMovingEvent == kMedium) {
         fluid.apply(kMediumPreset);
     } else if (isMovingEvent == kSlow) {
-        const float weight = std::min(TouchPressure, kHeaviestTouch);
         InkPreset preset = kSlowPreset;
-        preset.radius *= weight;
-        preset.sourceStrength *= weight;
+        preset.radius *= TouchPressure;
+        preset.sourceStrength *= TouchPressure;
         fluid.apply(preset);
     }
-    fluid.Inject(fluid.DragMode, startX, startY, endX, endY, color);
+    if (hasFlow()) fluid.Inject(fluid.DragMode, startX, startY, endX, endY, color);
     countFrame(drag_step);
     // The next frame's segment starts where this one ended.
     DRAG_START_X = DRAG_END_X;
@@ -76,7 +78,12 @@ void stepDrag(Color_ color) {
 void stepInk(Color_ hostColor) {
     fluid.InkColorOffset = kInkColorOffset;
     const Color_ color = offsetColor(hostColor);
-    fluid.Update(count);  // By contract with the parameters of the last frame.
+    if (hasFlow()) {
+        fluid.Update(count);  // By contract with the parameters of the last frame.
+    } else {
+        // A set-up leaves the ink's framebuffer bound, which the water must not draw into.
+        fluid.ResetState();
+    }
     count = wrappingDifference(count, -1);
     fluid.BackwardStepSize = kBackwardStep;
     fluid.InkIntensity = kInkIntensity;

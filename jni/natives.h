@@ -17,22 +17,24 @@
 // ask for; indices that name vertices which exist; bitmaps that stay valid during their hand-over. The library cannot
 // see these, and a mistake in them may crash.
 //
-// The caller also keeps the order, but a mistake there crashes nothing: until a set-up (step 2) has succeeded,
-// onDrawFrame draws no water, and says so in the log once. A picture that was not loaded is black.
+// The caller also keeps the order, but a mistake there crashes nothing: before onInitSetting, onDrawFrame draws no
+// water and says so in the log once. A program that failed to build draws nothing; a picture that was not loaded is
+// black.
 //
-// All else may be wrong without harm. A null array, or one that the virtual machine cannot pin (its OutOfMemoryError is
-// then pending), makes its call change nothing but, in onDrawFrame, the viewport; move answers true; the log says so
-// once a method. Coordinates, pressures, sizes and lighting values may be anything: the ink of a view of more than
-// 65,536 pixels a side is left out, and what is not a number in the mesh arrays stays in them.
+// Any other mistake is harmless. A null array of which the call would use elements, or one that the virtual machine
+// cannot pin (its OutOfMemoryError is then pending), makes the call change nothing, move return true and onDrawFrame
+// leave out the water: it still sets the viewport and steps the ink. The log says so once for each method. Coordinates,
+// pressures, sizes and lighting values may be anything: a view of more than 65,536 pixels a side gets no ink, and a
+// value in the mesh arrays that is not a number stays in them.
 #pragma once
 
 #include <jni.h>
 
 extern "C" {
 
-// Take over a picture: 32-bit RGBA, rows from the top, without padding between rows. The pixels are copied; the
-// bitmap may be recycled afterwards. A failure, or rows of fewer than 32 bits a pixel, is logged and leaves the earlier
-// picture in place.
+// Copy a picture: 32-bit RGBA, rows from the top, without padding between rows, whatever the bitmap's record says of
+// its stride and format. The bitmap may be recycled afterwards. A failure is logged and leaves the earlier pixels in
+// place; where only the lock failed, the slot has the new bitmap's size.
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferPortraitBGBitmap(
     JNIEnv* env, jobject, jobject bitmap);
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferLandscapeBGBitmap(
@@ -86,9 +88,9 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
 
 // Draws one frame over the whole view and clears nothing: without ink into the current framebuffer, with ink into
 // framebuffer 0, which the ink's passes bind. With ink, each call is also one step of the ink, and with counts of 0
-// nothing else. From the first touch on, a step whose latest touch lies inside the margin along the edges draws two
-// numbers of the process's lrand48: seed it with srand48 to repeat a recording. positions and heightAttribs hold 3
-// floats a vertex, indices unsigned vertex numbers, mvp 16 floats by columns.
+// nothing else. From the first touch on, each step whose latest touch lies farther than the margin (10 to 60 pixels)
+// from every edge draws two numbers of the process's lrand48: seed it with srand48 to repeat a recording. positions and
+// heightAttribs hold 3 floats a vertex, indices unsigned vertex numbers, mvp 16 floats by columns.
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onDrawFrame(
     JNIEnv* env, jobject, jfloatArray positions, jfloatArray heightAttribs, jshortArray indices, jint positionFloats,
     jint heightFloats, jint indexCount, jfloatArray mvp, jint meshSizeWidth, jint meshSizeHeight, jint numDetailsWidth,

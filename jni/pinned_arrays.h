@@ -7,7 +7,15 @@
 
 #include "base/log.h"
 
-// The elements of an array; null for a null array, or when the virtual machine has no memory for its copy.
+// An array and the number of its elements that the call uses.
+template <class Array>
+struct Argument {
+    Array array;
+    int count;
+};
+
+// The elements of an array, or null: for a null array, without memory for a copy, or, on some virtual machines, for an
+// array without elements.
 inline jfloat* pin(JNIEnv* env, jfloatArray array) {
     return array ? env->GetFloatArrayElements(array, nullptr) : nullptr;
 }
@@ -17,35 +25,32 @@ inline jshort* pin(JNIEnv* env, jshortArray array) {
 }
 
 inline void release(JNIEnv* env, jfloatArray array, jfloat* elements) {
-    env->ReleaseFloatArrayElements(array, elements, 0);
+    if (elements) env->ReleaseFloatArrayElements(array, elements, 0);
 }
 
 inline void release(JNIEnv* env, jshortArray array, jshort* elements) {
-    env->ReleaseShortArrayElements(array, elements, 0);
+    if (elements) env->ReleaseShortArrayElements(array, elements, 0);
 }
 
-// Names in the log, the first time, a method that could not work.
-inline void reportMissingArray(const char* method, bool& reported) {
-    if (!reported) LOG_ERROR("%s() without an array", method);
-    reported = true;
-}
-
-// Pins the arrays, calls `use` with their elements, and copies them back, all in the order given. Where an array is
-// null or the virtual machine has no memory for its copy, no further one is asked for, `use` is not called, and the log
-// names `method` the first time.
+// Pins the arrays, calls use(complete, elements...), and copies them back, all in the order given. `complete` tells
+// whether each array of which the call uses elements has an address. After the first one that has none, no further one
+// is pinned, as an OutOfMemoryError may be pending, and the log names `method` the first time.
 template <class Use, class... Arrays>
-void withPinned(JNIEnv* env, const char* method, Use use, Arrays... arrays) {
+void withPinned(JNIEnv* env, const char* method, Use use, Argument<Arrays>... arguments) {
     static bool reported = false;
-    std::tuple<decltype(pin(env, arrays))...> pinned;
+    bool complete = true;
+    const auto pinNext = [&](auto argument) {
+        auto* const elements = complete ? pin(env, argument.array) : nullptr;
+        complete = complete && (elements || argument.count < 1);
+        return elements;
+    };
+    const std::tuple pinned{pinNext(arguments)...};
+    if (!complete && !reported) LOG_ERROR("%s() without an array", method);
+    reported = reported || !complete;
     std::apply(
-        [&](auto*&... elements) {
-            ((elements = nullptr), ...);
-            if ((... && (elements = pin(env, arrays)))) {
-                use(elements...);
-            } else {
-                reportMissingArray(method, reported);
-            }
-            ((elements ? release(env, arrays, elements) : void()), ...);
+        [&](auto*... elements) {
+            use(complete, elements...);
+            (release(env, arguments.array, elements), ...);
         },
         pinned);
 }

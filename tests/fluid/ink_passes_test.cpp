@@ -92,7 +92,7 @@ TEST_F(InkPasses, injectionAddsWhatTheKernelAdds) {
     kernel.Scale = Vec2(1200.0f / kWidth, 2000.0f / kHeight);
     kernel.InverseSize = Vec2(1.0f / kWidth, 1.0f / kHeight);
     engine.Radius = kernel.Radius = 300;
-    kernel.ImpulseDensity = 30;
+    engine.ImpulseDensity = kernel.ImpulseDensity = 30;
     kernel.current = {903.3f, 1503.3f};
     for (const int mode : {-1, 0, 1, 2}) {
         for (vec2 previous : {vec2{320.3f, 500.4f}, {903.3f, 500.4f}, kernel.current}) {
@@ -103,7 +103,7 @@ TEST_F(InkPasses, injectionAddsWhatTheKernelAdds) {
             const bool hasLength = kernel.len > 0;
             kernel.normal = hasLength ? (kernel.current - kernel.previous) / kernel.len : Vec2(0);
             engine.AddInk(
-                engine.Density.Ping, engine.Density.Pong, mode, {previous.x, previous.y}, {903.3f, 1503.3f}, 30);
+                engine.Density.Ping, engine.Density.Pong, mode, {previous.x, previous.y}, {903.3f, 1503.3f}, 7);
             const Density expected = everyTexel(kernel, 0.5f);
             EXPECT_EQ(largestDifference(expected, before) > 0.2, mode != 2 || hasLength) << "adds something";
             EXPECT_LE(

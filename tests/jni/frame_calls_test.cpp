@@ -1,6 +1,8 @@
 // Every GL call of a frame, counted by name: a call too many is paid in every frame on a phone.
 #include <gtest/gtest.h>
 
+#include <array>
+
 #include "fluid/ink_presets.h"
 #include "host/water_host.h"
 #include "jni/gesture.h"
@@ -27,9 +29,9 @@ constexpr Use kAdded = {157, kMeshBytes + 2 * kQuadBytes + kGridBytes};
 
 class FrameCalls : public testing::Test {
 protected:
-    void start(bool withInk) {
+    void start(bool withInk, int width = 480) {
         resetGestures();
-        Frame::setUp(480, 800, withInk);
+        Frame::setUp(width, 800, withInk);
         frame.draw();
         takeGlUse();
     }
@@ -68,6 +70,23 @@ TEST_F(FrameCalls, areThoseOfTheTable) {
         expectFrame(kAdded);
     }
     EXPECT_EQ(fluid.DragMode, kFastDrag);
+    // Narrower than a cell: the flow's texture has no texels, and is specified all the same.
+    start(true, 11);
+    expectFrame({kCarried.calls, kMeshBytes + kQuadBytes});
+}
+
+TEST_F(FrameCalls, deleteObjectsOfEqualNamesAndOtherKinds) {
+    GLuint shader = 7, program = 7, buffer = 7, stale = 7;
+    const GlObject objects[] = {
+        {kQuadBuffer, GlKind::shader, &shader},
+        {kQuadBuffer, GlKind::program, &program},
+        {kQuadBuffer, GlKind::buffer, &buffer},
+        {kIndexBuffer, GlKind::buffer, &stale}};
+    takeGlUse();
+    deleteGroup(objects, kQuadBuffer);
+    EXPECT_EQ(takeGlUse().calls, (std::map<std::string, int>{{"glDeleteShader", 1}, {"glDeleteProgram", 1}}))
+        << "but not what two members name, of which one is stale";
+    EXPECT_EQ((std::array{shader, program, buffer, stale}), (std::array<GLuint, 4>{0, 0, 0, 7}));
 }
 
 TEST_F(FrameCalls, ofALateFrameDrawTheWaterOnce) {

@@ -1,6 +1,7 @@
 #include "jni/ink_frame.h"
 
 #include <algorithm>
+#include <cmath>
 #include <limits>
 
 #include "jni/gesture.h"
@@ -130,6 +131,21 @@ TEST_F(InkFrame, dragsWriteThePresetOfTheirSpeed) {
     drag_step = kLast - 2;
     frames(5);
     EXPECT_EQ(drag_step, kLast);
+}
+
+// The solver's floats overflow; a velocity that is not a number would stay in the flow.
+TEST_F(InkFrame, anEnormousPressureIsTakenAsItIsAndTheFlowStaysFinite) {
+    for (const float pressure : {1e18f, std::numeric_limits<float>::infinity()}) {
+        for (const int x : {240, 243, 244, 245}) touch(x, 400, x == 240 ? kActionDown : kActionMove, pressure);
+        frames(3);
+        EXPECT_EQ(TouchPressure, pressure * pressure);
+        EXPECT_EQ(fluid.Radius, 40 * TouchPressure);
+        EXPECT_EQ(fluid.SourceStrength, 45 * TouchPressure);
+        const Texture<vec2>& flow = fluid.VelocityTex;
+        const auto isFinite = [](vec2 v) { return std::isfinite(v.x) && std::isfinite(v.y); };
+        EXPECT_TRUE(std::all_of(flow.row(0), flow.row(flow.height), isFinite));
+        EXPECT_FALSE(std::all_of(flow.row(0), flow.row(flow.height), [](vec2 v) { return v.x == 0; }));
+    }
 }
 
 TEST_F(InkFrame, clearedInkAndInkThatWasSwitchedOffComeBackWithTheNextTouch) {

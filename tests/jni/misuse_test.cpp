@@ -45,7 +45,8 @@ TEST_F(Misuse, nothingIsDrawnBeforeASetUpAndThatIsLoggedOnce) {
     native::onInitGPU(env, nullptr);  // half a set-up, whose ink has no texels
     frame.draw();
     static int times = 0;
-    EXPECT_EQ(times += logged("E Ripple_Render() without a set-up"), 1) << "in the life of the process";
+    EXPECT_EQ(times += logged("E Ripple_Render() without the buffers of onInitSetting()"), 1)
+        << "in the process's life";
     ignoreErrors();
 }
 
@@ -79,16 +80,29 @@ TEST_F(Misuse, aMissingArrayMakesItsCallDoNothing) {
         EXPECT_EQ(gets, 2) << "an exception is pending: no further array may be asked for";
     }
     EXPECT_EQ(copiesOut, 0) << "what was pinned is released";
+    EXPECT_EQ(binding(GL_ELEMENT_ARRAY_BUFFER_BINDING), 0) << "nothing was drawn";
     EXPECT_EQ(frame.height.values, (std::vector<float>{1, 2, 3, 4}));
     EXPECT_EQ(frame.velocity.values, frame.height.values);
     EXPECT_EQ(frame.indices.values, std::vector<short>(6));
-    EXPECT_EQ(count, 0) << "no ink step without a picture";
+    EXPECT_EQ(count, 10) << "the ink is stepped all the same";
     static std::vector<std::string> lines;
     std::ranges::copy(log.take(), std::back_inserter(lines));
     const std::vector<std::string> expected = {
         "E initWaters() without an array", "E move() without an array", "E ripple() without an array",
         "E onDrawFrame() without an array"};
     EXPECT_EQ(lines, expected) << "each once in the life of the process";
+}
+
+TEST_F(Misuse, arraysOfWhichNothingIsUsedAndAProgramThatFailedStopNoDraw) {
+    Frame::setUp(kSide, kSide, true);
+    Frame::draw(env, nullptr, nullptr, nullptr, &frame.mvp, 0);
+    EXPECT_EQ(binding(GL_ELEMENT_ARRAY_BUFFER_BINDING), static_cast<int>(fluid.i_buf));
+    fluid.ripple_program = 0;
+    glBindBuffer(GL_ELEMENT_ARRAY_BUFFER, 0);
+    frame.draw();
+    EXPECT_EQ(binding(GL_ELEMENT_ARRAY_BUFFER_BINDING), static_cast<int>(fluid.i_buf));
+    EXPECT_EQ(binding(GL_CURRENT_PROGRAM), 0);
+    ignoreErrors();
 }
 
 // On the real driver, which crashes where it trusts its caller. A good set-up recovers from all of it.

@@ -2,6 +2,7 @@
 
 #include <cstring>
 #include <numeric>
+#include <ranges>
 #include <tuple>
 
 #include "jni/bitmaps.h"
@@ -9,32 +10,51 @@
 #include "tests/support/frame.h"
 #include "tests/support/log_recorder.h"
 
-TEST(Natives, takeOverABitmapAndKeepItWhenTheNextOneFails) {
+// A slot as it is after bitmaps that fail in every way, each of a size of its own.
+TEST(Natives, copyABitmapAndKeepItsPixelsWhenTheNextOneFails) {
     using Transfer = void (*)(JNIEnv*, jobject, jobject);
     for (const auto& [transfer, info, kept] :
          {std::tuple<Transfer, AndroidBitmapInfo&, std::uint8_t*&>(
               native::transferPortraitBGBitmap, bmp_portrait_bg_info, bmp_portrait_bg_Pixels),
           {native::transferLandscapeBGBitmap, bmp_landscape_bg_info, bmp_landscapebg_Pixels},
           {native::transferWaterBitmap, bmp_water_Info, bmp_water_Pixels}}) {
-        std::vector<std::uint8_t> pixels(2 * 3 * 4);
-        std::iota(pixels.begin(), pixels.end(), std::uint8_t{100});
-        const auto original = pixels;
-        DesktopBitmap good, narrow, locked;
-        good.info.width = narrow.info.width = locked.info.width = 2;
-        good.info.height = 3;
-        good.pixels = pixels.data();
-        narrow.info.stride = 4;
+        std::vector<std::uint8_t> pixels(4 * 4 * 4);
         LogRecorder log;
-        for (DesktopBitmap* const bitmap : {&good, &narrow, &locked, static_cast<DesktopBitmap*>(nullptr)}) {
-            transfer(copyingEnvironment(), nullptr, bitmap);
-            EXPECT_TRUE(!bitmap || bitmap->locks == 0);
-            EXPECT_EQ(std::pair(info.width, info.height), std::pair(2u, 3u));
-            EXPECT_EQ(std::memcmp(kept, original.data(), original.size()), 0);
+        const auto handOver = [&](unsigned width, unsigned height, bool locks, unsigned stride = 7, int format = 0) {
+            std::iota(pixels.begin(), pixels.end(), std::uint8_t{100});
+            DesktopBitmap bitmap;
+            bitmap.info.width = width;
+            bitmap.info.height = height;
+            bitmap.info.stride = stride;
+            bitmap.info.format = format;
+            if (locks) bitmap.pixels = pixels.data();
+            transfer(copyingEnvironment(), nullptr, &bitmap);
+            EXPECT_EQ(bitmap.locks, 0);
+            EXPECT_EQ(std::pair(info.width, info.height), std::pair(width, height));
             std::ranges::fill(pixels, std::uint8_t{0});  // recycled at once
-        }
-        const std::vector<std::string> lines = {
-            "E not a 32-bit bitmap: 4 bytes for 2 pixels", "E AndroidBitmap_lockPixels () failed! error = -3",
-            "E AndroidBitmap_getInfo () failed! error = -1"};
+        };
+        const auto holds = [&kept](int count, int zeros) {
+            return std::ranges::all_of(
+                std::views::iota(0, count + zeros), [&](int i) { return kept[i] == (i < count ? 100 + i : 0); });
+        };
+        handOver(4, 2, false);
+        EXPECT_EQ(kept, nullptr) << "nothing was ever locked";
+        handOver(2, 3, true);
+        EXPECT_TRUE(holds(2 * 3 * 4, 0)) << "whatever the stride says";
+        handOver(1, 3, false);
+        handOver(4, 3, false);
+        EXPECT_TRUE(holds(2 * 3 * 4, 2 * 3 * 4)) << "grown by zeros";
+        handOver(4, 4, true, 8, ANDROID_BITMAP_FORMAT_RGB_565);
+        EXPECT_TRUE(holds(4 * 4 * 2, 4 * 4 * 2)) << "half as long as it should be";
+        const std::uint8_t* const before = kept;
+        transfer(copyingEnvironment(), nullptr, nullptr);
+        EXPECT_EQ(kept, before);
+        handOver(1u << 31, 1u << 31, false);
+        EXPECT_EQ(kept, nullptr) << "no memory has as much";
+        const std::string lock = "E AndroidBitmap_lockPixels () failed! error = -3";
+        const std::vector<std::string> lines = {lock, lock,
+                                                lock, "E AndroidBitmap_getInfo () failed! error = -1",
+                                                lock, "E cannot copy a bitmap of 2147483648 x 2147483648"};
         EXPECT_EQ(log.take(), lines);
     }
 }

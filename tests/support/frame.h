@@ -9,10 +9,10 @@ struct Frame {
     ShortArray indices{6};
 
     void draw(JNIEnv* env = copyingEnvironment()) { draw(env, &positions, &heights, &indices, &mvp); }
-    static void draw(JNIEnv* env, FloatArray* p, FloatArray* h, ShortArray* i, FloatArray* m) {
+    static void draw(JNIEnv* env, FloatArray* p, FloatArray* h, ShortArray* i, FloatArray* m, int indexCount = 6) {
         native::onDrawFrame(
-            env, nullptr, p, h, i, 12, 12, 6, m, 1, 1, 2, 2, 1.33f, 0.5f, 0.5f, 1.0f, 0.1f, 0.2f, 0.3f, 1.0f, 1.0f,
-            40.0f, false);
+            env, nullptr, p, h, i, 2 * indexCount, 2 * indexCount, indexCount, m, 1, 1, 2, 2, 1.33f, 0.5f, 0.5f, 1.0f,
+            0.1f, 0.2f, 0.3f, 1.0f, 1.0f, 40.0f, false);
     }
     static void setUp(int width, int height, bool withInk) {
         native::onInitSetting(copyingEnvironment(), nullptr, width, height, withInk);

@@ -1,9 +1,11 @@
 """Turns the benchmarks' results into docs/bench.md and docs/bench.svg: report.py <folder of results> <docs>."""
 
+import datetime
 import json
 import pathlib
 import re
 import statistics
+import subprocess
 import sys
 
 results, docs = map(pathlib.Path, sys.argv[1:])
@@ -82,13 +84,14 @@ def met(limit, values):
     return bound is None or all(v >= bound if sign == ">=" else v <= bound for v in values)
 
 
+commit = subprocess.run(["git", "describe", "--always", "--dirty"], capture_output=True, text=True).stdout.strip()
 cpu = re.search(r"model name\s*: (.*)", pathlib.Path("/proc/cpuinfo").read_text())
 machine = cpu.group(1) if cpu else "an unnamed processor"
 lines = [
     "# Benchmarks",
     "",
-    f"Written by `scripts/bench.sh` on one core of: {machine}. Medians of 21 repetitions in random order,",
-    "with both compilers in turn and the baseline instruction set (no `-march`).",
+    f"Written by `scripts/bench.sh` on {datetime.date.today()} at commit {commit}, on one core of: {machine}.",
+    "Medians of 21 repetitions in random order, with both compilers in turn and the baseline instruction set (no `-march`).",
     "",
     "*Scalar* is the same formula as a plain loop at `-O2` without automatic vectorization, *-O3* the same loop with it, and",
     "*Eigen* the same formula as array expressions. A ratio says how many times as long the other form takes, or the first of",

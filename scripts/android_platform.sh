@@ -13,6 +13,7 @@ done
 apt=(apt-get -qq -o Dir::Etc::SourceList=/dev/null -o Dir::Etc::SourceParts="$platform/parts"
     -o Dir::State::Lists="$platform/lists" -o Dir::Cache="$platform/apt" -o APT::Sandbox::User=)
 "${apt[@]}" update
+echo "Going to download the source package android-platform-frameworks-base (45 MB) with apt-get"
 (cd "$platform" && "${apt[@]}" source --download-only android-platform-frameworks-base)
 tar -x -f "$platform"/android-platform-frameworks-base_*.orig.tar.* -C "$platform" \
     api/current.txt opengl/java/android/opengl/GLSurfaceView.java

@@ -14,7 +14,12 @@ install_missing "${web_packages[@]}"
 # A Node that does not come from Debian brings its own.
 command -v npm >/dev/null || install_missing npm
 
-[ web/node_modules -nt web/package-lock.json ] || npm --prefix web ci --no-audit --no-fund &
+fetch_packages() {
+    [ ! web/node_modules -nt web/package-lock.json ] || return 0
+    echo "Going to download the packages of web/package-lock.json with npm"
+    npm --prefix web ci --no-audit --no-fund
+}
+fetch_packages &
 cmake --preset web >/dev/null
 cmake --build --preset web
 wait $!

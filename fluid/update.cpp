@@ -52,7 +52,8 @@ void stillOverflows(const Texture<vec2>& velocity) {
         forGroups(0, 2 * velocity.width, [=](auto lanes, int i) {
             using F = decltype(lanes);
             const F speed = load<F>(row + i);
-            store((speed <= kFastest) & (speed >= -kFastest) ? speed : F{}, row + i);
+            const auto isHeld = (speed <= kFastest) & (speed >= -kFastest);
+            store(isHeld ? speed : F{}, row + i);
         });
     }
 }

@@ -13,6 +13,8 @@ struct Argument {
     Array array;
     int count;
 };
+template <class Array>
+Argument(Array, int) -> Argument<Array>;
 
 // The elements of an array, or null: for a null array, without memory for a copy, or, on some virtual machines, for an
 // array without elements.

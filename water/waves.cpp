@@ -76,6 +76,58 @@ void smooth(float* height, const float* copy, const float* centre, std::ptrdiff_
     });
 }
 
+// A region of the host's arrays: from the first vertex of each.
+struct Rows {
+    float* velocity;
+    float* height;
+    std::ptrdiff_t stride;
+    int width;
+    int count;
+};
+
+// Integrates and smooths rows that do not fill their stride. Each is copied into whole groups, so that three of the
+// four neighbours and every store lie on the borders of groups: a load across two cache lines costs two.
+bool integrateAndSmooth(const Rows& rows, float k) {
+    const auto [v, h, stride, width, count] = rows;
+    const std::ptrdiff_t copyStride = (std::ptrdiff_t{width} + 2 + 3) / 4 * 4;
+    float* const copies =
+        snapshot.reserve(static_cast<std::size_t>(copyStride) * (static_cast<std::size_t>(count) + 2));
+    if (!copies) return false;
+    float* const s = copies + copyStride;
+    for (int row = 0; row < count; ++row) {
+        integrate(h + row * stride, v + row * stride, s + row * copyStride, width);
+    }
+    const std::size_t rowBytes = static_cast<std::size_t>(width) * sizeof(float);
+    std::memcpy(s - copyStride, h - stride, rowBytes);
+    std::memcpy(s + count * copyStride, h + count * stride, rowBytes);
+    for (int row = 0; row < count; ++row) {
+        s[row * copyStride - 1] = h[row * stride - 1];
+        s[row * copyStride + width] = h[row * stride + width];
+    }
+    for (int row = 0; row < count; ++row) {
+        const float* const copy = s + row * copyStride;
+        smooth(h + row * stride, copy, copy, copyStride, width, k);
+    }
+    return true;
+}
+
+// The same for rows that fill their stride or overlap: the vertex left of a row is the last one of the row before,
+// which the step moves as well. The copy is laid out as the array is.
+bool integrateAndSmoothContiguous(const Rows& rows, float k) {
+    const auto [v, h, stride, width, count] = rows;
+    const std::ptrdiff_t length = (count - 1) * stride + width;
+    float* const copy = snapshot.reserve(static_cast<std::size_t>(length + 2 * stride));
+    if (!copy) return false;
+    float* const s = copy + stride;
+    for (int row = 0; row < count; ++row) integrate(h + row * stride, v + row * stride, h + row * stride, width);
+    std::copy_n(h - stride, length + 2 * stride, copy);
+    for (int row = 0; row < count; ++row) {
+        float* const heights = h + row * stride;
+        smooth(heights, s + row * stride, heights, stride, width, k);
+    }
+    return true;
+}
+
 }  // namespace
 
 bool stepWaves(
@@ -100,43 +152,12 @@ bool stepWaves(
     while (checkCalm && calm && row < rows) calm = pass(std::true_type{}, row++);
     while (row < rows) pass(std::false_type{}, row++);
 
-    // Rows that fill the stride are neighbours of each other in memory: the vertex left of a row is the last one of the
-    // row before, which this step moves too. Their copies must lie as they do. Other rows are copied one by one, in
-    // whole groups, so that three of the four neighbours and every store lie on the borders of groups: a load across
-    // two cache lines costs two.
-    const bool isContiguous = stride > 0 && width >= stride;
-    const std::ptrdiff_t copyStride = isContiguous ? stride : (std::ptrdiff_t{width} + 2 + 3) / 4 * 4;
-    const std::ptrdiff_t copied = copyStride * (rows + 1) + std::max<std::ptrdiff_t>(copyStride, width);
-    float* const copies = snapshot.reserve(static_cast<std::size_t>(copied));
-    float* const s = copies ? copies + copyStride : nullptr;
-    const std::size_t rowBytes = static_cast<std::size_t>(width) * sizeof(float);
-    for (row = 0; row < rows; ++row) {
-        float* const heights = h + row * stride;
-        float* const copy = s ? s + row * copyStride : heights;
-        integrate(heights, v + row * stride, copy, width);
-        if (isContiguous && s) std::memcpy(heights, copy, rowBytes);
-    }
-    if (!s) return calm;
-
-    if (isContiguous) {
-        const std::ptrdiff_t end = (rows - 1) * stride + width;
-        std::copy_n(h - stride, stride, s - stride);
-        std::copy_n(h + end, stride, s + end);
-    } else {
-        std::memcpy(s - copyStride, h - stride, rowBytes);
-        std::memcpy(s + rows * copyStride, h + rows * stride, rowBytes);
-        for (row = 0; row < rows; ++row) {
-            s[row * copyStride - 1] = h[row * stride - 1];
-            s[row * copyStride + width] = h[row * stride + width];
-        }
-    }
-
     // By contract exactly this damping smooths more.
     const float k = damping == 0.94f ? 0.068f : 0.018f;
-    for (row = 0; row < rows; ++row) {
-        float* const heights = h + row * stride;
-        const float* const copy = s + row * copyStride;
-        smooth(heights, copy, isContiguous ? heights : copy, copyStride, width, k);
-    }
+    const Rows all = {v, h, stride, width, rows};
+    const bool isContiguous = stride > 0 && width >= stride;
+    if (isContiguous ? integrateAndSmoothContiguous(all, k) : integrateAndSmooth(all, k)) return calm;
+    // Without memory for the copy the surface is only integrated.
+    for (row = 0; row < rows; ++row) integrate(h + row * stride, v + row * stride, h + row * stride, width);
     return calm;
 }

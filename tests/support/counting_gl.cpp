@@ -112,7 +112,7 @@ COUNT(glLinkProgram, (GLuint), )
 COUNT(glShaderSource, (GLuint, GLsizei, const GLchar* const*, const GLint*), )
 COUNT(
     glTexImage2D, (GLenum, GLint, GLint, GLsizei width, GLsizei height, GLint, GLenum, GLenum, const void* pixels),
-    take(pixels, GLsizeiptr{4} * std::max(width, 0) * std::max(height, 0)))
+    if (pixels) take(pixels, GLsizeiptr{4} * std::max(width, 0) * std::max(height, 0)))
 COUNT(glTexParameterf, (GLenum, GLenum, GLfloat), )
 COUNT(glTexParameteri, (GLenum, GLenum, GLint), )
 COUNT(glUniform1f, (GLint, GLfloat), )

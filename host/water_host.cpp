@@ -4,6 +4,7 @@
 #include <cmath>
 #include <utility>
 
+#include "host/look_limits.h"
 #include "host/native_names.h"
 #include "platform/desktop_bitmap.h"
 
@@ -24,6 +25,9 @@ constexpr int kMostInkSteps = 4;
 
 // Nearer to a step than this, in steps, the heights are those of the step.
 constexpr float kAtStep = 0.0625f;
+
+// The peak of a ripple is three times as high, and the water keeps heights of up to 100.
+constexpr float kMostAmplitude = 100.0f / 3.0f;
 
 // Steps are taken at the time nearest to theirs, so that neither the jitter of a clock nor rounding brings none to one
 // frame and two to the next.
@@ -49,7 +53,7 @@ std::vector<float> resampled(const std::vector<float>& field, int from, int to) 
 }  // namespace
 
 WaterHost::WaterHost(const Look& look, int width, int height, std::uint32_t seed)
-    : look_(look), random_(seed), calmSteps_(look.stepsToRest), lattice_{} {
+    : look_(withinLimits(look)), random_(seed), calmSteps_(look_.stepsToRest), lattice_{} {
     resize(width, height);
 }
 
@@ -61,7 +65,7 @@ void WaterHost::resize(int width, int height) {
 }
 
 void WaterHost::setLook(const Look& look) {
-    look_ = look;
+    look_ = withinLimits(look);
     fit();
 }
 
@@ -245,6 +249,7 @@ void WaterHost::dropRain() {
 }
 
 void WaterHost::raiseRipple(float x, float y, float amplitude) {
+    if (!std::isfinite(amplitude)) return;
     // The library counts countA cells across the extent, the lattice has one interval less; these positions hit the
     // very point. The fast axis runs down a column of the lattice.
     const auto extent = static_cast<float>(lattice_.extent);
@@ -253,7 +258,8 @@ void WaterHost::raiseRipple(float x, float y, float amplitude) {
     const float column = (0.5f + x / extent) * (n - 1.0f);
     native::ripple(
         hostEnvironment(), nullptr, &heights_, lattice_.extent, lattice_.extent, lattice_.points, lattice_.points,
-        (row / n - 0.5f) * extent, (column / n - 0.5f) * extent, amplitude);
+        (row / n - 0.5f) * extent, (column / n - 0.5f) * extent,
+        std::clamp(amplitude, -kMostAmplitude, kMostAmplitude));
     calmSteps_ = 0;
     isGathered_ = false;
 }

@@ -41,7 +41,7 @@ public:
     // Shows pictures handed over since setUp; the water and the ink stay as they are.
     void loadTextures(unsigned which = Pictures::kAll);
 
-    // Takes over all values; the water and the ink stay.
+    // Takes over all values, brought within their limits; the water and the ink stay.
     void setLook(const Look& look);
 
     // What the processor spent on a frame, in seconds: where the look leaves the mesh to the host, it gets coarser when

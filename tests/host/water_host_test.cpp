@@ -1,5 +1,8 @@
 #include "host/water_host.h"
 
+#include <algorithm>
+#include <limits>
+
 #include "tests/support/gesture_state.h"
 #include "tests/support/gl_test.h"
 #include "tests/support/test_pictures.h"
@@ -141,4 +144,37 @@ TEST_F(Host, inkBloomsInItsColorFadesAndIsClearedAtOnce) {
     host.draw();
     host.draw();
     EXPECT_EQ(readPixels(width, height), clear) << "a switch ends the stroke that it interrupts";
+}
+
+TEST_F(Host, numbersBeyondAllMeasureLeaveTheWaterAlive) {
+    constexpr float kInfinity = std::numeric_limits<float>::infinity();
+    constexpr float kNan = std::numeric_limits<float>::quiet_NaN();
+    Look broken;
+    broken.calmingTime = kNan;
+    broken.dropRadius = 0.0f;
+    broken.meshVertices = -1;
+    broken.stepsToRest = broken.stepsPerSecond = std::numeric_limits<int>::max();
+    for (const Look& look : {Look{}, broken}) {
+        WaterHost host = start(kShort, kLong, false, look);
+        const auto highest = [&host] {
+            const auto [low, high] = std::minmax_element(host.heights().begin(), host.heights().end());
+            return std::max(-*low, *high);
+        };
+        for (const float pressure : {kNan, kInfinity, -kInfinity}) {
+            host.splash(20, 30, pressure);
+            EXPECT_EQ(highest(), 0.0f) << pressure;
+        }
+        constexpr int kFar = std::numeric_limits<int>::max();
+        host.touch(TouchAction::down, 20, 30, 1.0e38f);
+        host.touch(TouchAction::move, -kFar, kFar, 1.0e38f);
+        host.touch(TouchAction::up, kFar, -kFar, kNan);
+        EXPECT_NEAR(highest(), 90.0f, 10.0f);
+        host.setLook(look);
+        host.advance(0.1);
+        host.setLook({.calmingTime = 1.0f});
+        for (int i = 0; i < 100; ++i) host.advance(0.1);
+        EXPECT_LT(highest(), 0.5f);
+        host.splash(20, 30, 1.0f);
+        EXPECT_GT(highest(), 3.0f);
+    }
 }

@@ -225,6 +225,25 @@ public final class RendererTest {
     }
 
     @Test
+    public void numbersBeyondAllMeasureLeaveTheWaterAlive() {
+        start();
+        drawUntilRest();
+        byte[] still = Screen.pixels;
+        for (float strength : new float[] {Float.NaN, 1e38f}) {
+            view.ripple(40, 40, strength);
+            drawUntilRest();
+            assertTrue("waves of strength " + strength + " calm", difference(still, Screen.pixels) <= 20);
+        }
+        Look look = new Look();
+        look.calmingTime = Float.NaN;
+        view.setLook(look);
+        view.ripple(40, 40, 1);
+        drawFrame();
+        drawFrame();
+        assertTrue("a splash shows", difference(still, Screen.pixels) > 30);
+    }
+
+    @Test
     public void aLayoutSaysWhatTheViewShows() {
         start();
         ViewAttributes.apply(new TypedArray() {

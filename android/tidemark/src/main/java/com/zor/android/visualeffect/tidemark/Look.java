@@ -140,6 +140,23 @@ public final class Look implements Cloneable {
         return properties;
     }
 
+    /** A copy with every value brought within its limits; one that is not a number takes the lower limit. */
+    Look withinLimits() {
+        Look copy = clone();
+        copy.replaceAll(new Values() {
+            @Override
+            public int whole(String name, int value, int least, int most) {
+                return Math.max(least, Math.min(value, most));
+            }
+
+            @Override
+            public float real(String name, float value, float least, float most) {
+                return value >= least ? Math.min(value, most) : least;
+            }
+        });
+        return copy;
+    }
+
     private void replaceAll(Values values) {
         meshVertices = values.whole("meshVertices", meshVertices, 0, 256);
         meshExtent = values.whole("meshExtent", meshExtent, 1, 1000);

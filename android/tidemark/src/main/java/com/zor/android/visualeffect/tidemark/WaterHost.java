@@ -25,6 +25,9 @@ public final class WaterHost {
     // Nearer to a step than this, in steps, the heights are those of the step.
     private static final float AT_STEP = 0.0625f;
 
+    // The peak of a ripple is three times as high, and the water keeps heights of up to 100.
+    private static final float MOST_AMPLITUDE = 100.0f / 3.0f;
+
     private final JniTidemarkRender library;
     private Look look;
     private final RainChance chance;
@@ -75,9 +78,9 @@ public final class WaterHost {
      */
     public WaterHost(@NotNull JniTidemarkRender library, @NotNull Look look, int width, int height, int seed) {
         this.library = library;
-        this.look = look.clone();
+        this.look = look.withinLimits();
         chance = new RainChance(seed);
-        calmSteps = look.stepsToRest;
+        calmSteps = this.look.stepsToRest;
         resize(width, height);
     }
 
@@ -96,12 +99,12 @@ public final class WaterHost {
     }
 
     /**
-     * Takes over all values; the water and the ink stay.
+     * Takes over all values, brought within their limits; the water and the ink stay.
      *
      * @param look is copied
      */
     public void setLook(@NotNull Look look) {
-        this.look = look.clone();
+        this.look = look.withinLimits();
         fit();
     }
 
@@ -399,6 +402,7 @@ public final class WaterHost {
 
     /** Position in model units. */
     private void raiseRipple(float x, float y, float amplitude) {
+        if (Float.isNaN(amplitude) || Float.isInfinite(amplitude)) return;
         // The library counts countA cells across the extent, the lattice has one interval less; these positions hit the
         // very point. The fast axis runs down a column of the lattice.
         float extent = lattice.extent;
@@ -406,7 +410,8 @@ public final class WaterHost {
         float row = (0.5f - y / extent) * (n - 1);
         float column = (0.5f + x / extent) * (n - 1);
         library.ripple(heights, lattice.extent, lattice.extent, lattice.points, lattice.points,
-                (row / n - 0.5f) * extent, (column / n - 0.5f) * extent, amplitude);
+                (row / n - 0.5f) * extent, (column / n - 0.5f) * extent,
+                Math.max(-MOST_AMPLITUDE, Math.min(amplitude, MOST_AMPLITUDE)));
         calmSteps = 0;
         isGathered = false;
     }

@@ -1,13 +1,13 @@
 #include "host/look_file.h"
 
 #include <algorithm>
-#include <cerrno>
-#include <cstring>
-#include <fstream>
+#include <cstddef>
 #include <sstream>
 #include <type_traits>
 
 #include "host/look_fields.h"
+#include "host/quoted.h"
+#include "host/read_file.h"
 
 namespace {
 
@@ -25,16 +25,16 @@ std::string readLine(const std::string& line, Look& look) {
     const std::string value = trimmed(line.substr(sign + 1));
     const auto* const field = std::find_if(
         std::begin(kLookFields), std::end(kLookFields), [&key](const LookField& f) { return f.name == key; });
-    if (field == std::end(kLookFields)) return "there is no value \"" + key + "\"";
+    if (field == std::end(kLookFields)) return "there is no value " + quoted(key);
     const auto read = [&](auto member) {
         std::istringstream words(value);
-        if (!(words >> look.*member) || !words.eof()) return key + " takes no \"" + value + "\"";
+        if (!(words >> look.*member) || !words.eof()) return key + " takes no " + quoted(value);
         using Number = std::remove_reference_t<decltype(look.*member)>;
         const auto least = static_cast<Number>(field->least);
         const auto most = static_cast<Number>(field->most);
         if (look.*member >= least && look.*member <= most) return std::string();
         std::ostringstream limits;
-        limits << key << " must be " << least << " to " << most << ", not " << value;
+        limits << key << " must be " << least << " to " << most << ", not " << quoted(value);
         return limits.str();
     };
     return std::visit(read, field->member);
@@ -54,18 +54,13 @@ std::optional<Look> parseLook(std::istream& text, const std::string& name, std::
             return std::nullopt;
         }
     }
-    if (text.bad()) {
-        error = "cannot read the look " + name;
-        return std::nullopt;
-    }
     return look;
 }
 
 std::optional<Look> loadLook(const std::string& path, std::string& error) {
-    std::ifstream file(path);
-    if (!file) {
-        error = "cannot read the look " + path + ": " + std::strerror(errno);
-        return std::nullopt;
-    }
-    return parseLook(file, path, error);
+    constexpr std::size_t kMostBytes = 1 << 20;
+    const std::optional<std::string> content = readFile(path, "the look", kMostBytes, error);
+    if (!content) return std::nullopt;
+    std::istringstream text(*content);
+    return parseLook(text, path, error);
 }

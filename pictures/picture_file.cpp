@@ -4,18 +4,16 @@
 #include <stb/stb_image_resize.h>
 
 #include <algorithm>
-#include <cerrno>
 #include <cmath>
-#include <cstring>
-#include <fstream>
-#include <limits>
 #include <memory>
-#include <sstream>
-#include <utility>
 
-#include "pictures/jpeg_tables.h"
+#include "host/read_file.h"
+#include "pictures/jpeg_file.h"
 
 namespace {
+
+// Four channels of two bytes, which a file holds in fewer bytes, and no more than an int counts.
+constexpr std::size_t kMostBytes = 8 * std::size_t{kMostPixels};
 
 std::size_t byteCount(int width, int height) {
     return 4 * static_cast<std::size_t>(width) * static_cast<std::size_t>(height);
@@ -32,19 +30,13 @@ std::string failureReason() {
 }  // namespace
 
 std::optional<Picture> loadPicture(const std::string& path, std::string& error, int mostPixels) {
-    std::ifstream file(path, std::ios::binary);
-    if (!file) {
-        error = "cannot read the picture " + path + ": " + std::strerror(errno);
-        return std::nullopt;
-    }
-    std::ostringstream stream;
-    stream << file.rdbuf();  // a directory reads as nothing
-    const std::string content = std::move(stream).str();
-    const auto* const bytes = reinterpret_cast<const stbi_uc*>(content.data());
-    const int size = static_cast<int>(std::min<std::size_t>(content.size(), std::numeric_limits<int>::max()));
+    const std::optional<std::string> content = readFile(path, "the picture", kMostBytes, error);
+    if (!content) return std::nullopt;
+    const auto* const bytes = reinterpret_cast<const stbi_uc*>(content->data());
+    const int size = static_cast<int>(content->size());
 
-    if (!haveSoundTables({bytes, content.size()})) {
-        error = path + " is not a JPEG picture that can be read: its Huffman tables are corrupt";
+    if (const char* const harm = harmIn({bytes, content->size()})) {
+        error = path + " is not a JPEG picture that can be read: " + harm;
         return std::nullopt;
     }
     Picture picture;

@@ -1,18 +1,22 @@
 #include "preview/touch_script.h"
 
-#include <cerrno>
 #include <charconv>
 #include <cmath>
-#include <cstring>
-#include <fstream>
+#include <cstddef>
 #include <sstream>
 #include <string_view>
+
+#include "host/quoted.h"
+#include "host/read_file.h"
 
 namespace {
 
 // Longest time and farthest position that a script may name: an hour, and what an int holds with room to spare.
 constexpr std::int64_t kLongestTimeMs = 3600 * 1000;
 constexpr double kFarthest = 1.0e6;
+
+// More than an hour of a finger's moves on a display of 120 frames a second.
+constexpr std::size_t kMostBytes = 16 << 20;
 
 template <class Number>
 std::optional<Number> parseNumber(std::string_view text) {
@@ -49,21 +53,23 @@ std::optional<TouchEvent> parseLine(std::istringstream& words, std::int64_t earl
     }
     const auto timeMs = parseNumber<std::int64_t>(time);
     if (!timeMs || *timeMs < 0 || *timeMs > kLongestTimeMs) {
-        return fail("the time \"" + time + "\" is not a number of milliseconds within an hour");
+        return fail("the time " + quoted(time) + " is not a number of milliseconds within an hour");
     }
     if (*timeMs < earliestMs) {
-        return fail("the time " + time + " is before that of the event above, " + std::to_string(earliestMs));
+        return fail(
+            "the time " + std::to_string(*timeMs) + " is before that of the event above, " +
+            std::to_string(earliestMs));
     }
     const auto parsedAction = parseAction(action);
-    if (!parsedAction) return fail("the action \"" + action + "\" is none of down, move, up and cancel");
+    if (!parsedAction) return fail("the action " + quoted(action) + " is none of down, move, up and cancel");
     const auto parsedX = parseCoordinate(x);
     const auto parsedY = parseCoordinate(y);
     if (!parsedX || !parsedY) {
-        return fail("the position \"" + (parsedX ? y : x) + "\" is neither pixels nor a percentage");
+        return fail("the position " + quoted(parsedX ? y : x) + " is neither pixels nor a percentage");
     }
     const auto parsedPressure = parseNumber<float>(pressure);
     if (!parsedPressure || !(*parsedPressure >= 0.0f && *parsedPressure <= 10.0f)) {
-        return fail("the pressure \"" + pressure + "\" is not between 0 and 10");
+        return fail("the pressure " + quoted(pressure) + " is not between 0 and 10");
     }
     return TouchEvent{*timeMs, *parsedAction, *parsedX, *parsedY, *parsedPressure};
 }
@@ -89,20 +95,14 @@ std::optional<std::vector<TouchEvent>> parseTouchScript(
         }
         events.push_back(*event);
     }
-    if (text.bad()) {
-        error = "cannot read the touch script " + name;
-        return std::nullopt;
-    }
     return events;
 }
 
 std::optional<std::vector<TouchEvent>> loadTouchScript(const std::string& path, std::string& error) {
-    std::ifstream file(path);
-    if (!file) {
-        error = "cannot read the touch script " + path + ": " + std::strerror(errno);
-        return std::nullopt;
-    }
-    return parseTouchScript(file, path, error);
+    const std::optional<std::string> content = readFile(path, "the touch script", kMostBytes, error);
+    if (!content) return std::nullopt;
+    std::istringstream text(*content);
+    return parseTouchScript(text, path, error);
 }
 
 void TouchPlayer::deliverBefore(double timeMs, WaterHost& host) {

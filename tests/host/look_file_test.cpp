@@ -19,12 +19,16 @@ TEST(LookFile, ChangesWhatItNamesAndNothingElse) {
 }
 
 TEST(LookFile, NamesTheLineThatIsWrong) {
+    const std::string longName = std::string(100, 'a') + " = 1";
+    const std::string beginning = '"' + std::string(60, 'a') + "...\"";
     for (const auto& [line, reason] :
          {std::pair{"damping 0.9", "key = number"},
           {"dampening = 0.9", "dampening"},
           {"damping =", "damping"},
           {"damping = 0.9f", "0.9f"},
           {"damping = nan", "nan"},
+          {"damping = \x1b[7m\xff", R"(takes no "\x1b[7m\xff")"},
+          {longName.c_str(), beginning.c_str()},
           {"damping = 0.9 0.9", "damping"},
           {"damping = 1.001", "0 to 1"},
           {"damping = -0.001", "0 to 1"},

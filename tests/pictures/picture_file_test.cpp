@@ -8,6 +8,8 @@
 #include <filesystem>
 #include <fstream>
 
+#include "host/read_file.h"
+
 using namespace std::string_literals;
 
 // A file without a name of its own, which nobody else can have.
@@ -52,6 +54,20 @@ TEST(PictureFile, RefusesWhatWouldHarmTheProcess) {
     EXPECT_NE(reasonAgainst("\xff\xd8\xff\xe0\0\4ab"s + table).find("Huffman"), std::string::npos);
     EXPECT_NE(reasonAgainst("\xff\xd8\xff\xda\0\4abscan"s + table).find("Huffman"), std::string::npos);
     EXPECT_EQ(reasonAgainst("\xff\xd8\xff\xfe\1\x20"s + table + "........").find("Huffman"), std::string::npos);
+}
+
+TEST(PictureFile, RefusesMoreScansThanAPictureNeeds) {
+    const std::vector<unsigned char> grey(8 * 8, 100);
+    ASSERT_TRUE(stbi_write_jpg(kPath.c_str(), 8, 8, 1, grey.data(), 95));
+    std::string error;
+    const std::string jpeg = readFile(kPath, "", 10000, error).value_or("");
+    const std::size_t start = jpeg.find("\xff\xda");
+    const std::string scan = jpeg.substr(start, jpeg.size() - 2 - start);
+    std::string content = jpeg.substr(0, start);
+    for (int i = 0; i < 100; ++i) content += scan;
+    std::ofstream(kPath, std::ios::binary) << content + "\xff\xd9";
+    EXPECT_TRUE(loadPicture(kPath, error)) << error;
+    EXPECT_NE(reasonAgainst(content + scan + "\xff\xd9").find("too many scans"), std::string::npos);
 }
 
 TEST(PictureFile, NamesInOneLineEachFileThatOnceDidHarm) {

@@ -2,6 +2,7 @@
 #include "tests/preview/program.h"
 
 #include <stb/stb_image_write.h>
+#include <sys/stat.h>
 
 #include <algorithm>
 #include <fstream>
@@ -16,6 +17,7 @@ static Picture load(const std::string& path) {
 }
 
 TEST_F(Program, StillWaterShowsThePictureOfItsOrientation) {
+    std::ofstream("../still.touch");
     for (const auto& [option, width, height] :
          {std::tuple{"--size 40x60 --portrait", 40, 60}, {"--size 60x40 --landscape", 60, 40}}) {
         Picture photo{width, height, {}};
@@ -24,7 +26,7 @@ TEST_F(Program, StillWaterShowsThePictureOfItsOrientation) {
                 photo.rgba.end(), {std::uint8_t(4 * (i % width)), std::uint8_t(4 * (i / width)), 40, 255});
         }
         ASSERT_TRUE(stbi_write_png("../photo.png", width, height, 4, photo.rgba.data(), 0));
-        EXPECT_EQ(preview(option + std::string(" ../photo.png --script /dev/null --seconds 0.05 --out o")), "0\n");
+        EXPECT_EQ(preview(option + std::string(" ../photo.png --script ../still.touch --seconds 0.05 --out o")), "0\n");
         const Picture frame = load("o/frame-0002.png");
         ASSERT_EQ(std::pair(frame.width, frame.height), std::pair(width, height));
         for (std::size_t i = 0; i < frame.rgba.size(); ++i) ASSERT_NEAR(frame.rgba[i], photo.rgba[i], 6) << i;
@@ -96,6 +98,9 @@ TEST_F(Program, RefusesBadInputInOneLineAndLeavesNothing) {
     std::ofstream("../junk.png") << "not a picture";
     std::ofstream("../bad.touch") << "0 down 1 1 1\n\n5 tap 1 1 1\n";
     std::ofstream("../bad.look") << "damping = 0.9\ndamping = 2\n";
+    std::ofstream("../large");
+    fs::resize_file("../large", (16 << 20) + 1);
+    ASSERT_EQ(mkfifo("../pipe", 0600), 0);
     fs::create_directory("../bin");
     std::ofstream("../bin/ffmpeg")
         << "#!/bin/sh\ncase $* in *late*) /bin/cat >/dev/null; esac\necho out of luck >&2\nexit 3\n";
@@ -107,7 +112,10 @@ TEST_F(Program, RefusesBadInputInOneLineAndLeavesNothing) {
         {"--landscape ../junk.png", "junk.png is not a PNG or JPEG"},
         {"--script ../bad.touch", "bad.touch:3: "},
         {"--script none.touch", "none.touch: No such file"},
-        {"--script /", "cannot read the touch script /"},
+        {"--script /", "the touch script /: it is not a regular file"},
+        {"--look /dev/zero", "the look /dev/zero: it is not a regular file"},
+        {"--light ../pipe", "the picture ../pipe: it is not a regular file"},
+        {"--script ../large", "the touch script ../large: it has more than 16777216 bytes"},
         {"--look ../bad.look", "bad.look:2: "},
         {"--look no.look", "no.look: No such file"},
         {"--out /proc/frames", "/proc/frames"},

@@ -26,7 +26,7 @@ TEST(TouchScript, NamesTheLineThatIsWrong) {
     for (const auto& [line, reason] :
          {std::pair{"100 down 1 1", "expected"},
           {"100 down 1 1 1 1", "expected"},
-          {"100 Down 1 1 1", "action"},
+          {"100 \x1b[7m 1 1 1", R"(action "\x1b[7m")"},
           {"-1 down 1 1 1", "time"},
           {"3600001 down 1 1 1", "time"},
           {"99 down 1 1 1", "before"},

@@ -1,4 +1,4 @@
-#include "pictures/jpeg_tables.h"
+#include "pictures/jpeg_file.h"
 
 #include <cstddef>
 #include <numeric>
@@ -13,6 +13,9 @@ constexpr std::uint8_t kStartOfScan = 0xda;
 
 constexpr std::size_t kCounts = 16;  // of codes, one for each length in bits
 constexpr int kMostCodes = 256;
+
+// Encoders write about ten, with each bit of each channel in a scan of its own less than fifty.
+constexpr int kMostScans = 100;
 
 // One or more tables: a byte of class and number, the counts, and a byte for each code.
 bool haveSoundCounts(Bytes tables) {
@@ -39,20 +42,23 @@ std::uint8_t nextMarker(Bytes& rest) {
 
 }  // namespace
 
-bool haveSoundTables(Bytes jpeg) {
+const char* harmIn(Bytes jpeg) {
     Bytes rest = jpeg;
-    if (rest.empty() || rest[0] != 0xff || nextMarker(rest) != kStartOfImage) return true;
-    bool scanning = false;
+    if (rest.empty() || rest[0] != 0xff || nextMarker(rest) != kStartOfImage) return nullptr;
+    int scans = 0;
     while (rest.size() > 2) {
         const std::uint8_t marker = nextMarker(rest);
         if (rest.size() < 2) break;
+        if (marker == kStartOfScan && ++scans > kMostScans) return "it has too many scans";
         // Where a scan ends is for its decoder to tell, so from there on every marker counts and nothing is skipped.
-        scanning = scanning || marker == kStartOfScan;
-        if (scanning && marker != kHuffmanTables) continue;
+        if (scans > 0 && marker != kHuffmanTables) continue;
         const std::size_t length = static_cast<std::size_t>(rest[0] << 8 | rest[1]);
-        if (length < 2 || length > rest.size()) return marker != kHuffmanTables;
-        if (marker == kHuffmanTables && !haveSoundCounts(rest.subspan(2, length - 2))) return false;
-        if (!scanning) rest = rest.subspan(length);
+        const bool isWhole = length >= 2 && length <= rest.size();
+        if (marker == kHuffmanTables && !(isWhole && haveSoundCounts(rest.subspan(2, length - 2)))) {
+            return "its Huffman tables are corrupt";
+        }
+        if (!isWhole) break;
+        if (scans == 0) rest = rest.subspan(length);
     }
-    return true;
+    return nullptr;
 }

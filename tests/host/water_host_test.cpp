@@ -91,6 +91,18 @@ TEST_F(Host, ringsAreRoundOnTheScreen) {
     EXPECT_NEAR((bottom + top) / 2, kLong / 2, 2);
 }
 
+TEST_F(Host, ringsRunAtTheirSpeed) {
+    for (const float speed : {0.1f, 0.2713f, 1.0f, 2.0f}) {
+        WaterHost host = start(kShort, kLong, false, {.ringSpeed = speed, .calmingTime = 100.0f});
+        host.splash(kShort / 2, kLong / 2, 1.0f);
+        for (int i = 0; i < 240; ++i) host.advance(0.4 / speed / 240);
+        const int n = host.lattice().points;
+        const auto column = host.heights().begin() + n / 2 * n + n / 2;
+        const auto crest = std::max_element(column, column + n / 2) - column;
+        EXPECT_NEAR(static_cast<double>(crest) * Look{}.pictureZoom / (n - 1), 0.4, 0.02) << speed << " view heights";
+    }
+}
+
 TEST_F(Host, theFrameRateDoesNotChangeTheWater) {
     const auto after = [this](double frame, int frames) {
         WaterHost host = start(kShort, kLong);

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <limits>
+#include <numeric>
 
 #include "tests/support/gesture_state.h"
 #include "tests/support/gl_test.h"
@@ -164,6 +165,25 @@ TEST_F(Host, inkBloomsInItsColorFadesAndIsClearedAtOnce) {
     host.draw();
     host.draw();
     EXPECT_EQ(readPixels(width, height), clear) << "a switch ends the stroke that it interrupts";
+}
+
+TEST_F(Host, aMoveFollowsAFingerAndRaisesAShortTrailAtMost) {
+    WaterHost host = start(kShort, kLong, true, {.longestTrail = 3.0f, .trailShare = 0.5f});
+    const auto raised = [&host] { return std::accumulate(host.heights().begin(), host.heights().end(), 0.0); };
+    host.draw();
+    const auto clear = readPixels(kShort, kLong);
+    for (int i = 0; i < 5; ++i) host.touch(TouchAction::move, 20, 20 + 10 * i, 1.0f);
+    EXPECT_EQ(raised(), 0.0) << "no finger is down";
+    for (int i = 0; i < 400 && !host.isResting(); ++i) {
+        if (host.advance(1.0 / 60)) host.draw();
+    }
+    EXPECT_TRUE(host.isResting());
+    EXPECT_EQ(readPixels(kShort, kLong), clear);
+
+    host.touch(TouchAction::down, 20, 20, 1.0f);
+    const double one = raised();
+    host.touch(TouchAction::move, 20, 70, 1.0f);
+    EXPECT_NEAR(raised(), (1 + 3 * 0.5) * one, 0.1 * one);
 }
 
 TEST_F(Host, numbersBeyondAllMeasureLeaveTheWaterAlive) {

@@ -39,9 +39,8 @@ void requireBuffer(GLuint buffer, const void* offset) {
     if (!buffer && !offset) std::abort();
 }
 
-// Compiled and linked, with nothing to say about it.
 GLint answer(GLenum query) {
-    return query == GL_INFO_LOG_LENGTH ? 0 : GL_TRUE;
+    return query == GL_INFO_LOG_LENGTH ? GlCompiler::logLength : GlCompiler::succeeds;
 }
 
 }  // namespace

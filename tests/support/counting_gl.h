@@ -11,5 +11,11 @@ struct GlUse {
     std::size_t bytes = 0;  // handed over by glBufferData and glTexImage2D
 };
 
+// Of shaders and programs. It never writes anything into a log.
+struct GlCompiler {
+    static inline bool succeeds = true;
+    static inline int logLength = 0;
+};
+
 // What was used since the last call.
 GlUse takeGlUse();

@@ -1,6 +1,7 @@
 #include "tests/support/library_blocks.h"
 
 #include <cstddef>
+#include <cstring>
 
 // The names are the linker's.
 extern "C" {
@@ -19,8 +20,9 @@ static bool fails() {
 
 void* __wrap_malloc(std::size_t size) {
     void* const block = fails() ? nullptr : __real_malloc(size);
-    if (block) ++LibraryBlocks::live;
-    return block;
+    if (!block) return nullptr;
+    ++LibraryBlocks::live;
+    return std::memset(block, '?', size);  // what nobody has written yet shows
 }
 
 void* __wrap_realloc(void* block, std::size_t size) {

@@ -49,6 +49,18 @@ TEST(PictureFile, RefusesWhatWouldHarmTheProcess) {
     const std::string reason = reasonAgainst(png + "\0\0\0\1\0\0\0\1\x08\6\0\0\0crc?\0\0\0\0\x1b[7mcrc?"s);
     EXPECT_EQ(reason.find('\x1b'), std::string::npos) << "bytes of the file that a terminal would obey";
 
+    // A pixel in a block of fixed codes: 24 bits of them, then 13 bytes for each 8 runs of 258 zeros, to over a
+    // gibibyte.
+    std::string zeros = "\x78\1\x63\x18\5"s;
+    for (int i = 0; i < 525'000; ++i) zeros += "\xa3\x60\x14\x8c\x82\x51\x30\x0a\x46\xc1\x28\x18\5";
+    zeros += "\0\0"s;
+    std::string length(4, '\0');
+    for (std::size_t i = 0; i < 4; ++i) length[i] = static_cast<char>(zeros.size() >> (24 - 8 * i));
+    EXPECT_NE(
+        reasonAgainst(png + "\0\0\0\1\0\0\0\1\x08\0\0\0\0crc?"s + length + "IDAT" + zeros + "crc?\0\0\0\0IENDcrc?"s)
+            .find("outofmem"),
+        std::string::npos);
+
     // Tables of one code too many, where the file's parts are still told apart, after that, and in a comment.
     const std::string table = "\xff\xc4\1\x14\0\0\0\0\0\0\0\0\1\xff\1\0\0\0\0\0\0"s + std::string(257, 'c');
     EXPECT_NE(reasonAgainst("\xff\xd8\xff\xe0\0\4ab"s + table).find("Huffman"), std::string::npos);

@@ -3,7 +3,7 @@ import { execFileSync } from 'node:child_process';
 import { cpSync, existsSync, readFileSync } from 'node:fs';
 import { join } from 'node:path';
 import { PNG } from 'pngjs';
-import { expect, slope, test } from './page.mjs';
+import { expect, screenshotPath, slope, test } from './page.mjs';
 
 const dist = new URL('../package/dist/', import.meta.url).pathname;
 const script = '<script type="module" src="tidemark-water.js"></script>';
@@ -201,6 +201,6 @@ test('the packed package works in a fresh project, with and without a bundler', 
         await show(page, '', { folder: outputDir, at: `http://pond.test/${name}.html` });
         const inside = name === 'iframe' ? page.frameLocator('iframe') : page;
         await inside.locator(name === 'esbuild' ? 'canvas[width="952"]' : 'tidemark-water[shown]').first().waitFor();
-        await page.screenshot({ animations: 'disabled', path: `../build/web/screens/${name.replace('/', '-')}.png` });
+        await page.screenshot({ animations: 'disabled', path: screenshotPath(name.replace('/', '-')) });
     }
 });

@@ -5,6 +5,7 @@ import { expect, test } from '@playwright/test';
 import { PNG } from 'pngjs';
 import puppeteer from 'puppeteer-core';
 import { Builder, By } from 'selenium-webdriver';
+import { screenshotPath } from './page.mjs';
 
 // Software graphics work in neither engine's sandbox.
 const env = { ...process.env, LIBGL_ALWAYS_SOFTWARE: '1', WEBKIT_DISABLE_SANDBOX_THIS_IS_DANGEROUS: '1' };
@@ -71,7 +72,7 @@ for (const [name, start] of Object.entries({ firefox, webkit })) {
                 await engine.show(baseURL);
                 await expect.poll(() => run(() => document.querySelector('#water[shown]') !== null)).toBe(true);
                 await new Promise((resolve) => setTimeout(resolve, 1500));
-                writeFileSync(`../build/web/screens/${name}-${size}.png`, await look());
+                writeFileSync(screenshotPath(`${name}-${size}`), await look());
             }
             const photo = info.outputPath('photo.svg');
             writeFileSync(photo, '<svg xmlns="http://www.w3.org/2000/svg" viewBox="0 0 9 9"><path fill="#ffc080" d="M0 0h9v9H0z"/></svg>');

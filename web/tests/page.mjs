@@ -1,8 +1,17 @@
 // A page with water, and its water frame by frame: without the page's loop and its clock.
+import { mkdirSync } from 'node:fs';
+import { join } from 'node:path';
 import { test as plain, expect } from '@playwright/test';
 import { PNG } from 'pngjs';
 
 export { expect };
+
+// Where the tests leave a screenshot for people to look at.
+export function screenshotPath(name) {
+    const folder = new URL('../../build/web/screens', import.meta.url).pathname;
+    mkdirSync(folder, { recursive: true });
+    return join(folder, `${name}.png`);
+}
 
 // Fails where the page complains.
 export const test = plain.extend({

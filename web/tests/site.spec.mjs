@@ -1,7 +1,6 @@
 // The page as a site: screens, a missing network, and browsers that cannot show it.
-import { difference, expect, flatPixels, open, takeOver, test } from './page.mjs';
+import { difference, expect, flatPixels, open, screenshotPath, takeOver, test } from './page.mjs';
 
-// To look at, in build/web/screens.
 const screens = {
     desktop: { viewport: { width: 1440, height: 900 } },
     phone: { viewport: { width: 390, height: 844 }, deviceScaleFactor: 3, isMobile: true, hasTouch: true },
@@ -14,7 +13,7 @@ for (const [name, screen] of Object.entries(screens)) {
             await open(page);
             const canvas = page.getByRole('button', { name: /Water/ });
             await expect(canvas).toHaveCSS('opacity', '1');
-            await page.screenshot({ path: `../build/web/screens/${name}.png` });
+            await page.screenshot({ path: screenshotPath(name) });
             const { width, height } = screen.viewport;
             const density = Math.min(screen.deviceScaleFactor ?? 1, 2);
             expect(await canvas.evaluate(({ width, height }) => [width, height])).toEqual([width * density, height * density]);

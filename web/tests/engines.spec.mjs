@@ -1,10 +1,10 @@
 // The playground in engines that Playwright does not drive as Debian ships them, on a screen of their own.
-import { spawn } from 'node:child_process';
 import { writeFileSync } from 'node:fs';
 import { expect, test } from '@playwright/test';
 import { PNG } from 'pngjs';
 import puppeteer from 'puppeteer-core';
 import { Builder, By } from 'selenium-webdriver';
+import { DriverService } from 'selenium-webdriver/remote/index.js';
 import { screenshotPath } from './page.mjs';
 
 // Software graphics work in neither engine's sandbox.
@@ -16,9 +16,11 @@ const watch = () => {
     onunhandledrejection = ({ reason }) => window.problems.push(String(reason));
 };
 
-async function firefox() {
+// Each adds to `started` what has to be closed.
+async function firefox(started) {
     const extraPrefsFirefox = { 'webgl.force-enabled': true, 'webgl.disable-fail-if-major-performance-caveat': true, 'security.sandbox.content.level': 0 };
     const browser = await puppeteer.launch({ browser: 'firefox', executablePath: '/usr/bin/firefox-esr', headless: false, env, extraPrefsFirefox });
+    started.push(() => browser.close());
     const [page] = await browser.pages();
     await page.evaluateOnNewDocument(watch);
     return {
@@ -33,17 +35,16 @@ async function firefox() {
         },
         pick: async (file) => (await page.$('#files')).uploadFile(file),
         look: async () => Buffer.from(await page.screenshot()),
-        close: () => browser.close(),
     };
 }
 
-async function webkit() {
-    const server = spawn('WebKitWebDriver', ['--port=4812', '--replace-on-new-session'], { env });
+async function webkit(started) {
+    const service = new DriverService.Builder('/usr/bin/WebKitWebDriver').setEnvironment(env).setLoopback(true).build();
+    started.push(() => service.kill());
     const options = { binary: '/usr/lib/x86_64-linux-gnu/webkit2gtk-4.1/MiniBrowser', args: ['--automation', '--enable-webgl=true'] };
     const capabilities = { browserName: 'MiniBrowser', 'webkitgtk:browserOptions': options };
-    const connect = () => new Builder().usingServer('http://127.0.0.1:4812').withCapabilities(capabilities).build();
-    let driver;
-    await expect(async () => { driver = await connect(); }).toPass();
+    const driver = await new Builder().usingServer(await service.start()).withCapabilities(capabilities).build();
+    started.push(() => driver.quit());
     return {
         resize: (width, height) => driver.manage().window().setRect({ x: 0, y: 0, width, height }),
         show: async (url) => (await driver.get(url), driver.executeScript(watch)),  // no earlier in this driver
@@ -51,14 +52,14 @@ async function webkit() {
         drag: (y, from, to) => driver.actions().move({ x: from, y }).press().move({ x: to, y }).release().perform(),
         pick: async (file) => (await driver.findElement(By.id('files'))).sendKeys(file),
         look: async () => Buffer.from(await driver.takeScreenshot(), 'base64'),
-        close: () => driver.quit().finally(() => server.kill()),
     };
 }
 
 for (const [name, start] of Object.entries({ firefox, webkit })) {
     test(`the playground in ${name}`, async ({ baseURL }, info) => {
-        const engine = await start();
+        const started = [];
         try {
+            const engine = await start(started);
             const { run, look } = engine;
             const message = () => run(() => document.querySelector('#message').textContent);
             const calm = () => run(() => window.tidemark.water.water.calm);
@@ -78,7 +79,7 @@ for (const [name, start] of Object.entries({ firefox, webkit })) {
             writeFileSync(photo, '<svg xmlns="http://www.w3.org/2000/svg" viewBox="0 0 9 9"><path fill="#ffc080" d="M0 0h9v9H0z"/></svg>');
             await engine.pick(photo);
             await expect.poll(calm).toBe(true);
-            expect(await red()).toBeGreaterThan(240);
+            await expect.poll(red).toBeGreaterThan(240);
             await engine.drag(500, 200, 200);
             await expect.poll(calm).toBe(false);
             // The ink fades within a second, which is a few frames here.
@@ -102,7 +103,7 @@ for (const [name, start] of Object.entries({ firefox, webkit })) {
             await expect.poll(red).toBeGreaterThan(240);
             expect(await run(() => window.problems)).toEqual([]);
         } finally {
-            await engine.close();
+            for (const close of started.reverse()) await close().catch(console.error);
         }
     });
 }

@@ -1,8 +1,6 @@
 // The built page in the system's Chromium. It lies in a folder, so that a path that is not relative shows.
 import { defineConfig } from '@playwright/test';
 
-const port = 4811;
-
 export default defineConfig({
     testDir: '.',
     outputDir: '../../build/web/test-results',
@@ -11,7 +9,7 @@ export default defineConfig({
     timeout: 90_000,
     expect: { timeout: 20_000 },
     use: {
-        baseURL: `http://localhost:${port}/some/where/`,
+        baseURL: `http://localhost:${process.env.SITE_PORT}/some/where/`,
         viewport: { width: 200, height: 300 },
         actionTimeout: 20_000,
         launchOptions: {
@@ -21,8 +19,8 @@ export default defineConfig({
         },
     },
     webServer: {
-        command: `npx vite preview --host localhost --port ${port} --strictPort --base /some/where/`,
+        command: 'npx vite preview --host localhost --port 0 --base /some/where/',  // any free port
         cwd: new URL('..', import.meta.url).pathname,
-        url: `http://localhost:${port}/some/where/`,
+        wait: { stdout: /localhost:(\x1b\[1m)?(?<SITE_PORT>\d+)/ },  // in bold
     },
 });

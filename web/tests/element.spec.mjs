@@ -24,6 +24,7 @@ async function show(page, html, { headers = {}, files = {}, folder = dist, at = 
 const element = (page) => page.locator('tidemark-water');
 
 test('200 waters come and go, and leave nothing', async ({ page }) => {
+    test.slow();
     await page.addInitScript(() => {
         window.memories = [];
         const { instantiate } = WebAssembly;
@@ -155,9 +156,12 @@ test('canvases of the page show a canvas and a video that move, and give picture
         await foreign.decode();
         for (const context of [source, gleam]) context.drawImage(foreign, 0, 0);
         await video.play();
-        await new Promise((resolve) => setTimeout(resolve, 300));
+        const frames = async (until) => { while (!until()) await new Promise(requestAnimationFrame); };
+        await frames(() => codes.length > 0);
         waters[1].drop(50, 50);
-        await new Promise((resolve) => setTimeout(resolve, 300));
+        await frames(() => codes.length > 1);
+        let more = 20;  // each is told once
+        await frames(() => more-- === 0);
         return [reds, codes];
     });
     expect(reds).toEqual([true, true, false, false]);
@@ -187,6 +191,7 @@ test('a high element shows the portrait, and off screen a still picture until it
 });
 
 test('the packed package works in a fresh project, with and without a bundler', async ({ page }, { outputDir }) => {
+    test.slow();
     const web = new URL('..', import.meta.url).pathname;
     cpSync(join(web, 'dist'), join(outputDir, 'playground'), { recursive: true });
     execFileSync('bash', ['-euc', `npm pack --silent ${web}package

@@ -57,6 +57,7 @@ async function webkit(started) {
 
 for (const [name, start] of Object.entries({ firefox, webkit })) {
     test(`the playground in ${name}`, async ({ baseURL }, info) => {
+        test.slow();
         const started = [];
         try {
             const engine = await start(started);

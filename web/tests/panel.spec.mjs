@@ -26,6 +26,7 @@ const touchAndRun = () => {
 };
 
 test('every value reaches the water under its own name', async ({ page }) => {
+    test.slow();
     await page.emulateMedia({ reducedMotion: 'reduce' });  // no drop falls by itself
     const pixelsWith = async (value) => {
         await page.goto('about:blank');
@@ -65,6 +66,7 @@ test('a link brings the same look, and a bad one the nearest', async ({ page }) 
 });
 
 test('the copied code compiles in both languages and holds the values', async ({ page, context }, { outputDir }) => {
+    test.slow();
     await context.grantPermissions(['clipboard-read', 'clipboard-write']);
     await openPanel(page, '#calmingTime=9.51&meshExtent=33&exponent=77&inkRed=0.125&rain=9');
     const copied = async (language) => {

@@ -13,6 +13,7 @@ const [width, height] = [135, 240];
 test.use({ viewport: { width, height }, contextOptions: { reducedMotion: 'reduce' } });  // no drop falls by itself
 
 test('frames of a script equal those of tidemark-preview', async ({ page }, { outputDir }) => {
+    test.slow();
     const script = join(root, 'scenes/curl.touch');
     mkdirSync(outputDir, { recursive: true });
     // The driver that filters textures exactly, as the browser's does; the faster one has weights of 8 bits, which the

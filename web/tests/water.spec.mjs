@@ -14,6 +14,7 @@ function expectMiddleOf(pixels, view, [width, height]) {
 }
 
 test('shows the photo, and each of two in its turn; a file that is none leaves it', async ({ page }) => {
+    test.slow();
     await open(page);
     await takeOver(page);
     const size = () => page.evaluate(() => window.tidemark.water.water.picture.size());
@@ -79,6 +80,7 @@ test('pointers become touches: one draws, as often as the library expects, and t
 });
 
 test('keys and buttons switch the ink, and clear it', async ({ page }) => {
+    test.slow();
     await open(page);
     await takeOver(page);
     const flat = await flatPixels(page);

@@ -23,7 +23,7 @@ const sentences: Partial<Record<ErrorCode, string>> = {
     simd: 'This page needs WebAssembly with SIMD, which this browser does not have.',
     module: 'The water did not load. Please try again.',
     decode: 'That file is not a picture that this browser can show.',
-    'cross-origin': 'The server of that picture does not allow other pages to use it.',
+    'cross-origin': 'That picture does not load, or its server does not allow other pages to use it.',
     load: 'That picture does not load.',
 };
 

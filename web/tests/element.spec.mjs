@@ -79,6 +79,8 @@ for (const [code, body, options, lack] of [
 ]) {
     test(`what does not work has the code ${code}, and the fallback stays`, async ({ page, problems }) => {
         if (lack) await page.addInitScript(lack);
+        const asked = [];
+        page.on('request', (request) => request.url().endsWith('pond.png') && asked.push(request));
         await page.addInitScript(() => {
             window.codes = [];
             addEventListener('error', ({ detail }) => detail && window.codes.push(detail.code), true);
@@ -86,6 +88,7 @@ for (const [code, body, options, lack] of [
         await show(page, `${body}<p slot="fallback">A pond</p></tidemark-water>${script}`, options);
         await expect.poll(() => page.evaluate(() => window.codes)).toEqual([code]);
         await expect(page.getByText('A pond')).toBeVisible();
+        expect(asked.length).toBeLessThan(2);
         problems.length = 0;  // the browser's own words on it
     });
 }

@@ -1,5 +1,7 @@
 // Keeps the whole site, so that it opens without a network. The build fills in the version and the files.
-const cacheName = 'tidemark ' + 'VERSION';
+// An origin's caches belong to all of its pages, among which may be another playground.
+const ours = `tidemark ${self.registration.scope} `;
+const cacheName = ours + 'VERSION';
 const files = ['FILES'];
 
 async function keepAll() {
@@ -9,7 +11,7 @@ async function keepAll() {
 }
 
 async function dropOlder() {
-    const names = (await caches.keys()).filter((name) => name.startsWith('tidemark ') && name !== cacheName);
+    const names = (await caches.keys()).filter((name) => name.startsWith(ours) && name !== cacheName);
     await Promise.all(names.map((name) => caches.delete(name)));
     await self.clients.claim();
 }

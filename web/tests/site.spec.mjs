@@ -26,13 +26,20 @@ for (const [name, screen] of Object.entries(screens)) {
     });
 }
 
-test('opens without a network once it has been loaded, and no two pictures look alike', async ({ page, context }) => {
+test('opens without a network once it has been loaded, and no two pictures look alike', async ({ page, context, baseURL }) => {
+    const [older, neighbour] = [`tidemark ${baseURL} 1`, `tidemark ${baseURL}else/ 1`];
+    await page.addInitScript((names) => {
+        if (navigator.serviceWorker?.controller === null) for (const name of names) caches.open(name);
+    }, [older, neighbour]);
     await open(page);
     await page.evaluate(async () => {
         const { serviceWorker } = navigator;
         await serviceWorker.ready;
         if (!serviceWorker.controller) await new Promise((resolve) => { serviceWorker.oncontrollerchange = resolve; });
     });
+    const kept = await page.evaluate(() => caches.keys());
+    expect(kept).toContain(neighbour);
+    expect(kept).not.toContain(older);
     await context.setOffline(true);
     const seen = [];
     for (const picture of ['river', 'pool', 'shore']) {

@@ -31,22 +31,25 @@ function completeSite() {
 // What the scripts will ask for, asked for with the page, and the painter already started: round trips less until the
 // first picture.
 function hurry() {
-    const start = (file) => `if (!location.search.includes('src=')) {
-        painter = new Worker('./${file}', { type: 'module' });
-        painter.onerror = () => { painter = null; };
-    }`;
-    const hint = (file) => (file.includes('painter')
-        ? { rel: 'prefetch', href: `./${file}` }  // by the worker
-        : { rel: 'preload', as: 'fetch', crossorigin: true, href: `./${file}` });
+    const tags = [
+        [/\/early_painter-/, (src) => ({ tag: 'script', attrs: { src } })],
+        [/\/painter-|painter.*\.wasm$/, (href) => ({ tag: 'link', attrs: { rel: 'prefetch', href } })],  // for the worker
+        [/\.wasm$/, (href) => ({ tag: 'link', attrs: { rel: 'preload', as: 'fetch', crossorigin: true, href } })],
+    ];
     return {
         name: 'hurry',
         apply: 'build',
+        generateBundle(_, bundle) {
+            const painter = Object.keys(bundle).find((file) => file.includes('/painter-'));
+            const source = readFileSync(new URL('src/early_painter.js', import.meta.url), 'utf8').replace('PAINTER', `./${painter}`);
+            this.emitFile({ type: 'asset', name: 'early_painter.js', source });
+        },
         transformIndexHtml: {
             order: 'post',
-            handler: (html, { bundle }) => Object.keys(bundle).filter((file) => /\.wasm$|\/painter-/.test(file)).map((file) => ({
-                injectTo: 'head',
-                ...(file.endsWith('.wasm') ? { tag: 'link', attrs: hint(file) } : { tag: 'script', children: start(file) }),
-            })),
+            handler: (html, { bundle }) => Object.keys(bundle).flatMap((file) => {
+                const tag = tags.find(([pattern]) => pattern.test(file))?.[1](`./${file}`);
+                return tag ? [{ ...tag, injectTo: 'head-prepend' }] : [];
+            }),
         },
     };
 }
@@ -55,5 +58,7 @@ export default defineConfig({
     base: './',  // any folder of any server
     worker: { format: 'es' },
     server: { fs: { allow: ['..'] } },  // host/look.properties and build/web
+    // So strict that a page with scripts of its own in the HTML, or styles, would not work.
+    preview: { headers: { 'content-security-policy': "default-src 'self'; script-src 'self' 'wasm-unsafe-eval'; img-src * blob: data:" } },
     plugins: [hurry(), completeSite()],
 });

@@ -1,4 +1,5 @@
-// The built page in the system's Chromium. It lies in a folder, so that a path that is not relative shows.
+// The built page in the system's Chromium, below a folder, where a path that is not relative does not load, and under
+// the strict content security policy of vite.config.js, whose violations the browser reports as errors of the page.
 import { defineConfig } from '@playwright/test';
 
 export default defineConfig({

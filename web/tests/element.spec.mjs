@@ -93,6 +93,46 @@ for (const [code, body, options, lack] of [
     });
 }
 
+test('a module that did not load is tried again with the next water', async ({ page, problems }) => {
+    await show(page, script);
+    await page.route('**/*.wasm', (route) => route.abort());
+    const code = () => page.evaluate(() => {
+        const water = document.createElement('tidemark-water');
+        document.body.append(water);
+        return new Promise((resolve) => {
+            water.addEventListener('error', ({ detail }) => resolve(detail.code));
+            water.addEventListener('ready', () => resolve(null));
+        });
+    });
+    expect(await code()).toBe('module');
+    await page.unroute('**/*.wasm');
+    expect(await code()).toBe(null);
+    problems.length = 0;
+});
+
+test('of two pictures given the later stays, through other attributes and another place', async ({ page }) => {
+    await show(page, `${script}<tidemark-water src="pond.png"></tidemark-water><p></p>`);
+    await element(page).and(page.locator('[shown]')).waitFor();
+    expect(await element(page).evaluate(async (water) => {
+        const drawing = (side) => createImageBitmap(new ImageData(side, side));
+        let load;
+        const late = Object.assign(new Image(), { src: 'pond.png', decode: () => new Promise((resolve) => (load = resolve)) });
+        const earlier = water.setPicture(late);
+        await water.setPicture(await drawing(30));
+        load();
+        await earlier;
+        const sizes = [water.water.picture.size()];
+        water.rain = 3;
+        await new Promise(requestAnimationFrame);
+        sizes.push(water.water.picture.size());
+        const { water: same } = water;
+        document.querySelector('p').append(water);
+        await new Promise(requestAnimationFrame);
+        sizes.push(water.water === same && same.picture.size());
+        return sizes;
+    })).toEqual(Array(3).fill([30, 30]));
+});
+
 test('what fails is told once, and a paused water shows another picture at another size', async ({ page }) => {
     await show(page, `${script}<tidemark-water light="words.png"><img slot="fallback" src="pond.png" alt=""></tidemark-water>`);
     await expect(element(page).locator('canvas').last()).toHaveCSS('opacity', '1');

@@ -73,6 +73,10 @@ test('the copied code compiles in both languages and holds the values', async ({
         await page.getByTitle(`Copy as ${language}`, { exact: true }).click();
         return page.evaluate(() => navigator.clipboard.readText());
     };
+    expect(await copied('HTML')).not.toContain('ink="off"');
+    await page.keyboard.press('i');
+    expect(await copied('HTML')).toContain(' ink="off"');
+    await page.keyboard.press('i');
     const output = '33 9.51 77.0 0.125 1.75 true true';
     const folder = join(outputDir, 'com/zor/android/visualeffect/tidemark');
     mkdirSync(folder, { recursive: true });

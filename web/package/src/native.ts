@@ -46,9 +46,10 @@ let compiled: Promise<WebAssembly.Module> | undefined;
 
 // A module that did not load is tried again with the next water.
 export function compile(): Promise<WebAssembly.Module> {
-    compiled ??= fetchModule();
-    compiled.catch(() => (compiled = undefined));
-    return compiled;
+    return (compiled ??= fetchModule().catch((error) => {
+        compiled = undefined;
+        throw error;
+    }));
 }
 
 export type Upload = (background: WebGLTexture, light: WebGLTexture, proportions: number) => void;

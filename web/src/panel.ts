@@ -1,4 +1,4 @@
-// The panel: what a visitor chooses in plain words, every value under "Expert", and the choice as code.
+// The panel: what a visitor chooses in plain words, values of the look under "Expert", and the choice as code.
 import { lookKeys, lookOf, presets, type LookKey, type Water } from 'tidemark-water';
 import properties from '../../host/look.properties?raw';
 import { toCpp, toHtml, toJava, toJavaScript } from './code';

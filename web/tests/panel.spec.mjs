@@ -1,4 +1,4 @@
-// The panel: every value does what it says, and leaves the page as code and as a link.
+// The panel: what is chosen reaches the water, and leaves the page as code and as a link.
 import { execFileSync } from 'node:child_process';
 import { copyFileSync, mkdirSync, writeFileSync } from 'node:fs';
 import { join } from 'node:path';
@@ -25,7 +25,7 @@ const touchAndRun = () => {
     return window.read();
 };
 
-test('every value reaches the water under its own name', async ({ page }) => {
+test('the value of every slider reaches the water under its own name', async ({ page }) => {
     test.slow();
     await page.emulateMedia({ reducedMotion: 'reduce' });  // no drop falls by itself
     const pixelsWith = async (value) => {

@@ -487,6 +487,7 @@ export class Water extends EventTarget implements Borrower, Touched {
         this.asked = 0;
         const { native, picture } = this;
         if (!this.live || !native || !picture || !this.light || !this.running()) return;
+        if (this.gl?.isContextLost()) return;  // the event that tells so is still to come
         const start = performance.now();
         if (picture.changed()) native._renewPictures();
         let frame: Frame;

@@ -181,19 +181,27 @@ public final class RendererTest {
     @Test
     public void theNewestViewDraws() {
         start();
+        view.setInk(true);
         drawUntilRest();
         TidemarkView newer = new TidemarkView(new Activity());
         newer.onStart();  // as a wallpaper does, which has no window
         newer.setPictures(green, green, white);
+        newer.setInk(true);
         Screen.during(newer, () -> showSurface(newer, SHORT, LONG));
         expectColor(GREEN);
         framesSeen = Screen.frames;
         touch(MotionEvent.ACTION_DOWN, 20, 40);
         assertEquals("frames of an older view", 0, drawUntilRest());
+        drawStroke(newer);
+        Screen.during(view, () -> showSurface(view, SHORT, LONG));
+        for (int i = 1; i <= 20; ++i) {
+            touch(view, MotionEvent.ACTION_MOVE, 50 + i, 80 + 2 * i);
+            drawFrame();
+        }
+        assertEquals("ink of the other view's stroke", 0, inked());
+        Screen.during(newer, view::onStop);
+        assertEquals("red of the other view, which goes on by itself", 0x40, Screen.pixels[0] & 255, 8);
         Screen.during(newer, newer::onDetachedFromWindow);
-        touch(MotionEvent.ACTION_UP, 20, 40);
-        drawUntilRest();
-        expectColor(RED);
     }
 
     @Test
@@ -307,15 +315,24 @@ public final class RendererTest {
     }
 
     private void touch(int action, float x, float y) {
+        touch(view, action, x, y);
+    }
+
+    private static void touch(TidemarkView view, int action, float x, float y) {
         view.onTouchEvent(new MotionEvent(action, 0, new int[] {0}, new float[][][] {{{x, y, 1}}}));
     }
 
     // Slow, and the finger stays down.
     private void drawStroke() {
-        touch(MotionEvent.ACTION_DOWN, 30, 40);
+        drawStroke(view);
+        framesSeen = Screen.frames;
+    }
+
+    private static void drawStroke(TidemarkView view) {
+        touch(view, MotionEvent.ACTION_DOWN, 30, 40);
         for (int i = 1; i <= 20; ++i) {
-            touch(MotionEvent.ACTION_MOVE, 30 + i, 40 + 2 * i);
-            drawFrame();
+            touch(view, MotionEvent.ACTION_MOVE, 30 + i, 40 + 2 * i);
+            Screen.goOn(view);
         }
     }
 

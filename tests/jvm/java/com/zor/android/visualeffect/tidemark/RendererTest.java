@@ -243,12 +243,14 @@ public final class RendererTest {
             assertTrue("waves of strength " + strength + " calm", difference(still, Screen.pixels) <= 20);
         }
         Look look = new Look();
-        look.calmingTime = Float.NaN;
+        look.dropRadius = Float.NaN;
         view.setLook(look);
         view.ripple(40, 40, 1);
         drawFrame();
         drawFrame();
         assertTrue("a splash shows", difference(still, Screen.pixels) > 30);
+        drawUntilRest();
+        assertTrue("waves of a broken look calm", difference(still, Screen.pixels) <= 20);
     }
 
     @Test

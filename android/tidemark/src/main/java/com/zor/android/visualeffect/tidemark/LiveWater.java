@@ -156,7 +156,8 @@ public final class LiveWater {
     }
 
     /**
-     * Brings the water to the time {@code now} and draws it into the current framebuffer where it has changed.
+     * Brings the water to the time {@code now} and draws it where it has changed: without ink into the current
+     * framebuffer, with ink into framebuffer 0.
      *
      * @param now seconds of any steady clock
      * @return what it did

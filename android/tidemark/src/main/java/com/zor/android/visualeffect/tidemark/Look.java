@@ -19,8 +19,8 @@ public final class Look implements Cloneable {
     /** Height of the view in model units. Range 16 to 64. */
     public int meshExtent = 32;
     /**
-     * How much larger a flat surface shows the picture than the mesh, because the eye looks through the surface onto a
-     * picture that lies a little behind it. Range 1 to 1.1.
+     * How many times smaller than the mesh a flat surface shows the picture, which follows from the distances in the
+     * vertex shader. The view shows the part of the mesh that the picture fills. Range 1 to 1.1.
      */
     public float pictureZoom = 1.015f;
     /** Speed of rings, view heights a second. Range 0.05 to 1. */
@@ -65,8 +65,8 @@ public final class Look implements Cloneable {
     /** Sharpness of the highlights, from broad to pinpoint. Range 1 to 200. */
     public float exponent = 40.0f;
     /**
-     * Height of the ripple that a touch of pressure 1 raises; heights of 1.13 and more show the water texture fully.
-     * Range 0.2 to 4.
+     * A third of the height of the ripple that a touch of pressure 1 raises; heights of 1.13 and more show the water
+     * texture fully. Range 0.2 to 4.
      */
     public float touchAmplitude = 2.2f;
     /** A finger that moves raises one ripple every so many thirds of a drop's radius. Range 0.5 to 5. */
@@ -75,7 +75,7 @@ public final class Look implements Cloneable {
     public float longestTrail = 200.0f;
     /** Height of these ripples as a share of a touch's. Range 0 to 1. */
     public float trailShare = 0.12f;
-    /** Greatest height of the ripple of one drop of rain. Range 0.2 to 2. */
+    /** A third of the height of the ripple that the largest drop of rain raises. Range 0.2 to 2. */
     public float rainAmplitude = 0.9f;
     /** Drops of rain a second. Range 0 to 60. */
     public float rainDropsPerSecond = 3.0f;

@@ -2,8 +2,6 @@
 
 #include <cstring>
 #include <numeric>
-#include <ranges>
-#include <tuple>
 
 #include "jni/bitmaps.h"
 #include "platform/desktop_bitmap.h"
@@ -12,12 +10,15 @@
 
 // A slot as it is after bitmaps that fail in every way, each of a size of its own.
 TEST(Natives, copyABitmapAndKeepItsPixelsWhenTheNextOneFails) {
-    using Transfer = void (*)(JNIEnv*, jobject, jobject);
-    for (const auto& [transfer, info, kept] :
-         {std::tuple<Transfer, AndroidBitmapInfo&, std::uint8_t*&>(
-              native::transferPortraitBGBitmap, bmp_portrait_bg_info, bmp_portrait_bg_Pixels),
-          {native::transferLandscapeBGBitmap, bmp_landscape_bg_info, bmp_landscapebg_Pixels},
-          {native::transferWaterBitmap, bmp_water_Info, bmp_water_Pixels}}) {
+    struct Slot {
+        void (*transfer)(JNIEnv*, jobject, jobject);
+        AndroidBitmapInfo& info;
+        std::uint8_t*& kept;
+    };
+    for (const Slot& slot :
+         {Slot{native::transferPortraitBGBitmap, bmp_portrait_bg_info, bmp_portrait_bg_Pixels},
+          Slot{native::transferLandscapeBGBitmap, bmp_landscape_bg_info, bmp_landscapebg_Pixels},
+          Slot{native::transferWaterBitmap, bmp_water_Info, bmp_water_Pixels}}) {
         std::vector<std::uint8_t> pixels(4 * 4 * 4);
         LogRecorder log;
         const auto handOver = [&](unsigned width, unsigned height, bool locks, unsigned stride = 7, int format = 0) {
@@ -28,17 +29,18 @@ TEST(Natives, copyABitmapAndKeepItsPixelsWhenTheNextOneFails) {
             bitmap.info.stride = stride;
             bitmap.info.format = format;
             if (locks) bitmap.pixels = pixels.data();
-            transfer(copyingEnvironment(), nullptr, &bitmap);
+            slot.transfer(copyingEnvironment(), nullptr, &bitmap);
             EXPECT_EQ(bitmap.locks, 0);
-            EXPECT_EQ(std::pair(info.width, info.height), std::pair(width, height));
+            EXPECT_EQ(std::pair(slot.info.width, slot.info.height), std::pair(width, height));
             std::ranges::fill(pixels, std::uint8_t{0});  // recycled at once
         };
-        const auto holds = [&kept](int count, int zeros) {
-            return std::ranges::all_of(
-                std::views::iota(0, count + zeros), [&](int i) { return kept[i] == (i < count ? 100 + i : 0); });
+        const auto holds = [&slot](int count, int zeros) {
+            int right = 0;
+            for (int i = 0; i < count + zeros; ++i) right += slot.kept[i] == (i < count ? 100 + i : 0);
+            return right == count + zeros;
         };
         handOver(4, 2, false);
-        EXPECT_EQ(kept, nullptr) << "nothing was ever locked";
+        EXPECT_EQ(slot.kept, nullptr) << "nothing was ever locked";
         handOver(2, 3, true);
         EXPECT_TRUE(holds(2 * 3 * 4, 0)) << "whatever the stride says";
         handOver(1, 3, false);
@@ -46,11 +48,11 @@ TEST(Natives, copyABitmapAndKeepItsPixelsWhenTheNextOneFails) {
         EXPECT_TRUE(holds(2 * 3 * 4, 2 * 3 * 4)) << "grown by zeros";
         handOver(4, 4, true, 8, ANDROID_BITMAP_FORMAT_RGB_565);
         EXPECT_TRUE(holds(4 * 4 * 2, 4 * 4 * 2)) << "half as long as it should be";
-        const std::uint8_t* const before = kept;
-        transfer(copyingEnvironment(), nullptr, nullptr);
-        EXPECT_EQ(kept, before);
+        const std::uint8_t* const before = slot.kept;
+        slot.transfer(copyingEnvironment(), nullptr, nullptr);
+        EXPECT_EQ(slot.kept, before);
         handOver(1u << 31, 1u << 31, false);
-        EXPECT_EQ(kept, nullptr) << "no memory has as much";
+        EXPECT_EQ(slot.kept, nullptr) << "no memory has as much";
         const std::string lock = "E AndroidBitmap_lockPixels () failed! error = -3";
         const std::vector<std::string> lines = {lock, lock,
                                                 lock, "E AndroidBitmap_getInfo () failed! error = -1",

@@ -18,8 +18,9 @@ public:
         : scene_(scene), width_(width), height_(height), host_(lookWith(vertices), width, height, 1) {
         __android_log_set_logger([](const __android_log_message*) {});
         resetGestures();
-        host_.handOver({smoothPicture(64, 64, 1), smoothPicture(64, 64, 2), smoothPicture(64, 64, 3)});
+        const Pictures pictures = {smoothPicture(64, 64, 1), smoothPicture(64, 64, 2), smoothPicture(64, 64, 3)};
         host_.setUp(scene != Scene::water);
+        host_.loadPictures(sourceOf(pictures));
         host_.rain(true);
         touch(TouchAction::down);
         if (scene == Scene::idleInk) touch(TouchAction::up);

@@ -1,57 +1,160 @@
 #include "host/live_water.h"
 
-LiveWater::LiveWater(const Look& look, std::uint32_t seed) : host_(look, 1, 1, seed) {}
+#include <algorithm>
+#include <cmath>
+#include <limits>
+#include <utility>
 
-void LiveWater::setPictures(Pictures pictures) {
-    handOverDue_ |= pictures.newSince(pictures_);
-    pictures_ = std::move(pictures);
+#include "host/look_values.h"
+
+namespace {
+
+// A view that keeps its size for so long, in seconds, has it for good.
+constexpr double kSettleSeconds = 0.1;
+
+// Pictures are handed over again where the view has grown by more than this since.
+constexpr double kGrowth = 1.25;
+
+}  // namespace
+
+float penWeight(float pressure) {
+    constexpr float kOrdinary = 0.5f;  // the pressure of an ordinary stroke
+    const float weight = pressure / kOrdinary;
+    return weight > 0.3f ? std::min(weight, 1.5f) : 0.3f;
 }
 
-void LiveWater::resize(int width, int height) {
-    host_.resize(width, height);
-    clock_.rest();
+LiveWater::LiveWater(PictureSource pictures, std::uint32_t seed)
+    : host_(Look{}, 1, 1, seed), pictures_(std::move(pictures)) {
+    pace_.allowResolution(true);
+}
+
+void LiveWater::setView(double width, double height, double density, double now) {
+    const ViewSize view = {width, height, density};
+    if (!(width > 0.0 && height > 0.0 && density > 0.0) || view == view_) return;
+    view_ = view;
+    settledAt_ = surface_.width == 0 ? now : now + kSettleSeconds;
+    fitSurface();
+}
+
+void LiveWater::setQuality(Quality quality) {
+    if (quality == quality_) return;
+    quality_ = quality;
+    pace_.allowResolution(quality == Quality::automatic);
+    fitSurface();
+}
+
+void LiveWater::fitSurface() {
+    wanted_ = drawnSize(view_, quality_, pace_.level().resolution);
+}
+
+void LiveWater::resized() {
+    if (wanted_ == surface_) return host_.redraw();
+    surface_ = wanted_;
+    host_.resize(surface_.width, surface_.height);
     setUpDue_ = true;
+    pace_.interrupt();
+}
+
+const LookField* LiveWater::setLook(const Look& look) {
+    const LookField* const invalid = firstInvalid(look);
+    if (invalid) return invalid;
+    host_.setLook(look);
+    longestFrame_ = double{look.longestFrame};
+    return nullptr;
 }
 
 void LiveWater::setInk(bool withInk) {
-    if (withInk == withInk_) return;
+    setUpDue_ |= withInk != withInk_;
     withInk_ = withInk;
-    setUpDue_ = true;
+}
+
+void LiveWater::touch(TouchAction action, float x, float y, float weight, double time) {
+    if (known_ != kAllPictures) return;
+    touches_.push_back({action, x, y, weight, time});
+}
+
+void LiveWater::splash(float x, float y, float weight) {
+    host_.splash(double{x} * surface_.width, double{y} * surface_.height, weight);
+}
+
+void LiveWater::picturesChanged(unsigned which) {
+    pictureDue_ |= which;
+    known_ |= which;
 }
 
 void LiveWater::renewContext() {
     setUpDue_ = true;
-    texturesDue_ = Pictures::kAll;
+    texturesDue_ = kAllPictures;
 }
 
 void LiveWater::prepare() {
-    if (host_.proportions() != proportions_) handOverDue_ |= Pictures::kBackgrounds;
-    proportions_ = host_.proportions();
-    host_.handOver(pictures_, handOverDue_);
-    const unsigned textures = handOverDue_ | texturesDue_;
-    prepared_ |= setUpDue_ || textures;
-    if (setUpDue_) {
-        host_.setUp(withInk_, textures);
-    } else {
-        host_.loadTextures(textures);
+    const int longer = std::max(surface_.width, surface_.height);
+    if (host_.proportions() != proportions_ || longer > kGrowth * longest_) {
+        pictureDue_ |= kBackgrounds;
+        proportions_ = host_.proportions();
+        longest_ = longer;
     }
-    setUpDue_ = false;
-    handOverDue_ = texturesDue_ = 0;
+    const unsigned textures = pictureDue_ | texturesDue_;
+    if (setUpDue_ || textures) pace_.interrupt();
+    if (std::exchange(setUpDue_, false)) host_.setUp(withInk_);
+    if (textures) host_.loadPictures(pictures_, std::exchange(pictureDue_, 0), std::exchange(texturesDue_, 0));
 }
 
 bool LiveWater::isResting() const {
-    if (pictures_.light.rgba.empty()) return true;
-    return !setUpDue_ && !handOverDue_ && host_.isResting();
+    if (known_ != kAllPictures || view_.width == 0.0) return true;
+    if (isSurfaceDue()) return false;
+    return surface_.width == 0 || (!setUpDue_ && !pictureDue_ && touches_.empty() && host_.isResting());
+}
+
+bool LiveWater::isSurfaceDue() const {
+    return wanted_ != surface_ && wanted_ != asked_;
+}
+
+// After a rest there is nothing to make up for.
+double LiveWater::secondsUntil(double now) {
+    const double seconds = isRunning_ ? now - now_ : 1.0 / 60;
+    if (!isRunning_) pace_.interrupt();
+    isRunning_ = true;
+    now_ = now;
+    return std::max(seconds, 0.0);
 }
 
 LiveWater::Frame LiveWater::frame(double now) {
     if (isResting()) {
-        clock_.rest();
+        isRunning_ = false;
         return Frame::resting;
     }
+    if (isSurfaceDue() && now >= settledAt_) {
+        asked_ = wanted_;
+        return Frame::resize;
+    }
+    if (surface_.width == 0) return Frame::waiting;
     prepare();
-    if (!host_.advance(clock_.secondsUntil(now))) return Frame::waiting;
+    const double seconds = std::min(secondsUntil(now), longestFrame_);
+    for (const Touch& touch : touches_) {
+        // On the host's clock, which stands still while the water rests.
+        const double ago = std::clamp(now - touch.time, -0.1, 1.0);
+        host_.touch(
+            touch.action, double{touch.x} * surface_.width, double{touch.y} * surface_.height, touch.weight,
+            host_.time() + seconds - ago);
+    }
+    touches_.clear();
+    if (!host_.advance(seconds)) return Frame::waiting;
     host_.draw();
-    if (isResting()) clock_.rest();
+    if (pace_.frameDrawn(now, host_.inkMoves() ? 1.0 / 60 : 0.0)) {
+        host_.setMeshShare(pace_.level().mesh);
+        fitSurface();
+    }
+    if (isResting()) isRunning_ = false;
     return Frame::drawn;
+}
+
+double LiveWater::due() const {
+    constexpr double kNever = std::numeric_limits<double>::infinity();
+    if (isResting()) return kNever;
+    const double surface = isSurfaceDue() ? settledAt_ : kNever;
+    if (surface_.width == 0) return surface;
+    const bool isDue = setUpDue_ || pictureDue_ || !touches_.empty();
+    const bool isStill = host_.isResting() && !isDue;
+    return std::min(surface, isStill ? kNever : now_ + (isDue ? 0.0 : host_.due() - host_.time()));
 }

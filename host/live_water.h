@@ -1,44 +1,67 @@
 // Water on a screen that is looked at: takes what happens (touches, another size, other pictures, another look) and
-// draws a frame when something has changed. The page in the browser and the window on the desktop are both around it.
+// draws a frame when something has changed. Every face with a screen is around it: the view on Android, the element in
+// the browser, the window on the desktop.
 //
 // Call everything on the one thread that owns the OpenGL ES 2.0 context; the context itself is needed by frame() only.
+// Times are seconds of the clock that the face gives to frame().
 #pragma once
 
 #include <cstdint>
-#include <utility>
+#include <vector>
 
-#include "host/frame_clock.h"
 #include "host/look.h"
-#include "host/picture.h"
+#include "host/pace.h"
+#include "host/picture_source.h"
+#include "host/view_size.h"
 #include "host/water_host.h"
+
+struct LookField;
+
+// What a pen's pressure, 0 to 1, counts: 0.3 to 1.5. A finger or a mouse, whose pressure is not worth much, counts 1.
+float penWeight(float pressure);
 
 class LiveWater {
 public:
     enum class Frame {
-        resting,  // nothing to draw until the next call that changes something
-        waiting,  // nothing to draw yet
-        drawn,
+        resting = 0,  // nothing to draw until the next call that changes something
+        waiting = 1,  // nothing to draw before due()
+        drawn = 2,
+        resize = 3,  // nothing was drawn: give the surface width() x height() pixels, then call resized()
     };
 
     // `seed` fixes where the rain falls.
-    LiveWater(const Look& look, std::uint32_t seed);
+    LiveWater(PictureSource pictures, std::uint32_t seed);
 
-    // Nothing is drawn before the first pictures. Hands over only those that differ from the last ones.
-    void setPictures(Pictures pictures);
+    // The view in density-independent pixels, and how many pixels of the display each of them has. Frames go on in the
+    // old size until the view has kept its size for a tenth of a second. The ink is lost then, the water stays.
+    void setView(double width, double height, double density, double now);
 
-    // In pixels, each at least 1. The ink is lost, the water stays.
-    void resize(int width, int height);
+    // How many pixels are drawn for a density-independent one at most; automatic at first.
+    void setQuality(Quality quality);
 
-    void setLook(const Look& look) { host_.setLook(look); }
+    int width() const { return wanted_.width; }
+    int height() const { return wanted_.height; }
+    void resized();
+
+    // Takes over all values; the water and the ink stay. Returns null, or the first value beyond its limits: then
+    // nothing changes.
+    const LookField* setLook(const Look& look);
 
     // Whether touches drop ink; they do not at first. A switch ends the stroke that is being drawn.
     void setInk(bool withInk);
 
     void setRain(bool falling) { host_.rain(falling); }
     void clearInk() { host_.clearInk(); }
-    void touch(TouchAction action, int x, int y, float pressure) { host_.touch(action, x, y, pressure); }
 
-    void splash(int x, int y, float pressure) { host_.splash(x, y, pressure); }
+    // One touch at the time at which it was reported. The place is a share of the view's width and height, from its top
+    // left corner. A cancel ends a stroke as lifting the finger does.
+    void touch(TouchAction action, float x, float y, float weight, double time);
+
+    // A ripple without a finger and without ink.
+    void splash(float x, float y, float weight);
+
+    // Nothing is drawn before all three pictures were there once. `which` is a sum of k...Picture.
+    void picturesChanged(unsigned which);
 
     // Where the framebuffer has lost the last frame.
     void redraw() { host_.redraw(); }
@@ -49,32 +72,43 @@ public:
     // Whether there is nothing to draw until the next call that changes something.
     bool isResting() const;
 
-    // Shorter by longer side of what the backgrounds are cropped to.
-    double proportions() const { return host_.proportions(); }
-
-    // What the processor spent on the last frame, in seconds; frames that take long make the mesh coarser. One that set
-    // the library up or took pictures over says nothing of the next ones.
-    void noteWork(double seconds) {
-        if (!std::exchange(prepared_, false)) host_.noteWork(seconds);
-    }
-
-    // Does what frame() does before it draws: sets the library up and loads what was handed over, where that is due.
-    void prepare();
-
-    // Brings the water to the time `now`, in seconds, and draws it where it has changed: without ink into the current
-    // framebuffer, with ink into framebuffer 0.
+    // Brings the water to the time `now`, that at which the display shows the frame, and draws it where it has changed:
+    // without ink into the current framebuffer, with ink into framebuffer 0.
     Frame frame(double now);
 
+    // When frame() will next have something to do: infinity while the water rests, in the past for the next frame.
+    double due() const;
+
 private:
+    void prepare();
+    void fitSurface();
+    bool isSurfaceDue() const;
+    double secondsUntil(double now);
+
     WaterHost host_;
-    FrameClock clock_;
-    Pictures pictures_;
+    PictureSource pictures_;
+    Pace pace_;
     bool withInk_ = false;
 
+    Quality quality_ = Quality::automatic;
+    ViewSize view_;
+    Size wanted_ = {0, 0};    // what the view asks for
+    Size asked_ = {0, 0};     // what the face was last told to give the surface
+    Size surface_ = {0, 0};   // what the surface has
+    double settledAt_ = 0.0;  // when the view will have kept its size long enough
+
+    // Reported since the last frame; places are shares of the view, times those of the face.
+    std::vector<Touch> touches_;
+
+    double longestFrame_ = Look{}.longestFrame;
+    bool isRunning_ = false;  // or the last frame was before a rest
+    double now_ = 0.0;        // of the last frame
+
     // What the library has not been told yet; the next frame does, where the context is current.
-    bool setUpDue_ = true;
-    unsigned handOverDue_ = 0;
-    unsigned texturesDue_ = 0;  // besides those handed over
+    bool setUpDue_ = false;
+    unsigned pictureDue_ = 0;   // to be handed over
+    unsigned texturesDue_ = 0;  // besides those
+    unsigned known_ = 0;        // pictures that were there once
     double proportions_ = 0.0;  // to which the backgrounds were last cropped
-    bool prepared_ = false;     // what was due, since the last noteWork()
+    int longest_ = 0;           // and the view's longer side then
 };

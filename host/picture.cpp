@@ -4,23 +4,93 @@
 #include <cmath>
 #include <cstddef>
 
-unsigned Pictures::newSince(const Pictures& before) const {
-    return (portrait == before.portrait ? 0u : kPortrait) | (landscape == before.landscape ? 0u : kLandscape) |
-           (light == before.light ? 0u : kLight);
+#include "host/host_jni.h"
+#include "host/native_names.h"
+#include "platform/desktop_bitmap.h"
+
+namespace {
+
+// The pixels along one axis that one pixel of a smaller picture covers, and the share that each of them has in it.
+struct Span {
+    int first;
+    std::vector<float> shares;
+};
+
+// `length` pixels from `from` on, divided among `count`.
+std::vector<Span> spans(double from, double length, int count) {
+    constexpr double kRounding = 1e-6;  // of a pixel
+    std::vector<Span> result;
+    for (int i = 0; i < count; ++i) {
+        const double start = from + length * i / count;
+        const double end = from + length * (i + 1) / count;
+        Span span = {static_cast<int>(start + kRounding), {}};
+        for (int pixel = span.first; pixel < end - kRounding; ++pixel) {
+            const double covered = std::min(end, pixel + 1.0) - std::max(start, static_cast<double>(pixel));
+            span.shares.push_back(static_cast<float>(covered * count / length));
+        }
+        result.push_back(std::move(span));
+    }
+    return result;
 }
 
-Picture cropToAspect(const Picture& picture, double aspectWidth, double aspectHeight) {
-    const double aspect = aspectWidth / aspectHeight;
-    Picture crop;
-    crop.width = std::clamp(static_cast<int>(std::lround(picture.height * aspect)), 1, picture.width);
-    crop.height = std::clamp(static_cast<int>(std::lround(picture.width / aspect)), 1, picture.height);
-    const int left = (picture.width - crop.width) / 2;
-    const int top = (picture.height - crop.height) / 2;
-    const auto rowBytes = static_cast<std::ptrdiff_t>(crop.width) * 4;
-    crop.rgba.reserve(static_cast<std::size_t>(rowBytes * crop.height));
-    for (int row = 0; row < crop.height; ++row) {
-        const auto start = picture.rgba.begin() + (std::ptrdiff_t{top + row} * picture.width + left) * 4;
-        crop.rgba.insert(crop.rgba.end(), start, start + rowBytes);
+// Rows are summed up first, then the columns of the sum.
+Picture shrunk(const Picture& picture, const std::vector<Span>& columns, const std::vector<Span>& rows) {
+    Picture result = {static_cast<int>(columns.size()), static_cast<int>(rows.size()), {}};
+    result.rgba.reserve(4 * columns.size() * rows.size());
+    const std::size_t rowBytes = 4 * static_cast<std::size_t>(picture.width);
+    std::vector<float> sum(rowBytes);
+    for (const Span& row : rows) {
+        std::fill(sum.begin(), sum.end(), 0.0f);
+        for (std::size_t i = 0; i < row.shares.size(); ++i) {
+            const std::uint8_t* const line = picture.rgba.data() + (static_cast<std::size_t>(row.first) + i) * rowBytes;
+            for (std::size_t k = 0; k < rowBytes; ++k) sum[k] += row.shares[i] * static_cast<float>(line[k]);
+        }
+        for (const Span& column : columns) {
+            float pixel[4] = {};
+            const float* at = sum.data() + 4 * column.first;
+            for (const float share : column.shares) {
+                for (float& channel : pixel) channel += share * *at++;
+            }
+            for (const float channel : pixel) result.rgba.push_back(static_cast<std::uint8_t>(channel + 0.5f));
+        }
     }
-    return crop;
+    return result;
+}
+
+void handOver(PictureSlot slot, const Picture& picture) {
+    DesktopBitmap bitmap;
+    bitmap.info.width = static_cast<std::uint32_t>(picture.width);
+    bitmap.info.height = static_cast<std::uint32_t>(picture.height);
+    bitmap.info.stride = bitmap.info.width * 4;
+    bitmap.info.format = ANDROID_BITMAP_FORMAT_RGBA_8888;
+    bitmap.pixels = const_cast<std::uint8_t*>(picture.rgba.data());
+    const auto transfer = slot == PictureSlot::portrait    ? native::transferPortraitBGBitmap
+                          : slot == PictureSlot::landscape ? native::transferLandscapeBGBitmap
+                                                           : native::transferWaterBitmap;
+    transfer(hostEnvironment(), nullptr, &bitmap);
+}
+
+}  // namespace
+
+Picture fitted(const Picture& picture, int width, int height) {
+    const double scale =
+        std::min(static_cast<double>(picture.width) / width, static_cast<double>(picture.height) / height);
+    if (scale > 1.0) {
+        return shrunk(
+            picture, spans((picture.width - width * scale) / 2, width * scale, width),
+            spans((picture.height - height * scale) / 2, height * scale, height));
+    }
+    const int columns = std::max(static_cast<int>(std::lround(width * scale)), 1);
+    const int rows = std::max(static_cast<int>(std::lround(height * scale)), 1);
+    return shrunk(
+        picture, spans((picture.width - columns) / 2, columns, columns),  // NOLINT(bugprone-integer-division)
+        spans((picture.height - rows) / 2, rows, rows));                  // NOLINT(bugprone-integer-division)
+}
+
+PictureSource sourceOf(const Pictures& pictures) {
+    const auto give = [&pictures](PictureSlot slot, int width, int height) {
+        if (slot == PictureSlot::light) return handOver(slot, pictures.light);
+        handOver(slot, fitted(slot == PictureSlot::portrait ? pictures.portrait : pictures.landscape, width, height));
+    };
+    return {give, nullptr};
 }

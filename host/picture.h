@@ -1,9 +1,12 @@
-// A picture in memory: rows from the top, four bytes a pixel in R, G, B, A order, no padding.
+// Pictures in the host's own memory, for faces whose pictures are there.
 #pragma once
 
 #include <cstdint>
 #include <vector>
 
+#include "host/picture_source.h"
+
+// Rows from the top, four bytes a pixel in R, G, B, A order, no padding.
 struct Picture {
     int width = 0;
     int height = 0;
@@ -15,13 +18,11 @@ struct Picture {
 // What the water lies over in portrait and in landscape, and the light that its waves throw back.
 struct Pictures {
     Picture portrait, landscape, light;
-
-    // Some of the three, as a sum.
-    enum : unsigned { kPortrait = 1, kLandscape = 2, kBackgrounds = 3, kLight = 4, kAll = 7 };
-
-    // Those that are others than in `before`.
-    unsigned newSince(const Pictures& before) const;
 };
 
-// The largest middle part of `picture` that has the proportions aspectWidth : aspectHeight.
-Picture cropToAspect(const Picture& picture, double aspectWidth, double aspectHeight);
+// The largest middle part of `picture` that has the proportions width : height, scaled down to width x height pixels
+// where it has more. Each pixel of the result is the mean of the area that it covers.
+Picture fitted(const Picture& picture, int width, int height);
+
+// Hands over pictures that stay where they are.
+PictureSource sourceOf(const Pictures& pictures);

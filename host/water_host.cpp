@@ -4,30 +4,40 @@
 #include <cmath>
 #include <utility>
 
-#include "host/look_limits.h"
 #include "host/native_names.h"
-#include "platform/desktop_bitmap.h"
 
 namespace {
 
-void handOverOne(void (*transfer)(JNIEnv*, jobject, jobject), const Picture& picture) {
-    DesktopBitmap bitmap;
-    bitmap.info.width = static_cast<std::uint32_t>(picture.width);
-    bitmap.info.height = static_cast<std::uint32_t>(picture.height);
-    bitmap.info.stride = bitmap.info.width * 4;
-    bitmap.info.format = ANDROID_BITMAP_FORMAT_RGBA_8888;
-    bitmap.pixels = const_cast<std::uint8_t*>(picture.rgba.data());
-    transfer(hostEnvironment(), nullptr, &bitmap);
-}
-
-constexpr double kInkStepsPerSecond = 60.0;
+constexpr double kInkStep = 1.0 / 60;
 constexpr int kMostInkSteps = 4;
+
+// The ink follows a finger so much later, in seconds: by a report of a digitizer of 60 Hz and a quarter of a step, so
+// that a step lies between two reports.
+constexpr double kInkDelay = 1.25 * kInkStep;
+
+// The first step may be taken so much too early, so that a frame in time for it is not followed by one with two.
+constexpr double kEarly = 0.3 * kInkStep;
+
+// A drop is raised in so many steps of the waves, whose shares are those of a half period of the sine.
+constexpr int kDropSteps = 8;
+constexpr double kHalfTurn = 3.141592653589793;
+
+// More drops at a time than any hand or rain raises.
+constexpr std::size_t kMostDrops = 2048;
+
+constexpr float kLightestTouch = 0.3f;
+constexpr float kHeaviestTouch = 1.5f;
 
 // Nearer to a step than this, in steps, the heights are those of the step.
 constexpr float kAtStep = 0.0625f;
 
 // The peak of a ripple is three times as high, and the water keeps heights of up to 100.
 constexpr float kMostAmplitude = 100.0f / 3.0f;
+
+// The mesh that is drawn: cells of at most 6 pixels; indices have 16 bits.
+constexpr double kCellPixels = 6.0;
+constexpr double kFewestVertices = 48.0;
+constexpr double kMostVertices = 256.0;
 
 // Steps are taken at the time nearest to theirs, so that neither the jitter of a clock nor rounding brings none to one
 // frame and two to the next.
@@ -53,25 +63,31 @@ std::vector<float> resampled(const std::vector<float>& field, int from, int to) 
 }  // namespace
 
 WaterHost::WaterHost(const Look& look, int width, int height, std::uint32_t seed)
-    : look_(withinLimits(look)), random_(seed), calmSteps_(look_.stepsToRest), lattice_{} {
+    : look_(look), random_(seed), calmSteps_(look_.stepsToRest), lattice_{} {
     resize(width, height);
 }
 
 void WaterHost::resize(int width, int height) {
     width_ = width;
     height_ = height;
-    quality_.fitTo(width, height, look_.pictureZoom);
     fit();
 }
 
 void WaterHost::setLook(const Look& look) {
-    look_ = withinLimits(look);
+    look_ = look;
     fit();
 }
 
-void WaterHost::noteWork(double seconds) {
-    quality_.noteWork(seconds);
+void WaterHost::setMeshShare(double share) {
+    meshShare_ = share;
     if (wantedVertices() != vertices_) fit();
+}
+
+int WaterHost::wantedVertices() const {
+    if (look_.meshVertices > 1) return look_.meshVertices;
+    const double cells = std::ceil(std::max(width_, height_) * double{look_.pictureZoom} / kCellPixels);
+    const double most = std::clamp(cells + 1.0, 96.0, kMostVertices);
+    return static_cast<int>(std::max(most * meshShare_, kFewestVertices));
 }
 
 // Lays the lattice and the mesh, squares around the view, so that their cells are squares on the screen and rings stay
@@ -92,8 +108,13 @@ void WaterHost::fit() {
         visibleWidth_ != oldWidth || visibleHeight_ != oldHeight) {
         makeMesh(vertices);
     }
-    pictureWidth_ = static_cast<int>(std::ceil(visibleWidth_));
-    pictureHeight_ = static_cast<int>(std::ceil(visibleHeight_));
+    // A flat surface shows the mesh's extent smaller by the zoom: a picture of less would end before the view does.
+    const auto extent = [this](float visible) {
+        constexpr float kRounding = 1e-3f;
+        return std::max(static_cast<int>(std::ceil(visible * look_.pictureZoom - kRounding)), 1);
+    };
+    pictureWidth_ = extent(visibleWidth_);
+    pictureHeight_ = extent(visibleHeight_);
     mvp_.values = {2.0f / visibleWidth_, 0, 0, 0, 0, 2.0f / visibleHeight_, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1};
     changed_ = true;
 }
@@ -134,74 +155,77 @@ double WaterHost::proportions() const {
     return static_cast<double>(shorter) / longer;
 }
 
-void WaterHost::handOver(const Pictures& pictures, unsigned which) {
-    const auto [shorter, longer] = std::minmax(pictureWidth_, pictureHeight_);
-    if (which & Pictures::kPortrait) {
-        handOverOne(native::transferPortraitBGBitmap, cropToAspect(pictures.portrait, shorter, longer));
-    }
-    if (which & Pictures::kLandscape) {
-        handOverOne(native::transferLandscapeBGBitmap, cropToAspect(pictures.landscape, longer, shorter));
-    }
-    if (which & Pictures::kLight) handOverOne(native::transferWaterBitmap, pictures.light);
+void WaterHost::loadPictures(const PictureSource& pictures, unsigned due, unsigned which) {
+    JNIEnv* const env = hostEnvironment();
+    // As many pixels as the view shows of them.
+    const int longer = static_cast<int>(std::ceil(std::max(width_, height_) * double{look_.pictureZoom}));
+    const int shorter = std::max(static_cast<int>(std::lround(longer * proportions())), 1);
+    const auto load = [&](unsigned picture, PictureSlot slot, int width, int height, auto native) {
+        if (due & picture) pictures.handOver(slot, width, height);
+        if (!((due | which) & picture)) return;
+        native(env, nullptr);
+        if (pictures.loaded) pictures.loaded(slot);
+        changed_ = true;
+    };
+    load(kPortraitPicture, PictureSlot::portrait, shorter, longer, native::onLoadPortraitBGTextures);
+    load(kLandscapePicture, PictureSlot::landscape, longer, shorter, native::onLoadLandscapeBGTextures);
+    load(kLightPicture, PictureSlot::light, 0, 0, native::onLoadWaterTextures);
 }
 
-void WaterHost::setUp(bool withInk, unsigned textures) {
+void WaterHost::setUp(bool withInk) {
     JNIEnv* const env = hostEnvironment();
     native::onInitSetting(env, nullptr, width_, height_, withInk);
     native::onInitGPU(env, nullptr);
     // The library would keep a stroke that the switch interrupts and go on with it at the next touch.
     if (withInk != withInk_) native::clearInkValue(env, nullptr);
+    if (withInk != withInk_) {
+        strokes_.reset();
+        inkStart_ = -1.0;
+    }
     withInk_ = withInk;
     inkSteps_ = 0;
-    loadTextures(textures);
     isSetUp_ = true;
     changed_ = true;
 }
 
-void WaterHost::loadTextures(unsigned which) {
-    JNIEnv* const env = hostEnvironment();
-    if (which & Pictures::kPortrait) native::onLoadPortraitBGTextures(env, nullptr);
-    if (which & Pictures::kLandscape) native::onLoadLandscapeBGTextures(env, nullptr);
-    if (which & Pictures::kLight) native::onLoadWaterTextures(env, nullptr);
-    changed_ |= which != 0;
+WaterHost::Place WaterHost::modelPlace(double x, double y) const {
+    return {
+        static_cast<float>(x / width_ - 0.5) * visibleWidth_, static_cast<float>(0.5 - y / height_) * visibleHeight_};
 }
 
-void WaterHost::touch(TouchAction action, int x, int y, float pressure) {
-    if (!isSetUp_) return;
-    if (!inkMoves()) dueInkSteps_ = 0.0;
-    raiseTouchRipples(action, x, y, look_.touchAmplitude * pressure);
+void WaterHost::touch(TouchAction action, double x, double y, float weight, double time) {
+    if (!isSetUp_ || !std::isfinite(x) || !std::isfinite(y) || !std::isfinite(time)) return;
+    constexpr double kFar = 1.0e6;  // pixels
+    x = std::clamp(x, -kFar, kFar);
+    y = std::clamp(y, -kFar, kFar);
+    weight = weight > kLightestTouch ? std::min(weight, kHeaviestTouch) : kLightestTouch;
+    raiseTouchRipples(action, modelPlace(x, y), look_.touchAmplitude * weight);
     fingerDown_ = action == TouchAction::down || (action == TouchAction::move && fingerDown_);
     if (!withInk_) return;
-    native::onTouch(hostEnvironment(), nullptr, x, y, static_cast<jint>(action), pressure);
-    inkSteps_ = look_.framesToFade;
+    if (!inkMoves() && inkStart_ < 0.0) inkStart_ = std::max(time + kInkDelay, 0.0);
+    strokes_.report({action, static_cast<float>(x), static_cast<float>(y), weight, time});
 }
 
-void WaterHost::raiseTouchRipples(TouchAction action, int x, int y, float amplitude) {
-    const float modelX = (static_cast<float>(x) / static_cast<float>(width_) - 0.5f) * visibleWidth_;
-    const float modelY = (0.5f - static_cast<float>(y) / static_cast<float>(height_)) * visibleHeight_;
+void WaterHost::raiseTouchRipples(TouchAction action, Place place, float amplitude) {
     if (action == TouchAction::down) {
-        raiseRipple(modelX, modelY, amplitude);
+        raise(place, amplitude);
     } else if (action == TouchAction::move && fingerDown_) {
         const float spacing =
             look_.trailCells * static_cast<float>(lattice_.extent) / static_cast<float>(lattice_.points - 1);
-        const float dx = modelX - touchX_;
-        const float dy = modelY - touchY_;
+        const float dx = place.x - trail_.x;
+        const float dy = place.y - trail_.y;
         const int ripples = static_cast<int>(std::min(std::sqrt(dx * dx + dy * dy) / spacing, look_.longestTrail));
         if (ripples < 1) return;
         for (int i = 1; i <= ripples; ++i) {
             const float t = static_cast<float>(i) / static_cast<float>(ripples);
-            raiseRipple(touchX_ + dx * t, touchY_ + dy * t, amplitude * look_.trailShare);
+            raise({trail_.x + dx * t, trail_.y + dy * t}, amplitude * look_.trailShare);
         }
     }
-    touchX_ = modelX;
-    touchY_ = modelY;
+    trail_ = place;
 }
 
-void WaterHost::splash(int x, int y, float pressure) {
-    if (!isSetUp_) return;
-    const float modelX = (static_cast<float>(x) / static_cast<float>(width_) - 0.5f) * visibleWidth_;
-    const float modelY = (0.5f - static_cast<float>(y) / static_cast<float>(height_)) * visibleHeight_;
-    raiseRipple(modelX, modelY, look_.touchAmplitude * pressure);
+void WaterHost::splash(double x, double y, float weight) {
+    if (isSetUp_) raise(modelPlace(x, y), look_.touchAmplitude * weight);
 }
 
 void WaterHost::clearInk() {
@@ -213,19 +237,37 @@ void WaterHost::clearInk() {
 bool WaterHost::advance(double seconds) {
     if (!isSetUp_) return false;
     const double passed = std::min(seconds, double{look_.longestFrame});
+    time_ += passed;
     dueSteps_ += passed * lattice_.stepsPerSecond;
     for (int steps = takeSteps(dueSteps_); steps > 0; --steps) {
         if (raining_) dropRain();
+        growDrops();
         if (calmSteps_ < look_.stepsToRest) stepWater();
     }
     if (calmSteps_ < look_.stepsToRest) changed_ = true;
-    if (!inkMoves()) return changed_;
-    dueInkSteps_ += passed * kInkStepsPerSecond;
-    return dueInkSteps_ >= 0.5;
+    startInk();
+    return inkMoves() ? time_ >= due() : changed_;
+}
+
+// The first step is that of the first touch, so that strokes are the same at any frame rate. Where its time would lie
+// in the middle between two frames of 60 Hz, the jitter of a clock would bring none to one frame and two to the next:
+// it is moved a little.
+void WaterHost::startInk() {
+    if (inkStart_ < 0.0 || time_ < inkStart_ - kEarly) return;
+    const double due = std::min((time_ - inkStart_) / kInkStep + 1.0, double{kMostInkSteps});
+    const double share = due - std::floor(due);
+    const double calm = share > 0.5 ? std::max(share, 0.65) : std::min(share, 0.35);
+    inkTime_ = time_ - (std::floor(due) + calm) * kInkStep;
+    inkStart_ = -1.0;
+}
+
+double WaterHost::due() const {
+    if (inkMoves()) return inkTime_ + 0.5 * kInkStep;
+    return isStill() && inkStart_ >= 0.0 ? inkStart_ - kEarly : time_;
 }
 
 bool WaterHost::isResting() const {
-    return !changed_ && !raining_ && calmSteps_ >= look_.stepsToRest && !inkMoves();
+    return isStill() && !inkMoves() && inkStart_ < 0.0;
 }
 
 void WaterHost::stepWater() {
@@ -245,23 +287,37 @@ void WaterHost::dropRain() {
     if (draw() * static_cast<float>(lattice_.stepsPerSecond) >= look_.rainDropsPerSecond) return;
     const float x = (draw() - 0.5f) * visibleWidth_;
     const float y = (draw() - 0.5f) * visibleHeight_;
-    raiseRipple(x, y, look_.rainAmplitude * (0.5f + 0.5f * draw()));
+    raise({x, y}, look_.rainAmplitude * (0.5f + 0.5f * draw()));
 }
 
-void WaterHost::raiseRipple(float x, float y, float amplitude) {
-    if (!std::isfinite(amplitude)) return;
+void WaterHost::raise(Place place, float amplitude) {
+    if (!std::isfinite(amplitude) || !std::isfinite(place.x) || !std::isfinite(place.y)) return;
+    if (drops_.size() >= kMostDrops) return;
+    drops_.push_back({place.x, place.y, std::clamp(amplitude, -kMostAmplitude, kMostAmplitude), 0});
+}
+
+// One step of every drop. The shares of all its steps, sin(pi (i + 1/2) / n) sin(pi / 2n), sum up to 1.
+void WaterHost::growDrops() {
+    if (drops_.empty()) return;
+    for (Drop& drop : drops_) {
+        const double phase = kHalfTurn * (drop.step++ + 0.5) / kDropSteps;
+        addRipple(drop, static_cast<float>(std::sin(phase) * std::sin(kHalfTurn / (2 * kDropSteps))));
+    }
+    std::erase_if(drops_, [](const Drop& drop) { return drop.step >= kDropSteps; });
+    calmSteps_ = 0;
+    isGathered_ = false;
+}
+
+void WaterHost::addRipple(const Drop& drop, float share) {
     // The library counts countA cells across the extent, the lattice has one interval less; these positions hit the
     // very point. The fast axis runs down a column of the lattice.
     const auto extent = static_cast<float>(lattice_.extent);
     const auto n = static_cast<float>(lattice_.points);
-    const float row = (0.5f - y / extent) * (n - 1.0f);
-    const float column = (0.5f + x / extent) * (n - 1.0f);
+    const float row = (0.5f - drop.y / extent) * (n - 1.0f);
+    const float column = (0.5f + drop.x / extent) * (n - 1.0f);
     native::ripple(
         hostEnvironment(), nullptr, &heights_, lattice_.extent, lattice_.extent, lattice_.points, lattice_.points,
-        (row / n - 0.5f) * extent, (column / n - 0.5f) * extent,
-        std::clamp(amplitude, -kMostAmplitude, kMostAmplitude));
-    calmSteps_ = 0;
-    isGathered_ = false;
+        (row / n - 0.5f) * extent, (column / n - 0.5f) * extent, drop.amplitude * share);
 }
 
 // The heights at the time of the frame, which on a display faster than the water lies between two steps.
@@ -277,23 +333,42 @@ void WaterHost::gatherHeights() {
 }
 
 void WaterHost::draw() {
-    JNIEnv* const env = hostEnvironment();
     if (!isMeshFilled_) fillMesh();
     gatherHeights();
-    int frames = 1;
-    if (inkMoves()) {
-        frames = std::clamp(takeSteps(dueInkSteps_), 1, kMostInkSteps);
-        dueInkSteps_ = std::clamp(dueInkSteps_, -0.5, 0.5);
+    int steps = 1;
+    const bool moves = inkMoves();
+    if (moves) {
+        const double due = (time_ - inkTime_) / kInkStep;
+        steps = static_cast<int>(std::clamp(std::floor(due + 0.5), 1.0, double{kMostInkSteps}));
+        // Steps that are left out take no time. A frame that comes early does not bring the next steps to the middle
+        // between two frames, where the jitter of a clock would decide between none and two.
+        const double behind = due < 0.4 ? -0.25 : std::clamp(due - steps, -0.5, 0.5);
+        inkTime_ = time_ - (behind + steps) * kInkStep;
     }
-    for (int i = 1; i <= frames; ++i) {
+    for (int i = 1; i <= steps; ++i) {
+        if (moves) {
+            inkTime_ += kInkStep;
+            for (const Touch& touch : strokes_.step(inkTime_ - kInkDelay)) {
+                const auto pixel = [](float place) { return static_cast<jint>(std::lround(place)); };
+                native::onTouch(
+                    hostEnvironment(), nullptr, pixel(touch.x), pixel(touch.y), static_cast<jint>(touch.action),
+                    touch.weight);
+                inkSteps_ = look_.framesToFade;
+            }
+        }
         // Only the last one is seen. The others move the ink below a mesh of nothing.
-        const auto sizeOf = [&](const auto& array) { return i == frames ? static_cast<jint>(array.values.size()) : 0; };
-        native::onDrawFrame(
-            env, nullptr, &positions_, &heightAttribs_, &indices_, sizeOf(positions_), sizeOf(heightAttribs_),
-            sizeOf(indices_), &mvp_, pictureWidth_, pictureHeight_, vertices_, vertices_, look_.refractiveIndex,
-            look_.alphaMix, look_.alphaScale1, look_.alphaScale2, look_.inkRed, look_.inkGreen, look_.inkBlue,
-            look_.fresnelRatio, look_.specularRatio, look_.exponent, width_ > height_);
-        if (inkSteps_ > 0) --inkSteps_;
+        drawOnce(i == steps);
+        // Under a finger that rests the ink goes on.
+        if (inkSteps_ > 0 && !strokes_.isActive()) --inkSteps_;
     }
     changed_ = false;
+}
+
+void WaterHost::drawOnce(bool isSeen) {
+    const auto sizeOf = [isSeen](const auto& array) { return isSeen ? static_cast<jint>(array.values.size()) : 0; };
+    native::onDrawFrame(
+        hostEnvironment(), nullptr, &positions_, &heightAttribs_, &indices_, sizeOf(positions_), sizeOf(heightAttribs_),
+        sizeOf(indices_), &mvp_, pictureWidth_, pictureHeight_, vertices_, vertices_, look_.refractiveIndex,
+        look_.alphaMix, look_.alphaScale1, look_.alphaScale2, look_.inkRed, look_.inkGreen, look_.inkBlue,
+        look_.fresnelRatio, look_.specularRatio, look_.exponent, width_ > height_);
 }

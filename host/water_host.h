@@ -1,6 +1,6 @@
-// The reference host: what an app does around the library, in the order that the library asks for. It owns the mesh
-// arrays, the view, the transform and the lighting values, turns touches and rain into ripples, steps water and ink in
-// time and tells when there is nothing new to draw.
+// What an app does around the library, in the order that the library asks for: owns the mesh arrays, the view, the
+// transform and the lighting values, turns touches and rain into ripples, steps water and ink in time and tells when
+// there is nothing new to draw. LiveWater puts it on a screen; what only renders pictures may drive it directly.
 //
 // Call everything on the one thread that owns the OpenGL ES 2.0 context.
 #pragma once
@@ -11,54 +11,51 @@
 
 #include "host/host_jni.h"
 #include "host/look.h"
-#include "host/mesh_quality.h"
-#include "host/picture.h"
+#include "host/picture_source.h"
+#include "host/stroke_clock.h"
 #include "host/surface_mesh.h"
 #include "host/wave_lattice.h"
 
-// The action codes of android.view.MotionEvent.
-enum class TouchAction { down = 0, up = 1, move = 2, cancel = 3 };
-
 class WaterHost {
 public:
-    // `seed` fixes where the rain falls. The view is width x height pixels, each at least 1.
+    // `seed` fixes where the rain falls. The view is width x height pixels, each at least 1. Every value of the look is
+    // within its limits, see look_values.h.
     WaterHost(const Look& look, int width, int height, std::uint32_t seed);
 
-    // setUp must follow, and before it another hand-over of the backgrounds where the proportions have changed. The
-    // water stays.
+    // setUp must follow. The water stays.
     void resize(int width, int height);
 
     // Shorter by longer side of what the backgrounds are cropped to in portrait and in landscape.
     double proportions() const;
 
-    // Hands pictures over, of which the library keeps copies; before setUp or loadTextures.
-    void handOver(const Pictures& pictures, unsigned which = Pictures::kAll);
+    // Sets the library up in the current context, with or without ink. The ink is lost.
+    void setUp(bool withInk);
 
-    // Sets the library up in the current context, with or without ink. A new context needs all textures; one that goes
-    // on, with another size or mode, keeps those that it has.
-    void setUp(bool withInk, unsigned textures = Pictures::kAll);
+    // Has pictures handed over (`due`) and loads them and others that the library has already (`which`) into textures.
+    void loadPictures(const PictureSource& pictures, unsigned due = kAllPictures, unsigned which = kAllPictures);
 
-    // Shows pictures handed over since setUp; the water and the ink stay as they are.
-    void loadTextures(unsigned which = Pictures::kAll);
-
-    // Takes over all values, brought within their limits; the water and the ink stay.
+    // Takes over all values, which are within their limits; the water and the ink stay.
     void setLook(const Look& look);
 
-    // What the processor spent on a frame, in seconds: where the look leaves the mesh to the host, it gets coarser when
-    // frames take long.
-    void noteWork(double seconds);
+    // Draws with a share of the vertices along each side that the size of the view asks for, where the look leaves the
+    // mesh to the host.
+    void setMeshShare(double share);
 
     // Where the framebuffer has lost the last frame.
     void redraw() { changed_ = true; }
 
-    // Before the first setUp touch, advance and clearInk do nothing.
+    // Seconds that have been given to advance() so far. Times of touches are measured from the same zero.
+    double time() const { return time_; }
 
-    // One touch event; x and y in pixels from the top left corner of the view, pressure around 1. A stroke begins with
-    // the finger's coming down.
-    void touch(TouchAction action, int x, int y, float pressure);
+    // Before the first setUp touch, splash, advance and clearInk do nothing.
 
-    // Raises the ripple of a finger of this pressure that comes down, without a finger and without ink.
-    void splash(int x, int y, float pressure);
+    // One touch: x and y in pixels from the top left corner of the view. A stroke begins with the finger's coming down.
+    // Ripples follow at once, the ink at `time` and a little later. `weight` is 1 for a finger, 0.3 to 1.5 for a pen.
+    void touch(TouchAction action, double x, double y, float weight, double time);
+    void touch(TouchAction action, double x, double y, float weight) { touch(action, x, y, weight, time_); }
+
+    // Raises the ripple of a finger of this weight that comes down, without a finger and without ink.
+    void splash(double x, double y, float weight);
 
     // Lets rain fall, `look.rainDropsPerSecond` drops a second, until it is switched off.
     void rain(bool falling) { raining_ = falling; }
@@ -67,8 +64,14 @@ public:
     // is due, as each frame moves it; otherwise when the picture has changed since the last draw.
     bool advance(double seconds);
 
+    // When advance() will next find something to draw, on the clock of time(), provided that isResting() is false.
+    double due() const;
+
     // Whether the picture stays as it is, however much time passes, until the next call that changes something.
     bool isResting() const;
+
+    // Whether ink lives, each step of which needs a frame: at most 60 frames a second are drawn then.
+    bool inkMoves() const { return withInk_ && inkStart_ < 0.0 && (strokes_.isActive() || inkSteps_ > 0); }
 
     // Draws a frame: without ink into the current framebuffer, with ink into framebuffer 0. With ink, moves it by the
     // steps that are due, at least by one; steps beyond the fourth are left out, so that a late frame does not make the
@@ -83,16 +86,32 @@ public:
     const WaveLattice& lattice() const { return lattice_; }
 
 private:
+    // A ripple that is being raised. Raised at once, it would be a facetted cone for some frames.
+    struct Drop {
+        float x, y;  // model units
+        float amplitude;
+        int step;
+    };
+
+    struct Place {
+        float x, y;
+    };
+    Place modelPlace(double x, double y) const;
+
     void fit();
-    int wantedVertices() const { return look_.meshVertices > 1 ? look_.meshVertices : quality_.vertices(); }
+    int wantedVertices() const;
     void makeMesh(int vertices);
     void fillMesh();
-    void raiseTouchRipples(TouchAction action, int x, int y, float amplitude);
+    void raiseTouchRipples(TouchAction action, Place place, float amplitude);
+    void raise(Place place, float amplitude);
     void stepWater();
+    void growDrops();
+    void addRipple(const Drop& drop, float share);
     void dropRain();
-    void raiseRipple(float x, float y, float amplitude);  // position in model units
+    bool isStill() const { return !changed_ && !raining_ && drops_.empty() && calmSteps_ >= look_.stepsToRest; }
+    void startInk();
     void gatherHeights();
-    bool inkMoves() const { return (withInk_ && fingerDown_) || inkSteps_ > 0; }
+    void drawOnce(bool isSeen);
 
     Look look_;
     int width_ = 0;  // view size, pixels
@@ -101,19 +120,25 @@ private:
     bool raining_ = false;
     bool withInk_ = false;
     bool isSetUp_ = false;
-    bool fingerDown_ = false;
-    int inkSteps_ = 0;       // until the ink has faded: the library does not tell whether any is left
-    bool changed_ = true;    // since the last draw
+    bool changed_ = true;  // since the last draw
+    double time_ = 0.0;
+
     int calmSteps_;          // calm steps in a row
     double dueSteps_ = 0.0;  // of the water that the time passed so far still asks for; below 0 when it is ahead
-    double dueInkSteps_ = 0.0;
+    std::vector<Drop> drops_;
+    bool fingerDown_ = false;
+    Place trail_ = {};  // where the finger raised its last ripple
+
+    StrokeClock strokes_;
+    double inkStart_ = -1.0;  // when the ink that rested is to begin, or below 0
+    double inkTime_ = 0.0;    // of the ink's last step
+    int inkSteps_ = 0;        // until the ink has faded: the library does not tell whether any is left
+
     bool isGathered_ = false;  // the mesh has the heights of the lattice
     bool isMeshFilled_ = false;
-    float touchX_ = 0.0f;  // where the finger raised its last ripple, model units
-    float touchY_ = 0.0f;
 
-    // The part of the square mesh that the view shows, in model units, and the whole numbers at or above it, which
-    // the library takes for the picture's extent.
+    // The part of the square mesh that the view shows, in model units, and the whole numbers that the library takes for
+    // the picture's extent.
     float visibleWidth_ = 0.0f;
     float visibleHeight_ = 0.0f;
     int pictureWidth_ = 0;
@@ -123,7 +148,7 @@ private:
     FloatArray velocity_{0};
     FloatArray heights_{0};
 
-    MeshQuality quality_;
+    double meshShare_ = 1.0;
     SurfaceMesh mesh_{2, 2, 1.0, 1.0};
     int vertices_ = 0;  // of the mesh, along each side of the square
     FloatArray positions_{0};

@@ -5,9 +5,7 @@
 #include <string>
 #include <string_view>
 
-struct Size {
-    int width, height;  // pixels
-};
+#include "host/view_size.h"
 
 // "540x960"; each side 1 to 8192.
 std::optional<Size> parseSize(std::string_view text, std::string& error);

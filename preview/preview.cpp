@@ -9,6 +9,7 @@
 #include <memory>
 #include <vector>
 
+#include "host/picture.h"
 #include "host/water_host.h"
 #include "platform/headless_context.h"
 #include "preview/frame_sink.h"
@@ -107,8 +108,8 @@ bool runPreview(const PreviewOptions& options, std::string& error) {
     // The ink draws from this generator as well.
     srand48(static_cast<long>(options.seed));
     WaterHost host(*look, width, height, options.seed);
-    host.handOver(*pictures);
     host.setUp(options.withInk);
+    host.loadPictures(sourceOf(*pictures));
     host.rain(options.rain);
     const int frames = countFrames(options, events);
     TouchPlayer touches(std::move(events), width, height);

@@ -108,6 +108,8 @@ std::optional<std::vector<TouchEvent>> loadTouchScript(const std::string& path, 
 void TouchPlayer::deliverBefore(double timeMs, WaterHost& host) {
     for (; next_ < events_.size() && static_cast<double>(events_[next_].timeMs) < timeMs; ++next_) {
         const TouchEvent& event = events_[next_];
-        host.touch(event.action, event.x.pixels(width_), event.y.pixels(height_), event.pressure);
+        host.touch(
+            event.action, event.x.pixels(width_), event.y.pixels(height_), event.pressure,
+            static_cast<double>(event.timeMs) / 1000.0);
     }
 }

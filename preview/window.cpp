@@ -9,6 +9,7 @@
 #include <utility>
 
 #include "host/live_water.h"
+#include "host/picture.h"
 #include "platform/keep_driver.h"
 #include "preview/scene.h"
 
@@ -25,16 +26,12 @@ Stage& stageOf(GLFWwindow* window) {
 }
 
 void touch(GLFWwindow* window, TouchAction action) {
-    // The cursor's unit is a pixel of the framebuffer on some systems only.
     double x = 0, y = 0;
-    int width = 0, height = 0, columns = 0, rows = 0;
+    int width = 0, height = 0;
     glfwGetCursorPos(window, &x, &y);
     glfwGetWindowSize(window, &width, &height);
-    glfwGetFramebufferSize(window, &columns, &rows);
-    const auto scale = [](double position, int pixels, int extent) {
-        return static_cast<int>(std::lround(position * pixels / std::max(extent, 1)));
-    };
-    stageOf(window).water.touch(action, scale(x, columns, width), scale(y, rows, height), 1.0f);
+    const auto share = [](double position, int extent) { return static_cast<float>(position / std::max(extent, 1)); };
+    stageOf(window).water.touch(action, share(x, width), share(y, height), 1.0f, glfwGetTime());
 }
 
 void onButton(GLFWwindow* window, int button, int action, int) {
@@ -56,9 +53,10 @@ void onKey(GLFWwindow* window, int key, int, int action, int) {
     if (key == GLFW_KEY_C) stage.water.clearInk();
 }
 
-// A window that is put away has no pixels.
+// The framebuffer has a window's pixels whatever the host would draw with, so it is told that the display is not finer
+// than the quality. A window that is put away has no pixels.
 void onResize(GLFWwindow* window, int width, int height) {
-    if (width > 0 && height > 0) stageOf(window).water.resize(width, height);
+    if (width > 0 && height > 0) stageOf(window).water.setView(width, height, 1.0, glfwGetTime());
 }
 
 void onExpose(GLFWwindow* window) {
@@ -76,18 +74,19 @@ void run(GLFWwindow* window, Stage& stage) {
     glfwGetFramebufferSize(window, &width, &height);
     onResize(window, width, height);
     while (!glfwWindowShouldClose(window)) {
-        const double start = glfwGetTime();
-        switch (stage.water.frame(start)) {
+        switch (stage.water.frame(glfwGetTime())) {
             case LiveWater::Frame::drawn:
-                stage.water.noteWork(glfwGetTime() - start);
                 glfwSwapBuffers(window);
                 glfwPollEvents();
                 break;
             case LiveWater::Frame::waiting:
-                glfwWaitEventsTimeout(0.001);
+                glfwWaitEventsTimeout(std::max(stage.water.due() - glfwGetTime(), 0.0005));
                 break;
             case LiveWater::Frame::resting:
                 glfwWaitEvents();
+                break;
+            case LiveWater::Frame::resize:
+                stage.water.resized();
                 break;
         }
     }
@@ -129,8 +128,10 @@ bool runWindow(const PreviewOptions& options, std::string& error) {
 
     // The ink draws from this generator as well.
     srand48(static_cast<long>(options.seed));
-    Stage stage{LiveWater(*look, options.seed), options.withInk, options.rain};
-    stage.water.setPictures(std::move(*pictures));
+    Stage stage{LiveWater(sourceOf(*pictures), options.seed), options.withInk, options.rain};
+    stage.water.setQuality(Quality::high);
+    stage.water.setLook(*look);
+    stage.water.picturesChanged(kAllPictures);
     stage.water.setInk(stage.withInk);
     stage.water.setRain(stage.raining);
     run(window, stage);

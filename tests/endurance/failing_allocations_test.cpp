@@ -27,10 +27,10 @@ protected:
     Shown play() const {
         const Look look = {.meshVertices = vertices_};
         // The pictures are cropped alike for each view, so that one that stays in place is the same.
-        WaterHost square(look, 1, 1, 1);
-        handOverPictures(square);
+        WaterHost square(look, 64, 64, 1);
+        setUp(square, true, kAllPictures);
         WaterHost host(look, width_, kHeight, 1);
-        host.setUp(true);
+        setUp(host, true);
         srand48(1);
         // A driver that refuses a shader explains it in a text of its own length.
         zorloadShaderScript(GL_VERTEX_SHADER, "void main( {");

@@ -28,6 +28,10 @@ inline std::vector<Scene> loadScenes() {
     return scenes;
 }
 
-inline void handOverPictures(WaterHost& host) {
-    host.handOver({smoothPicture(24, 32, 1), smoothPicture(32, 24, 2), smoothPicture(8, 8, 3)});
+// Sets the library up and loads its pictures, which are handed over where they are due.
+inline void setUp(WaterHost& host, bool withInk, unsigned due = 0) {
+    static const Pictures pictures = {smoothPicture(24, 32, 1), smoothPicture(32, 24, 2), smoothPicture(8, 8, 3)};
+    static const PictureSource source = sourceOf(pictures);
+    host.setUp(withInk);
+    host.loadPictures(source, due);
 }

@@ -40,8 +40,7 @@ protected:
             host->ReleaseFloatArrayElements(env, reference, elements, mode);
         };
         srand48(11);
-        handOverPictures(water);
-        setUp();
+        setUp(kAllPictures);
         // The buffers that only grow are grown by then: the larger view comes first.
         water.touch(TouchAction::down, 0, 0, 1.0f);
         water.advance(1.0 / 60);
@@ -51,9 +50,9 @@ protected:
 
     unsigned below(unsigned end) { return static_cast<unsigned>(random() % end); }
 
-    void setUp() {
+    void setUp(unsigned duePictures = 0) {
         water.resize(width, 240);
-        water.setUp(withInk);
+        ::setUp(water, withInk, duePictures);
         log.take();
     }
 

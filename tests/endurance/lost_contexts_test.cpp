@@ -47,7 +47,6 @@ protected:
         renewContext(kLonger, kLonger);
         resetGestures();
         WaterHost host(Look{.meshVertices = 32}, kShorter, kLonger, 1);
-        handOverPictures(host);
         return host;
     }
 
@@ -61,7 +60,7 @@ protected:
     // What a first set-up of the mode makes, once its first frame has bound it all.
     GlObjects firstSetUp(bool withInk) {
         WaterHost host = start();
-        host.setUp(withInk);
+        setUp(host, withInk, kAllPictures);
         host.touch(TouchAction::down, 90, 120, 1.0f);
         host.advance(1.0 / 60);
         host.draw();
@@ -74,7 +73,7 @@ protected:
         if (inNewContext) renewContext(kLonger, kLonger);
         hadInk_ = mood.withInk || (hadInk_ && !inNewContext);
         host.resize(mood.width, mood.height);
-        host.setUp(mood.withInk);
+        setUp(host, mood.withInk);
         // A context does not know the names of a lost one.
         const GLenum error = glGetError();
         EXPECT_TRUE(error == GL_NO_ERROR || error == GL_INVALID_VALUE) << error;
@@ -107,7 +106,7 @@ TEST_F(LostContexts, costOneSetUpEvenInTheMiddleOfAStroke) {
     // it need not be drawn.
     for (const bool losing : {false, true}) {
         WaterHost host = start();
-        host.setUp(false);
+        setUp(host, false, kAllPictures);
         std::mt19937 random(7);
         const auto oneIn = [&random](unsigned chances) { return random() % chances == 0; };
         Mood mood;
@@ -126,7 +125,7 @@ TEST_F(LostContexts, costOneSetUpEvenInTheMiddleOfAStroke) {
                     setUpAgain(host, mood, inNewContext);
                 } else if (i == 4 && mood != before) {
                     host.resize(mood.width, mood.height);
-                    host.setUp(mood.withInk);
+                    setUp(host, mood.withInk);
                 }
                 if (i < scene.size()) {
                     const TouchEvent& event = scene[i];

@@ -1,6 +1,12 @@
 #include "host/live_water.h"
 
+#include <cmath>
+#include <limits>
+
+#include "host/look_fields.h"
+#include "host/picture.h"
 #include "jni/bitmaps.h"
+#include "jni/globals.h"
 #include "tests/support/gesture_state.h"
 #include "tests/support/gl_test.h"
 #include "tests/support/test_pictures.h"
@@ -11,23 +17,33 @@ using Frame = LiveWater::Frame;
 
 class Live : public GlTest {
 protected:
-    static constexpr int kWidth = 54;
-    static constexpr int kHeight = 96;
+    static constexpr int kWidth = 72;
+    static constexpr int kHeight = 128;
 
     void SetUp() override {
         GlTest::SetUp();
         renewContext(kWidth, kHeight);
         resetGestures();
-        water.resize(kWidth, kHeight);
-        water.setPictures(pictures(1));
+        begin();
     }
 
-    static Pictures pictures(int variant) {
-        return {smoothPicture(54, 96, variant), smoothPicture(96, 54, variant + 1), smoothPicture(16, 16, variant + 2)};
+    void begin(const Look& look = {}) {
+        water = LiveWater(sourceOf(pictures), 1);
+        water.setLook(look);
+        water.setView(kWidth, kHeight, 1.0, now);
+        water.picturesChanged(kAllPictures);
     }
 
-    // The frame one sixtieth of a second later.
-    Frame next() { return water.frame(now += 1.0 / 60); }
+    // The frame so much later; the surface gets the size that it is to have.
+    Frame next(double seconds = 1.0 / 60) {
+        Frame frame = water.frame(now += seconds);
+        if (frame != Frame::resize) return frame;
+        size = {water.width(), water.height()};
+        water.resized();
+        return water.frame(now);
+    }
+
+    void touch(TouchAction action = TouchAction::down) { water.touch(action, 0.4f, 0.3f, 1.0f, now); }
 
     int framesToRest() {
         int frames = 0;
@@ -38,12 +54,12 @@ protected:
     std::vector<Rgba> seen() const { return readPixels(kWidth, kHeight); }
 
     // What the next frame tells the library: P, L and W for hand-overs, | for a set-up, p, l and w for texture loads.
-    std::string told() {
+    std::string told(double seconds = 1.0 / 60) {
         constexpr std::uint32_t kMark = 4711;
         AndroidBitmapInfo* const slots[] = {&bmp_portrait_bg_info, &bmp_landscape_bg_info, &bmp_water_Info};
         for (AndroidBitmapInfo* slot : slots) slot->flags = kMark;
         log.take();
-        next();
+        next(seconds);
         std::string calls;
         for (std::size_t i = 0; i < 3; ++i) {
             if (slots[i]->flags != kMark) calls += "PLW"[i];
@@ -57,25 +73,28 @@ protected:
         return calls;
     }
 
-    LiveWater water{Look{}, 1};
+    const Pictures pictures = {smoothPicture(72, 128, 1), smoothPicture(128, 72, 2), smoothPicture(16, 16, 3)};
+    LiveWater water{sourceOf(pictures), 1};
+    Size size = {0, 0};
     double now = 100.0;
 };
 
 }  // namespace
 
 TEST_F(Live, drawsWhatHasChangedAndRestsOtherwise) {
-    LiveWater without(Look{}, 1);
+    LiveWater without(sourceOf(pictures), 1);
+    without.setView(kWidth, kHeight, 1.0, 0.0);
     EXPECT_EQ(without.frame(0.0), Frame::resting) << "there is no picture yet";
+    EXPECT_EQ(without.due(), std::numeric_limits<double>::infinity());
 
-    water.setLook({.meshVertices = 24});
-    water.touch(TouchAction::down, 20, 30, 1.0f);
+    begin({.meshVertices = 24});
     water.clearInk();
     EXPECT_EQ(next(), Frame::drawn);
-    EXPECT_EQ(next(), Frame::resting) << "a touch before there is water";
-    water.touch(TouchAction::down, 20, 30, 1.0f);
+    EXPECT_EQ(next(), Frame::resting);
+    touch();
+    EXPECT_LE(water.due(), now);
     EXPECT_EQ(next(), Frame::drawn);
-    EXPECT_EQ(water.frame(now + 0.004), Frame::drawn) << "between two steps of the water";
-    EXPECT_EQ(next(), Frame::drawn);
+    EXPECT_EQ(next(0.004), Frame::drawn) << "between two steps of the water";
     const int frames = framesToRest();
     EXPECT_GT(frames, 60);
     EXPECT_LT(frames, 600);
@@ -89,42 +108,64 @@ TEST_F(Live, drawsWhatHasChangedAndRestsOtherwise) {
     EXPECT_LT(framesToRest(), 600);
 }
 
-TEST_F(Live, tellsTheLibraryOnlyWhatHasChanged) {
-    next();
-    water.setInk(true);
-    EXPECT_EQ(told(), "|");
-    water.resize(kHeight, kWidth);
-    EXPECT_EQ(told(), "|") << "the backgrounds fit the view that was turned";
-    water.resize(kHeight, kHeight);
-    EXPECT_EQ(told(), "PL|pl");
-    water.setPictures(pictures(1));
-    EXPECT_EQ(told(), "");
-    Pictures others = pictures(1);
-    others.landscape = pictures(2).landscape;
-    water.setPictures(others);
+// While a divider is dragged the water goes on in its old size.
+TEST_F(Live, isSetUpOnceTheViewKeepsItsSizeAndHandsOverWhatIsOfOtherProportions) {
+    EXPECT_EQ(told(), "PLW|pl") << "at once for the first view";
+    for (int i = 1; i < 30; ++i) {
+        water.setView(kHeight, kWidth + i, 1.0, now);
+        EXPECT_EQ(told(1.0 / 30), "");
+    }
+    EXPECT_EQ(size, (Size{kWidth, kHeight}));
+    water.setView(kHeight, kWidth, 1.0, now);
+    EXPECT_EQ(told(0.05), "");
+    EXPECT_NEAR(water.due(), now + 0.05, 1e-6);
+    EXPECT_EQ(told(0.06), "|") << "the backgrounds fit the view that was turned";
+    EXPECT_EQ(size, (Size{kHeight, kWidth}));
+    water.setView(kHeight, kHeight, 1.0, now);
+    EXPECT_EQ(told(0.2), "PL|pl");
+    water.setView(2 * kHeight, 2 * kHeight, 1.0, now);
+    EXPECT_EQ(told(0.2), "PL|pl") << "with the pixels of the larger view";
+    water.picturesChanged(kLandscapePicture);
     EXPECT_EQ(told(), "Ll");
     renewContext(kWidth, kHeight);
     water.renewContext();
     EXPECT_EQ(told(), "|plw") << "the library has copies";
-    Look look;
-    look.meshVertices = 64;
-    water.setLook(look);
+    water.setLook({.meshVertices = 64});
     EXPECT_EQ(told(), "");
-    look.meshExtent = 20;
-    water.setLook(look);
-    water.resize(kWidth, kHeight);
-    water.setPictures(pictures(3));
-    EXPECT_EQ(told(), "PLW|plw");
+}
+
+TEST_F(Live, drawsAsManyPixelsAsTheQualityAllows) {
+    for (const auto& [quality, density, pixels] :
+         {std::tuple(Quality::low, 2.6, 1.0),
+          {Quality::medium, 2.6, 2.0},
+          {Quality::high, 2.6, 2.6},
+          {Quality::high, 3.5, 3.0},
+          {Quality::medium, 1.5, 1.5},
+          {Quality::automatic, 3.5, 2.0}}) {
+        EXPECT_EQ(
+            drawnSize({360, 800, density}, quality, 1.0),
+            (Size{static_cast<int>(360 * pixels), static_cast<int>(800 * pixels)}));
+    }
+    EXPECT_EQ(drawnSize({360, 800, 3.0}, Quality::automatic, 0.5), (Size{360, 800}));
+    EXPECT_EQ(drawnSize({360, 800, 3.0}, Quality::medium, 0.5), (Size{720, 1600})) << "what is asked for stays";
+    EXPECT_EQ(drawnSize({4000, 2000, 2.0}, Quality::high, 1.0), (Size{4096, 2048}));
+    // A touch falls on the same share of the view whatever is drawn.
+    for (const Quality quality : {Quality::low, Quality::medium}) {
+        begin();
+        water.setQuality(quality);
+        water.setView(150, 200, 2.0, now);
+        water.setInk(true);
+        next();
+        water.touch(TouchAction::down, 0.25f, 0.5f, 1.0f, now);
+        for (int i = 0; i < 4; ++i) next();
+        EXPECT_EQ(std::pair(4 * POSITION_X, 2 * POSITION_Y), std::pair(size.width + 2, size.height)) << size.width;
+    }
 }
 
 TEST_F(Live, aPauseIsNotMadeUpFor) {
     enum Pause { kAfterTheLastFrame, kAfterRainWithoutADrop, kInTheWaves };
     const auto ringAfter = [this](Pause pause, double seconds) {
-        Look look;
-        look.rainDropsPerSecond = 0.0f;
-        water = LiveWater(look, 1);
-        water.resize(kWidth, kHeight);
-        water.setPictures(pictures(1));
+        begin({.rainDropsPerSecond = 0.0f});
         next();
         if (pause == kAfterRainWithoutADrop) {
             water.setRain(true);
@@ -133,13 +174,9 @@ TEST_F(Live, aPauseIsNotMadeUpFor) {
             EXPECT_EQ(next(), Frame::resting);
         }
         if (pause != kInTheWaves) now += seconds;
-        water.touch(TouchAction::down, 20, 30, 1.0f);
-        for (int i = 0; i < 3; ++i) next();
-        if (pause == kInTheWaves) {
-            water.resize(kWidth, kHeight);
-            now += seconds;
-        }
-        for (int i = 0; i < 3; ++i) next();
+        touch();
+        for (int i = 0; i < 12; ++i) next();
+        next(pause == kInTheWaves ? 0.25 + seconds : 0.25);
         return seen();
     };
     for (const Pause pause : {kAfterTheLastFrame, kAfterRainWithoutADrop, kInTheWaves}) {
@@ -147,22 +184,24 @@ TEST_F(Live, aPauseIsNotMadeUpFor) {
     }
 }
 
-TEST_F(Live, aLookChangesOnWavingWater) {
+TEST_F(Live, aLookChangesOnWavingWaterUnlessAValueIsBeyondItsLimits) {
     next();
     const auto flat = seen();
-    water.touch(TouchAction::down, 20, 30, 1.0f);
-    for (int i = 0; i < 6; ++i) next();
+    touch();
+    for (int i = 0; i < 12; ++i) next();
     const auto ring = seen();
-    Look look;
-    look.refractiveIndex = 1.2f;
-    water.setLook(look);
-    EXPECT_EQ(next(), Frame::drawn);
-    const auto lessBent = seen();
-    EXPECT_NE(lessBent, ring);
-    EXPECT_NE(lessBent, flat) << "the waves live on";
-    look.meshVertices = 64;
-    look.dropRadius = 0.05f;
-    water.setLook(look);
+    for (const float bad : {0.0f, std::numeric_limits<float>::quiet_NaN(), std::numeric_limits<float>::infinity()}) {
+        const LookField* const refused = water.setLook({.calmingTime = bad, .refractiveIndex = 1.2f});
+        ASSERT_TRUE(refused);
+        EXPECT_EQ(refused->name, "calmingTime");
+    }
+    EXPECT_EQ(next(0.0), Frame::drawn);
+    EXPECT_EQ(seen(), ring) << "the water stays as it is";
+    EXPECT_EQ(water.setLook({.refractiveIndex = 1.2f}), nullptr);
+    EXPECT_EQ(next(0.0), Frame::drawn);
+    EXPECT_NE(seen(), ring);
+    EXPECT_NE(seen(), flat) << "the waves live on";
+    water.setLook({.meshVertices = 64, .dropRadius = 0.05f});
     EXPECT_EQ(next(), Frame::drawn);
     EXPECT_NE(seen(), flat) << "on a coarser lattice too";
 }
@@ -170,41 +209,104 @@ TEST_F(Live, aLookChangesOnWavingWater) {
 // `count` counts the ink's steps since the finger came down.
 TEST_F(Live, inkMovesByTheClockOnAnyDisplay) {
     water.setLook({.meshVertices = 24});
-    for (const double rate : {30.0, 60.0, 75.0, 90.0, 120.0, 144.0}) {
+    for (const double rate : {15.0, 30.0, 60.0, 75.0, 90.0, 120.0, 144.0}) {
         SCOPED_TRACE(rate);
         water.setInk(false);
         next();
         water.setInk(true);
         next();
-        water.touch(TouchAction::down, 20, 30, 1.0f);
+        touch();
+        count = 0;
         const double start = now;
-        while (count < 72) water.frame(now += 1.0 / rate);
-        EXPECT_NEAR(now - start, 1.2, std::max(1.0 / rate, 1.0 / 60)) << "within a frame of the display or the ink";
+        int waited = 0;
+        while (count < 72 && now < start + 9.0) {
+            const bool isDue = water.due() <= now + 1.0 / rate;
+            const Frame frame = next(1.0 / rate);
+            EXPECT_EQ(frame == Frame::drawn, isDue) << now - start;
+            waited += frame == Frame::waiting;
+        }
+        EXPECT_NEAR(now - start, 1.22, 1.0 / rate + 1.0 / 60) << "within a frame of the display and the ink";
+        EXPECT_EQ(waited > 2, rate > 70) << "not before the next step is due";
 
         const int before = count;
-        water.frame(now += 0.2);
+        next(0.2);
         EXPECT_LE(count - before, 4) << "a late frame is not made up for without end";
-        water.frame(now += 1.0 / 60);
+        next();
         EXPECT_LE(count - before, 6) << "nor later";
     }
 }
 
-TEST_F(Live, longFramesMakeTheMeshCoarser) {
-    water.resize(960, 540);
-    next();
-    for (int i = 0; i <= 20; ++i) water.noteWork(i == 0 ? 9.0 : 0.0);  // the first was the set-up's
-    GLint bytes[2];
-    for (GLint& size : bytes) {
-        water.redraw();
-        next();
+// Frames that come at half the display's rate until there are fewer pixels.
+TEST_F(Live, drawsLessWhereTheDisplayIsKeptWaiting) {
+    begin({});
+    water.setView(480, 270, 1.0, now);
+    water.setRain(true);
+    const auto vertices = [] {
+        GLint bytes = 0;
         glBindBuffer(GL_ARRAY_BUFFER, fluid.v_buf);
-        glGetBufferParameteriv(GL_ARRAY_BUFFER, GL_BUFFER_SIZE, &size);
-        for (int i = 0; i < 20; ++i) water.noteWork(0.02);
+        glGetBufferParameteriv(GL_ARRAY_BUFFER, GL_BUFFER_SIZE, &bytes);
+        return bytes / 12;
+    };
+    int best = 0;
+    for (const double end = now + 3.5; now < end;) {
+        if (next(size.width > 400 ? 1.0 / 30 : 1.0 / 60) != Frame::drawn) continue;
+        best = std::max(best, vertices());
     }
-    EXPECT_EQ(bytes[0], 162 * 92 * 12) << "cells of 6 pixels, as many as the view shows";
-    EXPECT_EQ(bytes[1], 123 * 69 * 12);
-    GLint triangles;
-    glBindBuffer(GL_ELEMENT_ARRAY_BUFFER, fluid.i_buf);
-    glGetBufferParameteriv(GL_ELEMENT_ARRAY_BUFFER, GL_BUFFER_SIZE, &triangles);
-    EXPECT_EQ(triangles, 122 * 68 * 12) << "no index too many";
+    EXPECT_LT(vertices(), best / 2);
+    EXPECT_LE(size.width, 400);
+    EXPECT_NEAR(size.width * 270.0 / size.height, 480, 3);
+}
+
+namespace {
+
+struct Paced {
+    Pace pace;
+    double now = 0.0;
+    int changes = 0;
+
+    Paced() { pace.allowResolution(true); }
+
+    // `needed` seconds for a frame at the best level, less at others, on a display that shows 1 / period frames.
+    void run(double seconds, double needed, double period = 1.0 / 60) {
+        for (const double end = now + seconds; now < end;) {
+            const auto [mesh, resolution] = pace.level();
+            const double work = needed * (0.3 + 0.2 * mesh + 0.5 * resolution * resolution);
+            now += period * std::ceil(work / period - 1e-6);
+            changes += pace.frameDrawn(now, 0.0);
+        }
+    }
+    double resolution() const { return pace.level().resolution; }
+};
+
+}  // namespace
+
+TEST(Pace, settlesWithinTwoSecondsDoesNotSwingAndRecovers) {
+    Paced paced;
+    paced.run(0.9, 0.03);
+    EXPECT_EQ(paced.changes, 0) << "the first second is not judged";
+    paced.run(2.1, 0.03);
+    EXPECT_LT(paced.resolution(), 1.0);
+    const double settled = paced.resolution();
+    paced.changes = 0;
+    paced.run(60.0, 0.03);
+    EXPECT_LE(paced.changes, 12) << "it tries to be better, ever more rarely";
+    paced.changes = 0;
+    paced.run(60.0, 0.03);
+    EXPECT_LE(paced.changes, 4);
+    EXPECT_NEAR(paced.resolution(), settled, 0.2);
+    paced.run(80.0, 0.004);
+    EXPECT_EQ(std::pair(paced.pace.level().mesh, paced.resolution()), std::pair(1.0, 1.0)) << "there is room again";
+
+    Paced slowDisplay;
+    slowDisplay.run(12.0, 0.01, 1.0 / 30);
+    EXPECT_EQ(slowDisplay.resolution(), 1.0) << "a display of 30 Hz gains nothing by less";
+    Paced fast;
+    fast.run(4.0, 0.012, 1.0 / 120);
+    EXPECT_EQ(fast.resolution(), 1.0) << "60 frames a second are enough";
+    Paced fixed;
+    fixed.pace.allowResolution(false);
+    fixed.run(5.0, 0.018);
+    EXPECT_EQ(std::pair(fixed.pace.level().mesh, fixed.resolution()), std::pair(0.5, 1.0)) << "only the mesh";
+    fixed.run(5.0, 0.03);
+    EXPECT_EQ(fixed.pace.level().mesh, 1.0) << "which is as fine as it can be where that does not help";
 }

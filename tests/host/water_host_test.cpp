@@ -1,4 +1,5 @@
 #include "host/water_host.h"
+#include "host/picture.h"
 
 #include <algorithm>
 #include <limits>
@@ -20,14 +21,13 @@ protected:
         resetGestures();
         srand48(1);
         WaterHost host(look, width, height, 1);
-        host.handOver({portrait, landscape, smoothPicture(16, 16, 3)});
         host.setUp(withInk);
+        host.loadPictures(sourceOf(pictures));
         return host;
     }
 
     // Much higher and much wider than the view, so that the crop shows.
-    Picture portrait = smoothPicture(120, 300, 1);
-    Picture landscape = smoothPicture(300, 120, 2);
+    const Pictures pictures = {smoothPicture(120, 300, 1), smoothPicture(300, 120, 2), smoothPicture(16, 16, 3)};
 };
 
 void expectMiddleOf(const std::vector<Rgba>& pixels, int width, int height, const Picture& picture) {
@@ -48,17 +48,18 @@ void expectMiddleOf(const std::vector<Rgba>& pixels, int width, int height, cons
 
 TEST_F(Host, aFlatSurfaceShowsThePhotoUndistortedAndFillingTheView) {
     start(kShort, kLong).draw();
-    expectMiddleOf(readPixels(kShort, kLong), kShort, kLong, portrait);
+    expectMiddleOf(readPixels(kShort, kLong), kShort, kLong, pictures.portrait);
     WaterHost host = start(kLong, kShort);
     host.draw();
-    expectMiddleOf(readPixels(kLong, kShort), kLong, kShort, landscape);
+    expectMiddleOf(readPixels(kLong, kShort), kLong, kShort, pictures.landscape);
 
     // The view is turned, which keeps the pictures that were handed over.
     renewContext(kShort, kLong);
     host.resize(kShort, kLong);
     host.setUp(false);
+    host.loadPictures(sourceOf(pictures), 0);
     host.draw();
-    expectMiddleOf(readPixels(kShort, kLong), kShort, kLong, portrait);
+    expectMiddleOf(readPixels(kShort, kLong), kShort, kLong, pictures.portrait);
 }
 
 TEST_F(Host, ringsAreRoundOnTheScreen) {
@@ -96,7 +97,9 @@ TEST_F(Host, ringsRunAtTheirSpeed) {
     for (const float speed : {0.1f, 0.2713f, 1.0f, 2.0f}) {
         WaterHost host = start(kShort, kLong, false, {.ringSpeed = speed, .calmingTime = 100.0f});
         host.splash(kShort / 2, kLong / 2, 1.0f);
-        for (int i = 0; i < 240; ++i) host.advance(0.4 / speed / 240);
+        // From the middle of the steps that raise the drop.
+        const double time = 0.4 / speed + 4.0 / host.lattice().stepsPerSecond;
+        for (int i = 0; i < 240; ++i) host.advance(time / 240);
         const int n = host.lattice().points;
         const auto column = host.heights().begin() + n / 2 * n + n / 2;
         const auto crest = std::max_element(column, column + n / 2) - column;
@@ -154,7 +157,7 @@ TEST_F(Host, inkBloomsInItsColorFadesAndIsClearedAtOnce) {
     tap();
     int frames = 0;
     for (; host.advance(1.0 / 60) && frames < 400; ++frames) host.draw();
-    EXPECT_EQ(frames, look.framesToFade);
+    EXPECT_NEAR(frames, look.framesToFade, 2) << "and one or two until the finger has gone";
     const auto faded = readPixels(width, height);
     for (std::size_t i = 0; i < clear.size(); ++i) ASSERT_NEAR(faded[i][0], clear[i][0], 2);
 
@@ -180,41 +183,107 @@ TEST_F(Host, aMoveFollowsAFingerAndRaisesAShortTrailAtMost) {
     EXPECT_TRUE(host.isResting());
     EXPECT_EQ(readPixels(kShort, kLong), clear);
 
+    const auto swelled = [&] {  // the sum of the heights stays once a drop is there
+        for (int i = 0; i < 9; ++i) host.advance(1.0 / 60);
+        return raised();
+    };
     host.touch(TouchAction::down, 20, 20, 1.0f);
-    const double one = raised();
+    const double one = swelled();
     host.touch(TouchAction::move, 20, 70, 1.0f);
-    EXPECT_NEAR(raised(), (1 + 3 * 0.5) * one, 0.1 * one);
+    EXPECT_NEAR(swelled(), (1 + 3 * 0.5) * one, 0.2 * one);
 }
 
 TEST_F(Host, numbersBeyondAllMeasureLeaveTheWaterAlive) {
     constexpr float kInfinity = std::numeric_limits<float>::infinity();
     constexpr float kNan = std::numeric_limits<float>::quiet_NaN();
-    Look broken;
-    broken.calmingTime = kNan;
-    broken.dropRadius = 0.0f;
-    broken.meshVertices = -1;
-    broken.stepsToRest = broken.stepsPerSecond = std::numeric_limits<int>::max();
-    for (const Look& look : {Look{}, broken}) {
-        WaterHost host = start(kShort, kLong, false, look);
-        const auto highest = [&host] {
-            const auto [low, high] = std::minmax_element(host.heights().begin(), host.heights().end());
-            return std::max(-*low, *high);
-        };
-        for (const float pressure : {kNan, kInfinity, -kInfinity}) {
-            host.splash(20, 30, pressure);
-            EXPECT_EQ(highest(), 0.0f) << pressure;
+    WaterHost host = start(kShort, kLong, false, {.calmingTime = 1.0f});
+    const auto highest = [&host](int frames) {
+        for (int i = 0; i < frames; ++i) host.advance(1.0 / 60);
+        const auto [low, high] = std::minmax_element(host.heights().begin(), host.heights().end());
+        return std::max(-*low, *high);
+    };
+    for (const float weight : {kNan, kInfinity, -kInfinity}) host.splash(20, 30, weight);
+    host.splash(kNan, 30, 1.0f);
+    host.touch(TouchAction::down, kInfinity, 30, 1.0f);
+    EXPECT_EQ(highest(9), 0.0f);
+    host.touch(TouchAction::down, 20, 30, kNan);
+    const float lightest = highest(6);
+    EXPECT_GT(lightest, 0.1f) << "a touch without a weight counts as the lightest";
+    highest(600);
+    host.touch(TouchAction::down, 20, 30, 1.0e38f);
+    host.touch(TouchAction::move, -1.0e300, 1.0e300, 1.0e38f);
+    host.touch(TouchAction::up, 1.0e300, 0.0, kNan);
+    EXPECT_LT(highest(6), 6.0f * lightest) << "and the heaviest five times as much";
+    host.splash(20, 30, 1.0e38f);
+    EXPECT_GT(highest(6), 10.0f);
+    EXPECT_LT(highest(1000), 0.5f);
+    host.splash(20, 30, 1.0f);
+    EXPECT_GT(highest(6), 1.0f);
+}
+
+// A step, and at the left and right edges of the picture a colour of their own, which must not be smeared.
+TEST_F(Host, thePictureReachesEveryEdgeAtAnySize) {
+    for (const auto& [width, height] :
+         {std::pair{390, 844},
+          {360, 640},
+          {360, 800},
+          {393, 852},
+          {412, 915},
+          {430, 932},
+          {768, 1024},
+          {810, 1080},
+          {1024, 768},
+          {1366, 768},
+          {300, 300}}) {
+        SCOPED_TRACE(testing::Message() << width << " x " << height);
+        Picture ruler = {width, height, {}};
+        for (int y = 0; y < height; ++y) {
+            for (int x = 0; x < width; ++x) {
+                const auto tick = [](int place) { return static_cast<std::uint8_t>(place / 4 % 2 ? 200 : 50); };
+                ruler.rgba.insert(ruler.rgba.end(), {tick(x), tick(y), 0, 255});
+            }
         }
-        constexpr int kFar = std::numeric_limits<int>::max();
-        host.touch(TouchAction::down, 20, 30, 1.0e38f);
-        host.touch(TouchAction::move, -kFar, kFar, 1.0e38f);
-        host.touch(TouchAction::up, kFar, -kFar, kNan);
-        EXPECT_NEAR(highest(), 90.0f, 10.0f);
-        host.setLook(look);
-        host.advance(0.1);
-        host.setLook({.calmingTime = 1.0f});
-        for (int i = 0; i < 100; ++i) host.advance(0.1);
-        EXPECT_LT(highest(), 0.5f);
-        host.splash(20, 30, 1.0f);
-        EXPECT_GT(highest(), 3.0f);
+        renewContext(width, height);
+        resetGestures();
+        const Pictures rulers = {ruler, ruler, smoothPicture(16, 16, 3)};
+        WaterHost host({.meshVertices = 32}, width, height, 1);
+        host.setUp(false);
+        host.loadPictures(sourceOf(rulers));
+        host.draw();
+        const auto pixels = readPixels(width, height);
+        // The ticks along the last pixels before each edge change as often as in the middle.
+        const auto changes = [&](std::size_t channel, int from, int next) {
+            int result = 0;
+            for (int i = 1; i < 13; ++i) {
+                const auto at = [&](int k) { return pixels[static_cast<std::size_t>(from + k * next)][channel] > 125; };
+                result += at(i) != at(i - 1);
+            }
+            return result;
+        };
+        const int middle = height / 2 * width;
+        EXPECT_GE(changes(0, middle, 1), 2);
+        EXPECT_GE(changes(0, middle + width - 1, -1), 2);
+        EXPECT_GE(changes(1, width / 2, width), 2);
+        EXPECT_GE(changes(1, (height - 1) * width + width / 2, -width), 2);
     }
+}
+
+TEST(Fitted, keepsTheMiddleAndTheMeanOfWhatItScalesDown) {
+    Picture fine = {600, 1000, {}};
+    for (int i = 0; i < 600 * 1000; ++i) {
+        const auto level = static_cast<std::uint8_t>((i % 600 + i / 600) % 2 ? 255 : 1);  // aliases into anything
+        fine.rgba.insert(fine.rgba.end(), {level, static_cast<std::uint8_t>(i / 600 / 4), 7, 255});
+    }
+    const Picture small = fitted(fine, 91, 90);
+    EXPECT_EQ(std::pair(small.width, small.height), std::pair(91, 90));
+    for (int i = 0; i < 91 * 90; ++i) {
+        const std::uint8_t* const pixel = &small.rgba[static_cast<std::size_t>(4 * i)];
+        ASSERT_NEAR(pixel[0], 128, 12);
+        // 600 pixels of width for 91, so the middle 593 rows for 90.
+        ASSERT_NEAR(pixel[1], (500 + (i / 91 + 0.5 - 45) * 600 / 91) / 4, 1.0);
+        ASSERT_EQ(std::pair(pixel[2], pixel[3]), std::pair(std::uint8_t{7}, std::uint8_t{255}));
+    }
+    const Picture crop = fitted(fine, 6000, 2000);
+    EXPECT_EQ(std::pair(crop.width, crop.height), std::pair(600, 200));
+    EXPECT_TRUE(std::equal(crop.rgba.begin(), crop.rgba.end(), fine.rgba.begin() + 4 * 600 * 400)) << "as they are";
 }

@@ -1,30 +1,30 @@
 // The water of one canvas, as one instance of this module. web/package/src/native.ts gives it types.
 //
-// The instance is made with `context`, a WebGL context, and `upload(background, light, proportions)`, which fills these
-// two WebGL textures: pictures go from the browser's decoder to the GPU and never through this module's memory. What
-// the library is handed over are placeholders of one pixel.
+// The instance is made with `context`, a WebGL context, and `load(slot, width, height)`, which fills the texture that
+// is bound: pictures go from the browser's decoder to the GPU and never through this module's memory. What the library
+// is handed over is a placeholder of one pixel.
 #include <emscripten.h>
 
 #include <cstdlib>
 #include <optional>
 
 #include "host/live_water.h"
-#include "jni/globals.h"
+#include "host/look_values.h"
+#include "host/picture.h"
 #include "platform/log_filter.h"
-
-// The page fills the look as an array of numbers in the order of look.properties.
-static_assert(sizeof(int) == 4 && sizeof(float) == 4 && alignof(Look) == 4);
 
 namespace {
 
 Look look;
 std::optional<LiveWater> water;
-bool landscape = false;
 
-// What was uploaded last.
-GLuint background = 0;
-GLuint light = 0;
-bool uploadDue = false;
+// Of a value of the look, where the page writes it.
+char name[32];
+
+// What the last hand-over of each slot asked for.
+struct {
+    int width, height;
+} wanted[3];
 
 }  // namespace
 
@@ -33,8 +33,8 @@ EM_JS(void, useContext, (), {
     GL.makeContextCurrent(GL.registerContext(Module["context"], {majorVersion: 1}));
 });
 
-EM_JS(void, upload, (GLuint background, GLuint light, double proportions), {
-    Module["upload"](GL.textures[background], GL.textures[light], proportions);
+EM_JS(void, load, (int slot, int width, int height), {
+    Module["load"](slot, width, height);
 });
 
 // The names of objects that were lost with their context must not reach the new one.
@@ -45,41 +45,64 @@ EM_JS(void, forgetObjects, (), {
 
 namespace {
 
-void uploadWhereNew() {
-    water->prepare();
-    const GLuint shown = landscape ? fluid.landscapeBG : fluid.portraitBG;
-    if (!uploadDue && shown == background && fluid.environment == light) return;
-    background = shown;
-    light = fluid.environment;
-    uploadDue = false;
-    upload(background, light, water->proportions());
+PictureSource pageSource() {
+    static const Picture pixel = {1, 1, {0, 0, 0, 255}};
+    static const Pictures placeholders = {pixel, pixel, pixel};
+    static const PictureSource placeholder = sourceOf(placeholders);
+    return {
+        [](PictureSlot slot, int width, int height) {
+            wanted[static_cast<int>(slot)] = {width, height};
+            placeholder.handOver(slot, 1, 1);
+        },
+        [](PictureSlot slot) {
+            const auto [width, height] = wanted[static_cast<int>(slot)];
+            load(static_cast<int>(slot), width, height);
+        }};
 }
 
 }  // namespace
 
 extern "C" {
 
-// Sizes are in pixels of the canvas here and below.
 EMSCRIPTEN_KEEPALIVE void begin(std::uint32_t seed) {
     quietenLog();
     useContext();
     // The ink draws from this generator.
     srand48(static_cast<long>(seed));
-    water.emplace(look, seed);
-    const Picture pixel = {1, 1, {0, 0, 0, 255}};
-    water->setPictures({pixel, pixel, pixel});
+    water.emplace(pageSource(), seed);
 }
 
-EMSCRIPTEN_KEEPALIVE Look* lookToFill() {
-    return &look;
+// A look is given value by value, each by its name, and then applied. False for a value that the look does not have or
+// whose limits refuse it.
+EMSCRIPTEN_KEEPALIVE char* nameToFill() {
+    return name;
+}
+EMSCRIPTEN_KEEPALIVE bool setLookValue(double value) {
+    const LookField* const field = fieldNamed(name);
+    return field && setValue(look, *field, value);
 }
 EMSCRIPTEN_KEEPALIVE void applyLook() {
     water->setLook(look);
 }
-EMSCRIPTEN_KEEPALIVE void resize(int width, int height) {
-    landscape = width > height;
-    water->resize(width, height);
+
+// CSS pixels, and the display's pixels for each.
+EMSCRIPTEN_KEEPALIVE void setView(double width, double height, double density, double seconds) {
+    water->setView(width, height, density, seconds);
 }
+EMSCRIPTEN_KEEPALIVE void setQuality(int quality) {
+    water->setQuality(static_cast<Quality>(quality));
+}
+// What the canvas is to have after frame() has answered `resize`; then resized().
+EMSCRIPTEN_KEEPALIVE int width() {
+    return water->width();
+}
+EMSCRIPTEN_KEEPALIVE int height() {
+    return water->height();
+}
+EMSCRIPTEN_KEEPALIVE void resized() {
+    water->resized();
+}
+
 EMSCRIPTEN_KEEPALIVE void setInk(bool withInk) {
     water->setInk(withInk);
 }
@@ -89,16 +112,20 @@ EMSCRIPTEN_KEEPALIVE void setRain(bool falling) {
 EMSCRIPTEN_KEEPALIVE void clearInk() {
     water->clearInk();
 }
-EMSCRIPTEN_KEEPALIVE void touch(int action, int x, int y, float pressure) {
-    water->touch(static_cast<TouchAction>(action), x, y, pressure);
+
+// Places are shares of the canvas. A pressure below 0 is that of a finger or a mouse, any other a pen's.
+EMSCRIPTEN_KEEPALIVE void touch(int action, float x, float y, float pressure, double seconds) {
+    water->touch(static_cast<TouchAction>(action), x, y, pressure < 0.0f ? 1.0f : penWeight(pressure), seconds);
 }
-EMSCRIPTEN_KEEPALIVE void splash(int x, int y, float pressure) {
-    water->splash(x, y, pressure);
+EMSCRIPTEN_KEEPALIVE void splash(float x, float y, float weight) {
+    water->splash(x, y, weight);
 }
 
-// Asks for another upload.
-EMSCRIPTEN_KEEPALIVE void renewPictures() {
-    uploadDue = true;
+// A sum of 1 for the portrait, 2 for the landscape and 4 for the light.
+EMSCRIPTEN_KEEPALIVE void picturesChanged(unsigned which) {
+    water->picturesChanged(which);
+}
+EMSCRIPTEN_KEEPALIVE void redraw() {
     water->redraw();
 }
 EMSCRIPTEN_KEEPALIVE void renewContext() {
@@ -106,11 +133,7 @@ EMSCRIPTEN_KEEPALIVE void renewContext() {
     water->renewContext();
 }
 EMSCRIPTEN_KEEPALIVE int frame(double seconds) {
-    const double start = emscripten_get_now();
-    if (!water->isResting()) uploadWhereNew();
-    const LiveWater::Frame done = water->frame(seconds);
-    if (done == LiveWater::Frame::drawn) water->noteWork((emscripten_get_now() - start) / 1000.0);
-    return static_cast<int>(done);
+    return static_cast<int>(water->frame(seconds));
 }
 
 }  // extern "C"

@@ -1,0 +1,73 @@
+#include "host/pace.h"
+
+#include <algorithm>
+
+namespace {
+
+constexpr Pace::Level kLevels[] = {{1.0, 1.0}, {0.7, 1.0}, {0.5, 1.0}, {0.5, 0.8}, {0.5, 0.65}, {0.5, 0.5}};
+constexpr int kMeshLevels = 3;
+constexpr int kLowest = static_cast<int>(std::size(kLevels)) - 1;
+
+// An interval of a display that shows every frame varies by less than this.
+constexpr double kLate = 1.4;
+constexpr double kStartSeconds = 1.0;
+constexpr double kSettleSeconds = 0.15;
+constexpr double kMostPatience = 60.0;
+
+}  // namespace
+
+void Pace::allowResolution(bool allowed) {
+    lowest_ = allowed ? kLowest : kMeshLevels - 1;
+    level_ = std::min(level_, lowest_);
+}
+
+Pace::Level Pace::level() const {
+    return kLevels[level_];
+}
+
+void Pace::setLevel(int level, double now) {
+    level_ = level;
+    count_ = 0;
+    quietUntil_ = now + kSettleSeconds;
+}
+
+bool Pace::frameDrawn(double now, double shortest) {
+    if (quietUntil_ < 0.0) quietUntil_ = now + kStartSeconds;
+    const double interval = now - last_;
+    const bool follows = isFollowing_;
+    isFollowing_ = true;
+    last_ = now;
+    if (!follows || now < quietUntil_) return false;
+    intervals_[static_cast<std::size_t>(count_)] = interval;
+    if (++count_ < static_cast<int>(intervals_.size())) return false;
+    count_ = 0;
+    return judge(now, shortest);
+}
+
+bool Pace::judge(double now, double shortest) {
+    std::sort(intervals_.begin(), intervals_.end());
+    const double median = intervals_[intervals_.size() / 2];
+    rhythm_ = std::min(rhythm_, std::max(median, 1.0 / 240));
+    const bool isLate = median > kLate * std::max(rhythm_, shortest);
+    if (isLate && level_ < lowest_) {
+        if (level_ == 0) atBest_ = median;
+        // An attempt at a better level has failed.
+        if (now < retryAt_ + 2.0) patience_ = std::min(2 * patience_, kMostPatience);
+        retryAt_ = now + patience_;
+        setLevel(std::min(level_ + (median > 1.8 * rhythm_ ? 2 : 1), lowest_), now);
+        return true;
+    }
+    if (isLate && median > 0.9 * atBest_ && atBest_ > 0.0) {
+        // The coarsest frames come no sooner than the finest: it is the display that is slow.
+        rhythm_ = median;
+        atBest_ = 0.0;
+        setLevel(0, now);
+        return true;
+    }
+    if (!isLate && level_ > 0 && now >= retryAt_) {
+        retryAt_ = now;
+        setLevel(level_ - 1, now);
+        return true;
+    }
+    return false;
+}

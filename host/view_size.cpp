@@ -1,0 +1,25 @@
+#include "host/view_size.h"
+
+#include <algorithm>
+#include <cmath>
+
+namespace {
+
+// Smaller views than this are drawn as large, and shown smaller.
+constexpr double kShortestSide = 64.0;
+
+// More pixels along a side than any graphics processor of today draws at full speed.
+constexpr double kLongestSide = 4096.0;
+
+}  // namespace
+
+Size drawnSize(const ViewSize& view, Quality quality, double resolution) {
+    const double most = quality == Quality::low ? 1.0 : quality == Quality::high ? 3.0 : 2.0;
+    const double longer = std::max(view.width, view.height);
+    const double scale = std::min(
+        std::min(view.density, most) * (quality == Quality::automatic ? resolution : 1.0), kLongestSide / longer);
+    const auto side = [scale](double length) {
+        return static_cast<int>(std::lround(std::max(length * scale, kShortestSide)));
+    };
+    return {side(view.width), side(view.height)};
+}

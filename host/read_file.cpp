@@ -23,7 +23,7 @@ std::optional<std::string> readFile(
     std::ifstream file(path, std::ios::binary);
     if (!file) return fail(std::strerror(errno));
     std::string content(static_cast<std::size_t>(status.st_size), '\0');
-    file.read(content.data(), status.st_size);
+    file.read(content.data(), static_cast<std::streamsize>(content.size()));
     content.resize(static_cast<std::size_t>(file.gcount()));
     return content;
 }

@@ -117,6 +117,10 @@ EMSCRIPTEN_KEEPALIVE void clearInk() {
 EMSCRIPTEN_KEEPALIVE void touch(int action, float x, float y, float pressure, double seconds) {
     water->touch(static_cast<TouchAction>(action), x, y, pressure < 0.0f ? 1.0f : penWeight(pressure), seconds);
 }
+// A finger that comes down and is lifted at once.
+EMSCRIPTEN_KEEPALIVE void drop(float x, float y, float weight, double seconds) {
+    for (const TouchAction action : {TouchAction::down, TouchAction::up}) water->touch(action, x, y, weight, seconds);
+}
 EMSCRIPTEN_KEEPALIVE void splash(float x, float y, float weight) {
     water->splash(x, y, weight);
 }

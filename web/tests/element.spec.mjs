@@ -233,6 +233,18 @@ test('a high element shows the portrait, and off screen a still picture until it
     await expect.poll(live).toBe(true);
 });
 
+test.describe('dense', () => {
+    test.use({ deviceScaleFactor: 2, viewport: { width: 1728, height: 1080 } });
+    test('in the highest quality every pixel of the display is drawn', async ({ page }) => {
+        await show(page, `${script}<body style="margin: 0"><tidemark-water src="pond.png" quality="high" style="height: 1080px">`);
+        await element(page).and(page.locator('[shown]')).waitFor();
+        const size = () => element(page).evaluate(({ water: { canvas } }) => [canvas.width, canvas.height]);
+        await expect.poll(size).toEqual([3456, 2160]);
+        await element(page).evaluate((water) => { water.quality = 'low'; });
+        await expect.poll(size).toEqual([1728, 1080]);
+    });
+});
+
 test('the packed package works in a fresh project, with and without a bundler', async ({ page }, { outputDir }) => {
     test.slow();
     const web = new URL('..', import.meta.url).pathname;

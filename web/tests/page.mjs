@@ -39,16 +39,20 @@ export const takeOver = (page) =>
         const { canvas, gl, native } = water;
         water.pause();
         let seconds = performance.now() / 1000;
-        window.native = native;
+        performance.now = () => 1000 * seconds;
+        const frame = () => water.frame(native, 1000 * (seconds += 1 / 60));
         window.frames = (count) => {
-            for (let i = 0; i < count; ++i) native._frame((seconds += 1 / 60));
+            for (let i = 0; i < count; ++i) frame();
         };
         window.settle = () => {
-            for (let i = 0; native._frame((seconds += 1 / 60)) !== 0; ++i) if (i > 2000) throw new Error('no rest');
+            for (let i = 0; frame() !== 0; ++i) if (i > 2000) throw new Error('no rest');
         };
+        // In CSS pixels, so many seconds after the last frame.
+        window.touch = (action, x, y, later = 0) =>
+            native._touch(action, x / canvas.clientWidth, y / canvas.clientHeight, -1, seconds + later);
         // Only in the task that has drawn: afterwards the browser takes the canvas away. Rows from the top.
         window.read = () => {
-            native._renewPictures();
+            native._redraw();
             window.frames(1);
             const { width, height } = canvas;
             const pixels = new Uint8Array(4 * width * height);

@@ -17,10 +17,10 @@ const slide = (page, name, value) => page.getByLabel(name, { exact: true }).fill
 const touchAndRun = () => {
     window.frames(1);  // the time since the last one is over
     for (let x = 60; x <= 140; x += 20) {
-        window.native._touch(x === 60 ? 0 : 2, x, 200, 1);
+        window.touch(x === 60 ? 0 : 2, x, 200);
         window.frames(1);
     }
-    window.native._touch(1, 140, 200, 1);
+    window.touch(1, 140, 200);
     window.frames(20);
     return window.read();
 };

@@ -8,7 +8,7 @@ const screens = {
 };
 for (const [name, screen] of Object.entries(screens)) {
     test.describe(name, () => {
-        test.use(screen);
+        test.use({ ...screen, contextOptions: { reducedMotion: 'reduce' } });  // no slow frames make it coarser
         test('fills the screen, at most twice as dense as the page', async ({ page }) => {
             await open(page);
             const canvas = page.getByRole('button', { name: /Water/ });

@@ -48,35 +48,57 @@ test('a tap raises rings that come to rest, and then no frames are asked for', a
     })).toBe(0);
 });
 
-test('pointers become touches: one draws, as often as the library expects, and the others only ripple', async ({ page }) => {
+test('pointers become touches: one draws with every report, at its place and time, and the others only ripple', async ({ page }) => {
     await open(page, '#ink=0');
     const seen = await page.evaluate(() => {
-        const { water } = document.querySelector('tidemark-water');
+        const { native } = document.querySelector('tidemark-water').water;
         const seen = [];
-        water.touch = (...touch) => seen.push(touch);
-        water.ripple = (x, y) => seen.push(['ripple', x, y]);
-        let time = 1000;
-        const send = (type, pointerId, clientX, later, options) => {
+        native._touch = (action, x, y, pressure, seconds) => seen.push([action, 200 * x, 300 * y, pressure, 1000 * seconds]);
+        native._splash = (x) => seen.push(['ripple', 200 * x]);
+        const make = (type, pointerId, clientX, timeStamp, options) => {
             const event = new PointerEvent(type, {
-                pointerId, clientX, clientY: 10, button: 0, buttons: 1, pointerType: 'touch', bubbles: true, ...options });
-            Object.defineProperty(event, 'timeStamp', { value: (time += later) });
-            document.querySelector('tidemark-water').dispatchEvent(event);
+                pointerId, clientX, clientY: 15, button: 0, buttons: 1, pointerType: 'touch', pressure: 0.8, bubbles: true, ...options });
+            return Object.defineProperty(event, 'timeStamp', { value: timeStamp });
         };
-        send('pointerdown', 1, 10, 0);
-        send('pointermove', 1, 11, 1);    // a screen of a thousand reports a second
-        send('pointermove', 1, 12, 7);
-        send('pointerdown', 2, 90, 1);
-        send('pointermove', 2, 91, 9);    // not far enough for another ripple
-        send('pointermove', 2, 120, 9);
-        send('pointerup', 2, 120, 1);
-        send('pointerup', 1, 13, 1);
-        send('pointerdown', 2, 90, 1, { pointerType: 'pen', pressure: 0.25 });
-        send('pointercancel', 2, 92, 9);
-        send('pointermove', 3, 40, 9, { pointerType: 'mouse', buttons: 0 });
-        return seen;
+        const send = (...event) => document.querySelector('tidemark-water').dispatchEvent(make(...event));
+        send('pointerdown', 1, 10, 1000);
+        const moved = make('pointermove', 1, 12.5, 1009);
+        moved.getCoalescedEvents = () => [make('pointermove', 1, 11, 1001), moved];
+        document.querySelector('tidemark-water').dispatchEvent(moved);
+        send('pointerdown', 2, 90, 1010);
+        send('pointermove', 2, 91, 1019);  // not far enough for another ripple
+        send('pointermove', 2, 120, 1028);
+        send('pointerup', 2, 120, 1029);
+        send('pointerup', 1, 13, 1030);
+        send('pointerdown', 2, 90, 1031, { pointerType: 'pen', pressure: 0.25 });
+        send('pointercancel', 2, 92, 1040);
+        send('pointermove', 3, 40, 1049, { pointerType: 'mouse', buttons: 0 });
+        return seen.map((one) => one.map((part) => (part.toFixed ? Number(part.toFixed(6)) : part)));
     });
-    expect(seen).toEqual([[0, 10, 10, 1], [2, 12, 10, 1], ['ripple', 90, 10], ['ripple', 120, 10], [1, 13, 10, 1],
-        [0, 90, 10, 0.5], [3, 92, 10, 1], ['ripple', 40, 10]]);
+    expect(seen).toEqual([[0, 10, 15, -1, 1000], [2, 11, 15, -1, 1001], [2, 12.5, 15, -1, 1009], ['ripple', 90], ['ripple', 120],
+        [1, 13, 15, -1, 1030], [0, 90, 15, 0.25, 1031], [3, 92, 15, -1, 1040], ['ripple', 40]]);
+});
+
+test('a canvas whose size keeps changing is stretched, and gets its pixels once', async ({ page }) => {
+    await open(page, '#ink=0');
+    await takeOver(page);
+    expect(await page.evaluate(async () => {
+        const { canvas } = window.tidemark.water.water;
+        const sizes = [];
+        const follow = async (height) => {
+            document.querySelector('#water').style.height = `${height}px`;
+            for (let i = 0; i < 2; ++i) await new Promise(requestAnimationFrame);  // until the observer has seen it
+            for (let i = 0; i < 3; ++i) {
+                window.frames(1);
+                if (sizes.at(-1) !== canvas.height) sizes.push(canvas.height);
+            }
+        };
+        window.settle();
+        for (let height = 290; height > 200; height -= 10) await follow(height);
+        window.frames(6);
+        sizes.push(canvas.height);
+        return sizes;
+    })).toEqual([300, 210]);
 });
 
 test('keys and buttons switch the ink, and clear it', async ({ page }) => {
@@ -85,8 +107,8 @@ test('keys and buttons switch the ink, and clear it', async ({ page }) => {
     await takeOver(page);
     const flat = await flatPixels(page);
     const drawn = () => {
-        window.native._touch(0, 100, 150, 1);
-        window.native._touch(1, 100, 150, 1);
+        window.touch(0, 100, 150);
+        window.touch(1, 100, 150);
         window.frames(25);
         return window.read();
     };

@@ -51,11 +51,11 @@ export const presets: Readonly<Record<string, Preset>> = {
     },
 };
 
-/** Fineness of the waves and of the picture. */
-export type Quality = 'low' | 'medium' | 'high';
-const vertices = { low: 96, medium: 0, high: 256 };  // 0: by the size of the view and the time that frames take
+/** How many pixels are drawn. */
+export type Quality = 'auto' | 'low' | 'medium' | 'high';
 
 export interface Choices {
+    /** At most as many pixels for a CSS pixel as the display has, and as 1, 2 or 3; "auto" as frames keep the pace. */
     quality?: Quality | null;
     /** A key of `presets`. */
     preset?: string | null;
@@ -95,12 +95,11 @@ export function withinRange(look: Look): Look {
 }
 
 /** The whole look that these choices give, by the names of host/look.properties. */
-export function lookOf({ quality, preset, inkColor, rain, look }: Choices): Look {
+export function lookOf({ preset, inkColor, rain, look }: Choices): Look {
     const named = presets[preset ?? ''];
     const drops = Math.min(rain ?? named?.rain ?? 0, mostDrops);
     return {
         ...defaultLook(),
-        meshVertices: vertices[quality ?? 'medium'] ?? vertices.medium,
         ...(drops > 0 && { rainDropsPerSecond: drops, rainAmplitude: dropHeight(drops) }),
         ...named?.look,
         ...inkOf(inkColor ?? named?.inkColor ?? ''),

@@ -2,7 +2,7 @@
 // keeps its state in globals.
 import createInstance from '../../../build/web/tidemark-water.js';
 import { WaterError } from './errors.js';
-import { lookKeys, type Look } from './look.js';
+import type { Look } from './look.js';
 
 // The action codes of the library.
 export enum Touch {
@@ -16,6 +16,13 @@ export enum Frame {
     resting = 0,
     waiting = 1,
     drawn = 2,
+    resize = 3,
+}
+
+export enum Slot {
+    portrait = 0,
+    landscape = 1,
+    light = 2,
 }
 
 // The smallest module with a vector in it: a function that makes one and drops it.
@@ -52,33 +59,40 @@ export function compile(): Promise<WebAssembly.Module> {
     }));
 }
 
-export type Upload = (background: WebGLTexture, light: WebGLTexture, proportions: number) => void;
+/** Fills the texture that is bound with width x height pixels; the light has as many as it likes. */
+export type Load = (slot: Slot, width: number, height: number) => void;
 
 interface Instance {
-    HEAP32: Int32Array;
-    HEAPF32: Float32Array;
+    HEAPU8: Uint8Array;
     _begin(seed: number): void;
-    _lookToFill(): number;
+    _nameToFill(): number;
+    _setLookValue(value: number): number;
     _applyLook(): void;
-    _resize(width: number, height: number): void;
+    _setView(width: number, height: number, density: number, seconds: number): void;
+    _setQuality(quality: number): void;
+    _width(): number;
+    _height(): number;
+    _resized(): void;
     _setInk(withInk: boolean): void;
     _setRain(falling: boolean): void;
     _clearInk(): void;
-    _touch(action: number, x: number, y: number, pressure: number): void;
-    _splash(x: number, y: number, pressure: number): void;
-    _renewPictures(): void;
+    _touch(action: number, x: number, y: number, pressure: number, seconds: number): void;
+    _drop(x: number, y: number, weight: number, seconds: number): void;
+    _splash(x: number, y: number, weight: number): void;
+    _picturesChanged(which: number): void;
+    _redraw(): void;
     _renewContext(): void;
     _frame(seconds: number): number;
 }
 export type Native = Instance & { setLook(look: Look): void };
 
 export async function instantiate(
-    module: WebAssembly.Module, context: WebGLRenderingContext, upload: Upload, seed: number,
+    module: WebAssembly.Module, context: WebGLRenderingContext, load: Load, seed: number,
 ): Promise<Native> {
     const instance = await new Promise<unknown>((resolve, reject) => {
         createInstance({
             context,
-            upload,
+            load,
             instantiateWasm(imports: WebAssembly.Imports, done: (instance: WebAssembly.Instance) => void) {
                 WebAssembly.instantiate(module, imports).then(done, reject);
                 return {};
@@ -89,10 +103,11 @@ export async function instantiate(
     delete (context.canvas as { GLctxObject?: unknown }).GLctxObject;  // the canvas may outlive the water
     return Object.assign(instance, {
         setLook(look: Look) {
-            const place = instance._lookToFill() >> 2;
-            lookKeys.forEach(({ name, whole }, i) => {
-                (whole ? instance.HEAP32 : instance.HEAPF32)[place + i] = look[name]!;
-            });
+            const place = instance._nameToFill();
+            for (const [name, value] of Object.entries(look)) {
+                instance.HEAPU8.set(new TextEncoder().encode(`${name}\0`), place);
+                if (!instance._setLookValue(value)) console.warn(`tidemark-water: the look refuses ${name} = ${value}.`);
+            }
             instance._applyLook();
         },
     });

@@ -115,10 +115,8 @@ async function load(source: Source): Promise<Picture> {
 
 let scratch: HTMLCanvasElement | undefined;
 
-/** Fills `texture` with the middle of the picture in the proportions of width x height. Rows go from the top. */
-export function uploadCover(
-    gl: WebGLRenderingContext, texture: WebGLTexture, picture: Picture, width: number, height: number,
-): void {
+/** Fills the texture that is bound with the middle of the picture, scaled to width x height. Rows go from the top. */
+export function uploadCover(gl: WebGLRenderingContext, picture: Picture, width: number, height: number): void {
     scratch ??= canvasOf(width, height);
     if (scratch.width !== width) scratch.width = width;
     if (scratch.height !== height) scratch.height = height;
@@ -131,7 +129,7 @@ export function uploadCover(
             width * scale, height * scale, 0, 0, width, height);
     }
     try {
-        upload(gl, texture, scratch);
+        upload(gl, scratch);
     } catch {  // a canvas that was drawn on since
         scratch = undefined;
         throw new WaterError('cross-origin', 'The picture holds what this page may not use.');
@@ -139,10 +137,8 @@ export function uploadCover(
     if (!picture.moving()) scratch.width = scratch.height = 1;
 }
 
-export function upload(gl: WebGLRenderingContext, texture: WebGLTexture, source: TexImageSource): void {
-    gl.bindTexture(gl.TEXTURE_2D, texture);
+export function upload(gl: WebGLRenderingContext, source: TexImageSource): void {
     gl.texImage2D(gl.TEXTURE_2D, 0, gl.RGBA, gl.RGBA, gl.UNSIGNED_BYTE, source);
-    gl.bindTexture(gl.TEXTURE_2D, null);
 }
 
 let shipped: Promise<ImageBitmap> | undefined;

@@ -2,10 +2,6 @@
 // ripples.
 import { Touch } from './native.js';
 
-// Devices report positions up to a thousand times a second. The library tells slow strokes from fast ones by the
-// distance from one touch to the next, for screens that look 120 times a second.
-const shortestInterval = 1000 / 130;
-
 // Of a pointer that only ripples: pixels from one ripple to the next, and their height as a share of a touch's.
 const spacing = 14;
 const hoverHeight = 0.25;
@@ -14,37 +10,27 @@ const fingerHeight = 0.3;
 export interface Touched {
     hovers(): boolean;
     presses(): boolean;
-    /** Positions are in the window's pixels. */
-    touch(action: Touch, clientX: number, clientY: number, pressure: number): void;
-    ripple(clientX: number, clientY: number, pressure: number): void;
-}
-
-// A mouse and most screens report no pressure of their own; half is what a pen reports for an ordinary stroke.
-function pressureOf({ pointerType, pressure }: PointerEvent): number {
-    return pointerType === 'pen' ? Math.max(0.1, 2 * pressure) : 1;
+    touch(action: Touch, event: PointerEvent): void;
+    ripple(event: PointerEvent, height: number): void;
 }
 
 /** Events stay where they are, so that what lies on the water can be clicked, selected and scrolled. */
 export function followPointers(target: EventTarget, water: Touched, signal: AbortSignal): void {
     let drawing: number | null = null;
-    let lastTime = 0;
     const lastRipple = new Map<number, [number, number]>();  // of each pointer that only ripples
 
-    const send = (action: Touch, event: PointerEvent) => {
-        water.touch(action, event.clientX, event.clientY, pressureOf(event));
-        lastTime = event.timeStamp;
-    };
-    const trail = ({ pointerId, clientX, clientY }: PointerEvent, height: number) => {
+    const trail = (event: PointerEvent, height: number) => {
+        const { pointerId, clientX, clientY } = event;
         const [x, y] = lastRipple.get(pointerId) ?? [-spacing, -spacing];
         if (Math.hypot(clientX - x, clientY - y) < spacing) return;
         lastRipple.set(pointerId, [clientX, clientY]);
-        water.ripple(clientX, clientY, height);
+        water.ripple(event, height);
     };
     const end = (action: Touch) => (event: PointerEvent) => {
         lastRipple.delete(event.pointerId);
         if (event.pointerId !== drawing) return;
         drawing = null;
-        send(action, event);
+        water.touch(action, event);
     };
     // Of the window before anybody can stop them, or a stroke would never end.
     const listen = (on: EventTarget, type: string, call: (event: PointerEvent) => void) =>
@@ -54,10 +40,10 @@ export function followPointers(target: EventTarget, water: Touched, signal: Abor
         if (!water.presses() || event.button !== 0) return;
         if (drawing === null || drawing === event.pointerId) {
             drawing = event.pointerId;
-            send(Touch.down, event);
+            water.touch(Touch.down, event);
         } else {
             lastRipple.set(event.pointerId, [event.clientX, event.clientY]);
-            water.ripple(event.clientX, event.clientY, 1);
+            water.ripple(event, 1);
         }
     });
     listen(target, 'pointermove', (event) => {
@@ -72,10 +58,9 @@ export function followPointers(target: EventTarget, water: Touched, signal: Abor
     listen(window, 'pointermove', (event) => {
         if (event.pointerId !== drawing) return;
         if (event.buttons === 0) return end(Touch.up)(event);
-        const steps = event.getCoalescedEvents?.() ?? [];
-        for (const step of steps.length > 0 ? steps : [event]) {
-            if (step.timeStamp - lastTime >= shortestInterval) send(Touch.move, step);
-        }
+        // All that the device has reported since the last frame.
+        const reports = event.getCoalescedEvents?.() ?? [];
+        for (const report of reports.length > 0 ? reports : [event]) water.touch(Touch.move, report);
     });
     listen(window, 'pointerup', end(Touch.up));
     listen(window, 'pointercancel', end(Touch.cancel));

@@ -1,8 +1,8 @@
 // The water of one canvas: what is chosen flows in, touches come from the pointers, frames out of the loop.
 import { borrow, contextOf, giveBack, offer, type Borrower } from './contexts.js';
 import { WaterError } from './errors.js';
-import { lookOf, presets, type Choices } from './look.js';
-import { compile, Frame, instantiate, Touch, type Native } from './native.js';
+import { lookOf, presets, withinRange, type Choices } from './look.js';
+import { compile, Frame, instantiate, Slot, type Native, type Touch } from './native.js';
 import { loadPicture, plainPicture, shippedLight, upload, uploadCover, type Picture, type Source } from './pictures.js';
 import { followPointers, type Touched } from './pointers.js';
 
@@ -24,7 +24,7 @@ export interface Options extends Choices {
 }
 
 export interface DropOptions {
-    /** 1 is a touch. */
+    /** 1 is a touch. With ink, 0.3 to 1.5. */
     strength?: number;
     ink?: boolean;
 }
@@ -39,9 +39,8 @@ export interface Cost {
     work: number;
 }
 
-const densities = new Map([['low', 1], ['medium', 2], ['high', 3]]);
-const longestSide = 2048;  // as much as a phone draws at full speed
-const shortestSide = 64;
+const qualities = ['auto', 'low', 'medium', 'high'];  // in the host's order
+const backgrounds = (1 << Slot.portrait) | (1 << Slot.landscape);
 const parkAfter = 4000;    // milliseconds out of view
 const touchCounts = 3000;  // milliseconds that a touched water is not taken its context
 const lightSide = 512;
@@ -75,6 +74,7 @@ export class Water extends EventTarget implements Borrower, Touched {
     private native: Native | undefined;
     private gl: WebGLRenderingContext | undefined;
     private lose: WEBGL_lose_context | null = null;
+    private longestSide = Infinity;  // that the graphics can draw
     private live = false;     // the context is there, and the library in it
     private opening = false;
     private failed = false;
@@ -89,7 +89,8 @@ export class Water extends EventTarget implements Borrower, Touched {
     private lastTouch = -touchCounts;
     private parkTimer = 0;
     private dropTimer = 0;
-    private given = '';       // the look that the library has
+    private view = '';        // that the library has
+    private given = '';       // and the look
     private picture: Picture | undefined;
     private pictureTicket = 0;
     private pictureSource: Source | null | undefined;
@@ -113,7 +114,7 @@ export class Water extends EventTarget implements Borrower, Touched {
         followPointers(target, this, signal);
         document.addEventListener('visibilitychange', () => this.update(), { signal });
         this.reducedMotion.addEventListener('change', () => this.apply(), { signal });
-        addEventListener('resize', () => this.fit(), { signal });  // also another pixel density
+        this.watchDensity();
         canvas.addEventListener('webglcontextlost', () => this.contextLost(), { signal });
         canvas.addEventListener('webglcontextrestored', () => this.contextRestored(), { signal });
         this.fit();
@@ -138,14 +139,11 @@ export class Water extends EventTarget implements Borrower, Touched {
 
     /** A drop at a point of the canvas, in CSS pixels from its top left corner. */
     drop(x: number, y: number, { strength = 1, ink = false }: DropOptions = {}): void {
-        const [column, row] = this.pixel(x, y);
+        const column = x / (this.canvas.clientWidth || 1);
+        const row = y / (this.canvas.clientHeight || 1);
         const fall = () => {
-            if (ink) {
-                this.native?._touch(Touch.down, column, row, strength);
-                this.native?._touch(Touch.up, column, row, strength);
-            } else {
-                this.native?._splash(column, row, strength);
-            }
+            if (ink) this.native?._drop(column, row, strength, performance.now() / 1000);
+            else this.native?._splash(column, row, strength);
         };
         if (this.shown) fall();
         else this.addEventListener('ready', fall, { once: true, signal: this.end.signal });
@@ -172,7 +170,7 @@ export class Water extends EventTarget implements Borrower, Touched {
         let from = this.canvas;
         // The canvas is readable only in the task that has drawn.
         if (!this.drawAgain()) {
-            if (!this.still || this.still.width < shortestSide) return Promise.reject(new Error('no picture yet'));
+            if (!this.still || this.still.width === 1) return Promise.reject(new Error('no picture yet'));
             from = this.still;
         }
         return new Promise((resolve, reject) =>
@@ -205,12 +203,13 @@ export class Water extends EventTarget implements Borrower, Touched {
     presses(): boolean {
         return this.interactions().includes('press');
     }
-    touch(action: Touch, clientX: number, clientY: number, pressure: number): void {
-        this.native?._touch(action, ...this.pixelAt(clientX, clientY), pressure);
+    touch(action: Touch, event: PointerEvent): void {
+        const pressure = event.pointerType === 'pen' ? event.pressure : -1;  // that of others is made up
+        this.native?._touch(action, ...this.place(event), pressure, event.timeStamp / 1000);
         this.touched();
     }
-    ripple(clientX: number, clientY: number, pressure: number): void {
-        this.native?._splash(...this.pixelAt(clientX, clientY), pressure);
+    ripple(event: PointerEvent, height: number): void {
+        this.native?._splash(...this.place(event), height);
         this.touched();
     }
 
@@ -256,20 +255,14 @@ export class Water extends EventTarget implements Borrower, Touched {
         return this.inView && (!this.paused || this.stale) && !this.failed && !document.hidden && !this.end.signal.aborted;
     }
 
-    private pixel(x: number, y: number): [number, number] {
-        const { canvas } = this;
-        return [
-            Math.round((x / (canvas.clientWidth || 1)) * canvas.width),
-            Math.round((y / (canvas.clientHeight || 1)) * canvas.height),
-        ];
+    private place({ clientX, clientY }: PointerEvent): [number, number] {
+        const { left, top, width, height } = this.canvas.getBoundingClientRect();
+        return [(clientX - left) / (width || 1), (clientY - top) / (height || 1)];
     }
-    private pixelAt(clientX: number, clientY: number): [number, number] {
-        const { canvas } = this;
-        const { left, top, width, height } = canvas.getBoundingClientRect();
-        return [
-            Math.round(((clientX - left) / (width || 1)) * canvas.width),
-            Math.round(((clientY - top) / (height || 1)) * canvas.height),
-        ];
+
+    // The one of the two pictures that is shown.
+    private slot(): Slot {
+        return this.canvas.width > this.canvas.height ? Slot.landscape : Slot.portrait;
     }
 
     private fail(error: unknown): void {
@@ -325,15 +318,17 @@ export class Water extends EventTarget implements Borrower, Touched {
             if (this.native) {
                 this.native._renewContext();
             } else {
-                const load = (background: WebGLTexture, shine: WebGLTexture, proportions: number) =>
-                    this.loadTextures(background, shine, proportions);
-                const native = await instantiate(module, held.gl, load, 1 + Math.floor(Math.random() * 1e6));
+                const { gl } = held;
+                const load = (slot: Slot, width: number, height: number) => this.load(slot, width, height);
+                const native = await instantiate(module, gl, load, 1 + Math.floor(Math.random() * 1e6));
                 if (this.end.signal.aborted) return;
                 this.native = native;
-                native._resize(this.canvas.width, this.canvas.height);
+                this.longestSide = Math.min(gl.getParameter(gl.MAX_TEXTURE_SIZE), ...gl.getParameter(gl.MAX_VIEWPORT_DIMS));
+                if (this.picture) native._picturesChanged(backgrounds);
+                if (this.light) native._picturesChanged(1 << Slot.light);
+                this.view = '';
             }
             this.live = true;
-            this.given = '';
             this.apply();
             if (!this.inView) this.setInView(false);
         } catch (error) {
@@ -367,27 +362,23 @@ export class Water extends EventTarget implements Borrower, Touched {
         this.wake();
     }
 
+    // Where the window moves to a display of another density, nothing else tells so.
+    private watchDensity(): void {
+        const density = matchMedia(`(resolution: ${devicePixelRatio}dppx)`);
+        density.addEventListener('change', () => (this.fit(), this.watchDensity()), { once: true, signal: this.end.signal });
+    }
+
     private fit(): void {
-        const { canvas } = this;
-        const density = densities.get(this.options.quality ?? 'medium') ?? 2;
-        const { clientWidth, clientHeight } = canvas;
+        const { clientWidth, clientHeight } = this.canvas;
         if (!clientWidth || !clientHeight) return;  // not laid out now
-        const scale = Math.min(devicePixelRatio, density, longestSide / Math.max(clientWidth, clientHeight));
-        const width = Math.max(shortestSide, Math.round(clientWidth * scale));
-        const height = Math.max(shortestSide, Math.round(clientHeight * scale));
-        if (width === canvas.width && height === canvas.height) return;
-        canvas.width = width;
-        canvas.height = height;
+        const most = this.longestSide / Math.max(clientWidth, clientHeight);
+        const view = [clientWidth, clientHeight, Math.min(devicePixelRatio, most)] as const;
+        if (this.view === String(view)) return;
+        this.view = String(view);
+        this.native?._setView(...view, performance.now() / 1000);
+        this.stale = true;
         this.choosePictures();
-        this.native?._resize(width, height);
-        this.renewPictures();
-        if (this.live && this.running()) {
-            // At once, or the canvas would show nothing until the next frame.
-            cancelAnimationFrame(this.asked);
-            this.draw(performance.now());
-        } else {
-            this.wake();
-        }
+        this.wake();
     }
 
     private choosePictures(): void {
@@ -404,14 +395,13 @@ export class Water extends EventTarget implements Borrower, Touched {
         const light = loaded || (source && this.light) || await shippedLight();
         if (!isLast()) return;
         this.light = light;
-        this.renewPictures();
-        this.wake();
+        this.tell(1 << Slot.light);
     }
 
     // A picture that did not load is tried again only when it is asked for anew.
     private async choosePicture(anew = false): Promise<void> {
         const { src = null, srcPortrait = null } = this.options;
-        const source = this.canvas.height > this.canvas.width && srcPortrait ? srcPortrait : src;
+        const source = this.canvas.clientHeight > this.canvas.clientWidth && srcPortrait ? srcPortrait : src;
         if ((source === this.pictureSource && !anew) || source === '') return;
         this.pictureSource = source;
         const ticket = ++this.pictureTicket;
@@ -429,44 +419,48 @@ export class Water extends EventTarget implements Borrower, Touched {
             this.fail(error);
             throw error;
         }
-        this.renewPictures();
+        this.tell(backgrounds);
+    }
+
+    private tell(pictures: number): void {
+        this.native?._picturesChanged(pictures);
+        this.stale = true;
         this.wake();
     }
 
-    private renewPictures(): void {
-        this.native?._renewPictures();
-        this.stale = true;
-    }
-
-    // Called by the library's host in the middle of a frame, with textures of one pixel.
-    private loadTextures(background: WebGLTexture, shine: WebGLTexture, proportions: number): void {
-        const { canvas, gl, light, picture } = this;
+    // Called by the library's host in the middle of a frame. What is not shown keeps its one pixel.
+    private load(slot: Slot, width: number, height: number): void {
+        const { gl, light, picture } = this;
         if (!gl || !picture || !light) return;
-        const longer = Math.max(canvas.width, canvas.height);
-        const shorter = Math.max(1, Math.round(longer * proportions));
-        const upright = canvas.height >= canvas.width;
-        const cover = (part: 'picture' | 'light', texture: WebGLTexture, shown: Picture, width: number, height: number) => {
+        const cover = (part: 'picture' | 'light', shown: Picture, ...size: [number, number]) => {
             try {
-                uploadCover(gl, texture, shown, width, height);
+                uploadCover(gl, shown, ...size);
             } catch (error) {
-                uploadCover(gl, texture, (this[part] = plainPicture()), width, height);
+                uploadCover(gl, (this[part] = plainPicture()), ...size);
                 queueMicrotask(() => this.fail(error));  // who hears of it may call in, which is not for the middle of a frame
             }
         };
-        cover('picture', background, picture, upright ? shorter : longer, upright ? longer : shorter);
-        if ('drawable' in light) cover('light', shine, light, lightSide, lightSide);
-        else upload(gl, shine, light);
+        if (slot === this.slot()) cover('picture', picture, width, height);
+        if (slot !== Slot.light) return;
+        if ('drawable' in light) cover('light', light, lightSide, lightSide);
+        else upload(gl, light);
     }
 
     private apply(): void {
         const { native, options } = this;
         if (!native) return;
         this.fit();
+        native._setQuality(Math.max(0, qualities.indexOf(options.quality ?? 'auto')));
         const preset = presets[options.preset ?? ''];
         const rain = this.reduced() ? 0 : options.rain ?? preset?.rain ?? 0;
         const look = lookOf(options);
-        const text = JSON.stringify(look);
-        if (text !== this.given) native.setLook(look);
+        const text = JSON.stringify([look, options.look]);
+        if (text !== this.given) {
+            native.setLook(look);
+            const known = withinRange(options.look ?? {});
+            const unknown = Object.keys(options.look ?? {}).filter((name) => !(name in known));
+            if (unknown.length > 0) console.warn(`tidemark-water: the look has no such numbers: ${unknown.join(', ')}.`);
+        }
         this.given = text;
         this.stale = true;
         native._setInk(options.ink ?? preset?.ink ?? false);
@@ -477,10 +471,22 @@ export class Water extends EventTarget implements Borrower, Touched {
     // False where there is nothing to draw on.
     private drawAgain(): boolean {
         if (!this.live || this.failed || !this.native || !this.picture || !this.light) return false;
-        this.native._renewPictures();
+        this.native._redraw();
         // A step later than the last frame, which the host would think too early otherwise.
         this.lastFrame += 17;
-        return this.native._frame(this.lastFrame / 1000) === Frame.drawn;
+        return this.frame(this.native, this.lastFrame) === Frame.drawn;
+    }
+
+    // In one task with the frame, because a canvas that gets another size is empty until something is drawn.
+    private frame(native: Native, now: number): Frame {
+        const frame: Frame = native._frame(now / 1000);
+        if (frame !== Frame.resize) return frame;
+        const slot = this.slot();
+        this.canvas.width = native._width();
+        this.canvas.height = native._height();
+        native._resized();
+        if (slot !== this.slot()) native._picturesChanged(backgrounds);
+        return native._frame(now / 1000);
     }
 
     private readonly draw = (now: number): void => {
@@ -489,14 +495,15 @@ export class Water extends EventTarget implements Borrower, Touched {
         if (!this.live || !native || !picture || !this.light || !this.running()) return;
         if (this.gl?.isContextLost()) return;  // the event that tells so is still to come
         const start = performance.now();
-        if (picture.changed()) native._renewPictures();
+        if (picture.changed()) native._picturesChanged(1 << this.slot());
         let frame: Frame;
         try {
-            frame = native._frame(now / 1000);
+            frame = this.frame(native, now);
         } catch (error) {
             return this.fail(error);
         }
-        if (frame !== Frame.waiting) this.stale = false;
+        const isFitted = this.canvas.width === native._width() && this.canvas.height === native._height();
+        if (frame !== Frame.waiting && isFitted) this.stale = false;
         if (frame === Frame.drawn) {
             this.cost.frame = blend(this.cost.frame, this.calm ? 0 : now - this.lastFrame);
             this.cost.work = blend(this.cost.work, performance.now() - start);

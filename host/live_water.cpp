@@ -95,7 +95,7 @@ void LiveWater::prepare() {
         longest_ = longer;
     }
     const unsigned textures = pictureDue_ | texturesDue_;
-    if (setUpDue_ || textures) pace_.interrupt();
+    if (setUpDue_) pace_.interrupt();  // not for a picture, because one that moves is loaded with every frame
     if (std::exchange(setUpDue_, false)) host_.setUp(withInk_);
     if (textures) host_.loadPictures(pictures_, std::exchange(pictureDue_, 0), std::exchange(texturesDue_, 0));
 }

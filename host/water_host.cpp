@@ -177,15 +177,15 @@ void WaterHost::setUp(bool withInk) {
     native::onInitSetting(env, nullptr, width_, height_, withInk);
     native::onInitGPU(env, nullptr);
     // The library would keep a stroke that the switch interrupts and go on with it at the next touch.
-    if (withInk != withInk_) native::clearInkValue(env, nullptr);
     if (withInk != withInk_) {
+        native::clearInkValue(env, nullptr);
         strokes_.reset();
         inkStart_ = -1.0;
     }
     withInk_ = withInk;
     inkSteps_ = 0;
     isSetUp_ = true;
-    changed_ = true;
+    redraw();
 }
 
 WaterHost::Place WaterHost::modelPlace(double x, double y) const {
@@ -262,7 +262,7 @@ void WaterHost::startInk() {
 }
 
 double WaterHost::due() const {
-    if (inkMoves()) return inkTime_ + 0.5 * kInkStep;
+    if (inkMoves() && !isLost_) return inkTime_ + 0.5 * kInkStep;
     return isStill() && inkStart_ >= 0.0 ? inkStart_ - kEarly : time_;
 }
 
@@ -361,7 +361,7 @@ void WaterHost::draw() {
         // Under a finger that rests the ink goes on.
         if (inkSteps_ > 0 && !strokes_.isActive()) --inkSteps_;
     }
-    changed_ = false;
+    changed_ = isLost_ = false;
 }
 
 void WaterHost::drawOnce(bool isSeen) {

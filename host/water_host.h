@@ -41,8 +41,8 @@ public:
     // mesh to the host.
     void setMeshShare(double share);
 
-    // Where the framebuffer has lost the last frame.
-    void redraw() { changed_ = true; }
+    // Where the framebuffer has lost the last frame. The next one then does not wait for a step of the ink.
+    void redraw() { changed_ = isLost_ = true; }
 
     // Seconds that have been given to advance() so far. Times of touches are measured from the same zero.
     double time() const { return time_; }
@@ -121,6 +121,7 @@ private:
     bool withInk_ = false;
     bool isSetUp_ = false;
     bool changed_ = true;  // since the last draw
+    bool isLost_ = false;  // what that has drawn
     double time_ = 0.0;
 
     int calmSteps_;          // calm steps in a row

@@ -134,6 +134,20 @@ TEST_F(Live, isSetUpOnceTheViewKeepsItsSizeAndHandsOverWhatIsOfOtherProportions)
     EXPECT_EQ(told(), "");
 }
 
+// It would be seen empty until the next step of the ink.
+TEST_F(Live, drawsASurfaceOfAnotherSizeAtOnceUnderAFinger) {
+    water.setInk(true);
+    next();
+    touch();
+    for (int i = 1; i < 200; ++i) {
+        if (i % 41 == 0) water.setView(kWidth + i, kHeight, 1.0, now);
+        const Size before = size;
+        const Frame frame = next(1.0 / 240);
+        EXPECT_TRUE(size == before || frame == Frame::drawn) << i;
+    }
+    EXPECT_EQ(size.width, kWidth + 164);
+}
+
 TEST_F(Live, drawsAsManyPixelsAsTheQualityAllows) {
     for (const auto& [quality, density, pixels] :
          {std::tuple(Quality::low, 2.6, 1.0),
@@ -249,6 +263,7 @@ TEST_F(Live, drawsLessWhereTheDisplayIsKeptWaiting) {
     };
     int best = 0;
     for (const double end = now + 3.5; now < end;) {
+        water.picturesChanged(kLandscapePicture);  // which moves
         if (next(size.width > 400 ? 1.0 / 30 : 1.0 / 60) != Frame::drawn) continue;
         best = std::max(best, vertices());
     }

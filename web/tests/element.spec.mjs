@@ -201,7 +201,9 @@ test('canvases of the page show a canvas and a video that move, and give picture
         await video.play();
         const frames = async (until) => { while (!until()) await new Promise(requestAnimationFrame); };
         await frames(() => codes.length > 0);
-        waters[1].drop(50, 50);
+        waters[1].lose.loseContext();
+        await frames(() => waters[1].lost);
+        waters[1].lose.restoreContext();
         await frames(() => codes.length > 1);
         let more = 20;  // each is told once
         await frames(() => more-- === 0);

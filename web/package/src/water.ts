@@ -472,8 +472,6 @@ export class Water extends EventTarget implements Borrower, Touched {
     private drawAgain(): boolean {
         if (!this.live || this.failed || !this.native || !this.picture || !this.light) return false;
         this.native._redraw();
-        // A step later than the last frame, which the host would think too early otherwise.
-        this.lastFrame += 17;
         return this.frame(this.native, this.lastFrame) === Frame.drawn;
     }
 

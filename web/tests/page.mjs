@@ -37,7 +37,7 @@ export const takeOver = (page) =>
     page.evaluate(() => {
         const { water } = document.querySelector('tidemark-water');
         const { canvas, gl, native } = water;
-        water.pause();
+        water.running = () => false;
         let seconds = performance.now() / 1000;
         performance.now = () => 1000 * seconds;
         const frame = () => water.frame(native, 1000 * (seconds += 1 / 60));

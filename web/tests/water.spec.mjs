@@ -79,26 +79,29 @@ test('pointers become touches: one draws with every report, at its place and tim
         [1, 13, 15, -1, 1030], [0, 90, 15, 0.25, 1031], [3, 92, 15, -1, 1040], ['ripple', 40]]);
 });
 
-test('a canvas whose size keeps changing is stretched, and gets its pixels once', async ({ page }) => {
-    await open(page, '#ink=0');
+test('a canvas whose size keeps changing is stretched, and gets its pixels and the picture once', async ({ page }) => {
+    await open(page, '?src=favicon.svg#ink=0');
     await takeOver(page);
+    const flat = await flatPixels(page);
     expect(await page.evaluate(async () => {
         const { canvas } = window.tidemark.water.water;
         const sizes = [];
-        const follow = async (height) => {
-            document.querySelector('#water').style.height = `${height}px`;
+        const follow = async (width, height) => {
+            Object.assign(document.querySelector('#water').style, { width: `${width}px`, height: `${height}px` });
             for (let i = 0; i < 2; ++i) await new Promise(requestAnimationFrame);  // until the observer has seen it
             for (let i = 0; i < 3; ++i) {
                 window.frames(1);
-                if (sizes.at(-1) !== canvas.height) sizes.push(canvas.height);
+                if (sizes.at(-1) !== canvas.width) sizes.push(canvas.width);
             }
         };
-        window.settle();
-        for (let height = 290; height > 200; height -= 10) await follow(height);
+        for (let width = 210; width <= 290; width += 10) await follow(width, 200);
+        await follow(300, 200);  // the view is turned
         window.frames(6);
-        sizes.push(canvas.height);
+        sizes.push(canvas.width);
         return sizes;
-    })).toEqual([300, 210]);
+    })).toEqual([200, 300]);
+    const mean = (pixels) => difference(pixels, Buffer.alloc(pixels.length));
+    expect(mean(await flatPixels(page)) / mean(flat)).toBeCloseTo(1, 1);
 });
 
 test('keys and buttons switch the ink, and clear it', async ({ page }) => {

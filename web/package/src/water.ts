@@ -375,7 +375,7 @@ export class Water extends EventTarget implements Borrower, Touched {
         const view = [clientWidth, clientHeight, Math.min(devicePixelRatio, most)] as const;
         if (this.view === String(view)) return;
         this.view = String(view);
-        this.native?._setView(...view, performance.now() / 1000);
+        this.native?._setView(...view, this.paused ? 0 : performance.now() / 1000);
         this.stale = true;
         this.choosePictures();
         this.wake();
@@ -493,6 +493,10 @@ export class Water extends EventTarget implements Borrower, Touched {
         if (!this.live || !native || !picture || !this.light || !this.running()) return;
         if (this.gl?.isContextLost()) return;  // the event that tells so is still to come
         const start = performance.now();
+        if (this.paused) {  // and its clock as well
+            now = this.lastFrame;
+            native._redraw();
+        }
         if (picture.changed()) native._picturesChanged(1 << this.slot());
         let frame: Frame;
         try {

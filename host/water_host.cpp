@@ -339,10 +339,11 @@ void WaterHost::draw() {
     const bool moves = inkMoves();
     if (moves) {
         const double due = (time_ - inkTime_) / kInkStep;
-        steps = static_cast<int>(std::clamp(std::floor(due + 0.5), 1.0, double{kMostInkSteps}));
+        const double whole = std::floor(due + 0.5);
+        steps = static_cast<int>(std::clamp(whole, 1.0, double{kMostInkSteps}));
         // Steps that are left out take no time. A frame that comes early does not bring the next steps to the middle
         // between two frames, where the jitter of a clock would decide between none and two.
-        const double behind = due < 0.4 ? -0.25 : std::clamp(due - steps, -0.5, 0.5);
+        const double behind = due < 0.4 ? -0.25 : due - std::max(whole, 1.0);
         inkTime_ = time_ - (behind + steps) * kInkStep;
     }
     for (int i = 1; i <= steps; ++i) {

@@ -1,15 +1,22 @@
 #include "preview/inside.h"
 
-#include <GLES2/gl2.h>
-
+#include <algorithm>
 #include <cmath>
 #include <cstdint>
 #include <vector>
 
-#include "jni/globals.h"
+#include "host/engine_window.h"
 #include "pictures/canvas.h"
 
 namespace {
+
+// Values in rows; beyond an edge those on it go on.
+struct Grid {
+    const float* values;
+    int width, height;
+
+    float at(int x, int y) const { return values[std::clamp(y, 0, height - 1) * width + std::clamp(x, 0, width - 1)]; }
+};
 
 constexpr Rgb kPaper = {0.91f, 0.89f, 0.84f};
 
@@ -29,7 +36,7 @@ float cubic(float a, float b, float c, float d, float t) {
 // The height of each pixel's middle; the view shows the middle of the square lattice.
 std::vector<float> heightsInView(const WaterHost& host, int width, int height, float cellsPerPixel) {
     const int n = host.lattice().points;
-    const Texture<const float> mesh = {host.heights().data(), n, n};  // a row of it is a column of the mesh
+    const Grid mesh = {host.heights().data(), n, n};  // a row of it is a column of the mesh
     const auto place = [=](int pixel, int pixels) {
         return 0.5f * static_cast<float>(n - 1) + 0.5f * static_cast<float>(2 * pixel + 1 - pixels) * cellsPerPixel;
     };
@@ -43,7 +50,7 @@ std::vector<float> heightsInView(const WaterHost& host, int width, int height, f
             const int left = static_cast<int>(across);
             float h[4];
             for (int i = 0; i < 4; ++i) {
-                const auto at = [&](int j) { return mesh.clamped(top + j, left - 1 + i); };
+                const auto at = [&](int j) { return mesh.at(top + j, left - 1 + i); };
                 h[i] = cubic(at(-1), at(0), at(1), at(2), down - static_cast<float>(top));
             }
             heights.push_back(cubic(h[0], h[1], h[2], h[3], across - static_cast<float>(left)));
@@ -57,15 +64,14 @@ Picture drawHeight(const WaterHost& host, const Look& look, int width, int heigh
                                 {0.900f, 0.480f, 0.260f}, {0.600f, 0.080f, 0.040f}, {0.180f, 0.005f, 0.020f}};
     const float cellsPerPixel =
         static_cast<float>(host.lattice().points - 1) / look.pictureZoom / static_cast<float>(std::max(width, height));
-    std::vector<float> heights = heightsInView(host, width, height, cellsPerPixel);
-    const Texture<float> view = {heights.data(), width, height};
+    const std::vector<float> heights = heightsInView(host, width, height, cellsPerPixel);
+    const Grid view = {heights.data(), width, height};
     Canvas canvas(width, height);
     forAllPixels(canvas, [&](Rgb& pixel, int x, int y) {
         // Heights of 1.13 and more show the water texture fully. The light comes from the upper left.
-        const float h = view.clamped(x, y);
+        const float h = view.at(x, y);
         const float t = 0.5f + 0.5f * std::copysign(std::pow(std::abs(h) / 1.13f, 0.8f), h);
-        const float rise =
-            view.clamped(x + 1, y) - view.clamped(x - 1, y) + view.clamped(x, y + 1) - view.clamped(x, y - 1);
+        const float rise = view.at(x + 1, y) - view.at(x - 1, y) + view.at(x, y + 1) - view.at(x, y - 1);
         pixel = colourAt(kColours, t) * std::clamp(1.0f + 0.35f * rise / cellsPerPixel, 0.5f, 1.6f);
     });
     return toPicture(canvas);
@@ -87,7 +93,7 @@ void drawArrow(Canvas& canvas, float x, float y, float directionX, float directi
     });
 }
 
-Picture drawVelocity(const Picture& result) {
+Picture drawVelocity(const Picture& result, const EngineView& engine) {
     constexpr Rgb kColours[] = {
         {0.080f, 0.450f, 0.600f}, {0.200f, 0.850f, 0.700f}, {0.900f, 0.850f, 0.220f}, {1.000f, 0.400f, 0.100f}};
     constexpr float kFastest = 60.0f;
@@ -97,41 +103,25 @@ Picture drawVelocity(const Picture& result) {
         const float grey = 0.3f * pixel.r + 0.6f * pixel.g + 0.1f * pixel.b;
         pixel = mix(pixel, {grey, grey, grey}, 0.6f) * 0.15f;
     });
-    const Texture<vec2>& field = fluid.VelocityTex;
-    const float cellWidth = static_cast<float>(result.width) / static_cast<float>(field.width);
-    const float cellHeight = static_cast<float>(result.height) / static_cast<float>(field.height);
-    for (int j = kCells / 2; j < field.height; j += kCells) {
-        for (int i = kCells / 2; i < field.width; i += kCells) {
-            const vec2 u = field.row(j)[i];
-            const float speed = std::hypot(u.x, u.y);
+    const float cellWidth = static_cast<float>(result.width) / static_cast<float>(engine.gridWidth);
+    const float cellHeight = static_cast<float>(result.height) / static_cast<float>(engine.gridHeight);
+    for (int j = kCells / 2; j < engine.gridHeight; j += kCells) {
+        for (int i = kCells / 2; i < engine.gridWidth; i += kCells) {
+            const float* const u = &engine.velocity[static_cast<std::size_t>(2 * (j * engine.gridWidth + i))];
+            const float speed = std::hypot(u[0], u[1]);
             const float t = std::sqrt(std::min(speed / kFastest, 1.0f));
             if (!(t > 0.04f)) continue;
             const float x = (static_cast<float>(i) + 0.5f) * cellWidth;
             const float y = static_cast<float>(result.height) - (static_cast<float>(j) + 0.5f) * cellHeight;
-            drawArrow(canvas, x, y, u.x / speed, -u.y / speed, 6.0f + 28.0f * t, colourAt(kColours, t));
+            drawArrow(canvas, x, y, u[0] / speed, -u[1] / speed, 6.0f + 28.0f * t, colourAt(kColours, t));
         }
     }
     return toPicture(canvas);
 }
 
-// The engine's ink, rows from the bottom.
-std::vector<float> readDensity() {
-    const auto texels = static_cast<std::size_t>(fluid.InkWidth) * static_cast<std::size_t>(fluid.InkHeight);
-    std::vector<std::uint8_t> rgba(4 * texels);
-    glBindFramebuffer(GL_FRAMEBUFFER, fluid.Density.Ping.FboHandle);
-    glReadPixels(0, 0, fluid.InkWidth, fluid.InkHeight, GL_RGBA, GL_UNSIGNED_BYTE, rgba.data());
-    glBindFramebuffer(GL_FRAMEBUFFER, 0);
-    std::vector<float> density(texels);
-    for (std::size_t i = 0; i < texels; ++i) {
-        density[i] = static_cast<float>(rgba[4 * i]) + static_cast<float>(rgba[4 * i + 1]) / 255.0f;
-    }
-    return density;
-}
-
 // Darkens paper by the formula by which the water's shader darkens the picture.
-Picture drawDensity(int width, int height) {
-    std::vector<float> density = readDensity();
-    const Texture<float> ink = {density.data(), fluid.InkWidth, fluid.InkHeight};
+Picture drawDensity(int width, int height, const EngineView& engine) {
+    const Grid ink = {engine.density.data(), engine.inkWidth, engine.inkHeight};
     const float columnsPerPixel = static_cast<float>(ink.width) / static_cast<float>(width);
     const float rowsPerPixel = static_cast<float>(ink.height) / static_cast<float>(height);
     Canvas canvas(width, height);
@@ -140,15 +130,16 @@ Picture drawDensity(int width, int height) {
         const float row = (static_cast<float>(height - y) - 0.5f) * rowsPerPixel - 0.5f;
         const int i = static_cast<int>(std::floor(column));
         const int j = static_cast<int>(std::floor(row));
-        const float value = bilinear(
-            ink.clamped(i, j), ink.clamped(i + 1, j), ink.clamped(i, j + 1), ink.clamped(i + 1, j + 1),
-            column - static_cast<float>(i), row - static_cast<float>(j));
-        const auto through = [&](float paper, float channel) {
-            const float divisor = 1.0f + fluid.InkIntensity * value * ((1.5f - fluid.InkColorOffset) / channel - 1.0f);
+        const float right = column - static_cast<float>(i);
+        const float up = row - static_cast<float>(j);
+        const auto along = [&](int line) { return std::lerp(ink.at(i, line), ink.at(i + 1, line), right); };
+        const float value = std::lerp(along(j), along(j + 1), up);
+        const auto through = [value](float paper, float tint) {
+            const float divisor = 1.0f + value * tint;
             return paper / (divisor * divisor);  // of light; the shader divides its square root
         };
-        const Color_ colour = fluid.InkColor;
-        pixel = {through(kPaper.r, colour.r), through(kPaper.g, colour.g), through(kPaper.b, colour.b)};
+        const float* const tint = engine.tint;
+        pixel = {through(kPaper.r, tint[0]), through(kPaper.g, tint[1]), through(kPaper.b, tint[2])};
     });
     return toPicture(canvas);
 }
@@ -161,7 +152,8 @@ std::string insideName(int picture) {
 }
 
 std::array<Picture, 4> drawInside(const WaterHost& host, const Look& look, const Picture& result) {
+    const EngineView engine = lookIntoEngine();
     return {
-        drawHeight(host, look, result.width, result.height), drawVelocity(result),
-        drawDensity(result.width, result.height), result};
+        drawHeight(host, look, result.width, result.height), drawVelocity(result, engine),
+        drawDensity(result.width, result.height, engine), result};
 }

@@ -2,6 +2,8 @@
 #include <CLI/CLI.hpp>
 
 #include <cstdio>
+#include <map>
+#include <optional>
 #include <string>
 
 #include "platform/log_filter.h"
@@ -20,6 +22,8 @@ int fail(const std::string& reason) {
 int main(int argc, char** argv) {
     PreviewOptions options;
     std::string size = "540x960";
+    double density = 1.0;
+    std::optional<Quality> quality;
     std::string ink;
     bool noInk = false;
     bool verbose = false;
@@ -37,6 +41,13 @@ int main(int argc, char** argv) {
     file("--script", options.script, "Touches to play: lines of \"time_ms action x y pressure\"");
     app.add_flag("--rain", options.rain, "Let it rain; without --script it always does");
     app.add_option("--size", size, "Size of the view in pixels")->type_name("WxH")->capture_default_str();
+    app.add_option("--density", density, "Pixels of the display for each density-independent pixel")
+        ->check(CLI::Range(0.5, 8.0))
+        ->capture_default_str();
+    app.add_option("--quality", quality, "Draw at most 1, 2 or 3 pixels for each density-independent pixel")
+        ->transform(CLI::CheckedTransformer(std::map<std::string, Quality>{
+            {"low", Quality::low}, {"medium", Quality::medium}, {"high", Quality::high}}))
+        ->type_name("low|medium|high");
     app.add_option(
         "--seconds", options.seconds, "Length of the scene in seconds; default: a little more than the script");
     app.add_option("--fps", options.framesPerSecond, "Frames per second")->capture_default_str();
@@ -55,7 +66,8 @@ int main(int argc, char** argv) {
     app.add_flag("--no-ink", noInk, "Water without ink")->excludes(inkOption)->excludes(inside);
     CLI::Option* window =
         app.add_flag("--window", inWindow, "Open a window instead and touch the water with the mouse");
-    for (const char* recorded : {"--script", "--seconds", "--fps", "--out", "--every", "--video", "--inside"}) {
+    for (const char* recorded :
+         {"--density", "--quality", "--script", "--seconds", "--fps", "--out", "--every", "--video", "--inside"}) {
         window->excludes(app.get_option(recorded));
     }
     app.add_flag("--verbose", verbose, "Show the library's log");
@@ -72,6 +84,10 @@ int main(int argc, char** argv) {
     const std::optional<Size> parsedSize = parseSize(size, error);
     if (!parsedSize) return fail("--size " + error);
     options.size = *parsedSize;
+    if (quality) {
+        const auto [width, height] = *parsedSize;
+        options.size = drawnSize({width / density, height / density, density}, *quality, 1.0);
+    }
     if (options.seconds && !(*options.seconds > 0.0 && *options.seconds <= 3600.0)) {
         return fail("--seconds must be above 0 and at most 3600");
     }

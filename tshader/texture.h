@@ -13,13 +13,6 @@ struct Texture {
 
     T* row(int j) const { return data + static_cast<std::ptrdiff_t>(j) * width; }
 
-    // Texel (i, j), or the nearest one on the edge for a neighbour just outside.
-    const T& clamped(int i, int j) const {
-        i = i < 0 ? 0 : (i < width ? i : width - 1);
-        j = j < 0 ? 0 : (j < height ? j : height - 1);
-        return row(j)[i];
-    }
-
     bool empty() const { return data == nullptr || width <= 0 || height <= 0; }
 };
 

@@ -28,7 +28,7 @@ protected:
         const Look look = {.meshVertices = vertices_};
         // The pictures are cropped alike for each view, so that one that stays in place is the same.
         WaterHost square(look, 64, 64, 1);
-        setUp(square, true, kAllPictures);
+        setUp(square, false, kAllPictures);
         WaterHost host(look, width_, kHeight, 1);
         setUp(host, true);
         srand48(1);

@@ -172,7 +172,8 @@ TEST_F(Live, drawsAsManyPixelsAsTheQualityAllows) {
         next();
         water.touch(TouchAction::down, 0.25f, 0.5f, 1.0f, now);
         for (int i = 0; i < 4; ++i) next();
-        EXPECT_EQ(std::pair(4 * POSITION_X, 2 * POSITION_Y), std::pair(size.width + 2, size.height)) << size.width;
+        EXPECT_NEAR(4 * POSITION_X, size.width, 2);
+        EXPECT_EQ(2 * POSITION_Y, size.height);
     }
 }
 

@@ -1,0 +1,21 @@
+// The one window into the engine, for faces that show what lies behind a frame. It needs the library's objects: the
+// shared library hides what it looks at.
+#pragma once
+
+#include <vector>
+
+struct EngineView {
+    // The flow, rows from the bottom: x and y of each cell, y upwards.
+    std::vector<float> velocity;
+    int gridWidth, gridHeight;
+
+    // The ink, rows from the bottom, 0 to 127.
+    std::vector<float> density;
+    int inkWidth, inkHeight;
+
+    // What a unit of density adds to the divisor of red, green and blue.
+    float tint[3];
+};
+
+// What the last frame has left. Needs the context current and a set-up with ink; leaves framebuffer 0 bound.
+EngineView lookIntoEngine();

@@ -1,11 +1,10 @@
 #include "host/look_file.h"
 
-#include <algorithm>
 #include <cstddef>
 #include <sstream>
-#include <type_traits>
+#include <variant>
 
-#include "host/look_fields.h"
+#include "host/look_values.h"
 #include "host/quoted.h"
 #include "host/read_file.h"
 
@@ -23,21 +22,16 @@ std::string readLine(const std::string& line, Look& look) {
     if (sign == line.npos) return "expected \"key = number\"";
     const std::string key = trimmed(line.substr(0, sign));
     const std::string value = trimmed(line.substr(sign + 1));
-    const auto* const field = std::find_if(
-        std::begin(kLookFields), std::end(kLookFields), [&key](const LookField& f) { return f.name == key; });
-    if (field == std::end(kLookFields)) return "there is no value " + quoted(key);
-    const auto read = [&](auto member) {
-        std::istringstream words(value);
-        if (!(words >> look.*member) || !words.eof()) return key + " takes no " + quoted(value);
-        using Number = std::remove_reference_t<decltype(look.*member)>;
-        const auto least = static_cast<Number>(field->least);
-        const auto most = static_cast<Number>(field->most);
-        if (look.*member >= least && look.*member <= most) return std::string();
-        std::ostringstream limits;
-        limits << key << " must be " << least << " to " << most << ", not " << quoted(value);
-        return limits.str();
-    };
-    return std::visit(read, field->member);
+    const LookField* const field = fieldNamed(key);
+    if (!field) return "there is no value " + quoted(key);
+    std::istringstream words(value);
+    double number = 0.0;
+    if (!(words >> number) || !words.eof()) return key + " takes no " + quoted(value);
+    if (setValue(look, *field, number)) return "";
+    std::ostringstream limits;
+    limits << key << " must be " << field->least << " to " << field->most << ", not " << quoted(value);
+    if (std::holds_alternative<int Look::*>(field->member)) limits << ", and a whole number";
+    return limits.str();
 }
 
 }  // namespace

@@ -1,41 +1,34 @@
 #include "host/look_values.h"
 
+#include <algorithm>
 #include <cmath>
 #include <type_traits>
 
-#include "host/look_fields.h"
-
-namespace {
-
-bool isWithin(const LookField& field, double value) {
-    // Limits are compared as the members hold them: a float's 0.3 is a little more than 0.3.
-    const auto as = [&field](double limit) {
-        return std::holds_alternative<float Look::*>(field.member) ? double{static_cast<float>(limit)} : limit;
-    };
-    return as(value) >= as(field.least) && as(value) <= as(field.most);
-}
-
-}  // namespace
-
 const LookField* fieldNamed(std::string_view name) {
-    for (const LookField& field : kLookFields) {
-        if (field.name == name) return &field;
-    }
-    return nullptr;
+    const auto* const field = std::find_if(
+        std::begin(kLookFields), std::end(kLookFields), [=](const LookField& f) { return f.name == name; });
+    return field == std::end(kLookFields) ? nullptr : field;
 }
 
 bool setValue(Look& look, const LookField& field, double value) {
-    if (!isWithin(field, value)) return false;
-    std::visit(
-        [&](auto member) { look.*member = static_cast<std::remove_reference_t<decltype(look.*member)>>(value); },
-        field.member);
-    return true;
+    const auto set = [&](auto member) {
+        using Number = std::remove_reference_t<decltype(look.*member)>;
+        // The float that is nearest to a limit may lie beyond it.
+        const double least = std::min(field.least, static_cast<double>(static_cast<Number>(field.least)));
+        const double most = std::max(field.most, static_cast<double>(static_cast<Number>(field.most)));
+        if (!(value >= least && value <= most)) return false;  // NaN among them
+        if (std::is_integral_v<Number> && value != std::floor(value)) return false;
+        look.*member = static_cast<Number>(value);
+        return true;
+    };
+    return std::visit(set, field.member);
 }
 
 const LookField* firstInvalid(const Look& look) {
-    for (const LookField& field : kLookFields) {
-        const auto isInvalid = [&](auto member) { return !isWithin(field, static_cast<double>(look.*member)); };
-        if (std::visit(isInvalid, field.member)) return &field;
-    }
-    return nullptr;
+    Look copy;
+    const auto* const field = std::find_if(std::begin(kLookFields), std::end(kLookFields), [&](const LookField& f) {
+        const auto valueOf = [&](auto member) { return static_cast<double>(look.*member); };
+        return !setValue(copy, f, std::visit(valueOf, f.member));
+    });
+    return field == std::end(kLookFields) ? nullptr : field;
 }

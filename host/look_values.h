@@ -1,17 +1,16 @@
-// The values of a look by their names, and what they keep to.
+// The values of a look by their names, and the limits that they keep to.
 #pragma once
 
 #include <string_view>
 
-#include "host/look.h"
+#include "host/look_fields.h"
 
-struct LookField;  // see look_fields.h, which the build writes
-
-// Null where there is no such value.
+// Null if there is none.
 const LookField* fieldNamed(std::string_view name);
 
-// False, and the look stays as it is, for a value that is not a finite number within the field's limits.
+// False, and nothing changes, for a value that is not finite, beyond the field's limits, or a fraction where the field
+// holds whole numbers.
 bool setValue(Look& look, const LookField& field, double value);
 
-// The first value beyond its limits, or null.
+// Null if all values are within their limits.
 const LookField* firstInvalid(const Look& look);

@@ -2,7 +2,10 @@
 
 #include <gtest/gtest.h>
 
+#include <cmath>
 #include <sstream>
+
+#include "host/look_values.h"
 
 static std::optional<Look> read(const std::string& text, std::string& error) {
     std::istringstream stream(text);
@@ -40,4 +43,16 @@ TEST(LookFile, NamesTheLineThatIsWrong) {
         EXPECT_EQ(error.rfind("a.look:3: ", 0), 0U) << error;
         EXPECT_NE(error.find(reason), std::string::npos) << error;
     }
+}
+
+TEST(LookValues, NameWhatIsBeyondItsLimits) {
+    Look look;
+    look.dropRadius = 0.3f;  // its limit, to the nearest float above
+    EXPECT_EQ(firstInvalid(look), nullptr);
+    look.inkBlue = std::nanf("");
+    look.framesToFade = -1;
+    const LookField* const invalid = firstInvalid(look);
+    ASSERT_NE(invalid, nullptr);
+    EXPECT_EQ(invalid->name, "inkBlue");
+    EXPECT_EQ(fieldNamed("inkblue"), nullptr);
 }

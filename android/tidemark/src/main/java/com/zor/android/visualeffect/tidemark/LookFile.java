@@ -16,28 +16,15 @@ final class LookFile implements Look.Values {
     }
 
     @Override
-    public int whole(String key, int usual, int least, int most) {
-        return (int) take(key, WHOLE, usual, least, most);
-    }
-
-    @Override
-    public float real(String key, float usual, float least, float most) {
-        return take(key, REAL, usual, least, most);
+    public double next(String key, double usual, double least, double most, boolean isWhole) {
+        Object found = left.remove(key);
+        if (found == null) return usual;
+        String text = found.toString().trim();
+        if (!text.matches(isWhole ? WHOLE : REAL)) throw new IllegalArgumentException(key + " takes no \"" + text + "\"");
+        return Look.checked(key, Float.parseFloat(text), least, most, isWhole);
     }
 
     void expectNoOthers() {
         for (Object key : left.keySet()) throw new IllegalArgumentException("there is no value \"" + key + "\"");
-    }
-
-    private float take(String key, String form, float usual, float least, float most) {
-        Object found = left.remove(key);
-        if (found == null) return usual;
-        String text = found.toString().trim();
-        if (!text.matches(form)) throw new IllegalArgumentException(key + " takes no \"" + text + "\"");
-        float value = Float.parseFloat(text);
-        if (value < least || value > most) {
-            throw new IllegalArgumentException(key + " must be " + least + " to " + most + ", not " + text);
-        }
-        return value;
     }
 }

@@ -12,7 +12,7 @@ java() {
 compile() {
     "$JAVAC" -Xlint:all,-options -Werror "$@"
 }
-mapfile -t shipped < <(java "$source/android")
+mapfile -t shipped < <(java "$source/android" "$source/examples")
 mapfile -t tests < <(java "$source/tests/jvm/java")
 
 # The framework's own view, without what it keeps from apps: tracing and names of errors. Its surface comes by a test.
@@ -36,7 +36,7 @@ done
 "$AAPT2" link -I /usr/share/android-framework-res/framework-res.apk --manifest resources/manifest.xml \
     -o resources/linked.apk --java resources --extra-packages com.zor.android.visualeffect.tidemark resources/*.zip
 
-mapfile -t shipped < <(java "$source/android" resources)
+mapfile -t shipped < <(java "$source/android" "$source/examples" resources)
 compile --release 8 -h headers -cp "classes/platform:$ANNOTATIONS" -d classes/shipped "${shipped[@]}"
 compile --release 8 -cp classes/platform -d classes/fakes "${fakes[@]}"
 compile --release 17 -h headers -cp "classes/fakes:classes/platform:classes/shipped:$JUNIT" -d classes/tests "${tests[@]}"

@@ -1,128 +1,140 @@
-// Plays a scene to the host in C++ and writes down each single call, what came of it and what the library logged, and
-// beside that the pictures: for the host in Java to be held against.
+// The calls of examples/minimal-java/MinimalWater.java as WholeRunTest makes it make them, in C++: writes the pictures
+// that it takes, the frames and what the library logs, for those of the Java virtual machine to be held against.
 #include <GLES2/gl2.h>
 
 #include <algorithm>
+#include <cmath>
 #include <cstdlib>
 #include <fstream>
-#include <functional>
-#include <map>
 #include <memory>
 #include <set>
-#include <sstream>
 #include <string>
 #include <vector>
 
-#include "host/live_water.h"
-#include "host/look_file.h"
+#include "host/host_jni.h"
+#include "host/native_names.h"
+#include "platform/desktop_bitmap.h"
 #include "platform/headless_context.h"
 #include "tests/support/log_recorder.h"
 #include "tests/support/test_pictures.h"
 
+namespace {
+
+constexpr int kN = 128;
+constexpr int kExtent = 32;
+
+JNIEnv* const env = hostEnvironment();
+std::string directory;
+FloatArray positions(3 * kN * kN), heights(kN*kN), velocity(kN*kN), attribs(3 * kN * kN), mvp(16);
+ShortArray indices(6 * (kN - 1) * (kN - 1));
+float visibleWidth, visibleHeight;
+int width, height;
+
+void write(const std::string& name, const void* data, std::size_t bytes) {
+    std::ofstream(directory + name, std::ios::binary)
+        .write(static_cast<const char*>(data), static_cast<std::streamsize>(bytes));
+}
+
+void handOver(void (*transfer)(JNIEnv*, jobject, jobject), const char* name, int w, int h, int variant) {
+    Picture picture = smoothPicture(w, h, variant);
+    write(name, picture.rgba.data(), picture.rgba.size());
+    DesktopBitmap bitmap;
+    bitmap.info = {
+        static_cast<uint32_t>(w), static_cast<uint32_t>(h), static_cast<uint32_t>(4 * w),
+        ANDROID_BITMAP_FORMAT_RGBA_8888, 0};
+    bitmap.pixels = picture.rgba.data();
+    transfer(env, nullptr, &bitmap);
+}
+
+void setUp(int w, int h) {
+    width = w;
+    height = h;
+    handOver(native::transferPortraitBGBitmap, "portrait", 90, 160, 1);
+    handOver(native::transferLandscapeBGBitmap, "landscape", 160, 90, 2);
+    handOver(native::transferWaterBitmap, "light", 64, 64, 3);
+    native::onInitSetting(env, nullptr, w, h, JNI_TRUE);
+    native::onInitGPU(env, nullptr);
+    native::onLoadPortraitBGTextures(env, nullptr);
+    native::onLoadLandscapeBGTextures(env, nullptr);
+    native::onLoadWaterTextures(env, nullptr);
+    native::initWaters(env, nullptr, &positions, &indices, kN * kN, kExtent, kExtent, kN, kN);
+    visibleWidth = static_cast<float>(kExtent * w) / static_cast<float>(std::max(w, h));
+    visibleHeight = static_cast<float>(kExtent * h) / static_cast<float>(std::max(w, h));
+    mvp.values = {2.0f / visibleWidth, 0, 0, 0, 0, 2.0f / visibleHeight, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1};
+}
+
+void draw() {
+    for (std::size_t i = 0; i < kN * kN; ++i) {
+        attribs.values[3 * i] = heights.values[i];
+        attribs.values[3 * i + 1] = heights.values[i + kN < kN * kN ? i + kN : i];
+        attribs.values[3 * i + 2] = heights.values[i % kN > 0 ? i - 1 : i];
+    }
+    const auto extent = [](float visible) { return static_cast<jint>(std::ceil(visible)); };
+    native::onDrawFrame(
+        env, nullptr, &positions, &attribs, &indices, 3 * kN * kN, 3 * kN * kN, 6 * (kN - 1) * (kN - 1), &mvp,
+        extent(visibleWidth), extent(visibleHeight), kN, kN, 1.75f, 0.5f, 0.7f, 1.0f, 0.05f, 0.15f, 0.45f, 0.8f, 4.5f,
+        40.0f, width > height);
+}
+
+void frame() {
+    native::move(env, nullptr, &velocity, &heights, 1, 1, kN - 1, kN - 1, kN, kN, JNI_FALSE, 0.985f, 0.3f);
+    draw();
+}
+
+void touch(int x, int y, int action, float pressure) {
+    native::onTouch(env, nullptr, x, y, action, pressure);
+    const auto place = [](int at, int side, float visible) {
+        return (static_cast<float>(at) - 0.5f * static_cast<float>(side)) / static_cast<float>(side) * visible;
+    };
+    const float size = pressure * (action == 0 ? 2.0f : action == 2 ? 0.25f : 0.0f);
+    native::ripple(
+        env, nullptr, &heights, kExtent, kExtent, kN, kN, place(y, height, visibleHeight),
+        place(x, width, visibleWidth), size);
+}
+
+void keep(const char* name) {
+    static std::set<std::vector<std::uint8_t>> kept;
+    std::vector<std::uint8_t> pixels(4 * static_cast<std::size_t>(width * height));
+    glReadPixels(0, 0, width, height, GL_RGBA, GL_UNSIGNED_BYTE, pixels.data());
+    write(name, pixels.data(), pixels.size());
+    if (!kept.insert(pixels).second) std::exit(1);  // shows nothing new
+}
+
+void expectInk(int shown) {
+    if (native::getClearInkValue(env, nullptr) != shown) std::exit(2);
+}
+
+}  // namespace
+
 int main(int, char** argv) {
-    const std::string directory = std::string(argv[2]) + '/';
-    std::ofstream journal(directory + "journal");
+    directory = std::string(argv[1]) + '/';
     LogRecorder log;
     std::string error;
-    std::unique_ptr<HeadlessContext> context;
-    std::map<std::string, Picture> pictures;
-    std::set<std::vector<std::uint8_t>> kept;
-    LiveWater water(Look{}, 1);
-    LiveWater::Frame shown{};
-    int width = 0, height = 0, drawn = 0;
-    double now = 0.0;
-    std::vector<std::string> words;
-    std::vector<double> n;  // the words' values, from the first on
-
-    const auto write = [&](const std::vector<std::uint8_t>& rgba) {
-        std::ofstream file(directory + words[1] + ".rgba", std::ios::binary);
-        file.write(reinterpret_cast<const char*>(rgba.data()), static_cast<std::streamsize>(rgba.size()));
-    };
-    const auto whole = [&](std::size_t i) { return static_cast<int>(n[i]); };
-    const auto real = [&](std::size_t i) { return static_cast<float>(n[i]); };
-    const auto read = [&](const std::string& line) {
-        std::istringstream in(line);
-        words.clear();
-        n.clear();
-        for (std::string word; in >> word;) {
-            words.push_back(word);
-            n.push_back(std::strtod(word.c_str(), nullptr));
-        }
-    };
-
-    const std::map<std::string, std::function<void()>> calls = {
-        {"picture", [&] { write((pictures[words[1]] = smoothPicture(whole(2), whole(3), whole(4))).rgba); }},
-        {"pictures",
-         [&] {
-             water.setPictures({pictures.at(words[1]), pictures.at(words[2]), pictures.at(words[3])});
-         }},
-        {"context",
-         [&] {
-             context.reset();
-             context = HeadlessContext::create(160, 160, error);
-             water.renewContext();
-         }},
-        {"resize", [&] { water.resize(width = whole(1), height = whole(2)); }},
-        {"ink", [&] { water.setInk(words[1] == "on"); }},
-        {"rain", [&] { water.setRain(words[1] == "on"); }},
-        {"look",
-         [&] {
-             std::stringstream lines;
-             for (std::size_t i = 1; i < words.size(); ++i) lines << words[i] << '\n';
-             water.setLook(parseLook(lines, "look", error).value());
-         }},
-        {"clear", [&] { water.clearInk(); }},
-        {"redraw", [&] { water.redraw(); }},
-        {"splash", [&] { water.splash(whole(1), whole(2), real(3)); }},
-        {"touch", [&] { water.touch(static_cast<TouchAction>(whole(1)), whole(2), whole(3), real(4)); }},
-        {"frame", [&] { drawn += (shown = water.frame(n[1])) == LiveWater::Frame::drawn; }},
-        {"keep",
-         [&] {
-             std::vector<std::uint8_t> pixels(4 * static_cast<std::size_t>(width * height));
-             glReadPixels(0, 0, width, height, GL_RGBA, GL_UNSIGNED_BYTE, pixels.data());
-             write(pixels);
-             if (!kept.insert(pixels).second) std::exit(1);  // shows nothing new
-         }},
-    };
-    const auto call = [&](const std::string& line) {
-        read(line);
-        calls.at(words[0])();
-        journal << line;
-        if (words[0] == "frame") journal << ' ' << static_cast<int>(shown);
-        journal << '\n';
-        for (const std::string& said : log.take()) journal << said << '\n';
-    };
-    const auto frame = [&](double rate) {
-        std::ostringstream line;
-        line << "frame " << std::hexfloat << (now += 1.0 / rate);
-        call(line.str());
-        return shown;
-    };
-    const auto touch = [&](int action, double x, double y, double pressure) {
-        std::ostringstream line;
-        line << "touch " << action << ' ' << static_cast<int>(x) << ' ' << static_cast<int>(y) << ' ' << pressure;
-        call(line.str());
-    };
-
-    std::ifstream scene(argv[1]);
-    for (std::string line; std::getline(scene, line);) {
-        if (line.empty() || line[0] == '#') continue;
-        read(line);
-        const std::vector<double> m = n;
-        if (words[0] == "wait") {
-            now += m[1];
-        } else if (words[0] == "frames") {
-            for (int i = 0; i < m[1]; ++i) frame(m[2]);
-        } else if (words[0] == "rest") {
-            while (frame(60.0) != LiveWater::Frame::resting && drawn < 3000) continue;
-        } else if (words[0] == "stroke") {
-            touch(0, m[1], m[2], m[6]);
-            for (int i = 1; i <= m[5]; ++i, frame(60.0)) {
-                touch(2, m[1] + (m[3] - m[1]) * i / m[5], m[2] + (m[4] - m[2]) * i / m[5], m[6]);
-            }
-        } else {
-            call(line);
-        }
+    std::unique_ptr<HeadlessContext> context = HeadlessContext::create(160, 160, error);
+    setUp(90, 160);
+    draw();
+    keep("still");
+    touch(30, 40, 0, 1.0f);
+    for (int i = 1; i <= 30; ++i) {
+        touch(30 + i, 40 + 2 * i, 2, 1.0f);
+        frame();
     }
-    return drawn >= 1000 ? 0 : 1;
+    keep("stroke");
+    expectInk(1);
+    touch(60, 100, 1, 0.5f);
+    for (int i = 0; i < 10; ++i) frame();
+    keep("lifted");
+    native::clearInkValue(env, nullptr);
+    frame();
+    keep("cleared");
+    expectInk(0);
+    context.reset();
+    context = HeadlessContext::create(160, 160, error);
+    setUp(160, 90);
+    touch(45, 45, 0, 1.0f);
+    for (int i = 0; i < 10; ++i) frame();
+    keep("turned");
+    std::string lines;
+    for (const std::string& line : log.take()) lines += line + '\n';
+    write("log", lines.data(), lines.size());
 }

@@ -1,5 +1,7 @@
 #include "host/host_jni.h"
 
+#include <type_traits>
+
 namespace {
 
 template <class Array, class Element, class Reference>
@@ -14,8 +16,10 @@ void JNICALL releaseElements(JNIEnv*, Reference, Element*, jint) {}
 }  // namespace
 
 JNIEnv* hostEnvironment() {
-    static const JNINativeInterface_ functions = [] {
-        JNINativeInterface_ table = {};
+    // By whichever name this platform's header gives the table.
+    using Functions = std::remove_cvref_t<decltype(*JNIEnv::functions)>;
+    static constexpr Functions functions = [] {
+        Functions table = {};
         table.GetFloatArrayElements = getElements<FloatArray, jfloat, jfloatArray>;
         table.GetShortArrayElements = getElements<ShortArray, jshort, jshortArray>;
         table.ReleaseFloatArrayElements = releaseElements;

@@ -45,8 +45,9 @@ bool Pace::frameDrawn(double now, double shortest) {
 }
 
 bool Pace::judge(double now, double shortest) {
-    std::sort(intervals_.begin(), intervals_.end());
-    const double median = intervals_[intervals_.size() / 2];
+    auto* const middle = intervals_.begin() + intervals_.size() / 2;
+    std::nth_element(intervals_.begin(), middle, intervals_.end());
+    const double median = *middle;
     rhythm_ = std::min(rhythm_, std::max(median, 1.0 / 240));
     const bool isLate = median > kLate * std::max(rhythm_, shortest);
     if (isLate && level_ < lowest_) {

@@ -1,5 +1,5 @@
 #!/usr/bin/env bash
-# platform.sh TRIPLE DIRECTORY: stand-ins to link with, whose names are those that the library may use of Android's own
+# platform.sh TRIPLE DIRECTORY: stand-ins to link with, whose names are those that the libraries may use of Android's own
 # libraries at API level 21. None of them is of the C++ runtime.
 set -euo pipefail
 triple=$1
@@ -13,6 +13,6 @@ mapfile -t gl < <(sed -nE 's/^GL_APICALL .* GL_APIENTRY (gl\w+).*/\1/p' /usr/inc
 library libGLESv2.so "${gl[@]}"
 library liblog.so __android_log_print
 library libjnigraphics.so AndroidBitmap_{getInfo,lockPixels,unlockPixels}
-library libm.so exp floorf
-library libc.so __cxa_atexit free lrand48 malloc memcmp memcpy memmove memset realloc strlen \
-    __aeabi_{idiv,memclr,memclr4,memcpy,memcpy4,memmove4}
+library libm.so ceil ceilf exp floor floorf lround lroundf sin
+library libc.so __cxa_atexit abort free lrand48 malloc memcmp memcpy memmove memset realloc strlen \
+    __aeabi_{idiv,memclr,memclr4,memclr8,memcpy,memcpy4,memcpy8,memmove,memmove4,memmove8}

@@ -46,6 +46,25 @@ public final class Bitmap {
         return new Bitmap(colors, width, height, source.config);
     }
 
+    /** As the platform's filter, which takes four pixels for one, however many there are. */
+    public static Bitmap createScaledBitmap(Bitmap source, int width, int height, boolean filter) {
+        int[] colors = new int[width * height];
+        for (int i = 0; i < colors.length; ++i) {
+            int x = i % width * source.width / width;
+            int y = i / width * source.height / height;
+            for (int shift = 0; shift < 32; shift += 8) {
+                int sum = 2;
+                for (int at = 0; at < 4; ++at) {
+                    int column = Math.min(x + at % 2, source.width - 1);
+                    int row = Math.min(y + at / 2, source.height - 1);
+                    sum += source.colors[row * source.width + column] >>> shift & 255;
+                }
+                colors[i] |= sum / 4 << shift;
+            }
+        }
+        return new Bitmap(colors, width, height, source.config);
+    }
+
     public Bitmap copy(Config config, boolean mutable) {
         return new Bitmap(colors, width, height, config);
     }

@@ -1,5 +1,7 @@
 package android.view;
 
+import android.os.SystemClock;
+
 /** A touch whose parts a test fills in; [finger][position], the current position last. */
 public final class MotionEvent {
     public static final int ACTION_DOWN = 0;
@@ -9,6 +11,11 @@ public final class MotionEvent {
     public static final int ACTION_POINTER_DOWN = 5;
     public static final int ACTION_POINTER_UP = 6;
     public static final int ACTION_HOVER_MOVE = 7;
+    public static final int TOOL_TYPE_FINGER = 1;
+    public static final int TOOL_TYPE_STYLUS = 2;
+
+    /** Of all fingers; each position is a millisecond later than the one before. */
+    public int toolType = TOOL_TYPE_FINGER;
 
     private final int action;
     private final int actionIndex;
@@ -67,5 +74,17 @@ public final class MotionEvent {
 
     public float getHistoricalPressure(int index, int position) {
         return xyPressure[index][position][2];
+    }
+
+    public int getToolType(int index) {
+        return toolType;
+    }
+
+    public long getEventTime() {
+        return getHistoricalEventTime(getHistorySize());
+    }
+
+    public long getHistoricalEventTime(int position) {
+        return SystemClock.uptimeMillis() + position;
     }
 }

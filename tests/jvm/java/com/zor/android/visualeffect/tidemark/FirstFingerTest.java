@@ -13,15 +13,19 @@ import java.util.List;
 public final class FirstFingerTest {
     private final List<String> heard = new ArrayList<>();
     private final FirstFinger finger =
-            new FirstFinger((action, x, y, pressure) -> heard.add(action + " " + x + " " + y + " " + pressure));
+            new FirstFinger((action, x, y, isStylus, pressure, time) -> heard.add(
+                    action + " " + x + " " + y + (isStylus ? " pen " : " ") + pressure + " " + time));
 
     @Test
     public void historyArrivesInOrder() {
         follow(MotionEvent.ACTION_DOWN, 0, new int[] {7}, at(10.4f, 20.6f));
         float[][] path = {{11, 21, 0.1f}, {12, 22, 0.2f}, {13, 23, 0.3f}};
-        follow(MotionEvent.ACTION_MOVE, 0, new int[] {7}, path);
+        MotionEvent moves = new MotionEvent(MotionEvent.ACTION_MOVE, 0, new int[] {7}, new float[][][] {path});
+        moves.toolType = MotionEvent.TOOL_TYPE_STYLUS;
+        finger.follow(moves);
         follow(MotionEvent.ACTION_UP, 0, new int[] {7}, at(13, 23));
-        assertEquals(List.of("0 10 21 1.0", "2 11 21 0.1", "2 12 22 0.2", "2 13 23 0.3", "1 13 23 1.0"), heard);
+        assertEquals(List.of("0 10.4 20.6 1.0 0", "2 11.0 21.0 pen 0.1 0", "2 12.0 22.0 pen 0.2 1",
+                "2 13.0 23.0 pen 0.3 2", "1 13.0 23.0 1.0 0"), heard);
     }
 
     @Test
@@ -36,7 +40,7 @@ public final class FirstFingerTest {
         follow(MotionEvent.ACTION_MOVE, 0, new int[] {1}, at(53, 63));
         follow(MotionEvent.ACTION_UP, 0, new int[] {1}, at(53, 63));
         follow(MotionEvent.ACTION_DOWN, 0, new int[] {0}, at(8, 9));
-        assertEquals(List.of("0 1 2 1.0", "2 3 4 1.0", "1 5 6 1.0", "0 8 9 1.0"), heard);
+        assertEquals(List.of("0 1.0 2.0 1.0 0", "2 3.0 4.0 1.0 0", "1 5.0 6.0 1.0 0", "0 8.0 9.0 1.0 0"), heard);
     }
 
     @Test
@@ -49,7 +53,7 @@ public final class FirstFingerTest {
         follow(MotionEvent.ACTION_DOWN, 0, new int[] {0}, at(1, 2));
         follow(MotionEvent.ACTION_CANCEL, 0, new int[] {0}, at(3, 4));
         finger.lift();
-        assertEquals(List.of("0 1 2 1.0", "1 1 2 0.0", "0 1 2 1.0", "3 1 2 0.0"), heard);
+        assertEquals(List.of("0 1.0 2.0 1.0 0", "1 1.0 2.0 0.0 0", "0 1.0 2.0 1.0 0", "3 1.0 2.0 0.0 0"), heard);
     }
 
     private void follow(int action, int actionIndex, int[] ids, float[][]... positions) {

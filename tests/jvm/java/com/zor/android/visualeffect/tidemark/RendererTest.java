@@ -5,16 +5,20 @@ import static org.junit.Assert.assertThrows;
 import static org.junit.Assert.assertTrue;
 
 import android.app.Activity;
+import android.content.res.Resources;
 import android.content.res.TypedArray;
 import android.graphics.Bitmap;
 import android.opengl.GLES20;
 import android.os.SystemClock;
+import android.util.DisplayMetrics;
 import android.view.MotionEvent;
+import android.view.SurfaceHolder;
 
 import org.junit.After;
 import org.junit.Before;
 import org.junit.Test;
 
+import java.lang.reflect.Proxy;
 import java.util.Arrays;
 import java.util.List;
 import java.util.Vector;
@@ -26,7 +30,19 @@ public final class RendererTest {
     private static final int RED = 0xffc04030;
     private static final int GREEN = 0xff40a050;
 
-    private final Activity activity = new Activity();
+    private final Activity activity = new Activity() {
+        @Override
+        public Resources getResources() {
+            return new Resources(null, null, null) {
+                @Override
+                public DisplayMetrics getDisplayMetrics() {
+                    DisplayMetrics display = new DisplayMetrics();
+                    display.density = 2;
+                    return display;
+                }
+            };
+        }
+    };
     private final ViewOfAWindow view = new ViewOfAWindow(activity);
     private final ActivityFollower follower = new ActivityFollower(activity, view);
     private final Bitmap red = plain(Bitmap.Config.ARGB_8888, RED);
@@ -68,13 +84,8 @@ public final class RendererTest {
         byte[] still = Screen.pixels;
         touch(MotionEvent.ACTION_DOWN, 20, 40);
         touch(MotionEvent.ACTION_UP, 20, 40);
-        drawFrame();
+        for (int i = 0; i < 8; ++i) drawFrame();
         assertTrue("a touch raises a wave", difference(still, Screen.pixels) > 30);
-        long before = SystemClock.nanos;
-        Screen.refreshRate = 240;
-        drawFrame();
-        Screen.refreshRate = 60;
-        assertTrue("without ink no frame waits", SystemClock.nanos - before < 10000000);
         int frames = drawUntilRest();
         assertTrue(frames + " frames of waves", frames > 60 && frames < 480);
         assertTrue("water at rest looks as before", difference(still, Screen.pixels) <= 8);
@@ -93,8 +104,12 @@ public final class RendererTest {
         start();
         view.setInk(true);
         drawUntilRest();
+        long before = SystemClock.nanos;
+        Screen.refreshRate = 240;
         drawStroke();
+        Screen.refreshRate = 60;
         assertTrue("ink along a stroke", inked() > 100);
+        assertTrue("20 frames take the time of 20 steps of the ink", SystemClock.nanos - before > 250000000);
 
         view.setPreserveEGLContextOnPause(false);
         stop();
@@ -124,8 +139,10 @@ public final class RendererTest {
         drawUntilRest();
         drawStroke();
         stop();
+        int cleared = GLES20.clears;
         restart();
         assertTrue("ink goes on after a pause that kept the context", inked() > 100);
+        assertEquals("blank frames, as no step of the ink is due", cleared, GLES20.clears);
         view.setInk(false);
         view.setInk(true);
         drawFrame();
@@ -168,6 +185,19 @@ public final class RendererTest {
     }
 
     @Test
+    public void aLargePictureIsCroppedAndEveryPixelCounts() {
+        int[] colors = new int[500 * 640];
+        for (int i = 0; i < colors.length; ++i) {  // a chessboard between red margins
+            int x = i % 500;
+            colors[i] = x < 70 || x >= 430 ? RED : (x / 2 + i / 1000) % 2 == 0 ? 0xff000000 : 0xffffffff;
+        }
+        Bitmap board = Bitmap.createBitmap(colors, 500, 640, Bitmap.Config.ARGB_8888);
+        Bitmap fitted = new Pictures(board, board, board).fitted(0, SHORT, LONG);
+        assertEquals(SHORT + " x " + LONG, fitted.getWidth() + " x " + fitted.getHeight());
+        for (int i = 0; i < fitted.pixels.capacity(); i += 4) assertEquals(127, fitted.pixels.get(i) & 255, 1);
+    }
+
+    @Test
     public void whatIsSetWhileTheViewIsAwayIsKept() {
         start();
         drawUntilRest();
@@ -189,19 +219,41 @@ public final class RendererTest {
         newer.setInk(true);
         Screen.during(newer, () -> showSurface(newer, SHORT, LONG));
         expectColor(GREEN);
+        while (Screen.goOn(newer)) continue;
         framesSeen = Screen.frames;
         touch(MotionEvent.ACTION_DOWN, 20, 40);
         assertEquals("frames of an older view", 0, drawUntilRest());
+
         drawStroke(newer);
         Screen.during(view, () -> showSurface(view, SHORT, LONG));
         for (int i = 1; i <= 20; ++i) {
-            touch(view, MotionEvent.ACTION_MOVE, 50 + i, 80 + 2 * i);
+            touch(MotionEvent.ACTION_MOVE, 50 + i, 80 + 2 * i);
             drawFrame();
         }
         assertEquals("ink of the other view's stroke", 0, inked());
-        Screen.during(newer, view::onStop);
-        assertEquals("red of the other view, which goes on by itself", 0x40, Screen.pixels[0] & 255, 8);
+        Screen.during(view, view::onStop);
+        assertTrue("the other view goes on by itself", Screen.goOn(newer));
+        assertEquals("its red", 0x40, Screen.pixels[0] & 255, 8);
         Screen.during(newer, newer::onDetachedFromWindow);
+    }
+
+    @Test
+    public void theSurfaceHasTheSizeOfTheQuality() {
+        start();
+        drawUntilRest();
+        int cleared = GLES20.clears;
+        view.setQuality(Quality.LOW);
+        view.onSizeChanged(LONG, LONG, 0, 0);  // on a display of two pixels each
+        drawUntilRest();
+        assertEquals("80 x 80", view.sizeSet);
+        assertEquals("blank frames until the surface is another", cleared, GLES20.clears);
+        resize(80, 80);
+        drawUntilRest();
+        expectColor(RED);
+        byte[] still = Screen.pixels;
+        touch(MotionEvent.ACTION_DOWN, LONG / 2, LONG / 4);
+        for (int i = 0; i < 8; ++i) drawFrame();
+        assertTrue("a touch is where it is in the view", difference(rowOf(still), rowOf(Screen.pixels)) > 30);
     }
 
     @Test
@@ -229,28 +281,11 @@ public final class RendererTest {
         view.setLook(look);
         look.meshVertices = 1;  // the view has its own copy
         assertEquals("frames of another mesh", 1, drawUntilRest());
-        expectColor(RED);
-    }
-
-    @Test
-    public void numbersBeyondAllMeasureLeaveTheWaterAlive() {
-        start();
-        drawUntilRest();
-        byte[] still = Screen.pixels;
-        for (float strength : new float[] {Float.NaN, 1e38f}) {
-            view.ripple(40, 40, strength);
-            drawUntilRest();
-            assertTrue("waves of strength " + strength + " calm", difference(still, Screen.pixels) <= 20);
-        }
-        Look look = new Look();
         look.dropRadius = Float.NaN;
-        view.setLook(look);
-        view.ripple(40, 40, 1);
-        drawFrame();
-        drawFrame();
-        assertTrue("a splash shows", difference(still, Screen.pixels) > 30);
-        drawUntilRest();
-        assertTrue("waves of a broken look calm", difference(still, Screen.pixels) <= 20);
+        String message = assertThrows(IllegalArgumentException.class, () -> view.setLook(look)).getMessage();
+        assertTrue(message, message.contains("dropRadius"));
+        assertEquals("frames of a look that is refused", 0, drawUntilRest());
+        expectColor(RED);
     }
 
     @Test
@@ -268,8 +303,19 @@ public final class RendererTest {
     }
 
     private static final class ViewOfAWindow extends TidemarkView {
+        String sizeSet;
+
         ViewOfAWindow(Activity activity) {
             super(activity);
+        }
+
+        @Override
+        public SurfaceHolder getHolder() {
+            return (SurfaceHolder) Proxy.newProxyInstance(getClass().getClassLoader(),
+                    new Class<?>[] {SurfaceHolder.class}, (self, method, values) -> {
+                        if (method.getName().equals("setFixedSize")) sizeSet = values[0] + " x " + values[1];
+                        return null;
+                    });
         }
 
         void reattach() {
@@ -367,6 +413,12 @@ public final class RendererTest {
             if (i % 4 == 3) continue;
             assertTrue((pixels[i] & 255) + " at byte " + i, Math.abs((pixels[i] & 255) - expected[i % 4]) <= 8);
         }
+    }
+
+    // A quarter of the way down.
+    private static byte[] rowOf(byte[] pixels) {
+        int row = pixels.length / Screen.height;
+        return Arrays.copyOfRange(pixels, Screen.height * 3 / 4 * row, (Screen.height * 3 / 4 + 1) * row);
     }
 
     private static int difference(byte[] one, byte[] other) {

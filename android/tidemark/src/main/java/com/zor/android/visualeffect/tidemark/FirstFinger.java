@@ -5,15 +5,17 @@ import android.view.MotionEvent;
 /** Picks the touches of the finger that came down first; the water takes no others. */
 final class FirstFinger {
     interface Listener {
-        void touch(int action, int x, int y, float pressure);
+        /** The position in pixels of the view, and the time in milliseconds of the system's uptime. */
+        void touch(int action, float x, float y, boolean isStylus, float pressure, long time);
     }
 
     private static final int NONE = -1;
 
     private final Listener listener;
     private int finger = NONE;
-    private int lastX;
-    private int lastY;
+    private float lastX;
+    private float lastY;
+    private long lastTime;
 
     FirstFinger(Listener listener) {
         this.listener = listener;
@@ -23,7 +25,7 @@ final class FirstFinger {
         switch (event.getActionMasked()) {
             case MotionEvent.ACTION_DOWN:
                 finger = event.getPointerId(0);
-                send(WaterHost.DOWN, event, 0);
+                send(MotionEvent.ACTION_DOWN, event, 0);
                 break;
             case MotionEvent.ACTION_MOVE:
                 sendMoves(event);
@@ -31,12 +33,12 @@ final class FirstFinger {
             case MotionEvent.ACTION_POINTER_UP:
             case MotionEvent.ACTION_UP:
                 if (event.getPointerId(event.getActionIndex()) == finger) {
-                    send(WaterHost.UP, event, event.getActionIndex());
+                    send(MotionEvent.ACTION_UP, event, event.getActionIndex());
                     finger = NONE;
                 }
                 break;
             case MotionEvent.ACTION_CANCEL:
-                end(WaterHost.CANCEL);
+                end(MotionEvent.ACTION_CANCEL);
                 break;
             default:  // further fingers, and what is no touch
         }
@@ -44,12 +46,12 @@ final class FirstFinger {
 
     /** Ends a touch whose end will not be seen; the ink stays. */
     void lift() {
-        end(WaterHost.UP);
+        end(MotionEvent.ACTION_UP);
     }
 
     private void end(int action) {
         if (finger == NONE) return;
-        listener.touch(action, lastX, lastY, 0);
+        listener.touch(action, lastX, lastY, false, 0, lastTime);
         finger = NONE;
     }
 
@@ -58,19 +60,20 @@ final class FirstFinger {
         int index = event.findPointerIndex(finger);
         if (index < 0) return;
         for (int i = 0; i < event.getHistorySize(); ++i) {
-            send(WaterHost.MOVE, event.getHistoricalX(index, i), event.getHistoricalY(index, i),
-                    event.getHistoricalPressure(index, i));
+            listener.touch(MotionEvent.ACTION_MOVE, event.getHistoricalX(index, i), event.getHistoricalY(index, i),
+                    isStylus(event, index), event.getHistoricalPressure(index, i), event.getHistoricalEventTime(i));
         }
-        send(WaterHost.MOVE, event, index);
+        send(MotionEvent.ACTION_MOVE, event, index);
     }
 
     private void send(int action, MotionEvent event, int index) {
-        send(action, event.getX(index), event.getY(index), event.getPressure(index));
+        lastX = event.getX(index);
+        lastY = event.getY(index);
+        lastTime = event.getEventTime();
+        listener.touch(action, lastX, lastY, isStylus(event, index), event.getPressure(index), lastTime);
     }
 
-    private void send(int action, float x, float y, float pressure) {
-        lastX = Math.round(x);
-        lastY = Math.round(y);
-        listener.touch(action, lastX, lastY, pressure);
+    private static boolean isStylus(MotionEvent event, int index) {
+        return event.getToolType(index) == MotionEvent.TOOL_TYPE_STYLUS;
     }
 }

@@ -4,7 +4,7 @@ import android.graphics.Bitmap;
 
 /**
  * The native library's whole interface, for which {@code jni/natives.h} has the last word. Most apps want
- * {@link TidemarkView} or {@link LiveWater}, which make these calls in the right order. All objects of this class share
+ * {@link TidemarkView}, which makes these calls in the right order. All objects of this class share
  * one effect.
  *
  * <p><b>Threads.</b> The library takes no lock: call every method on the one thread that owns the OpenGL ES 2.0

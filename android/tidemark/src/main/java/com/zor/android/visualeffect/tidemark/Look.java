@@ -231,13 +231,6 @@ public final class Look implements Cloneable {
         framesToFade = (int) values.next("framesToFade", framesToFade, 0, 10000, true);
     }
 
-    /** A copy with every value brought within its limits; one that is not a number takes the lower limit. */
-    Look withinLimits() {
-        Look copy = clone();
-        copy.forEach((name, value, least, most, isWhole) -> value >= least ? Math.min(value, most) : least);
-        return copy;
-    }
-
     /** The value itself, or an {@code IllegalArgumentException} where it is beyond its limits or no number. */
     static double checked(String name, double value, double least, double most, boolean isWhole) {
         if (value >= least && value <= most) return value;

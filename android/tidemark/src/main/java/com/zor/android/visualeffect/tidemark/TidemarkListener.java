@@ -10,7 +10,7 @@ public interface TidemarkListener {
         NO_OPENGL,
         /** The app holds no native library for the device's processor. */
         NO_LIBRARY,
-        /** A side of a picture is longer than the device's largest texture; the earlier pictures stay. */
+        /** A side of the light is longer than the device's largest texture; the earlier pictures stay. */
         PICTURE_TOO_LARGE
     }
 

@@ -4,8 +4,8 @@ import android.opengl.GLES20;
 import android.opengl.GLSurfaceView;
 import android.os.Handler;
 import android.os.Looper;
-import android.os.SystemClock;
 import android.util.Log;
+import android.view.MotionEvent;
 
 import org.jetbrains.annotations.NotNull;
 import org.jetbrains.annotations.Nullable;
@@ -27,8 +27,13 @@ import javax.microedition.khronos.opengles.GL10;
  * not: the next frame takes over what has changed.
  */
 public final class TidemarkRenderer implements GLSurfaceView.Renderer {
+    /** Gives the surface another size, on the main thread. */
+    interface Surface {
+        void setSize(int width, int height);
+    }
+
     private interface Change {
-        void apply(LiveWater water);
+        void apply(NativeWater water);
     }
 
     private interface News {
@@ -37,9 +42,6 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
 
     private static final String TAG = "Tidemark";
 
-    // Seconds. With a look that lets no time pass, ink would wait for ever, and the main thread for this one.
-    private static final double LONGEST_WAIT = 0.1;
-
     // The library serves one effect. The lock is held for every call of it, since each view has its own GL thread.
     private static final List<TidemarkRenderer> SHOWN = new ArrayList<>();  // the newest last
     private static volatile TidemarkRenderer newest;  // of these
@@ -47,17 +49,19 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
 
     // The renderer itself would keep its view and its activity in memory.
     private final Object mark = new Object();
-    private final Runnable requestRender;
+    private final FrameTimer timer;
+    private final Surface surface;
     private final Queue<Change> changes = new ConcurrentLinkedQueue<>();
     private final AtomicReference<Pictures> newPictures = new AtomicReference<>();
     private volatile TidemarkListener listener;
+    private volatile boolean hasView;  // or all that is known is the surface
 
     // Of the GL thread.
-    private LiveWater water;  // null where the library does not load
+    private NativeWater water;  // null where the library does not load
     private boolean isBroken;
-    private Pictures pictures;
-    private int width;
+    private int width;  // of the surface, pixels
     private int height;
+    private Quality quality = Quality.AUTO;
 
     /**
      * With no pictures yet, without ink and rain.
@@ -65,7 +69,12 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
      * @param requestRender asks for one frame, as the method of that name of {@code GLSurfaceView} does
      */
     public TidemarkRenderer(@NotNull Runnable requestRender) {
-        this.requestRender = requestRender;
+        this(requestRender, (width, height) -> {});
+    }
+
+    TidemarkRenderer(Runnable requestRender, Surface surface) {
+        timer = new FrameTimer(requestRender);
+        this.surface = surface;
     }
 
     /**
@@ -91,9 +100,11 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
      * Takes over all values; the water and the ink stay.
      *
      * @param look is copied
+     * @throws IllegalArgumentException naming a value that is beyond its limits; nothing changes
      */
     public void setLook(@NotNull Look look) {
         Look copy = look.clone();
+        copy.forEach(Look::checked);
         change(water -> water.setLook(copy));
     }
 
@@ -108,7 +119,7 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
 
     /** Lets all ink vanish. */
     public void clearInk() {
-        change(LiveWater::clearInk);
+        change(NativeWater::clearInk);
     }
 
     /**
@@ -120,27 +131,47 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
         change(water -> water.setRain(falling));
     }
 
+    void setQuality(Quality quality) {
+        change(water -> {
+            this.quality = quality;
+            if (hasView) water.setQuality(quality.ordinal());
+        });
+    }
+
+    /** Sides in density-independent pixels; from now on the surface has the size that the quality asks for. */
+    void setView(double width, double height, double density) {
+        hasView = true;
+        double now = FrameTimer.now();
+        change(water -> {
+            water.setQuality(quality.ordinal());
+            water.setView(width, height, density, now);
+        });
+    }
+
     /**
-     * One touch event. While another renderer draws, or none, it only ends what began before.
+     * One position of a touch. While another renderer draws, or none, it only ends what began before.
      *
      * @param action as in {@code MotionEvent}: 0 down, 1 up, 2 move, 3 cancel
-     * @param x pixels from the left edge of the view
-     * @param y pixels from its top edge
-     * @param pressure around 1
+     * @param x share of the view's width from its left edge
+     * @param y share of its height from its top edge
+     * @param isStylus whether the pressure counts
+     * @param pressure as {@code MotionEvent} has it
+     * @param time of the event, likewise
      */
-    public void touch(int action, int x, int y, float pressure) {
-        boolean isEnd = action == WaterHost.UP || action == WaterHost.CANCEL;
-        if (isEnd || newest == this) change(water -> water.touch(action, x, y, pressure));
+    public void touch(int action, float x, float y, boolean isStylus, float pressure, long time) {
+        boolean isEnd = action == MotionEvent.ACTION_UP || action == MotionEvent.ACTION_CANCEL;
+        if (!isEnd && newest != this) return;
+        change(water -> water.touch(action, x, y, isStylus, pressure, time * FrameTimer.MILLISECOND));
     }
 
     /**
      * A splash without a finger; it drops no ink. Nothing while another renderer draws, or none.
      *
-     * @param x pixels from the left edge of the view
-     * @param y pixels from its top edge
+     * @param x share of the view's width from its left edge
+     * @param y share of its height from its top edge
      * @param strength 1 for that of a finger that comes down
      */
-    public void ripple(int x, int y, float strength) {
+    public void ripple(float x, float y, float strength) {
         if (newest == this) change(water -> water.splash(x, y, strength));
     }
 
@@ -152,16 +183,17 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
             SHOWN.add(this);
             newest = this;
         }
-        requestRender.run();
+        timer.askForFrame();
     }
 
     /** Asks for no more frames, and lets the one that was shown before go on. */
     public void hide() {
         synchronized (SHOWN) {
             SHOWN.remove(this);
+            timer.stop();
             if (newest != this) return;
             newest = SHOWN.isEmpty() ? null : SHOWN.get(SHOWN.size() - 1);
-            if (newest != null) newest.requestRender.run();
+            if (newest != null) newest.timer.askForFrame();
         }
     }
 
@@ -171,23 +203,23 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
         if (isReady()) water.renewContext();
     }
 
-    /** A surface of the same size in the same context keeps water and ink, as after a pause. */
     @Override
     public void onSurfaceChanged(GL10 gl, int width, int height) {
-        if (!isReady() || width == this.width && height == this.height) return;
         this.width = width;
         this.height = height;
-        water.resize(width, height);
+        if (!isReady()) return;
+        if (!hasView) {
+            water.setQuality(Quality.HIGH.ordinal());  // which stays the same
+            water.setView(width, height, 1, FrameTimer.now());
+        }
+        if (!hasView || water.width() == width && water.height() == height) water.resized();
     }
 
     @Override
     public void onDrawFrame(GL10 gl) {
-        double start = seconds();
-        LiveWater.Frame frame;
-        while ((frame = tryFrame()) == LiveWater.Frame.WAITING && seconds() < start + LONGEST_WAIT) {
-            SystemClock.sleep(1);
+        synchronized (SHOWN) {
+            if (!draw(timer.takeTime())) GLES20.glClear(GLES20.GL_COLOR_BUFFER_BIT);  // nothing to show
         }
-        if (frame != LiveWater.Frame.DRAWN) GLES20.glClear(GLES20.GL_COLOR_BUFFER_BIT);  // nothing to show
     }
 
     void report(TidemarkListener.Failure failure, String message) {
@@ -202,40 +234,46 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
 
     // One that rests would have to clear its surface, and shows its last picture as long as nobody asks.
     private void askForFrame() {
-        if (newest == this) requestRender.run();
+        if (newest == this) timer.askForFrame();
     }
 
-    private LiveWater.Frame tryFrame() {
-        synchronized (SHOWN) {
-            // What was asked for before a newer one came can still be drawn until that one does.
-            if (newest != this && owner != mark || !isReady()) return LiveWater.Frame.RESTING;
-            if (owner != mark) takeOver();
-            takeChanges();
-            // The surface shows its buffer after every call, so every call has to fill it.
-            water.redraw();
-            double start = seconds();
-            LiveWater.Frame frame = water.frame(start);
-            if (frame == LiveWater.Frame.DRAWN) {
-                water.noteWork(seconds() - start);
-                if (!water.isResting()) {
-                    askForFrame();
-                } else {
-                    tell(TidemarkListener::onCalm);
-                }
-            }
-            return frame;
+    private boolean draw(double now) {
+        // What was asked for before a newer one came can still be drawn until that one does.
+        if (newest != this && owner != mark || !isReady()) return false;
+        if (owner != mark) takeOver();
+        takeChanges();
+        // The surface shows its buffer after every call, so every call has to fill it.
+        water.redraw();
+        int frame = water.frame(now);
+        if (frame == NativeWater.RESIZE) {
+            resize();
+            frame = water.frame(now);
         }
+        double due = water.due();
+        if (frame == NativeWater.WAITING && due < FrameTimer.NEVER) {
+            frame = water.frame(due + FrameTimer.MILLISECOND);
+            due = water.due();
+        }
+        if (newest == this) timer.setDue(due);
+        if (frame == NativeWater.DRAWN && due == FrameTimer.NEVER) tell(TidemarkListener::onCalm);
+        return frame == NativeWater.DRAWN;
     }
 
-    private static double seconds() {
-        return SystemClock.elapsedRealtimeNanos() * 1.0e-9;
+    private void resize() {
+        int wantedWidth = water.width();
+        int wantedHeight = water.height();
+        if (wantedWidth == width && wantedHeight == height) {
+            water.resized();
+        } else {
+            new Handler(Looper.getMainLooper()).post(() -> surface.setSize(wantedWidth, wantedHeight));
+        }
     }
 
     // Loads the library, which the layout editor and an app's tests on a desktop do not have.
     private boolean isReady() {
         if (water != null || isBroken) return water != null;
         try {
-            water = new LiveWater(new JniTidemarkRender(), new Look(), (int) System.nanoTime());
+            water = new NativeWater((int) System.nanoTime());
         } catch (LinkageError e) {
             isBroken = true;
             report(TidemarkListener.Failure.NO_LIBRARY, e.toString());
@@ -248,7 +286,7 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
         if (owner != null) {
             new JniTidemarkRender().clearInkValue();
             water.renewContext();
-            if (pictures != null) water.setPictures(pictures = pictures.asNew());
+            water.renewPictures();
         }
         owner = mark;
     }
@@ -262,13 +300,12 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
     private void takePictures(Pictures handedIn) {
         int[] most = new int[1];
         GLES20.glGetIntegerv(GLES20.GL_MAX_TEXTURE_SIZE, most, 0);
-        if (handedIn.longestSide() > most[0]) {
-            report(TidemarkListener.Failure.PICTURE_TOO_LARGE, "a picture has a side of " + handedIn.longestSide()
+        if (handedIn.longestSideOfLight() <= most[0]) {
+            water.setPictures(handedIn);
+        } else {
+            report(TidemarkListener.Failure.PICTURE_TOO_LARGE, "the light has a side of " + handedIn.longestSideOfLight()
                     + " pixels, and the largest texture of the device one of " + most[0]);
-            return;
         }
-        pictures = handedIn;
-        water.setPictures(handedIn);
     }
 
     // A listener that was taken away meanwhile hears nothing.

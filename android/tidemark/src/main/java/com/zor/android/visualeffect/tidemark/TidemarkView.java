@@ -3,6 +3,7 @@ package com.zor.android.visualeffect.tidemark;
 import android.app.Activity;
 import android.app.ActivityManager;
 import android.content.Context;
+import android.content.res.Resources;
 import android.content.res.TypedArray;
 import android.graphics.Bitmap;
 import android.opengl.GLSurfaceView;
@@ -20,7 +21,8 @@ import org.jetbrains.annotations.Nullable;
  * effect when it is.
  *
  * <p>A layout may say {@code app:portrait}, {@code app:landscape} and {@code app:light} (drawables that are bitmaps),
- * {@code app:look} (a raw resource that {@link Look#load} reads), {@code app:ink} and {@code app:rain}.
+ * {@code app:look} (a raw resource that {@link Look#load} reads), {@code app:ink}, {@code app:rain} and
+ * {@code app:quality}.
  *
  * <p>Of several views that are seen the newest one draws, since the library serves a single effect. An older one
  * rests, and goes on when the newer one is stopped, hidden or taken out of its window.
@@ -28,8 +30,13 @@ import org.jetbrains.annotations.Nullable;
 public class TidemarkView extends GLSurfaceView {
     private static final int OPENGL_ES_2 = 0x20000;
 
-    final TidemarkRenderer renderer = new TidemarkRenderer(this::requestFrame);
-    private final FirstFinger finger = new FirstFinger(renderer::touch);
+    final TidemarkRenderer renderer =
+            new TidemarkRenderer(this::requestFrame, (width, height) -> getHolder().setFixedSize(width, height));
+    private final FirstFinger finger = new FirstFinger(this::touch);
+    private final Resources resources;
+    private boolean isLaidOut;
+    private float width;  // of the view, pixels
+    private float height;
     private boolean canDraw;  // not in a layout editor
     private boolean isStopped;
     private boolean hasSurface;
@@ -54,6 +61,7 @@ public class TidemarkView extends GLSurfaceView {
      */
     public TidemarkView(@NotNull Context context, @Nullable AttributeSet attributes) {
         super(context, attributes);
+        resources = context.getResources();
         canDraw = !isInEditMode() && hasOpenGl(context);
         if (canDraw) {
             prepareSurface();
@@ -90,8 +98,9 @@ public class TidemarkView extends GLSurfaceView {
     }
 
     /**
-     * Shows other pictures. The backgrounds are cropped to the view; no side may be longer than the device's largest
-     * texture, 2048 pixels being safe everywhere. Keep the bitmaps unchanged while the view uses them.
+     * Shows other pictures. The backgrounds may have any size: they are cropped to the view and scaled down to it. No side
+     * of the light may be longer than the device's largest texture, 2048 pixels being safe everywhere. Keep the bitmaps
+     * unchanged while the view uses them.
      *
      * @param portrait what the water lies over in an upright view
      * @param landscape and in a wide one
@@ -106,6 +115,7 @@ public class TidemarkView extends GLSurfaceView {
      * Changes how the water looks and moves; the water and the ink stay.
      *
      * @param look is copied
+     * @throws IllegalArgumentException naming a value that is beyond its limits; nothing changes
      */
     public void setLook(@NotNull Look look) {
         renderer.setLook(look);
@@ -135,6 +145,15 @@ public class TidemarkView extends GLSurfaceView {
     }
 
     /**
+     * Chooses how many pixels are drawn; {@link Quality#AUTO} at first.
+     *
+     * @param quality at the cost of time and of battery
+     */
+    public void setQuality(@NotNull Quality quality) {
+        renderer.setQuality(quality);
+    }
+
+    /**
      * A splash without a finger; it drops no ink. Nothing while the view is not shown.
      *
      * @param x pixels from the left edge of the view
@@ -142,7 +161,7 @@ public class TidemarkView extends GLSurfaceView {
      * @param strength 1 for that of a finger that comes down
      */
     public void ripple(float x, float y, float strength) {
-        renderer.ripple(Math.round(x), Math.round(y), strength);
+        renderer.ripple(x / width, y / height, strength);
     }
 
     /**
@@ -210,6 +229,25 @@ public class TidemarkView extends GLSurfaceView {
     }
 
     @Override
+    protected void onSizeChanged(int width, int height, int oldWidth, int oldHeight) {
+        super.onSizeChanged(width, height, oldWidth, oldHeight);
+        isLaidOut = true;
+        this.width = width;
+        this.height = height;
+        double density = resources.getDisplayMetrics().density;
+        renderer.setView(width / density, height / density, density);
+    }
+
+    @Override
+    public void surfaceChanged(SurfaceHolder holder, int format, int width, int height) {
+        if (!isLaidOut) {  // in no window, as in a wallpaper
+            this.width = width;
+            this.height = height;
+        }
+        super.surfaceChanged(holder, format, width, height);
+    }
+
+    @Override
     public void surfaceCreated(SurfaceHolder holder) {
         hasSurface = true;
         showOrHide();
@@ -228,6 +266,10 @@ public class TidemarkView extends GLSurfaceView {
         hasSurface = false;
         showOrHide();
         super.onDetachedFromWindow();
+    }
+
+    private void touch(int action, float x, float y, boolean isStylus, float pressure, long time) {
+        renderer.touch(action, x / width, y / height, isStylus, pressure, time);
     }
 
     private void showOrHide() {

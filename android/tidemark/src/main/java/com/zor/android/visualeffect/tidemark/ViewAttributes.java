@@ -25,6 +25,7 @@ final class ViewAttributes {
             view.setPictures(upright, wide, decode(resources, light));
         }
         view.setInk(given.getBoolean(R.styleable.TidemarkView_ink, false));
+        view.setQuality(Quality.values()[given.getInt(R.styleable.TidemarkView_quality, 0)]);
         view.setRain(given.getBoolean(R.styleable.TidemarkView_rain, false));
     }
 

@@ -1,0 +1,98 @@
+package com.zor.android.visualeffect.tidemark;
+
+import android.graphics.Bitmap;
+
+/**
+ * Water on a screen that is looked at: {@code host/live_water.h} method by method, where each is documented. Call
+ * everything on the GL thread, and of all waters one at a time.
+ */
+final class NativeWater {
+    /** What {@link #frame} answers: nothing to draw until the next call that changes something. */
+    static final int RESTING = 0;
+    /** Nothing to draw yet. */
+    static final int WAITING = 1;
+    /** The framebuffer holds another picture. */
+    static final int DRAWN = 2;
+    /** The surface must first have {@link #width} x {@link #height} pixels. */
+    static final int RESIZE = 3;
+
+    static {
+        System.loadLibrary("TidemarkEffect");
+        System.loadLibrary("TidemarkHost");
+    }
+
+    private final long handle;
+    private Pictures pictures;
+
+    NativeWater(int seed) {
+        handle = create(seed);
+    }
+
+    void setPictures(Pictures pictures) {
+        int changed = pictures.newSince(this.pictures);
+        this.pictures = pictures;
+        picturesChanged(changed);
+    }
+
+    /** The library has lost them. */
+    void renewPictures() {
+        if (pictures != null) picturesChanged(Pictures.ALL);
+    }
+
+    void setLook(Look look) {
+        look.forEach((name, value, least, most, isWhole) -> {
+            if (!setLookValue(name, value)) throw new IllegalArgumentException(name + " cannot be " + value);
+            return value;
+        });
+        applyLook();
+    }
+
+    // Called in the middle of a frame.
+    private Bitmap picture(int slot, int width, int height) {
+        return pictures.fitted(slot, width, height);
+    }
+
+    // Its memory is not the virtual machine's, and a view does not hear that nobody wants it any more.
+    @Override
+    protected void finalize() {
+        destroy();
+    }
+
+    private static native long create(int seed);
+
+    private native void destroy();
+
+    native void setView(double width, double height, double density, double now);
+
+    native void setQuality(int quality);
+
+    native int width();
+
+    native int height();
+
+    native void resized();
+
+    private native boolean setLookValue(String name, double value);
+
+    private native void applyLook();
+
+    native void setInk(boolean withInk);
+
+    native void setRain(boolean falling);
+
+    native void clearInk();
+
+    native void touch(int action, float x, float y, boolean isStylus, float pressure, double time);
+
+    native void splash(float x, float y, float weight);
+
+    private native void picturesChanged(int which);
+
+    native void redraw();
+
+    native void renewContext();
+
+    native int frame(double now);
+
+    native double due();
+}

@@ -82,7 +82,8 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
     jfloat posB, jfloat amplitude);
 
 // Takes one touch event: pixels of the view from the top left, the action code of android.view.MotionEvent, and the
-// pressure. Drops ink with the next frame when the ink is on.
+// pressure. Drops ink with the next frame when the ink is on. The distance between two touches decides the kind of
+// stroke: give it one move for each frame while the finger moves, and none while it rests.
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onTouch(
     JNIEnv* env, jobject, jint x, jint y, jint action, jfloat pressure);
 

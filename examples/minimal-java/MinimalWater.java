@@ -91,11 +91,11 @@ public final class MinimalWater implements GLSurfaceView.Renderer {
             heightAttribs[3 * i + 2] = heights[i % N > 0 ? i - 1 : i];
         }
         library.onDrawFrame(positions, heightAttribs, indices, positions.length, heightAttribs.length, indices.length,
-                mvp, (int) Math.ceil(visibleWidth), (int) Math.ceil(visibleHeight), N, N, 1.75f, 0.5f, 0.7f, 1,
-                0.05f, 0.15f, 0.45f, 0.8f, 4.5f, 40, width > height);
+                mvp, (int) Math.ceil(visibleWidth * 1.015f), (int) Math.ceil(visibleHeight * 1.015f), N, N,
+                1.75f, 0.5f, 0.7f, 1, 0.05f, 0.15f, 0.45f, 0.8f, 4.5f, 40, width > height);
     }
 
-    /** A touch of the first finger, as {@code MotionEvent} has it, in pixels; its history as touches of their own. */
+    /** A touch of the first finger in pixels; of the moves before a frame only the last one. */
     public void touch(int x, int y, int action, float pressure) {
         library.onTouch(x, y, action, pressure);
         float across = (x - 0.5f * width) / width * visibleWidth;

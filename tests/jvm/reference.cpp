@@ -69,7 +69,7 @@ void draw() {
         attribs.values[3 * i + 1] = heights.values[i + kN < kN * kN ? i + kN : i];
         attribs.values[3 * i + 2] = heights.values[i % kN > 0 ? i - 1 : i];
     }
-    const auto extent = [](float visible) { return static_cast<jint>(std::ceil(visible)); };
+    const auto extent = [](float visible) { return static_cast<jint>(std::ceil(visible * 1.015f)); };
     native::onDrawFrame(
         env, nullptr, &positions, &attribs, &indices, 3 * kN * kN, 3 * kN * kN, 6 * (kN - 1) * (kN - 1), &mvp,
         extent(visibleWidth), extent(visibleHeight), kN, kN, 1.75f, 0.5f, 0.7f, 1.0f, 0.05f, 0.15f, 0.45f, 0.8f, 4.5f,

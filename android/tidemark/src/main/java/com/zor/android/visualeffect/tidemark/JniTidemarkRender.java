@@ -130,8 +130,8 @@ public final class JniTidemarkRender {
             float amplitude);
 
     /**
-     * Takes one touch event of one finger; with ink, the next frame drops it there. Hand in historical positions as
-     * events of their own: the distance between two events decides what kind of stroke is drawn.
+     * Takes one touch of one finger; with ink, the next frame drops it there. The distance between two touches decides
+     * what kind of stroke is drawn: call it once for each frame while the finger moves, however often that is reported.
      *
      * @param x pixels from the left edge of the view; outside of it is allowed
      * @param y pixels from its top edge, likewise

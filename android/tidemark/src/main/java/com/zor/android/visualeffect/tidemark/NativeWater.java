@@ -7,11 +7,7 @@ import android.graphics.Bitmap;
  * everything on the GL thread, and of all waters one at a time.
  */
 final class NativeWater {
-    /** What {@link #frame} answers: nothing to draw until the next call that changes something. */
-    static final int RESTING = 0;
-    /** Nothing to draw yet. */
-    static final int WAITING = 1;
-    /** The framebuffer holds another picture. */
+    /** Of what {@link #frame} answers: the framebuffer holds another picture. */
     static final int DRAWN = 2;
     /** The surface must first have {@link #width} x {@link #height} pixels. */
     static final int RESIZE = 3;

@@ -250,10 +250,6 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
             frame = water.frame(now);
         }
         double due = water.due();
-        if (frame == NativeWater.WAITING && due < FrameTimer.NEVER) {
-            frame = water.frame(due + FrameTimer.MILLISECOND);
-            due = water.due();
-        }
         if (newest == this) timer.setDue(due);
         if (frame == NativeWater.DRAWN && due == FrameTimer.NEVER) tell(TidemarkListener::onCalm);
         return frame == NativeWater.DRAWN;

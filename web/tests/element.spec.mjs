@@ -133,8 +133,8 @@ test('of two pictures given the later stays, through other attributes and anothe
     })).toEqual(Array(3).fill([30, 30]));
 });
 
-test('what fails is told once, and a paused water shows another picture at another size', async ({ page }) => {
-    await show(page, `${script}<tidemark-water light="words.png"><img slot="fallback" src="pond.png" alt=""></tidemark-water>`);
+test('what fails is told once, and a paused water shows another picture at another size', async ({ page, problems }) => {
+    await show(page, `${script}<tidemark-water light="words.png" look='{"exponent": 9, "Exponent": 9}'><img slot="fallback" src="pond.png" alt=""></tidemark-water>`);
     await expect(element(page).locator('canvas').last()).toHaveCSS('opacity', '1');
     expect(await element(page).evaluate(async (water, codes = []) => {
         water.addEventListener('error', ({ detail }) => codes.push(detail.code));
@@ -146,6 +146,25 @@ test('what fails is told once, and a paused water shows another picture at anoth
     })).toEqual(['decode']);
     await page.setViewportSize({ width: 300, height: 300 });
     await expect.poll(async () => PNG.sync.read(await element(page).screenshot()).data[4 * 270]).toBeGreaterThan(150);
+    expect(problems.splice(0)).toEqual([expect.stringMatching(/no such numbers: Exponent\./)]);
+});
+
+test('a paused water stands still while something is chosen', async ({ page }) => {
+    await show(page, `${script}<tidemark-water src="pond.png"></tidemark-water>`);
+    await element(page).and(page.locator('[shown]')).waitFor();
+    expect(await element(page).evaluate(async (water) => {
+        const pictures = [];
+        const wait = (milliseconds) => new Promise((resolve) => setTimeout(resolve, milliseconds));
+        water.drop(80, 80);
+        await wait(300);
+        water.pause();
+        for (const inkColor of ['#ff0000', '#00ff00']) {
+            pictures.push(await (await water.toBlob()).text());
+            water.inkColor = inkColor;
+            await wait(100);
+        }
+        return !water.water.calm && pictures[0] === pictures[1];
+    })).toBe(true);
 });
 
 test('in a shadow root content is clicked and rippled, keys drop, and motion keeps to the wish', async ({ page }) => {

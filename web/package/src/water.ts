@@ -91,6 +91,7 @@ export class Water extends EventTarget implements Borrower, Touched {
     private dropTimer = 0;
     private view = '';        // that the library has
     private given = '';       // and the look
+    private leftOut = '';     // of which the console has been told
     private picture: Picture | undefined;
     private pictureTicket = 0;
     private pictureSource: Source | null | undefined;
@@ -454,18 +455,23 @@ export class Water extends EventTarget implements Borrower, Touched {
         const preset = presets[options.preset ?? ''];
         const rain = this.reduced() ? 0 : options.rain ?? preset?.rain ?? 0;
         const look = lookOf(options);
-        const text = JSON.stringify([look, options.look]);
-        if (text !== this.given) {
-            native.setLook(look);
-            const known = withinRange(options.look ?? {});
-            const unknown = Object.keys(options.look ?? {}).filter((name) => !(name in known));
-            if (unknown.length > 0) console.warn(`tidemark-water: the look has no such numbers: ${unknown.join(', ')}.`);
-        }
+        const text = JSON.stringify(look);
+        if (text !== this.given) native.setLook(look);
         this.given = text;
+        this.warn();
         this.stale = true;
         native._setInk(options.ink ?? preset?.ink ?? false);
         native._setRain(rain > 0);
         this.wake();
+    }
+
+    // Of what is left out of the look.
+    private warn(): void {
+        const { look } = this.options;
+        const known = withinRange(look ?? {});
+        const names = Object.keys(look ?? {}).filter((name) => !(name in known)).join(', ');
+        if (names !== this.leftOut && names) console.warn(`tidemark-water: the look has no such numbers: ${names}.`);
+        this.leftOut = names;
     }
 
     // False where there is nothing to draw on.

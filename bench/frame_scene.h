@@ -1,4 +1,4 @@
-// The reference host at work, one frame at a time, whatever GL is behind it.
+// The host at work, one frame at a time, whatever GL is behind it.
 #pragma once
 
 #include <android/log.h>

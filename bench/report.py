@@ -111,7 +111,7 @@ for what, limit, values, timed in rows:
 
 lines += [
     "",
-    "Whole frames of the reference host, with the vertices along a side of the mesh and the size of the view. CPU time is",
+    "Whole frames of the host, with the vertices along a side of the mesh and the size of the view. CPU time is",
     "measured with a GL that only counts its calls. The last column is a whole frame with the software driver",
     f"({next(iter(driver_runs.values()))['label']}), which also draws on the CPU.",
     "",

@@ -57,19 +57,6 @@ Picture shrunk(const Picture& picture, const std::vector<Span>& columns, const s
     return result;
 }
 
-void handOver(PictureSlot slot, const Picture& picture) {
-    DesktopBitmap bitmap;
-    bitmap.info.width = static_cast<std::uint32_t>(picture.width);
-    bitmap.info.height = static_cast<std::uint32_t>(picture.height);
-    bitmap.info.stride = bitmap.info.width * 4;
-    bitmap.info.format = ANDROID_BITMAP_FORMAT_RGBA_8888;
-    bitmap.pixels = const_cast<std::uint8_t*>(picture.rgba.data());
-    const auto transfer = slot == PictureSlot::portrait    ? native::transferPortraitBGBitmap
-                          : slot == PictureSlot::landscape ? native::transferLandscapeBGBitmap
-                                                           : native::transferWaterBitmap;
-    transfer(hostEnvironment(), nullptr, &bitmap);
-}
-
 }  // namespace
 
 Picture fitted(const Picture& picture, int width, int height) {
@@ -85,6 +72,19 @@ Picture fitted(const Picture& picture, int width, int height) {
     return shrunk(
         picture, spans((picture.width - columns) / 2, columns, columns),  // NOLINT(bugprone-integer-division)
         spans((picture.height - rows) / 2, rows, rows));                  // NOLINT(bugprone-integer-division)
+}
+
+void handOver(PictureSlot slot, const Picture& picture) {
+    DesktopBitmap bitmap;
+    bitmap.info.width = static_cast<std::uint32_t>(picture.width);
+    bitmap.info.height = static_cast<std::uint32_t>(picture.height);
+    bitmap.info.stride = bitmap.info.width * 4;
+    bitmap.info.format = ANDROID_BITMAP_FORMAT_RGBA_8888;
+    bitmap.pixels = const_cast<std::uint8_t*>(picture.rgba.data());
+    const auto transfer = slot == PictureSlot::portrait    ? native::transferPortraitBGBitmap
+                          : slot == PictureSlot::landscape ? native::transferLandscapeBGBitmap
+                                                           : native::transferWaterBitmap;
+    transfer(hostEnvironment(), nullptr, &bitmap);
 }
 
 PictureSource sourceOf(const Pictures& pictures) {

@@ -24,5 +24,8 @@ struct Pictures {
 // where it has more. Each pixel of the result is the mean of the area that it covers.
 Picture fitted(const Picture& picture, int width, int height);
 
+// Hands a picture over as it is.
+void handOver(PictureSlot slot, const Picture& picture);
+
 // Hands over pictures that stay where they are.
 PictureSource sourceOf(const Pictures& pictures);

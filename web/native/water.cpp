@@ -46,13 +46,11 @@ EM_JS(void, forgetObjects, (), {
 namespace {
 
 PictureSource pageSource() {
-    static const Picture pixel = {1, 1, {0, 0, 0, 255}};
-    static const Pictures placeholders = {pixel, pixel, pixel};
-    static const PictureSource placeholder = sourceOf(placeholders);
+    static const Picture placeholder = {1, 1, {0, 0, 0, 255}};
     return {
         [](PictureSlot slot, int width, int height) {
             wanted[static_cast<int>(slot)] = {width, height};
-            placeholder.handOver(slot, 1, 1);
+            handOver(slot, placeholder);
         },
         [](PictureSlot slot) {
             const auto [width, height] = wanted[static_cast<int>(slot)];

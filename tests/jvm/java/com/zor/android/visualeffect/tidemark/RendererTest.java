@@ -279,9 +279,8 @@ public final class RendererTest {
         look.meshVertices = 64;
         look.stepsToRest = 5;
         view.setLook(look);
-        look.meshVertices = 1;  // the view has its own copy
+        look.dropRadius = Float.NaN;  // the view has its own copy
         assertEquals("frames of another mesh", 1, drawUntilRest());
-        look.dropRadius = Float.NaN;
         String message = assertThrows(IllegalArgumentException.class, () -> view.setLook(look)).getMessage();
         assertTrue(message, message.contains("dropRadius"));
         assertEquals("frames of a look that is refused", 0, drawUntilRest());

@@ -22,6 +22,6 @@ offline=(unshare --net)
 grep 'The desktop program is left out' configured || fail "does not say what is missing"
 "${offline[@]}" cmake --build build --parallel "$(nproc)" >built 2>&1 || fail "fails: $(cat built)"
 ! grep --after-context 9 'warning:' built || fail "warns"
-source/tests/elf_test.sh build/libTidemarkEffect.so source/jni/natives.h
+source/tests/elf_test.sh build/libTidemarkEffect.so source/jni/natives.h 90000
 grep -q 'CMAKE_BUILD_TYPE:STRING=Release' build/CMakeCache.txt || fail "is not optimized"
 diff <(echo "$before") <(listing) || fail "changes its sources"

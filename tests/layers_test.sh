@@ -20,7 +20,7 @@ declare -A below=(
     [android]="$faces"
     [bench]="$library host platform tests/support"
     [fuzz]="$library host platform tests/support"
-    [tests]="$library host platform pictures preview bench"
+    [tests]="$library host platform pictures preview bench android"
 )
 failed=0
 while IFS= read -r folder; do

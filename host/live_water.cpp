@@ -139,7 +139,11 @@ LiveWater::Frame LiveWater::frame(double now) {
             host_.time() + seconds - ago);
     }
     touches_.clear();
-    if (!host_.advance(seconds)) return Frame::waiting;
+    if (!host_.advance(seconds)) {
+        // A touch may have changed nothing, as one that ends without ink does.
+        isRunning_ = !isResting();
+        return isRunning_ ? Frame::waiting : Frame::resting;
+    }
     host_.draw();
     if (pace_.frameDrawn(now, host_.inkMoves() ? 1.0 / 60 : 0.0)) {
         host_.setMeshShare(pace_.level().mesh);

@@ -80,7 +80,7 @@ void run(GLFWwindow* window, Stage& stage) {
                 glfwPollEvents();
                 break;
             case LiveWater::Frame::waiting:
-                glfwWaitEventsTimeout(std::max(stage.water.due() - glfwGetTime(), 0.0005));
+                glfwWaitEventsTimeout(std::clamp(stage.water.due() - glfwGetTime(), 0.0005, 1.0));
                 break;
             case LiveWater::Frame::resting:
                 glfwWaitEvents();

@@ -99,6 +99,8 @@ TEST_F(Live, drawsWhatHasChangedAndRestsOtherwise) {
     EXPECT_GT(frames, 60);
     EXPECT_LT(frames, 600);
 
+    touch(TouchAction::up);
+    EXPECT_EQ(next(), Frame::resting) << "a finger that goes without ink changes nothing";
     water.redraw();
     EXPECT_EQ(next(), Frame::drawn);
     water.setRain(true);

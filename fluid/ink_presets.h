@@ -65,7 +65,7 @@ inline constexpr InkPreset kSetUpPreset = {
     .velocityDissipation = 0.9f,
     .densityDissipation = 0.92f};
 
-// What a released drag leaves for the fading ink.
+// A released drag sets these factors for the ink that fades.
 inline constexpr float kReleasedVelocityDissipation = 0.9f;
 inline constexpr float kReleasedDensityDissipation = 0.9f;
 

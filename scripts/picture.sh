@@ -46,26 +46,6 @@ for vertices in 96 128 192 256; do
         --every 26 --out "out/quality-$vertices"
 done
 parts=()
-# The same stroke at 15, 60 and 144 frames a second.
-parts=()
-for fps in 15 60 144; do
-    "$preview" --script scenes/figure_eight.touch --fps "$fps" --seconds 2 --every $((2 * fps - 1)) --out "out/strokes-$fps"
-    parts+=(-i "out/strokes-$fps/frame-0001.png")
-done
-ffmpeg -v error -y "${parts[@]}" -filter_complex "hstack=inputs=3,crop=1620:640:0:280,scale=1200:-1" \
-    -frames:v 1 -c:v libwebp -quality 80 docs/strokes.webp
-
-# The same stroke on a phone at each quality.
-parts=()
-for quality in low medium high; do
-    "$preview" --script scenes/welcome.touch --size 1080x2340 --density 3 --quality "$quality" --seconds 1.6 \
-        --every 95 --out "out/quality-$quality"
-    parts+=(-i "out/quality-$quality/frame-0001.png")
-done
-ffmpeg -v error -y "${parts[@]}" -filter_complex \
-    "[0]scale=540:-1[a];[1]scale=540:-1[b];[2]scale=540:-1[c];[a][b][c]hstack=inputs=3,crop=1620:700:0:300,scale=1200:-1" \
-    -frames:v 1 -c:v libwebp -quality 80 docs/density.webp
-
 for vertices in 96 128 192 256; do
     parts+=(-i "out/quality-$vertices/frame-0001.png")
 done

@@ -7,7 +7,7 @@
 
 namespace {
 
-// What stands behind a NativeWater. It draws with the arrays of its own; only pictures are Java's.
+// The native part of a NativeWater. It draws with its own arrays; only the pictures belong to Java.
 struct Water {
     explicit Water(std::uint32_t seed)
         : live({[this](PictureSlot slot, int width, int height) { handOver(slot, width, height); }, {}}, seed) {}

@@ -1,6 +1,6 @@
 #include <Eigen/Core>
 
-#include "bench/forms.h"
+#include "reference/forms.h"
 
 namespace {
 

@@ -3,8 +3,8 @@
 #include <cmath>
 #include <cstdio>
 
-#include "bench/ink_grid.h"
-#include "bench/surface.h"
+#include "reference/ink_grid.h"
+#include "reference/surface.h"
 
 namespace {
 

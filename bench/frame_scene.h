@@ -6,8 +6,8 @@
 #include <cmath>
 
 #include "host/water_host.h"
-#include "tests/support/gesture_state.h"
-#include "tests/support/test_pictures.h"
+#include "probes/gesture_state.h"
+#include "probes/smooth_picture.h"
 
 enum class Scene { water, idleInk, drag };
 

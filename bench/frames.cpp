@@ -9,14 +9,14 @@
 #include <vector>
 
 #include "bench/frame_scene.h"
-#include "bench/surface.h"
+#include "reference/surface.h"
 #include "fluid/fluid.h"
 #include "host/surface_mesh.h"
 #include "jni/globals.h"
 #include "jni/ink_frame.h"
-#include "tests/support/counting_gl.h"
-#include "tests/support/gesture_state.h"
-#include "tests/support/library_blocks.h"
+#include "probes/counting_gl.h"
+#include "probes/gesture_state.h"
+#include "probes/library_blocks.h"
 
 namespace {
 

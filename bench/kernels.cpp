@@ -5,8 +5,8 @@
 
 #include <string>
 
-#include "bench/ink_grid.h"
-#include "bench/surface.h"
+#include "reference/ink_grid.h"
+#include "reference/surface.h"
 
 namespace {
 

@@ -10,7 +10,7 @@
 
 #include "fuzz/require.h"
 #include "jni/bitmaps.h"
-#include "tests/support/gesture_state.h"
+#include "probes/gesture_state.h"
 
 namespace {
 

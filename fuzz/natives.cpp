@@ -13,7 +13,7 @@
 #include "host/native_names.h"
 #include "jni/globals.h"
 #include "platform/desktop_bitmap.h"
-#include "tests/support/copying_environment.h"
+#include "probes/copying_environment.h"
 
 namespace {
 

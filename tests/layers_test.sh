@@ -18,9 +18,11 @@ declare -A below=(
     [preview]="$faces"
     [web]="$faces"
     [android]="$faces"
-    [bench]="$library host platform tests/support"
-    [fuzz]="$library host platform tests/support"
-    [tests]="$library host platform pictures preview bench android"
+    [reference]="$library"
+    [probes]="$library host platform"
+    [bench]="$library host platform reference probes"
+    [fuzz]="$library host platform probes"
+    [tests]="$library host platform pictures preview android reference probes"
 )
 failed=0
 while IFS= read -r folder; do

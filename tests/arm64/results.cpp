@@ -9,8 +9,8 @@
 #include <limits>
 #include <span>
 
-#include "bench/ink_grid.h"
-#include "bench/surface.h"
+#include "reference/ink_grid.h"
+#include "reference/surface.h"
 #include "tshader/flush_denormals.h"
 #include "water/mesh.h"
 

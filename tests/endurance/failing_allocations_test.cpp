@@ -4,9 +4,9 @@
 
 #include "gl/shader_program.h"
 #include "tests/endurance/hands.h"
-#include "tests/support/gesture_state.h"
+#include "probes/gesture_state.h"
 #include "tests/support/gl_test.h"
-#include "tests/support/library_blocks.h"
+#include "probes/library_blocks.h"
 
 namespace {
 

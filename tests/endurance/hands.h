@@ -7,7 +7,7 @@
 #include <string_view>
 
 #include "preview/touch_script.h"
-#include "tests/support/test_pictures.h"
+#include "probes/smooth_picture.h"
 
 // A taste in every run of the tests, all of it where the environment asks for it.
 inline bool isFullLength() {

@@ -10,9 +10,9 @@
 
 #include "jni/globals.h"
 #include "tests/endurance/hands.h"
-#include "tests/support/counting_gl.h"
-#include "tests/support/gesture_state.h"
-#include "tests/support/library_blocks.h"
+#include "probes/counting_gl.h"
+#include "probes/gesture_state.h"
+#include "probes/library_blocks.h"
 #include "tests/support/log_recorder.h"
 
 namespace {

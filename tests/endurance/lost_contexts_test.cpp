@@ -5,9 +5,9 @@
 #include <string_view>
 
 #include "tests/endurance/hands.h"
-#include "tests/support/gesture_state.h"
+#include "probes/gesture_state.h"
 #include "tests/support/gl_test.h"
-#include "tests/support/library_blocks.h"
+#include "probes/library_blocks.h"
 
 namespace {
 

@@ -2,7 +2,7 @@
 #include <cstdlib>
 #include <string_view>
 
-#include "bench/forms.h"
+#include "reference/forms.h"
 #include "fluid/fluid.h"
 #include "fluid/touch.h"
 #include "jni/globals.h"

@@ -2,7 +2,7 @@
 #include <cstdlib>
 #include <random>
 
-#include "bench/ink_grid.h"
+#include "reference/ink_grid.h"
 #include "fluid/fluid.h"
 #include "jni/globals.h"
 #include "tests/support/gl_test.h"

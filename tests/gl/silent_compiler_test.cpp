@@ -5,7 +5,7 @@
 #include <vector>
 
 #include "gl/shader_program.h"
-#include "tests/support/counting_gl.h"
+#include "probes/counting_gl.h"
 #include "tests/support/log_recorder.h"
 
 using Lines = std::vector<std::string>;

@@ -7,9 +7,9 @@
 #include "host/picture.h"
 #include "jni/bitmaps.h"
 #include "jni/globals.h"
-#include "tests/support/gesture_state.h"
+#include "probes/gesture_state.h"
 #include "tests/support/gl_test.h"
-#include "tests/support/test_pictures.h"
+#include "probes/smooth_picture.h"
 
 namespace {
 

@@ -5,9 +5,9 @@
 #include "host/live_water.h"
 #include "host/picture.h"
 #include "jni/globals.h"
-#include "tests/support/gesture_state.h"
+#include "probes/gesture_state.h"
 #include "tests/support/gl_test.h"
-#include "tests/support/test_pictures.h"
+#include "probes/smooth_picture.h"
 
 namespace {
 

@@ -5,9 +5,9 @@
 #include <limits>
 #include <numeric>
 
-#include "tests/support/gesture_state.h"
+#include "probes/gesture_state.h"
 #include "tests/support/gl_test.h"
-#include "tests/support/test_pictures.h"
+#include "probes/smooth_picture.h"
 
 namespace {
 

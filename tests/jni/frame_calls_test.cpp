@@ -7,10 +7,10 @@
 #include "host/water_host.h"
 #include "jni/gesture.h"
 #include "jni/globals.h"
-#include "tests/support/counting_gl.h"
+#include "probes/counting_gl.h"
 #include "tests/support/frame.h"
-#include "tests/support/gesture_state.h"
-#include "tests/support/library_blocks.h"
+#include "probes/gesture_state.h"
+#include "probes/library_blocks.h"
 #include "tests/support/log_recorder.h"
 
 namespace {

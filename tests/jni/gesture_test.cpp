@@ -7,7 +7,7 @@
 #include <limits>
 #include <vector>
 
-#include "tests/support/gesture_state.h"
+#include "probes/gesture_state.h"
 
 namespace {
 

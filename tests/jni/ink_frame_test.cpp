@@ -6,7 +6,7 @@
 
 #include "jni/gesture.h"
 #include "tests/support/frame.h"
-#include "tests/support/gesture_state.h"
+#include "probes/gesture_state.h"
 #include "tests/support/gl_test.h"
 
 namespace {

@@ -16,7 +16,7 @@
 #include "platform/desktop_bitmap.h"
 #include "platform/headless_context.h"
 #include "tests/support/log_recorder.h"
-#include "tests/support/test_pictures.h"
+#include "probes/smooth_picture.h"
 
 namespace {
 

@@ -2,7 +2,7 @@
 #pragma once
 
 #include "host/native_names.h"
-#include "tests/support/copying_environment.h"
+#include "probes/copying_environment.h"
 
 struct Frame {
     FloatArray positions{12}, heights{12}, mvp{16}, velocity{4}, height{4};

@@ -4,7 +4,7 @@
 #include <random>
 #include <span>
 
-#include "bench/ink_grid.h"
+#include "reference/ink_grid.h"
 
 namespace {
 

@@ -6,7 +6,7 @@
 #include <limits>
 #include <vector>
 
-#include "bench/forms.h"
+#include "reference/forms.h"
 
 TEST(VelocityPacking, givesTheBytesOfDoublePrecision) {
     const float infinity = std::numeric_limits<float>::infinity();

@@ -7,7 +7,7 @@
 #include <random>
 #include <vector>
 
-#include "bench/forms.h"
+#include "reference/forms.h"
 
 namespace {
 

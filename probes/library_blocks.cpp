@@ -1,4 +1,4 @@
-#include "tests/support/library_blocks.h"
+#include "probes/library_blocks.h"
 
 #include <cstddef>
 #include <cstring>

@@ -1,4 +1,4 @@
-#include "bench/forms.h"
+#include "reference/forms.h"
 #include "tshader/velocity_packing.h"
 
 const Forms kLibrary = {

@@ -4,7 +4,7 @@
 #include <random>
 #include <vector>
 
-#include "bench/forms.h"
+#include "reference/forms.h"
 
 struct Surface {
     // Heights within +-amplitude; N x N vertices.

@@ -1,4 +1,4 @@
-#include "tests/support/counting_gl.h"
+#include "probes/counting_gl.h"
 
 #include <GLES2/gl2.h>
 

@@ -5,7 +5,7 @@
 #include <cmath>
 #include <vector>
 
-#include "bench/forms.h"
+#include "reference/forms.h"
 
 namespace {
 

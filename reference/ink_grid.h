@@ -5,7 +5,7 @@
 
 #include <vector>
 
-#include "bench/forms.h"
+#include "reference/forms.h"
 
 struct InkGrid {
     InkGrid(int viewWidth, int viewHeight);

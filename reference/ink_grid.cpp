@@ -1,4 +1,4 @@
-#include "bench/ink_grid.h"
+#include "reference/ink_grid.h"
 
 #include <algorithm>
 #include <random>

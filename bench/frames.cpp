@@ -9,7 +9,6 @@
 #include <vector>
 
 #include "bench/frame_scene.h"
-#include "reference/surface.h"
 #include "fluid/fluid.h"
 #include "host/surface_mesh.h"
 #include "jni/globals.h"
@@ -17,6 +16,7 @@
 #include "probes/counting_gl.h"
 #include "probes/gesture_state.h"
 #include "probes/library_blocks.h"
+#include "reference/surface.h"
 
 namespace {
 

@@ -3,10 +3,10 @@
 #include <map>
 
 #include "gl/shader_program.h"
-#include "tests/endurance/hands.h"
 #include "probes/gesture_state.h"
-#include "tests/support/gl_test.h"
 #include "probes/library_blocks.h"
+#include "tests/endurance/hands.h"
+#include "tests/support/gl_test.h"
 
 namespace {
 

@@ -9,10 +9,10 @@
 #include <tuple>
 
 #include "jni/globals.h"
-#include "tests/endurance/hands.h"
 #include "probes/counting_gl.h"
 #include "probes/gesture_state.h"
 #include "probes/library_blocks.h"
+#include "tests/endurance/hands.h"
 #include "tests/support/log_recorder.h"
 
 namespace {

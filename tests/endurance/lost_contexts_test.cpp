@@ -4,10 +4,10 @@
 #include <random>
 #include <string_view>
 
-#include "tests/endurance/hands.h"
 #include "probes/gesture_state.h"
-#include "tests/support/gl_test.h"
 #include "probes/library_blocks.h"
+#include "tests/endurance/hands.h"
+#include "tests/support/gl_test.h"
 
 namespace {
 

@@ -2,10 +2,10 @@
 #include <cstdlib>
 #include <string_view>
 
-#include "reference/forms.h"
 #include "fluid/fluid.h"
 #include "fluid/touch.h"
 #include "jni/globals.h"
+#include "reference/forms.h"
 #include "tests/support/gl_test.h"
 
 namespace {

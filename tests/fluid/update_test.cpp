@@ -2,9 +2,9 @@
 #include <cstdlib>
 #include <random>
 
-#include "reference/ink_grid.h"
 #include "fluid/fluid.h"
 #include "jni/globals.h"
+#include "reference/ink_grid.h"
 #include "tests/support/gl_test.h"
 
 namespace {

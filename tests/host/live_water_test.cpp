@@ -8,8 +8,8 @@
 #include "jni/bitmaps.h"
 #include "jni/globals.h"
 #include "probes/gesture_state.h"
-#include "tests/support/gl_test.h"
 #include "probes/smooth_picture.h"
+#include "tests/support/gl_test.h"
 
 namespace {
 

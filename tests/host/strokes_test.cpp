@@ -6,8 +6,8 @@
 #include "host/picture.h"
 #include "jni/globals.h"
 #include "probes/gesture_state.h"
-#include "tests/support/gl_test.h"
 #include "probes/smooth_picture.h"
+#include "tests/support/gl_test.h"
 
 namespace {
 

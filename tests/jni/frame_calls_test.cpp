@@ -8,9 +8,9 @@
 #include "jni/gesture.h"
 #include "jni/globals.h"
 #include "probes/counting_gl.h"
-#include "tests/support/frame.h"
 #include "probes/gesture_state.h"
 #include "probes/library_blocks.h"
+#include "tests/support/frame.h"
 #include "tests/support/log_recorder.h"
 
 namespace {

@@ -5,8 +5,8 @@
 #include <limits>
 
 #include "jni/gesture.h"
-#include "tests/support/frame.h"
 #include "probes/gesture_state.h"
+#include "tests/support/frame.h"
 #include "tests/support/gl_test.h"
 
 namespace {

@@ -3,8 +3,8 @@
 #include <algorithm>
 
 #include "jni/gesture.h"
-#include "tests/support/frame.h"
 #include "probes/gesture_state.h"
+#include "tests/support/frame.h"
 #include "tests/support/gl_test.h"
 
 namespace {

@@ -15,8 +15,8 @@
 #include "host/native_names.h"
 #include "platform/desktop_bitmap.h"
 #include "platform/headless_context.h"
-#include "tests/support/log_recorder.h"
 #include "probes/smooth_picture.h"
+#include "tests/support/log_recorder.h"
 
 namespace {
 

@@ -6,7 +6,7 @@
 #include <string>
 
 #include "bench/frame_scene.h"
-#include "platform/headless_context.h"
+#include "desktop/headless_context.h"
 
 namespace {
 

@@ -8,7 +8,7 @@
 
 #include "base/log.h"
 #include "fluid/fluid.h"
-#include "fluid/ink_presets.h"
+#include "fluid/ink_tuning.h"
 #include "gl/targets.h"
 
 namespace {

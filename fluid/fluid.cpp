@@ -4,7 +4,7 @@
 
 #include "base/log.h"
 #include "fluid/buffers.h"
-#include "fluid/ink_presets.h"
+#include "fluid/ink_tuning.h"
 #include "gl/picture_texture.h"
 #include "gl/quad.h"
 #include "water/renderer.h"

@@ -43,12 +43,3 @@ void Fluid::AddInk(Surface_ source, Surface_ destination, int mode, Vector_ prev
     DrawQuad();
     ResetState();
 }
-
-void Fluid::Inject(int mode, float x1, float y1, float x2, float y2, Color_ color) {
-    recordStroke(*this, x1, y1, x2, y2);
-    InkColor = color;
-    const Touch touch = latestTouch(*this);
-    if (!isInside(*this, touch.x, touch.y, BoundaryMargin)) return;
-    AddInk(Density.Ping, Density.Pong, mode, Previous, Current, ImpulseDensity);
-    SwapSurfaces(&Density);
-}

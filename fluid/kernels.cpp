@@ -1,8 +1,5 @@
-#include <utility>
-
 #include "fluid/fluid.h"
 #include "fluid/touch.h"
-#include "tshader/flush_denormals.h"
 
 // Each wrapper hands its kernel the fields and uniforms of this call and runs it.
 
@@ -85,13 +82,4 @@ void Fluid::SubtractGradient(Texture<vec2> velocity, Texture<float> pressure, Te
     kernel.InverseSize = inverseSize(*this);
     kernel.GradientScale = GradientScale;
     kernel.run();
-}
-
-void Fluid::Perturb(float x0, float y0, float x1, float y1) {
-    recordStroke(*this, x0, y0, x1, y1);
-    const Touch touch = latestTouch(*this);
-    if (!isInside(*this, touch.x, touch.y, BoundaryMargin)) return;
-    const FlushDenormals flush;
-    AddVelocity(VelocityTex, VelocityTexTemp, Previous, Current);
-    std::swap(VelocityTex, VelocityTexTemp);
 }

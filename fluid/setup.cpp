@@ -4,7 +4,7 @@
 #include "base/log.h"
 #include "fluid/buffers.h"
 #include "fluid/fluid.h"
-#include "fluid/ink_presets.h"
+#include "fluid/ink_tuning.h"
 #include "gl/shader_program.h"
 #include "shaders/shaders.h"
 

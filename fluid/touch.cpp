@@ -1,7 +1,9 @@
 #include "fluid/touch.h"
 
 #include <cmath>
+#include <utility>
 
+#include "base/flush_denormals.h"
 #include "base/touch_state.h"
 #include "base/wrapping.h"
 
@@ -30,4 +32,22 @@ Segment segmentBetween(Vector_ previous, Vector_ current) {
     float length = static_cast<float>(std::sqrt(static_cast<double>(dx * dx + dy * dy)));
     if (length == 0.0f) length = 1.0f;
     return {{dx / length, dy / length}, length};
+}
+
+void Fluid::Inject(int mode, float x1, float y1, float x2, float y2, Color_ color) {
+    recordStroke(*this, x1, y1, x2, y2);
+    InkColor = color;
+    const Touch touch = latestTouch(*this);
+    if (!isInside(*this, touch.x, touch.y, BoundaryMargin)) return;
+    AddInk(Density.Ping, Density.Pong, mode, Previous, Current, ImpulseDensity);
+    SwapSurfaces(&Density);
+}
+
+void Fluid::Perturb(float x0, float y0, float x1, float y1) {
+    recordStroke(*this, x0, y0, x1, y1);
+    const Touch touch = latestTouch(*this);
+    if (!isInside(*this, touch.x, touch.y, BoundaryMargin)) return;
+    const FlushDenormals flush;
+    AddVelocity(VelocityTex, VelocityTexTemp, Previous, Current);
+    std::swap(VelocityTex, VelocityTexTemp);
 }

@@ -2,13 +2,13 @@
 #include <cstdlib>
 #include <utility>
 
+#include "base/flush_denormals.h"
+#include "base/groups.h"
 #include "base/scratch.h"
 #include "fluid/fluid.h"
-#include "fluid/ink_presets.h"
+#include "fluid/ink_tuning.h"
 #include "fluid/touch.h"
 #include "gl/targets.h"
-#include "tshader/flush_denormals.h"
-#include "tshader/groups.h"
 #include "tshader/velocity_packing.h"
 
 namespace {

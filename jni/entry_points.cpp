@@ -1,7 +1,7 @@
 #include <GLES2/gl2.h>
 
 #include "base/log.h"
-#include "fluid/ink_presets.h"
+#include "fluid/ink_tuning.h"
 #include "jni/bitmaps.h"
 #include "jni/gesture.h"
 #include "jni/globals.h"

@@ -3,7 +3,7 @@
 #include <cmath>
 
 #include "base/wrapping.h"
-#include "fluid/ink_presets.h"
+#include "fluid/ink_tuning.h"
 #include "jni/globals.h"
 
 namespace {
@@ -50,9 +50,9 @@ void touchWhileTapping(int x, int y, int action) {
 
 void touchWhileDragging(int x, int y, int action) {
     const float distance = measureMovement(x, y);
-    isMovingEvent = distance > static_cast<float>(Allegro_threshold)   ? kFast
-                    : distance > static_cast<float>(Andante_threshold) ? kMedium
-                                                                       : kSlow;
+    isMovingEvent = distance > static_cast<float>(Allegro_threshold)   ? kFastDrag
+                    : distance > static_cast<float>(Andante_threshold) ? kMediumDrag
+                                                                       : kSlowDrag;
     if (action != kActionUp) return;
     if (step < max_step && drag_step <= 9) {
         // Hardly a drag: it goes on as the tap that it came from.

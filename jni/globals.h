@@ -7,7 +7,6 @@
 #include "fluid/fluid.h"
 
 enum GestureState { kIdle = 0, kTapping = 1, kDragging = 2 };
-enum SpeedClass { kUnmeasured = -1, kSlow = 0, kMedium = 1, kFast = 2 };
 enum MotionAction {
     kActionDown = 0,
     kActionUp = 1,
@@ -22,7 +21,7 @@ extern int Allegro_threshold;  // pixels above which it is fast
 extern int acc_step;           // tap frames in which the divergence source grows
 extern int sim_step;           // tap frames in which ink is injected
 extern int max_step;           // length of a tap, frames
-extern int isMovingEvent;      // SpeedClass of the latest drag movement
+extern int isMovingEvent;      // StrokeKind of the latest drag movement, kTap until there is one
 
 // Gesture and frame.
 extern int state;            // GestureState

@@ -3,7 +3,7 @@
 #include <limits>
 
 #include "base/wrapping.h"
-#include "fluid/ink_presets.h"
+#include "fluid/ink_tuning.h"
 #include "jni/globals.h"
 
 namespace {
@@ -55,12 +55,12 @@ void stepDrag(Color_ color) {
     const auto startY = static_cast<float>(DRAG_START_Y);
     const auto endX = static_cast<float>(DRAG_END_X);
     const auto endY = static_cast<float>(DRAG_END_Y);
-    if (isMovingEvent == kFast) {
+    if (isMovingEvent == kFastDrag) {
         fluid.apply(kFastPreset);
         fluid.Perturb(startX, startY, endX, endY);
-    } else if (isMovingEvent == kMedium) {
+    } else if (isMovingEvent == kMediumDrag) {
         fluid.apply(kMediumPreset);
-    } else if (isMovingEvent == kSlow) {
+    } else if (isMovingEvent == kSlowDrag) {
         InkPreset preset = kSlowPreset;
         preset.radius *= TouchPressure;
         preset.sourceStrength *= TouchPressure;

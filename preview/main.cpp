@@ -6,7 +6,7 @@
 #include <optional>
 #include <string>
 
-#include "platform/log_filter.h"
+#include "host/log_filter.h"
 #include "preview/preview.h"
 #include "preview/window.h"
 

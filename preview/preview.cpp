@@ -9,9 +9,9 @@
 #include <memory>
 #include <vector>
 
+#include "desktop/headless_context.h"
 #include "host/picture.h"
 #include "host/water_host.h"
-#include "platform/headless_context.h"
 #include "preview/frame_sink.h"
 #include "preview/inside.h"
 #include "preview/progress.h"

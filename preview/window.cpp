@@ -8,9 +8,9 @@
 #include <cstdlib>
 #include <utility>
 
+#include "desktop/keep_driver.h"
 #include "host/live_water.h"
 #include "host/picture.h"
-#include "platform/keep_driver.h"
 #include "preview/scene.h"
 
 namespace {

@@ -4,7 +4,7 @@
 set -euo pipefail
 cd "$1"
 library="base tshader gl water fluid jni"
-faces="host platform pictures jni/natives.h"
+faces="host platform desktop pictures jni/natives.h"
 declare -A below=(
     [base]=""
     [tshader]="base"
@@ -13,6 +13,7 @@ declare -A below=(
     [fluid]="base tshader gl water"
     [jni]="base tshader gl water fluid"
     [platform]=""
+    [desktop]=""
     [pictures]="host"
     [host]="platform jni/natives.h"
     [preview]="$faces"
@@ -20,9 +21,9 @@ declare -A below=(
     [android]="$faces"
     [reference]="$library"
     [probes]="$library host platform"
-    [bench]="$library host platform reference probes"
+    [bench]="$library host platform desktop reference probes"
     [fuzz]="$library host platform probes"
-    [tests]="$library host platform pictures preview android reference probes"
+    [tests]="$library host platform desktop pictures preview android reference probes"
 )
 failed=0
 while IFS= read -r folder; do

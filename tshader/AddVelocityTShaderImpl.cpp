@@ -2,7 +2,8 @@
 
 #include <algorithm>
 
-#include "tshader/groups.h"
+#include "base/groups.h"
+#include "tshader/pairs.h"
 
 namespace {
 

@@ -1,6 +1,7 @@
 #include "tshader/AdvectVelocityTShaderImpl.h"
 
-#include "tshader/groups.h"
+#include "base/groups.h"
+#include "tshader/pairs.h"
 
 namespace {
 

@@ -2,7 +2,7 @@
 
 #include <algorithm>
 
-#include "tshader/groups.h"
+#include "base/groups.h"
 
 namespace {
 

@@ -3,7 +3,8 @@
 
 #include <cstddef>
 
-#include "tshader/float4.h"
+#include "base/float4.h"
+#include "tshader/vec.h"
 
 template <class T>
 struct Texture {

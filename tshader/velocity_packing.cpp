@@ -3,7 +3,7 @@
 #include <bit>
 #include <cstring>
 
-#include "tshader/float4.h"
+#include "tshader/pairs.h"
 
 static_assert(std::endian::native == std::endian::little, "four bytes of a texel are stored as one int");
 

@@ -4,7 +4,7 @@
 #include <cmath>
 #include <cstddef>
 
-#include "tshader/groups.h"
+#include "base/groups.h"
 
 namespace {
 

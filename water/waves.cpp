@@ -6,9 +6,9 @@
 #include <cstring>
 #include <type_traits>
 
+#include "base/flush_denormals.h"
+#include "base/groups.h"
 #include "base/scratch.h"
-#include "tshader/flush_denormals.h"
-#include "tshader/groups.h"
 
 namespace {
 

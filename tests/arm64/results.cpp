@@ -9,9 +9,9 @@
 #include <limits>
 #include <span>
 
+#include "base/flush_denormals.h"
 #include "reference/ink_grid.h"
 #include "reference/surface.h"
-#include "tshader/flush_denormals.h"
 #include "water/mesh.h"
 
 namespace {

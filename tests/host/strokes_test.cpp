@@ -2,6 +2,7 @@
 #include <algorithm>
 #include <cmath>
 
+#include "fluid/ink_tuning.h"
 #include "host/live_water.h"
 #include "host/picture.h"
 #include "jni/globals.h"
@@ -110,7 +111,7 @@ protected:
 TEST_F(Strokes, areTheSameFromEveryDigitizerOnEveryDisplay) {
     const Density expected = draw(1000, 60);
     const std::vector<int> expectedClasses = classes;
-    for (const int speed : {kSlow, kMedium, kFast}) {
+    for (const int speed : {kSlowDrag, kMediumDrag, kFastDrag}) {
         EXPECT_GE(std::ranges::count(classes, speed), 3) << "the stroke has all speeds";
     }
     // A stroke that begins between two steps of the ink may have one more.

@@ -3,7 +3,7 @@
 
 #include <array>
 
-#include "fluid/ink_presets.h"
+#include "fluid/ink_tuning.h"
 #include "host/water_host.h"
 #include "jni/gesture.h"
 #include "jni/globals.h"

@@ -7,6 +7,7 @@
 #include <limits>
 #include <vector>
 
+#include "fluid/ink_tuning.h"
 #include "probes/gesture_state.h"
 
 namespace {
@@ -19,7 +20,7 @@ constexpr int kOther = 9;
 struct Row {
     int addSteps = 0;  // frames that the ink step counted before the event
     int x = 50, y = 50, action = kActionDown;
-    int state = kIdle, step = 0, dragStep = 0, speed = kUnmeasured;
+    int state = kIdle, step = 0, dragStep = 0, speed = kTap;
     float shown = 1.0f;
 };
 
@@ -42,27 +43,27 @@ const Gesture kGestures[] = {
     {"a longer way makes it a drag, which has a speed",
      {{.action = kActionDown, .state = kTapping},
       {.x = 52, .y = 52, .action = kActionMove, .state = kDragging},
-      {.addSteps = 4, .x = 54, .y = 52, .action = kActionMove, .state = kDragging, .dragStep = 4, .speed = kSlow},
-      {.x = 57, .y = 52, .action = kActionMove, .state = kDragging, .dragStep = 4, .speed = kMedium},
-      {.x = 67, .y = 52, .action = kActionMove, .state = kDragging, .dragStep = 4, .speed = kMedium},
-      {.x = 67, .y = 63, .action = kActionMove, .state = kDragging, .dragStep = 4, .speed = kFast},
-      {.x = 67, .y = 63, .action = kActionDown, .state = kDragging, .dragStep = 4, .speed = kSlow},
-      {.x = 80, .y = 63, .action = kOther, .state = kDragging, .dragStep = 4, .speed = kFast},
-      {.x = 81, .y = 63, .action = kActionCancel, .dragStep = 4, .speed = kSlow, .shown = 0}}},
+      {.addSteps = 4, .x = 54, .y = 52, .action = kActionMove, .state = kDragging, .dragStep = 4, .speed = kSlowDrag},
+      {.x = 57, .y = 52, .action = kActionMove, .state = kDragging, .dragStep = 4, .speed = kMediumDrag},
+      {.x = 67, .y = 52, .action = kActionMove, .state = kDragging, .dragStep = 4, .speed = kMediumDrag},
+      {.x = 67, .y = 63, .action = kActionMove, .state = kDragging, .dragStep = 4, .speed = kFastDrag},
+      {.x = 67, .y = 63, .action = kActionDown, .state = kDragging, .dragStep = 4, .speed = kSlowDrag},
+      {.x = 80, .y = 63, .action = kOther, .state = kDragging, .dragStep = 4, .speed = kFastDrag},
+      {.x = 81, .y = 63, .action = kActionCancel, .dragStep = 4, .speed = kSlowDrag, .shown = 0}}},
     {"so does any movement once its time is over",
      {{.action = kActionDown, .state = kTapping},
       {.addSteps = 11, .action = kActionMove, .state = kTapping, .step = 11},
       {.addSteps = 1, .action = kActionMove, .state = kDragging, .step = 12},
-      {.action = kActionUp, .speed = kSlow}}},
+      {.action = kActionUp, .speed = kSlowDrag}}},
     {"a drag of nine frames goes on as the tap that it was, and the next one counts anew",
      {{.action = kActionDown, .state = kTapping},
       {.addSteps = 3, .x = 59, .action = kActionMove, .state = kDragging, .step = 3},
-      {.addSteps = 9, .x = 59, .action = kActionUp, .state = kTapping, .step = 3, .dragStep = 9, .speed = kSlow},
-      {.action = kActionMove, .state = kDragging, .step = 3, .speed = kSlow}}},
+      {.addSteps = 9, .x = 59, .action = kActionUp, .state = kTapping, .step = 3, .dragStep = 9, .speed = kSlowDrag},
+      {.action = kActionMove, .state = kDragging, .step = 3, .speed = kSlowDrag}}},
     {"a longer one ends",
      {{.action = kActionDown, .state = kTapping},
       {.addSteps = 3, .x = 59, .action = kActionMove, .state = kDragging, .step = 3},
-      {.addSteps = 10, .x = 59, .action = kActionUp, .speed = kSlow}}},
+      {.addSteps = 10, .x = 59, .action = kActionUp, .speed = kSlowDrag}}},
 };
 
 }  // namespace

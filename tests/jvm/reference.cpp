@@ -11,10 +11,10 @@
 #include <string>
 #include <vector>
 
+#include "desktop/headless_context.h"
 #include "host/host_jni.h"
 #include "host/native_names.h"
 #include "platform/desktop_bitmap.h"
-#include "platform/headless_context.h"
 #include "probes/smooth_picture.h"
 #include "tests/support/log_recorder.h"
 

@@ -11,7 +11,7 @@
 #include <string>
 #include <vector>
 
-#include "platform/headless_context.h"
+#include "desktop/headless_context.h"
 #include "tests/support/log_recorder.h"
 
 using Rgba = std::array<std::uint8_t, 4>;

@@ -9,9 +9,9 @@
 #include <optional>
 
 #include "host/live_water.h"
+#include "host/log_filter.h"
 #include "host/look_values.h"
 #include "host/picture.h"
-#include "platform/log_filter.h"
 
 namespace {
 

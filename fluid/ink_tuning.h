@@ -2,8 +2,9 @@
 // person tunes stands here; globals.h has the thresholds and lengths of gestures, which an app may change at run time.
 #pragma once
 
-// How ink is laid. The two passes over the density and the velocity's advection tell them apart by these codes.
-enum DragMode { kTap = -1, kSlowDrag = 0, kMediumDrag = 1, kFastDrag = 2 };
+// How ink is laid: by a tap, or by a drag of one of three speeds. The two passes over the density and the velocity's
+// advection branch on these codes.
+enum StrokeKind { kTap = -1, kSlowDrag = 0, kMediumDrag = 1, kFastDrag = 2 };
 
 struct InkPreset {
     int dragMode;

@@ -11,20 +11,12 @@
 #include <xmmintrin.h>
 #endif
 
-#include "tshader/vec.h"
-
 #if defined(__FINITE_MATH_ONLY__) && __FINITE_MATH_ONLY__
 #error "The kernels rely on comparisons that NaN fails: a compiler that assumes none makes it an index."
 #endif
 
 typedef float float4 __attribute__((vector_size(16)));
 typedef int int4 __attribute__((vector_size(16)));
-
-// One or four vec2 values taken apart.
-template <class F>
-struct Pair {
-    F x, y;
-};
 
 // Rows start anywhere, so loads and stores must not assume alignment.
 template <class F>
@@ -71,48 +63,6 @@ inline float4 evenLanes(float4 a, float4 b) {
 
 inline float4 oddLanes(float4 a, float4 b) {
     return __builtin_shufflevector(a, b, 1, 3, 5, 7);
-}
-
-template <class F>
-inline Pair<F> loadPairs(const vec2* from);
-
-template <>
-inline Pair<float> loadPairs<float>(const vec2* from) {
-    return {from->x, from->y};
-}
-
-template <>
-inline Pair<float4> loadPairs<float4>(const vec2* from) {
-    const float4 first = load<float4>(&from[0].x);
-    const float4 second = load<float4>(&from[2].x);
-    return {evenLanes(first, second), oddLanes(first, second)};
-}
-
-inline float4 firstTwo(Pair<float4> value) {
-    return __builtin_shufflevector(value.x, value.y, 0, 4, 1, 5);
-}
-
-inline float4 lastTwo(Pair<float4> value) {
-    return __builtin_shufflevector(value.x, value.y, 2, 6, 3, 7);
-}
-
-inline void storePairs(Pair<float> value, vec2* to) {
-    *to = vec2{value.x, value.y};
-}
-
-inline void storePairs(Pair<float4> value, vec2* to) {
-    store(firstTwo(value), &to[0].x);
-    store(lastTwo(value), &to[2].x);
-}
-
-// to = from - value, without taking `from` apart.
-inline void subtractPairs(const vec2* from, Pair<float> value, vec2* to) {
-    *to = vec2{from->x - value.x, from->y - value.y};
-}
-
-inline void subtractPairs(const vec2* from, Pair<float4> value, vec2* to) {
-    store(load<float4>(&from[0].x) - firstTwo(value), &to[0].x);
-    store(load<float4>(&from[2].x) - lastTwo(value), &to[2].x);
 }
 
 // first, first + 1, ... in the lanes: exact while the numbers stay below 2^24.

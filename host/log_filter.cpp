@@ -1,4 +1,4 @@
-#include "platform/log_filter.h"
+#include "host/log_filter.h"
 
 #include <android/log.h>
 

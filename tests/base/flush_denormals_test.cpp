@@ -1,4 +1,4 @@
-#include "tshader/flush_denormals.h"
+#include "base/flush_denormals.h"
 
 #include <gtest/gtest.h>
 

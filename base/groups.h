@@ -1,6 +1,6 @@
 #pragma once
 
-#include "tshader/float4.h"
+#include "base/float4.h"
 
 // Walks the elements first <= x < end in groups of four and the rest one by one: calls body(lanes, x), where the type
 // of `lanes`, float4 or float, says how many elements to work on.

@@ -1,10 +1,10 @@
-#include "platform/headless_context.h"
+#include "desktop/headless_context.h"
 
 #define EGL_EGLEXT_PROTOTYPES
 #include <EGL/egl.h>
 #include <EGL/eglext.h>
 
-#include "platform/keep_driver.h"
+#include "desktop/keep_driver.h"
 
 std::unique_ptr<HeadlessContext> HeadlessContext::create(int width, int height, std::string& error) {
     const char* missing = "no OpenGL ES 2.0 driver: install Debian's packages libegl-mesa0 and libgl1-mesa-dri";

@@ -1,4 +1,4 @@
-#include "platform/keep_driver.h"
+#include "desktop/keep_driver.h"
 
 #include <dlfcn.h>
 #include <link.h>

@@ -5,7 +5,7 @@
 #include "gl/shader_program.h"
 #include "probes/gesture_state.h"
 #include "probes/library_blocks.h"
-#include "tests/endurance/hands.h"
+#include "tests/endurance/strokes.h"
 #include "tests/support/gl_test.h"
 
 namespace {
@@ -115,7 +115,7 @@ TEST_F(FailingAllocations, costWhatTheyAreForAndTheNextSetUpRecovers) {
         {"no memory for uploading the ink's velocity", 1}};
     EXPECT_EQ(seen, wanted);
 
-    const Session dearth = fail(1, INT_MAX);
-    EXPECT_GT(dearth.complaints, 0);
-    EXPECT_TRUE(dearth.disturbed.inked == dearth.disturbed.water);
+    const Session starved = fail(1, INT_MAX);
+    EXPECT_GT(starved.complaints, 0);
+    EXPECT_TRUE(starved.disturbed.inked == starved.disturbed.water);
 }

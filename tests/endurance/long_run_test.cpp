@@ -1,4 +1,4 @@
-// A day of hands on the water, as fast as it goes.
+// A day of touches, as fast as the machine computes it.
 #include <gtest/gtest.h>
 
 #include <algorithm>
@@ -12,7 +12,7 @@
 #include "probes/counting_gl.h"
 #include "probes/gesture_state.h"
 #include "probes/library_blocks.h"
-#include "tests/endurance/hands.h"
+#include "tests/endurance/strokes.h"
 #include "tests/support/log_recorder.h"
 
 namespace {
@@ -74,11 +74,11 @@ protected:
         while (length-- > 0 && !HasFailure()) frame();
     }
 
-    // A scene or its beginning, at up to any speed, and what happens between two.
-    void play(const Scene& scene) {
-        const auto events = below(2 * static_cast<unsigned>(scene.size()));
-        for (const TouchEvent& event : std::span(scene).first(std::min<std::size_t>(events, scene.size()))) {
-            water.touch(event.action, event.x.pixels(width), event.y.pixels(240), event.pressure);
+    // A stroke or its beginning, at up to any speed, and what happens between two.
+    void play(const Stroke& stroke) {
+        const auto events = below(2 * static_cast<unsigned>(stroke.size()));
+        for (const StrokeEvent& event : std::span(stroke).first(std::min<std::size_t>(events, stroke.size()))) {
+            water.touch(event.action, event.x * width, event.y * 240, 1.0f);
             rest(below(3));
         }
         rest(below(60));
@@ -108,13 +108,13 @@ protected:
 
 TEST_F(LongRun, aDayNeitherGrowsNorSlowsDownNorLeavesTheNumbers) {
     const int hour = isFullLength() ? 216'000 : 5000;  // frames
-    const std::vector<Scene> scenes = loadScenes();
+    const std::vector<Stroke> strokes = strokesOfAllKinds();
     const int blocks = LibraryBlocks::live;
     std::set<Cost> atFirst;
     std::set<Cost> atLast;
     while (frames < 24 * hour && !HasFailure()) {
         costs = frames < hour ? &atFirst : frames >= 23 * hour ? &atLast : nullptr;
-        play(scenes[below(static_cast<unsigned>(scenes.size()))]);
+        play(strokes[below(static_cast<unsigned>(strokes.size()))]);
         EXPECT_EQ(LibraryBlocks::live, blocks);
     }
     EXPECT_EQ(atFirst.size(), 2U * 3) << "two views, each without ink, with it and with more of it";

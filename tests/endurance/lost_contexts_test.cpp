@@ -6,7 +6,7 @@
 
 #include "probes/gesture_state.h"
 #include "probes/library_blocks.h"
-#include "tests/endurance/hands.h"
+#include "tests/endurance/strokes.h"
 #include "tests/support/gl_test.h"
 
 namespace {
@@ -36,10 +36,10 @@ protected:
     static constexpr int kShorter = 180;  // sides of the view
     static constexpr int kLonger = 240;
 
-    struct Mood {
+    struct Mode {
         int width = kShorter, height = kLonger;
         bool withInk = false;
-        bool operator==(const Mood&) const = default;
+        bool operator==(const Mode&) const = default;
     };
 
     // In a new context and a library freshly loaded, but for its buffers.
@@ -50,9 +50,9 @@ protected:
         return host;
     }
 
-    static std::size_t picture(WaterHost& host, const Mood& mood) {
+    static std::size_t picture(WaterHost& host, const Mode& mode) {
         host.draw();
-        const auto pixels = readPixels(mood.width, mood.height);
+        const auto pixels = readPixels(mode.width, mode.height);
         return std::hash<std::string_view>()(
             {reinterpret_cast<const char*>(pixels.data()), pixels.size() * sizeof pixels[0]});
     }
@@ -68,12 +68,12 @@ protected:
     }
 
     // In the middle of each stroke the library is set up again, in a context that lives or in a new one.
-    void setUpAgain(WaterHost& host, const Mood& mood, bool inNewContext) {
+    void setUpAgain(WaterHost& host, const Mode& mode, bool inNewContext) {
         EXPECT_EQ(glGetError(), GLenum{GL_NO_ERROR});
         if (inNewContext) renewContext(kLonger, kLonger);
-        hadInk_ = mood.withInk || (hadInk_ && !inNewContext);
-        host.resize(mood.width, mood.height);
-        setUp(host, mood.withInk);
+        hadInk_ = mode.withInk || (hadInk_ && !inNewContext);
+        host.resize(mode.width, mode.height);
+        setUp(host, mode.withInk);
         // A context does not know the names of a lost one.
         const GLenum error = glGetError();
         EXPECT_TRUE(error == GL_NO_ERROR || error == GL_INVALID_VALUE) << error;
@@ -95,7 +95,7 @@ protected:
 }  // namespace
 
 TEST_F(LostContexts, costOneSetUpEvenInTheMiddleOfAStroke) {
-    const std::vector<Scene> scenes = loadScenes();
+    const std::vector<Stroke> strokes = strokesOfAllKinds();
     first_[false] = firstSetUp(false);
     first_[true] = firstSetUp(true);
     const int blocks = LibraryBlocks::live;
@@ -109,41 +109,41 @@ TEST_F(LostContexts, costOneSetUpEvenInTheMiddleOfAStroke) {
         setUp(host, false, kAllPictures);
         std::mt19937 random(7);
         const auto oneIn = [&random](unsigned chances) { return random() % chances == 0; };
-        Mood mood;
+        Mode mode;
         for (int lost = 0, n = 0; lost < losses; ++n) {
             SCOPED_TRACE(n);
-            const Scene& scene = scenes[random() % scenes.size()];
-            const Mood before = mood;
-            if (oneIn(4)) mood.withInk = !mood.withInk;
-            if (oneIn(4)) std::swap(mood.width, mood.height);
+            const Stroke& stroke = strokes[random() % strokes.size()];
+            const Mode before = mode;
+            if (oneIn(4)) mode.withInk = !mode.withInk;
+            if (oneIn(4)) std::swap(mode.width, mode.height);
             host.rain(oneIn(3));
             const bool inNewContext = !oneIn(3);
             lost += inNewContext;
             for (std::size_t i = 0; i < 7; ++i) {
-                const Mood& now = i < 4 ? before : mood;
+                const Mode& now = i < 4 ? before : mode;
                 if (i == 4 && losing) {
-                    setUpAgain(host, mood, inNewContext);
-                } else if (i == 4 && mood != before) {
-                    host.resize(mood.width, mood.height);
-                    setUp(host, mood.withInk);
+                    setUpAgain(host, mode, inNewContext);
+                } else if (i == 4 && mode != before) {
+                    host.resize(mode.width, mode.height);
+                    setUp(host, mode.withInk);
                 }
-                if (i < scene.size()) {
-                    const TouchEvent& event = scene[i];
-                    host.touch(event.action, event.x.pixels(now.width), event.y.pixels(now.height), event.pressure);
+                if (i < stroke.size()) {
+                    const StrokeEvent& event = stroke[i];
+                    host.touch(event.action, event.x * now.width, event.y * now.height, 1.0f);
                 }
                 host.advance(1.0 / 60);
                 if (losing) host.draw();
             }
-            const std::size_t inked = picture(host, mood);
+            const std::size_t inked = picture(host, mode);
             host.clearInk();
-            const std::size_t water = picture(host, mood);
+            const std::size_t water = picture(host, mode);
             if (!losing) {
                 undisturbed.push_back(water);
                 continue;
             }
             ASSERT_EQ(water, undisturbed[static_cast<std::size_t>(n)]);
             strokesGoneOn += inked != water && before.withInk && inNewContext;
-            ASSERT_TRUE(inked == water || mood.withInk);
+            ASSERT_TRUE(inked == water || mode.withInk);
             ASSERT_LE(LibraryBlocks::live, blocks);
         }
     }

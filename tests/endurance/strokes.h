@@ -1,0 +1,55 @@
+// The strokes of long sessions.
+#pragma once
+
+#include <cmath>
+#include <cstdlib>
+#include <random>
+#include <string_view>
+#include <vector>
+
+#include "host/picture.h"
+#include "host/water_host.h"
+#include "probes/smooth_picture.h"
+
+// Whether the environment asks for sessions of full length; those of an ordinary test run are short.
+inline bool isFullLength() {
+    const char* const wish = std::getenv("TIDEMARK_ENDURANCE");
+    return wish && std::string_view(wish) == "full";
+}
+
+struct StrokeEvent {
+    TouchAction action;
+    double x, y;  // shares of the view; some lie beyond its edges
+};
+using Stroke = std::vector<StrokeEvent>;
+
+// Taps, and curves of each speed that the ink tells apart on a view of about 240 pixels. A few are cancelled.
+inline std::vector<Stroke> strokesOfAllKinds() {
+    std::mt19937 random(1);
+    std::normal_distribution<double> place(0.5, 0.15);
+    std::uniform_real_distribution<double> turn(-0.3, 0.3), share(0.2, 1.8);
+    std::vector<Stroke> strokes;
+    for (int i = 0; i < 16; ++i) {
+        const double length = std::vector{0.0, 0.009, 0.025, 0.08}[static_cast<std::size_t>(i % 4)];  // of a move
+        Stroke stroke = {{TouchAction::down, place(random), place(random)}};
+        double direction = 20 * turn(random);
+        for (auto moves = 8 + random() % 32; moves > 0; --moves) {
+            direction += turn(random);
+            const auto [action, x, y] = stroke.back();
+            const double way = length * share(random);
+            stroke.push_back({TouchAction::move, x + way * std::cos(direction), y + way * std::sin(direction)});
+        }
+        stroke.push_back(stroke.back());
+        stroke.back().action = i % 5 == 4 ? TouchAction::cancel : TouchAction::up;
+        strokes.push_back(stroke);
+    }
+    return strokes;
+}
+
+// Sets the library up and loads its pictures, which are handed over where they are due.
+inline void setUp(WaterHost& host, bool withInk, unsigned due = 0) {
+    static const Pictures pictures = {smoothPicture(24, 32, 1), smoothPicture(32, 24, 2), smoothPicture(8, 8, 3)};
+    static const PictureSource source = sourceOf(pictures);
+    host.setUp(withInk);
+    host.loadPictures(source, due);
+}

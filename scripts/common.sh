@@ -11,7 +11,9 @@
     fuzz_packages=(clang libclang-rt-dev llvm)
     arm64_packages=(g++-aarch64-linux-gnu qemu-user)
     android_packages=(clang lld llvm libc++-14-dev libc6-dev-arm64-cross libc6-dev-armel-cross android-liblog-dev
-        android-platform-frameworks-native-headers android-libnativehelper-dev proguard-cli)
+        android-platform-frameworks-native-headers android-libnativehelper-dev android-framework-res
+        libjetbrains-annotations-java python3 proguard-cli aapt zip zipalign apksigner)
+    android_test_packages=(enjarify unzip)
     web_packages=(cmake ninja-build openjdk-17-jdk-headless emscripten)
     web_test_packages=(chromium firefox-esr webkit2gtk-driver xvfb xauth libjetbrains-annotations-java)
     bench_packages=(clang libbenchmark-dev libeigen3-dev python3)

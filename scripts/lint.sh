@@ -17,7 +17,7 @@ if [ "$fix" ]; then
     exit
 fi
 git ls-files '*.cpp' '*.h' | xargs clang-format --dry-run --Werror
-shellcheck -x scripts/*.sh .ci/run tests/*.sh tests/*/*.sh
+shellcheck -x scripts/*.sh .ci/run tests/*.sh tests/*/*.sh android/debian/*.sh
 git ls-files '*.py' | PYTHONPYCACHEPREFIX=build/pycache xargs python3 -m py_compile
 # The playground has the package's types from its build.
 [ ! -d web/package/dist ] || web/node_modules/.bin/tsc --noEmit -p web

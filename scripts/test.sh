@@ -4,8 +4,8 @@
 #             sanitizers, and some seconds of fuzzing
 #   --arm64   64-bit Arm: vector arithmetic in the machine code of the loops over many numbers, and results, computed in
 #             an emulator, that equal this machine's bit for bit
-#   --android the library as Android takes it: compiled, linked and sealed for three processors, and run with the
-#             shrunk Java classes
+#   --android the sample's APK and the module's AAR: signature, names and pages; the APK's code and libraries run; an
+#             app's layout and Kotlin build with the AAR
 #   --web     the package for web pages and the playground, in Chromium, and the playground in Firefox and WebKitGTK
 set -euo pipefail
 cd "$(dirname "$0")/.."
@@ -55,9 +55,11 @@ test_arm64() {
 }
 
 test_android() {
-    install_missing "${build_packages[@]}" "${test_packages[@]}" "${android_packages[@]}"
+    install_missing "${build_packages[@]}" "${test_packages[@]}" "${android_packages[@]}" "${android_test_packages[@]}"
+    command -v npm >/dev/null || install_missing npm
     cmake --preset release -DTIDEMARK_BENCH=OFF -DTIDEMARK_WERROR=ON >/dev/null
     cmake --build --preset release
+    scripts/android.sh
     ctest --preset release -j "$(nproc)" --label-regex android
 }
 

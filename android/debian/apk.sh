@@ -1,0 +1,27 @@
+#!/usr/bin/env bash
+# apk.sh SOURCE BINARY: packs the sample, its classes shrunk by the module's own rules, and signs it with a key that is
+# made once for this build. A phone takes the next one over it only with the same key.
+set -euo pipefail
+source=$1
+here=$(dirname "$0")
+cd "$2"
+rm -rf apk && mkdir apk
+
+# The classes for apps are whole, as tests run the APK's code; those with native methods have only the module's rules.
+python3 "$here/java_api.py" "$JDK" java_api.jar
+proguard -include "$source/android/tidemark/consumer-rules.pro" -include resources/rules.pro \
+    -injars classes/shipped -outjars apk/classes.jar -libraryjars "java_api.jar:classes/platform:$ANNOTATIONS" \
+    -keep 'class !**.JniTidemarkRender,!**.NativeWater,com.zor.android.visualeffect.tidemark.* { *; }' \
+    -keepclassmembers 'class **.JniTidemarkRender { <init>(); }' \
+    -target 1.7 -dontnote -forceprocessing
+"$JDK/bin/java" -cp dx.jar com.android.dx.command.Main --dex --min-sdk-version=21 --output=apk/classes.dex apk/classes.jar
+
+cp resources/linked.apk apk/packed.apk
+ln -s ../jni apk/lib
+(cd apk && zip -q -X packed.apk classes.dex && zip -q -X -0 packed.apk lib/*/*.so)
+zipalign 16384 apk/packed.apk apk/aligned.apk
+password=(-storepass android)
+[ -f key.jks ] || "$JDK/bin/keytool" -genkeypair -keystore key.jks "${password[@]}" -alias tidemark -keyalg RSA \
+    -keysize 2048 -validity 10000 -dname CN=Tidemark
+apksigner sign --ks key.jks --ks-pass pass:android --out tidemark-sample.apk apk/aligned.apk
+rm -f tidemark-sample.apk.idsig

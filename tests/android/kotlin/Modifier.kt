@@ -1,0 +1,5 @@
+package androidx.compose.ui
+
+interface Modifier {
+    companion object : Modifier
+}

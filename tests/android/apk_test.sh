@@ -14,6 +14,7 @@ fail() {
 rm -rf "$folder" && mkdir "$folder"
 apksigner verify --verbose --min-sdk-version 21 -Werr "$apk"
 zipalign -c 16384 "$apk" || fail "not aligned to pages of 16 KiB"
+! unzip -v "$apk" '*.so' | grep Defl || fail "compressed libraries"
 
 name=com.zor.android.visualeffect.tidemark
 about=$(aapt2 dump badging "$apk")
@@ -38,6 +39,8 @@ natives() {
     javap -p -cp "$1" "$name.JniTidemarkRender" "$name.NativeWater" | grep ' native ' | sed 's/ final / /' | sort
 }
 diff <(natives "$classes") <(natives "$folder/classes.jar") || fail "other native methods (>) than in the sources (<)"
-for class in $(aapt2 dump xmltree --file AndroidManifest.xml "$apk" | sed -nE 's/.*:name\(.*"('"$name"'[^"]*)".*/\1/p'); do
-    javap -cp "$folder/classes.jar" "$class" >/dev/null || fail "no $class"
+named=$(aapt2 dump xmltree --file AndroidManifest.xml "$apk" | sed -nE 's/.*:name\(.*"(\.\w+)" \(Raw.*/\1/p')
+[ "$named" ] || fail "a manifest without classes"
+for class in $named; do
+    javap -cp "$folder/classes.jar" "$name.sample$class" >/dev/null || fail "no $class"
 done

@@ -1,5 +1,5 @@
 #!/usr/bin/env bash
-# platform.sh TRIPLE DIRECTORY: stand-ins to link with, whose names are those that the libraries may use of Android's own
+# link_names.sh TRIPLE DIRECTORY: stand-ins to link with, whose names are those that the libraries may use of Android's own
 # libraries at API level 21. None of them is of the C++ runtime.
 set -euo pipefail
 triple=$1

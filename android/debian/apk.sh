@@ -14,7 +14,8 @@ proguard -include "$source/android/tidemark/consumer-rules.pro" -include resourc
     -keep 'class !**.JniTidemarkRender,!**.NativeWater,com.zor.android.visualeffect.tidemark.* { *; }' \
     -keepclassmembers 'class **.JniTidemarkRender { <init>(); }' \
     -target 1.7 -dontnote -forceprocessing
-"$JDK/bin/java" -cp dx.jar com.android.dx.command.Main --dex --min-sdk-version=21 --output=apk/classes.dex apk/classes.jar
+"$JDK/bin/java" -cp dx.jar com.android.dx.command.Main --dex --min-sdk-version=21 --output=apk/classes.dex \
+    apk/classes.jar
 
 cp resources/linked.apk apk/packed.apk
 ln -s ../jni apk/lib

@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
-# apk_test.sh APK VERSION CLASSES FOLDER: the APK is signed for every Android that it is for, its libraries can be mapped
-# where they are, and nothing that the platform or a library asks for by name is missing. Leaves its parts in FOLDER, the
-# code as a jar.
+# apk_test.sh APK VERSION CLASSES FOLDER: the APK is signed for every Android that it is for, its libraries can be
+# mapped where they are, and nothing that the platform or a library asks for by name is missing. Leaves its parts in
+# FOLDER, the code as a jar.
 set -euo pipefail
 apk=$1
 version=$2

@@ -1,7 +1,6 @@
-// Four single-precision lanes in one register. The compiler's vector type gives + - * /, the comparisons
-// and the lane-wise ternary on SSE, NEON and WebAssembly SIMD alike, and takes a plain float beside it for
-// four equal lanes. A formula written as a template over `float` and `float4` thus reads the same for one
-// texel and for four.
+// float4 is a SIMD vector of four floats. The compiler provides + - * /, comparisons and the lane-wise ternary for it
+// on SSE, NEON and WebAssembly SIMD, and broadcasts a plain float operand. A formula that is a template over `float`
+// and `float4` therefore computes one texel or four with the same source text.
 #pragma once
 
 #include <cmath>
@@ -12,13 +11,13 @@
 #endif
 
 #if defined(__FINITE_MATH_ONLY__) && __FINITE_MATH_ONLY__
-#error "The kernels rely on comparisons that NaN fails: a compiler that assumes none makes it an index."
+#error "The kernels rely on NaN failing comparisons; with -ffinite-math-only a NaN would become a texel index."
 #endif
 
 typedef float float4 __attribute__((vector_size(16)));
 typedef int int4 __attribute__((vector_size(16)));
 
-// Rows start anywhere, so loads and stores must not assume alignment.
+// memcpy, because rows have no alignment guarantee.
 template <class F>
 inline F load(const float* from) {
     F value;
@@ -31,8 +30,8 @@ inline void store(F value, float* to) {
     std::memcpy(to, &value, sizeof value);
 }
 
-// a < b ? a : b and a > b ? a : b; where either is not a number, b. SSE has one instruction for each, which g++ does
-// not find behind the ternary.
+// a < b ? a : b and a > b ? a : b: the result is b if either operand is NaN. g++ does not compile the ternary to
+// minps and maxps, hence the intrinsics.
 inline float lesser(float a, float b) {
     return a < b ? a : b;
 }
@@ -65,7 +64,7 @@ inline float4 oddLanes(float4 a, float4 b) {
     return __builtin_shufflevector(a, b, 1, 3, 5, 7);
 }
 
-// first, first + 1, ... in the lanes: exact while the numbers stay below 2^24.
+// Returns first, first + 1, ... in the lanes. Exact below 2^24.
 template <class F>
 inline F countUp(int first);
 
@@ -79,7 +78,7 @@ inline float4 countUp<float4>(int first) {
     return static_cast<float>(first) + float4{0.0f, 1.0f, 2.0f, 3.0f};
 }
 
-// The lanes rounded toward zero; they must fit an int.
+// Rounds toward zero. Undefined for values outside the range of int.
 inline int toInt(float value) {
     return static_cast<int>(value);
 }

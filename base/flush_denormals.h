@@ -1,5 +1,5 @@
-// Makes the processor treat denormal floats as zero while the object lives. A fading velocity field ends in
-// denormals, which cost many times as much as other numbers and mean nothing here.
+// Sets flush-to-zero and denormals-are-zero for the lifetime of the object, then restores the host's floating-point
+// mode. Fields that decay end in denormals, which many processors compute with many times more slowly.
 #pragma once
 
 #if defined(__SSE2__) && !defined(__EMSCRIPTEN__)
@@ -12,16 +12,14 @@ class FlushDenormals {
 public:
     FlushDenormals() : saved_(get()) { set(saved_ | kFlush); }
 
-    // The host's own arithmetic must not notice: its control register comes back as it was.
     ~FlushDenormals() { set(saved_); }
-
     FlushDenormals(const FlushDenormals&) = delete;
     FlushDenormals& operator=(const FlushDenormals&) = delete;
 
 private:
 #if defined(__SSE2__) && !defined(__EMSCRIPTEN__)
     using Register = unsigned int;
-    static constexpr Register kFlush = 0x8040;  // results (FTZ) and operands (DAZ)
+    static constexpr Register kFlush = 0x8040;  // FTZ | DAZ
     static Register get() {
         return _mm_getcsr();
     }
@@ -41,7 +39,7 @@ private:
     }
 #elif defined(__arm__) && defined(__ARM_FP)
     using Register = std::uint32_t;
-    static constexpr Register kFlush = Register{1} << 24;  // FZ; NEON flushes anyway, scalar code does not
+    static constexpr Register kFlush = Register{1} << 24;  // FZ, for scalar code; NEON always flushes
     static Register get() {
         Register value;
         __asm__ volatile("vmrs %0, fpscr" : "=r"(value));

@@ -2,8 +2,8 @@
 
 #include "base/float4.h"
 
-// Walks the elements first <= x < end in groups of four and the rest one by one: calls body(lanes, x), where the type
-// of `lanes`, float4 or float, says how many elements to work on.
+// Calls body(lanes, x) for the elements first <= x < end, four at a time, then one at a time for the remainder. The
+// type of `lanes` is float4 or float and selects the width; its value is unused.
 template <class Body>
 inline void forGroups(int first, int end, Body body) {
     if (first >= end) return;

@@ -1,4 +1,4 @@
-// The one way into the platform's log.
+// The library writes to the platform's log only through these macros.
 #pragma once
 
 #include <android/log.h>

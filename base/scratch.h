@@ -6,7 +6,7 @@
 
 #include "base/log.h"
 
-// A buffer that only grows and lives across calls, so that warm frames allocate nothing.
+// A buffer that is reused across calls and never shrinks, so that frames after the first few allocate nothing.
 template <class T>
 class Scratch {
 public:
@@ -15,7 +15,7 @@ public:
     Scratch(const Scratch&) = delete;
     Scratch& operator=(const Scratch&) = delete;
 
-    // Room for `needed` elements with any content, or null, logged once, when there is no memory.
+    // Returns `needed` uninitialized elements, or null if the allocation fails. Consecutive failures are logged once.
     T* reserve(std::size_t needed) {
         if (needed <= capacity_) return data_;
         std::free(data_);

@@ -1,8 +1,8 @@
-// The latest touch, as the native methods store it and the engine reads it: screen pixels as the host reports them,
-// origin at the top left, y downwards. At load all are 0, and they keep their values when no finger is down.
+// The latest touch: written by the native methods, read by the engine. Screen pixels, origin at the top left, y down.
+// The values are 0 at load and are kept after the finger is lifted.
 #pragma once
 
 extern int POSITION_X;
 extern int POSITION_Y;
-extern int DX;  // from the touch before, measured while tapping or dragging
+extern int DX;  // movement since the previous touch event; updated only during a tap or drag
 extern int DY;

@@ -1,4 +1,5 @@
-// A texel of ink: R holds the whole part, G the fraction. Linear, so that a filtered texel decodes to filtered ink.
+// Density = 255 R + G: R holds the whole part, G the fraction. Decoding is linear, so a bilinearly filtered texel decodes
+// to the filtered density.
 FULL float decodeDensity(FULL vec4 texel) {
     return 255.0 * texel.x + texel.y;
 }

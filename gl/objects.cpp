@@ -6,7 +6,7 @@
 
 namespace {
 
-bool isHeldOnce(std::span<const GlObject> all, const GlObject& object) {
+bool isUniqueName(std::span<const GlObject> all, const GlObject& object) {
     return std::count_if(all.begin(), all.end(), [&object](const GlObject& other) {
                return other.kind == object.kind && *other.name == *object.name;
            }) == 1;
@@ -38,7 +38,7 @@ void deleteGroup(std::span<const GlObject> all, GlGroup group) {
     LOG_INFO(group, *first->name);
     for (const GlObject& object : all) {
         if (!isInGroup(object)) continue;
-        if (*object.name && isHeldOnce(all, object)) deleteObject(object.kind, *object.name);
+        if (*object.name && isUniqueName(all, object)) deleteObject(object.kind, *object.name);
         *object.name = 0;
     }
 }

@@ -1,8 +1,8 @@
-// Deletes GL objects before they are made anew.
+// Deletes GL objects before a set-up creates them again.
 //
-// When a context is lost, the members that named its objects keep the names, and the new context gives the same names
-// out again. A name that two members hold is stale in one of them, so its object is left alone: better one object too
-// many than another member's object deleted.
+// After a context loss the members keep the names of its objects, and the new context assigns the same names again. If
+// two members have the same name, one of them is stale, and it is unknown which. Such an object is not deleted: a leak
+// is better than deleting an object that another member uses.
 #pragma once
 
 #include <GLES2/gl2.h>
@@ -11,9 +11,9 @@
 
 enum class GlKind { program, shader, buffer, framebuffer, texture };
 
-// Objects that are made and deleted together form a group. Its key is the line that the log gets when the group is
-// deleted, with the name of the first object that is not a shader. Keys are compared by address, so that only a
-// constant below, and no literal with a typing error, names a group.
+// Objects that are created and deleted together form a group. The group's key is the format of the line that is logged
+// on deletion, with the name of the first object that is not a shader. Keys are compared by address: use the constants
+// below, not literals.
 using GlGroup = const char*;
 inline constexpr char kRippleProgram[] = "glDelete ripple_program = %u";
 inline constexpr char kAdvectDensityProgram[] = "glDelete advect_density_program = %u";
@@ -28,13 +28,12 @@ inline constexpr char kPortraitTexture[] = "glDelete portraitBG = %u";
 inline constexpr char kLandscapeTexture[] = "glDelete landscapeBG = %u";
 inline constexpr char kEnvironmentTexture[] = "glDelete environment = %u";
 
-// A member that names an object.
 struct GlObject {
     GlGroup group;
     GlKind kind;
-    GLuint* name;
+    GLuint* name;  // points to the engine's member
 };
 
-// Deletes the objects of a group, if it has any, with a line in the log, and sets their names to 0. `all` are the
-// members of the engine.
+// Deletes the objects of `group` and sets their names to 0. Logs one line if the group has objects. `all` lists every
+// object of the engine.
 void deleteGroup(std::span<const GlObject> all, GlGroup group);

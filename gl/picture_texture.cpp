@@ -6,7 +6,7 @@ void makePictureTexture(GLuint& texture, const AndroidBitmapInfo& info, const vo
     glTexImage2D(
         GL_TEXTURE_2D, 0, GL_RGBA, static_cast<GLsizei>(info.width), static_cast<GLsizei>(info.height), 0, GL_RGBA,
         GL_UNSIGNED_BYTE, pixels);
-    // Clamped and without mipmaps, so that a picture of any size is complete.
+    // OpenGL ES 2.0 samples a texture of any size only with clamping and without mipmaps.
     glTexParameterf(GL_TEXTURE_2D, GL_TEXTURE_WRAP_S, GL_CLAMP_TO_EDGE);
     glTexParameterf(GL_TEXTURE_2D, GL_TEXTURE_WRAP_T, GL_CLAMP_TO_EDGE);
     glTexParameterf(GL_TEXTURE_2D, GL_TEXTURE_MAG_FILTER, GL_LINEAR);

@@ -3,6 +3,6 @@
 #include <GLES2/gl2.h>
 #include <android/bitmap.h>
 
-// Makes a texture from 32-bit RGBA pixels, `info.width` x `info.height`, rows from the top and without padding, and
-// stores its name. Null pixels leave its content undefined. It stays bound.
+// Creates a texture of `info.width` x `info.height` RGBA8 texels and stores its name. `pixels` starts with the top row
+// and has no padding; null leaves the content undefined. The texture stays bound.
 void makePictureTexture(GLuint& texture, const AndroidBitmapInfo& info, const void* pixels);

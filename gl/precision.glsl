@@ -1,5 +1,6 @@
 precision mediump float;
-// What needs more than the 11 bits of half precision, where the device has it: positions, and ink in two bytes.
+// FULL marks values that need more than the 11 bits of a half float: positions and two-byte densities. It is highp where
+// the fragment shader supports it.
 #ifdef GL_FRAGMENT_PRECISION_HIGH
 #define FULL highp
 #else

@@ -15,7 +15,7 @@ constexpr Corner kQuad[4] = {{-1, -1, 0, 0}, {1, -1, 1, 0}, {-1, 1, 0, 1}, {1, 1
 }  // namespace
 
 void drawQuad(GLuint buffer) {
-    // By contract uploaded at every pass.
+    // By contract every pass uploads the corners.
     glBindBuffer(GL_ARRAY_BUFFER, buffer);
     glBufferData(GL_ARRAY_BUFFER, sizeof kQuad, kQuad, GL_STATIC_DRAW);
     glEnableVertexAttribArray(0);

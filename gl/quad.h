@@ -2,6 +2,7 @@
 
 #include <GLES2/gl2.h>
 
-// Draws the whole target with the program in use, uploading the corners into `buffer`: attribute 0 is the position,
-// attribute 1 runs from (0, 0) at the bottom left to (1, 1). Leaves `buffer` bound and attribute 1 enabled.
+// Draws a quad over the whole target with the program in use. Uploads the corners into `buffer`: attribute 0 is the
+// position, attribute 1 the texture coordinates from (0, 0) at the bottom left to (1, 1). Leaves `buffer` bound and
+// attribute 1 enabled.
 void drawQuad(GLuint buffer);

@@ -1,4 +1,4 @@
-// A quad over the whole target; v_texCoord runs from 0 at the left and bottom edges to 1 at the right and top.
+// Draws a quad over the whole target; v_texCoord is (0, 0) at the bottom left and (1, 1) at the top right.
 attribute vec4 vertex;
 attribute vec2 texCoord;
 varying vec2 v_texCoord;

@@ -12,13 +12,14 @@ struct Free {
     void operator()(char* text) const { std::free(text); }
 };
 
-// Reads a text of at most `length` bytes with `get`; without memory for it the text is lost, which is all it is for.
+// Reads an info log of at most `length` bytes with `get`. Returns null if it is empty or the allocation fails: the text
+// is only logged.
 template <class Get>
 std::unique_ptr<char, Free> readInfoLog(GLint length, Get get) {
     if (length <= 1) return nullptr;
     std::unique_ptr<char, Free> text(static_cast<char*>(std::malloc(static_cast<std::size_t>(length))));
     if (!text) return nullptr;
-    *text = '\0';  // a driver may write nothing
+    *text = '\0';  // some drivers report a length and write nothing
     get(length, text.get());
     return text;
 }
@@ -26,7 +27,7 @@ std::unique_ptr<char, Free> readInfoLog(GLint length, Get get) {
 }  // namespace
 
 GLuint zorloadShaderScript(GLenum type, const char* source) {
-    LOG_ERROR("zorloadShaderScript");  // By contract an error.
+    LOG_ERROR("zorloadShaderScript");  // By contract at error priority.
     const GLuint shader = glCreateShader(type);
     if (!shader) return 0;
     glShaderSource(shader, 1, &source, nullptr);
@@ -39,7 +40,7 @@ GLuint zorloadShaderScript(GLenum type, const char* source) {
     glGetShaderiv(shader, GL_INFO_LOG_LENGTH, &length);
     const auto text =
         readInfoLog(length, [shader](GLint size, char* to) { glGetShaderInfoLog(shader, size, nullptr, to); });
-    // By contract the number is the type, not the name.
+    // By contract the number is the shader's type, not its name.
     if (text) LOG_ERROR("Could not compile shader %d:\n%s\n", static_cast<int>(type), text.get());
     glDeleteShader(shader);
     return 0;
@@ -52,7 +53,7 @@ GLuint zorCreateShaderProgram(GLuint vertexShader, GLuint fragmentShader) {
     if (!program) return 0;
     glAttachShader(program, vertexShader);
     glAttachShader(program, fragmentShader);
-    // By contract also for the water, which has neither.
+    // By contract also for the water's program, which declares neither attribute.
     glBindAttribLocation(program, 0, "vertex");
     glBindAttribLocation(program, 1, "texCoord");
     glLinkProgram(program);

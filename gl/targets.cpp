@@ -4,7 +4,7 @@
 #include "gl/texture_units.h"
 
 Surface_ createSurface(int width, int height) {
-    LOG_ERROR("CreateSurface");  // By contract an error.
+    LOG_ERROR("CreateSurface");  // By contract at error priority.
     Surface_ surface;
     surface.Width = width;
     surface.Height = height;
@@ -21,7 +21,7 @@ Surface_ createSurface(int width, int height) {
     }
     glFramebufferTexture2D(GL_FRAMEBUFFER, GL_COLOR_ATTACHMENT0, GL_TEXTURE_2D, surface.TextureHandle, 0);
     const GLenum status = glCheckFramebufferStatus(GL_FRAMEBUFFER);
-    // By contract no error.
+    // By contract at info priority.
     if (status != GL_FRAMEBUFFER_COMPLETE) LOG_INFO("FRAMEBUFFER_ERROR - %d", static_cast<int>(status));
     glClearColor(0.0f, 0.0f, 0.0f, 0.0f);
     glClear(GL_COLOR_BUFFER_BIT);

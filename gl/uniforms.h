@@ -1,5 +1,5 @@
-// Sets one uniform of the program in use by its name. By contract names are looked up at every use; one that the
-// program does not declare is ignored by GL.
+// Sets a uniform of the program in use. By contract its location is looked up by name on every call. GL ignores a name
+// that the program does not declare.
 #pragma once
 
 #include <GLES2/gl2.h>

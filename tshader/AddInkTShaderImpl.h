@@ -1,5 +1,5 @@
-// Adds ink around the touch or along the last drag segment: the CPU form of the GPU's ink injection. By contract no
-// frame runs it.
+// Adds ink around the touch or along the last drag segment. CPU version of fluid/add_ink.frag; by contract only tests
+// run it.
 #pragma once
 
 #include "tshader/tshader_core.h"
@@ -17,5 +17,5 @@ public:
     int mode = 0;                 // 2 along the segment, otherwise around current
     float len = 0.0f;             // length of the segment
     float ImpulseDensity = 0.0f;  // ink at the centre
-    float Radius = 0.0f;          // reach, in screen pixels
+    float Radius = 0.0f;          // maximum distance that receives ink, screen pixels
 };

@@ -16,8 +16,8 @@ struct Range {
     int first, end;
 };
 
-// The velocity at the point p, which is pushed if its foot on the segment lies strictly inside: by contract harder the
-// farther away it is.
+// Returns the new velocity at p. It changes if the projection of p onto the segment is strictly between the ends. By
+// contract the push grows with the distance d: u + d * (0.1 * (p - foot) + 0.1 * (current - foot)).
 template <class F>
 Pair<F> push(Pair<F> velocity, F px, F py, const Segment& segment) {
     const F t = segment.normal.x * (px - segment.previous.x) + segment.normal.y * (py - segment.previous.y);
@@ -32,8 +32,8 @@ Pair<F> push(Pair<F> velocity, F px, F py, const Segment& segment) {
         reached ? velocity.y + d * (0.1f * dy + 0.1f * (segment.current.y - footY)) : velocity.y};
 }
 
-// The texels of an axis that lie within `radius` of a stretch of the screen, and one more on either side to
-// make up for rounding. The comparisons are such that NaN gives the whole axis.
+// Returns the texels of one axis within `radius` of the interval between `from` and `to`, widened by one texel on each
+// side against rounding. A NaN fails the comparisons and gives the whole axis.
 Range reach(float from, float to, float radius, float scale, int size) {
     const float first = (std::min(from, to) - radius) / scale - 1.5f;
     const float last = (std::max(from, to) + radius) / scale + 1.5f;

@@ -7,7 +7,7 @@ void AdvectDensityTShaderImpl::shaderMain(const vec4& fragCoord, float& out) {
     const vec2 u = texture2DLinear(VelocityTexture, InverseSize * fragment);
     float step = BackwardStepSize;
     if (drag < 2) {
-        // The ink under a resting finger stays; the step grows to its full length over 80 pixels.
+        // Within 80 pixels the step is proportional to the distance, so ink under a resting finger stays.
         vec2 p = Scale * fragment;
         const float squared = distanceNoSqrt(center, p);
         if (squared < 80.0f * 80.0f) step = static_cast<float>(std::sqrt(squared) * 0.0075);

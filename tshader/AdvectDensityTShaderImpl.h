@@ -1,4 +1,4 @@
-// Moves the ink density along the velocity: the CPU form of the GPU's density advection. By contract no frame runs it.
+// Advects the ink density along the velocity. CPU version of fluid/advect_density.frag; by contract only tests run it.
 #pragma once
 
 #include "tshader/tshader_core.h"
@@ -11,7 +11,7 @@ public:
     Texture<float> SourceTexture;  // density
     vec2 InverseSize = {};         // output pixels to texture coordinates
     float TimeStep = 0.0f;
-    float BackwardStepSize = 0.0f;  // factor on the back-trace, away from the touch
+    float BackwardStepSize = 0.0f;  // scale of the back-trace, 80 pixels and more away from the touch
     float Dissipation = 0.0f;       // factor on the result
     vec2 Scale = {};                // screen pixels per output pixel
     vec2 center = {};               // touch point, in screen pixels, y up

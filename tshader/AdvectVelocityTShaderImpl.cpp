@@ -5,16 +5,16 @@
 
 namespace {
 
-// Touches drag the velocity along within this distance, in screen pixels.
+// A drag changes the velocity within this distance of the touch, screen pixels.
 constexpr float kDragRadius = 25.0f;
 
-// What a drag of this class adds to the velocity near the touch: by contract a medium one takes off half of its
-// movement and a fast one adds half.
+// Returns the velocity that a drag adds near the touch: by contract -delta / 2 for a medium drag and +delta / 2 for a
+// fast one.
 vec2 dragPush(int drag, const vec2& delta) {
     return (static_cast<float>(drag) - 1.5f) * delta;
 }
 
-// Texels texels[at] and texels[at + 1] for each lane of `at`.
+// Loads texels[at] and texels[at + 1] for each lane of `at`.
 inline void gatherNeighbours(const vec2* texels, int4 at, Pair<float4>& left, Pair<float4>& right) {
     const float4 a = load<float4>(&texels[at[0]].x);
     const float4 b = load<float4>(&texels[at[1]].x);
@@ -35,16 +35,16 @@ inline Pair<float> sample(Texture<vec2> source, Pair<float> c) {
     return {s.x, s.y};
 }
 
-// texture2DLinear at four points of a source that is at least two texels wide. One load brings both texels of a row, so
-// the last column is reached from the left with weight 1, and the last row of several from below. The other texel
-// counts 0 times there, and only one that is not finite would still be seen; no valid frame leaves one.
+// texture2DLinear at four points of a source that is at least two texels wide. One load reads both texels of a row, so
+// a sample in the last column reads the pair to its left with weights 0 and 1; the last row works the same way. A texel
+// of weight 0 affects the result only if it is not finite, and no frame leaves such a velocity.
 inline Pair<float4> sample(Texture<vec2> source, Pair<float4> c) {
     const float lastX = static_cast<float>(source.width - 1);
     const float lastY = static_cast<float>(source.height - 1);
     const bool oneRow = source.height == 1;
     const float4 fx = lastX * clampToUnit(c.x);
     const float4 fy = lastY * clampToUnit(c.y);
-    // A lane mask is -1 where it holds.
+    // A comparison gives -1 in the lanes where it is true.
     const int4 x0 = toInt(fx) + (fx >= lastX);
     const int4 y0 = toInt(fy) + (fy >= (oneRow ? 1.0f : lastY));
     const int4 at = y0 * source.width + x0;
@@ -85,7 +85,7 @@ void AdvectVelocityTShaderImpl::run() {
         vec2* out = output.row(j);
         const float y = static_cast<float>(j);
 
-        // By contract the touch reaches texel corners here: texel (0, 0) stands at screen (0, 0).
+        // By contract the distance to the touch is measured from the texel's corner: texel (0, 0) is at screen (0, 0).
         const float dy = touch.y - scale.y * y;
         const bool reached = dragged && dy * dy < kDragRadius * kDragRadius;
         forGroups(0, width, [=]<class F>(F, int i) {

@@ -1,4 +1,5 @@
-// Moves the velocity along itself: each texel traces back along its velocity and samples the source there.
+// Semi-Lagrangian self-advection of the velocity: each texel traces back along its velocity and samples the source
+// there.
 #pragma once
 
 #include "tshader/tshader_core.h"
@@ -8,13 +9,13 @@ public:
     void shaderMain(const vec4& fragCoord, vec2& out) override;
     void run();
 
-    Texture<vec2> VelocityTexture;  // traced back
-    Texture<vec2> SourceTexture;    // sampled there
+    Texture<vec2> VelocityTexture;  // gives the back-trace
+    Texture<vec2> SourceTexture;    // sampled at its end
     vec2 InverseSize = {};          // one texel in texture coordinates
     vec2 Scale = {};                // screen pixels per texel
     float TimeStep = 0.0f;          // texels per unit of velocity
     float Dissipation = 0.0f;       // factor on the result
     vec2 center = {};               // touch point, in screen pixels, y up
-    vec2 delta = {};                // its last movement, y up
+    vec2 delta = {};                // latest movement of the touch, y up
     int drag = 0;                   // -1 tap, 0 slow, 1 medium, 2 fast drag
 };

@@ -39,7 +39,7 @@ void ComputeDivergenceTShaderImpl::run() {
     for (int j = 0; j < height; ++j) {
         float* out = output.row(j);
 
-        // By contract the disc is laid over texel corners: texel (0, 0) stands at screen (0, 0).
+        // By contract the distance to the touch is measured from the texel's corner: texel (0, 0) is at screen (0, 0).
         const float dy = touch.y - scale.y * static_cast<float>(j);
         const bool reached = dy * dy < radiusSquared;
         const auto write = [=]<class F>(F divergence, int x) {

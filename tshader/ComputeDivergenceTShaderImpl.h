@@ -1,4 +1,5 @@
-// The divergence of the velocity, lowered in a disc around the touch so that the ink is pushed out of it.
+// Computes the divergence of the velocity. In a disc around the touch it subtracts SourceStrength, so that the pressure
+// solve drives the flow out of the disc.
 #pragma once
 
 #include "tshader/tshader_core.h"
@@ -13,6 +14,6 @@ public:
     vec2 InverseSize = {};  // one texel in texture coordinates
     float HalfInvCellSize = 0.0f;
     float SourceStrength = 0.0f;
-    float SourceRadius = 0.0f;  // in screen pixels
+    float SourceRadius = 0.0f;  // of the disc, in screen pixels
     vec2 center = {};           // of the disc, in screen pixels, y up
 };

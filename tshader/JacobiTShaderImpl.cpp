@@ -6,7 +6,7 @@
 
 namespace {
 
-// One relaxation from the four neighbours, for one texel or for four in a row.
+// (left + right + below + above + alpha * divergence) * inverseBeta
 template <class F>
 F relax(F left, F right, F below, F above, F divergence, float alpha, float inverseBeta) {
     return ((((left + right) + below) + above) + alpha * divergence) * inverseBeta;
@@ -27,7 +27,7 @@ void JacobiTShaderImpl::run() {
     if (output.empty()) return;
     const int width = output.width;
     const int height = output.height;
-    // Locals, as every store could change a float field of this object.
+    // Local copies: the compiler must assume that a store to the output changes a float field of this object.
     const float alpha = Alpha;
     const float inverseBeta = InverseBeta;
 

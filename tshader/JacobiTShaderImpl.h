@@ -1,4 +1,4 @@
-// One Jacobi relaxation of the pressure equation.
+// One Jacobi iteration of the pressure equation.
 #pragma once
 
 #include "tshader/tshader_core.h"
@@ -7,12 +7,12 @@ class JacobiTShaderImpl : public TShaderCore<float> {
 public:
     void shaderMain(const vec4& fragCoord, float& out) override;
 
-    // Relaxes the interior; by contract the border of the output becomes 0.
+    // Computes the interior; by contract sets the border of the output to 0.
     void run();
 
     Texture<float> Pressure;
     Texture<float> Divergence;
     float Alpha = 0.0f;        // weight of the divergence
-    float InverseBeta = 0.0f;  // one over the number of neighbours
+    float InverseBeta = 0.0f;  // 1 / number of neighbours
     vec2 InverseSize = {};     // one texel in texture coordinates
 };

@@ -1,4 +1,4 @@
-// Takes the pressure gradient out of the velocity.
+// Subtracts the pressure gradient from the velocity.
 #pragma once
 
 #include "tshader/tshader_core.h"

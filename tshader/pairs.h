@@ -1,4 +1,5 @@
-// One or four vec2 values taken apart into their components, so that a formula works on lanes of equal meaning.
+// Pair<F> holds one or four vec2 values as a structure of arrays: all x components in one F, all y components in
+// another.
 #pragma once
 
 #include "base/float4.h"
@@ -41,7 +42,7 @@ inline void storePairs(Pair<float4> value, vec2* to) {
     store(lastTwo(value), &to[2].x);
 }
 
-// to = from - value, without taking `from` apart.
+// to = from - value, without deinterleaving `from`.
 inline void subtractPairs(const vec2* from, Pair<float> value, vec2* to) {
     *to = vec2{from->x - value.x, from->y - value.y};
 }

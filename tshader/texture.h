@@ -1,4 +1,4 @@
-// A view of a CPU image and its two samplers. A Texture owns nothing; row 0 is the bottom row.
+// Texture is a non-owning view of a CPU image; row 0 is the bottom row. Two samplers read it.
 #pragma once
 
 #include <cstddef>
@@ -17,20 +17,19 @@ struct Texture {
     bool empty() const { return data == nullptr || width <= 0 || height <= 0; }
 };
 
-// What is not a number fails the first comparison and ends at 0, so that it never becomes an index.
+// NaN fails the first comparison and gives 0, so it never becomes an index.
 template <class F>
 inline F clampToUnit(F c) {
     return lesser(greater(c, F{}), F{} + 1.0f);
 }
 
-// The bilinear blend of four neighbouring texels, for one sample or for four at once.
 template <class F, class T>
 inline T bilinear(T t00, T t10, T t01, T t11, F tx, F ty) {
     return (1.0f - tx) * (1.0f - ty) * t00 + tx * (1.0f - ty) * t10 + (1.0f - tx) * ty * t01 + tx * ty * t11;
 }
 
-// By contract coordinate 0 is the centre of the first texel and 1 that of the last: there is no half-texel offset, so a
-// sample at (i + 0.5) / width blends texel i with a neighbour.
+// By contract coordinate 0 is the centre of the first texel and 1 the centre of the last. A sample at (i + 0.5) / width
+// therefore blends texel i with a neighbour.
 template <class T>
 inline T texture2DLinear(Texture<T> t, vec2 c) {
     if (t.empty()) return T{};

@@ -1,10 +1,10 @@
-// The base of the CPU kernels. A kernel is a fragment shader over float textures: its fields are the textures
-// and uniforms, shaderMain computes one fragment, and `run`, where a kernel has one, fills the output.
-// A kernel owns nothing; output must be another buffer than every input.
+// Base class of the CPU kernels. A kernel is a fragment shader over float textures: its fields are the textures and
+// uniforms, shaderMain computes one fragment, and `run`, if the kernel has one, computes the whole output. A kernel
+// owns no memory; the output must not alias an input.
 //
-// The library calls `run` only. It computes what shaderMain does, but for rounding and for two differences that stand
-// by contract: velocity advection and divergence lay the disc around the touch over the texels' corners, not their
-// centres, and Jacobi sets the border of its output to 0.
+// The library calls only `run`. Its result differs from shaderMain's by rounding and, by contract, in two places:
+// velocity advection and divergence measure the distance to the touch from a texel's corner instead of its centre, and
+// Jacobi sets the border of its output to 0.
 #pragma once
 
 #include <cstddef>
@@ -18,7 +18,7 @@ class TShaderCore {
 public:
     virtual ~TShaderCore() = default;
 
-    // The C allocator: where the C++ runtime is linked statically, its own would bring the unwinder along.
+    // Uses malloc, because the C++ runtime's operator new would link the unwinder into a static build.
     static void* operator new(std::size_t size) noexcept { return std::malloc(size); }
     static void* operator new(std::size_t, void* place) noexcept { return place; }
     static void operator delete(void* kernel) { std::free(kernel); }
@@ -27,5 +27,5 @@ public:
     virtual void shaderMain(const vec4& fragCoord, T& out) = 0;
 
     Texture<T> output;
-    char name[100] = {};  // by contract, though nothing reads it
+    char name[100] = {};  // set by contract; the library does not read it
 };

@@ -1,4 +1,4 @@
-// Plain float vectors with the operators and functions that the kernels share with their shader counterparts.
+// Float vectors with the GLSL operators and functions that the kernels use.
 #pragma once
 
 #include <cmath>
@@ -51,7 +51,7 @@ inline vec2 operator/(float s, const vec2& v) {
     return vec2{s / v.x, s / v.y};
 }
 
-// Divides each component: multiplying by 1 / s would round twice.
+// Divides each component, because multiplying by 1 / s would round twice.
 inline vec2 operator/(const vec2& v, const float& s) {
     return vec2{v.x / s, v.y / s};
 }
@@ -72,7 +72,7 @@ inline vec4 operator*(const vec4& v, const float& s) {
     return vec4{v.x * s, v.y * s, v.z * s, v.w * s};
 }
 
-// A vector passes a comparison when every component does.
+// A comparison of a vector is true if it is true for every component.
 inline bool isLE(const float& a, float b) {
     return a <= b;
 }
@@ -97,7 +97,7 @@ inline bool isGT(const vec4& v, float b) {
     return v.x > b && v.y > b && v.z > b && v.w > b;
 }
 
-// In double precision, so that only the last step rounds.
+// Computed in double precision, so that only the conversion to float rounds.
 inline float fract(float x) {
     const double exact = x;
     return static_cast<float>(exact - std::floor(exact));

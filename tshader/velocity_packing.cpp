@@ -9,9 +9,8 @@ static_assert(std::endian::native == std::endian::little, "four bytes of a texel
 
 namespace {
 
-// The two bytes in the low half of an int, whole part first in memory. NaN packs like 127.
-// A raised component is a multiple of 2^-18, and no such fraction times 255 lies close enough below a whole
-// number to be rounded up to it: single precision yields the same bytes as double precision would.
+// Returns whole | fraction << 8; NaN packs like 127. Single precision gives the same bytes as double: c + 127 is a
+// multiple of 2^-18, and no fraction of that form times 255 is close enough below an integer to round up to it.
 template <class I, class F>
 I packComponent(F c) {
     const F raised = c < -127.0f ? 0.0f : (c < 127.0f ? c + 127.0f : 254.0f);

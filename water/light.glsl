@@ -10,7 +10,7 @@ varying vec3 vNormal;
 varying vec3 vHalfVec;
 varying float vHeights;
 
-// The picture behind the water and the light on its waves, whose highlights are clamped to `brightest`.
+// Returns the refracted background with the light on the waves added; highlights are clamped to `brightest`.
 vec3 litWater(float brightest) {
     vec4 waterColor = texture2D(sWaterTexture, vWaterTextureCoord);
     vec4 bgColor = texture2D(sBGTexture, vBGTexture1Coord);

@@ -22,11 +22,11 @@ void fillPositions(
 }
 
 void fillIndices(std::int16_t* indices, int numDetailsWidth, int numDetailsHeight) {
-    if (numDetailsHeight < 2) return;  // no cells, however many columns there are
+    if (numDetailsHeight < 2) return;  // Without rows of cells, do not loop over a huge column count.
     for (int p = 1; p < numDetailsWidth; ++p) {
         for (int q = 1; q < numDetailsHeight; ++q) {
-            // Row p, column q: the bottom right corner of the cell, in the 16 bits that an index has. By contract the
-            // stride is the width, where that of the positions is the height.
+            // The corner is truncated to the 16 bits of an index. By contract the stride is numDetailsWidth, whereas
+            // the positions use numDetailsHeight.
             const auto bottomRight = static_cast<std::uint16_t>(
                 static_cast<unsigned>(q) * static_cast<unsigned>(numDetailsWidth) + static_cast<unsigned>(p));
             const auto bottomLeft = static_cast<std::uint16_t>(bottomRight - numDetailsWidth);

@@ -27,7 +27,7 @@ void drawWater(
     const WaterInk* ink) {
     const GLuint program = objects.program;
     if (!objects.positions) {
-        // Without a buffer bound, the attributes' offsets would be addresses, and the draw would read address 0.
+        // Without a bound buffer GL takes the attribute offsets as addresses, and the draw would read address 0.
         static bool reported = false;
         if (!reported) LOG_ERROR("Ripple_Render() without the buffers of onInitSetting()");
         reported = true;
@@ -44,7 +44,7 @@ void drawWater(
     const auto aHeights = static_cast<GLuint>(glGetAttribLocation(program, "aHeights"));
     glUniformMatrix4fv(glGetUniformLocation(program, "uMVPMatrix"), 1, GL_FALSE, mesh.mvp);
 
-    // By contract in every frame and as static, though positions and indices stay the same.
+    // By contract every frame uploads all buffers with GL_STATIC_DRAW, although positions and indices do not change.
     glBindBuffer(GL_ARRAY_BUFFER, 0);
     upload(GL_ARRAY_BUFFER, objects.positions, std::ptrdiff_t{mesh.positionFloats} * 4, mesh.positions);
     upload(GL_ARRAY_BUFFER, objects.heights, std::ptrdiff_t{mesh.heightFloats} * 4, mesh.heightAttribs);
@@ -61,7 +61,7 @@ void drawWater(
     }
 
     setUniform(program, "alphaRatio1", light.alphaMix * light.alphaScale1);
-    // By contract, though no shader declares it.
+    // By contract set, although no shader declares it.
     setUniform(program, "alphaRatio2", static_cast<float>(double{light.alphaScale2} * (1.0 - double{light.alphaMix})));
     setUniform(program, "fresnelRatio", light.fresnelRatio);
     setUniform(program, "specularRatio", light.specularRatio);

@@ -1,29 +1,29 @@
-// Draws the water: the picture behind it seen through its slopes, light on its waves, and ink in it.
+// Draws the water: the background refracted by its slopes, highlights on the waves, and the ink.
 #pragma once
 
 #include <GLES2/gl2.h>
 
-// GL names of the water program of a set-up, of the three buffers that each frame fills, and of the pictures.
+// GL names.
 struct WaterObjects {
     GLuint program;
-    GLuint positions;
+    GLuint positions;  // buffers, filled by each frame
     GLuint heights;
     GLuint indices;
-    GLuint background;
+    GLuint background;  // textures
     GLuint light;
 };
 
 struct WaterMesh {
-    const float* positions;      // 3 a vertex
-    const float* heightAttribs;  // 3 a vertex
-    const short* indices;        // unsigned vertex numbers, 3 a triangle
+    const float* positions;      // 3 per vertex
+    const float* heightAttribs;  // 3 per vertex
+    const short* indices;        // unsigned vertex numbers, 3 per triangle
     int positionFloats;
     int heightFloats;
     int indexCount;
-    const float* mvp;  // 16, by columns
+    const float* mvp;  // 16, column-major
     int sizeWidth;     // extent in model units
     int sizeHeight;
-    int detailsWidth;  // vertices a side
+    int detailsWidth;  // vertices along each axis
     int detailsHeight;
 };
 
@@ -38,14 +38,14 @@ struct WaterLight {
 };
 
 struct WaterInk {
-    GLuint density;  // texture, two bytes a value
-    float tint[3];   // what a unit of density adds to the divisor of a channel
+    GLuint density;  // texture, two bytes per value
+    float tint[3];   // the colour is divided by 1 + intensity * density * tint
     float intensity;
 };
 
-// Draws into the current framebuffer, over a view of viewWidth x viewHeight pixels. Without `ink` the program must be
-// the plain one. Leaves the program in use, the buffers of positions and indices bound and texture units 0 to 3
-// unbound.
+// Draws into the current framebuffer, over a view of viewWidth x viewHeight pixels. `objects.program` must be the ink
+// program if `ink` is not null, else the plain one. Leaves the program in use, the buffers of positions and indices
+// bound and texture units 0 to 3 unbound.
 void drawWater(
     const WaterObjects& objects, int viewWidth, int viewHeight, const WaterMesh& mesh, const WaterLight& light,
     const WaterInk* ink);

@@ -15,13 +15,13 @@ struct Range {
     int end;
 };
 
-// A centre far outside the mesh gives bounds that no int holds.
+// Clamps, because a centre far outside the mesh gives bounds beyond the range of int.
 int toIndex(float value) {
     return static_cast<int>(std::clamp(std::floor(static_cast<double>(value)), -1.0e9, 1.0e9));
 }
 
-// The seven cells around `centre`, by contract kept off the cells 0, 1 and count - 1. All tests fail for a centre that
-// is not a number, which then gets the whole axis: nothing is within reach of it.
+// Returns the seven cells around `centre`, by contract without the cells 0, 1 and count - 1. A NaN fails both
+// comparisons and gives the whole axis, where no cell then passes the height test.
 Range boxAround(float centre, int count) {
     return {
         centre > 5.0f ? toIndex(centre - kReach) : 2,
@@ -32,7 +32,7 @@ Range boxAround(float centre, int count) {
 
 void addRipple(const RippleField& field, float posA, float posB, float amplitude) {
     if (field.countA < 1 || field.countB < 1) return;
-    // By contract `count` cells span the extent, not count - 1.
+    // By contract `count` cells cover the extent, not count - 1.
     const float centreA = (posA / static_cast<float>(field.extentA) + 0.5f) * static_cast<float>(field.countA);
     const float centreB = static_cast<float>(field.countB) * (0.5f + posB / static_cast<float>(field.extentB));
     const Range a = boxAround(centreA, field.countA);

@@ -1,8 +1,6 @@
-// Impulses that disturb the water.
 #pragma once
 
-// A field of one value per vertex: countA values along the fast axis, countB along the slow one, spanning
-// extentA x extentB of the host's units around its middle.
+// A field of one value per vertex, centred on (0, 0), extentA x extentB units of the host. A is the fast axis.
 struct RippleField {
     float* values;  // countA * countB floats, addressed as b * countA + a
     int extentA;
@@ -11,6 +9,6 @@ struct RippleField {
     int countB;
 };
 
-// Adds a cone with a radius of three cells and a peak of 3 * amplitude at (posA, posB), measured from the middle.
-// Cells 0, 1 and count - 1 of either axis are never touched, so any centre, even one that is not a number, is safe.
+// Adds a cone with a radius of three cells and a peak of 3 * amplitude at (posA, posB). Never writes the cells 0, 1 and
+// count - 1 of either axis, so any centre is safe, including NaN.
 void addRipple(const RippleField& field, float posA, float posB, float amplitude);

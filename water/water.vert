@@ -1,13 +1,13 @@
-// Bends the view ray of each vertex by the slope of the water and finds what it hits: in model space the eye is
-// 30 in front of the surface and the picture lies on the plane z = 30.9 behind it.
+// Refracts the view ray of each vertex by the slope of the water and intersects it with the background. In model space
+// the eye is at z = -30, the water at z = 0 and the background in the plane z = 30.9.
 uniform mat4 uMVPMatrix;
 uniform float uMESH_SIZE_WIDTH;
 uniform float uMESH_SIZE_HEIGHT;
-uniform float uNUM_DETAILS_WIDTH;  // by contract declared, and not used
+uniform float uNUM_DETAILS_WIDTH;  // by contract declared, but not used
 uniform float uNUM_DETAILS_HEIGHT;
 uniform float uRefractiveIndex;
 attribute vec4 aPosition;
-attribute vec4 aHeights;  // the vertex's own height and those of its neighbours in x and in y
+attribute vec4 aHeights;  // heights of the vertex, of its neighbour in x and of its neighbour in y
 varying vec2 vWaterTextureCoord;
 varying vec2 vBGTexture1Coord;
 varying vec3 vNormal;
@@ -30,16 +30,16 @@ void main() {
 
     float reach = (30.9 - surface.z) / ray.z;
     vec2 hit = ray.xy * reach + surface.xy;
-    // The picture's first row is its top, so t runs down while y runs up.
+    // The picture's first row is its top, so t increases downwards and y upwards.
     vBGTexture1Coord = vec2(hit.x / maxX * 0.25 + 0.5, hit.y / maxY * -0.25 + 0.5);
-    // By contract y goes with the width and x with the height.
+    // By contract y is divided by the width and x by the height.
     vWaterTextureCoord = slope * 0.5 + 0.5 + vec2(aPosition.y / uMESH_SIZE_WIDTH, aPosition.x / uMESH_SIZE_HEIGHT) * 0.25;
 
     vec4 position = uMVPMatrix * aPosition;
-    // By contract neither a direction nor normalized.
+    // By contract a transformed point, not a normalized direction.
     vec3 light = (uMVPMatrix * vec4(5.0, -5.0, 1.0, 1.0)).xyz;
     vNormal = normalize(vec3(slope, 0.6));
     vHalfVec = normalize(normalize(vec3(0.0, 0.0, 1.0) - position.xyz) + light);
     vHeights = h;
-    gl_Position = position;  // by contract flat: the heights only bend what is seen
+    gl_Position = position;  // by contract flat: the heights affect only refraction and light
 }

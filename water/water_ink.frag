@@ -1,7 +1,7 @@
 #include "gl/precision.glsl"
 #include "gl/density_texel.glsl"
 #include "water/light.glsl"
-// Water with ink: highlights a little lower, and the colour divided by the ink.
+// color = litWater / (1 + intensity * density * ink_color); highlights are clamped lower than without ink.
 uniform FULL sampler2D Density;
 uniform FULL float intensity;
 uniform FULL vec2 Scale;

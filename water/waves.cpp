@@ -25,8 +25,7 @@ F laplacian(const float* h, std::ptrdiff_t stride) {
     return sum;
 }
 
-// The integrated heights of the region and of the vertices around it, so that smoothing can write the host's array
-// while it still reads the neighbours' old heights.
+// A copy of the integrated heights of the region and its border: smoothing reads it and writes the host's array.
 Scratch<float> snapshot("smoothing the water");
 
 bool isFast(float speed) {
@@ -38,7 +37,7 @@ int4 isFast(float4 speed) {
     return reinterpret_cast<float4>(magnitude) > kCalmSpeed;
 }
 
-// Accelerates one row; with `test` returns whether all of it stays calm.
+// Updates the velocities of one row. With `test` returns whether every one is within the calm band, else true.
 template <bool test>
 bool accelerate(
     float* velocity, const float* height, std::ptrdiff_t stride, int width, float damping, float waveSpeed) {
@@ -57,7 +56,7 @@ bool accelerate(
     return !fast && !(fastLanes[0] | fastLanes[1] | fastLanes[2] | fastLanes[3]);
 }
 
-// Writes one row of integrated heights to `integrated`, which may be the row itself.
+// integrated = clamp(height + velocity) for one row. `integrated` may be `height`.
 void integrate(const float* height, const float* velocity, float* integrated, int width) {
     forGroups(0, width, [=](auto lanes, int x) {
         using F = decltype(lanes);
@@ -68,7 +67,7 @@ void integrate(const float* height, const float* velocity, float* integrated, in
     });
 }
 
-// Smooths one row: height <- k * laplacian(copy) + centre, where `centre` holds the heights before smoothing.
+// height = k * laplacian(copy) + centre for one row; `centre` holds the heights before smoothing.
 void smooth(float* height, const float* copy, const float* centre, std::ptrdiff_t copyStride, int width, float k) {
     forGroups(0, width, [=](auto lanes, int x) {
         using F = decltype(lanes);
@@ -76,17 +75,17 @@ void smooth(float* height, const float* copy, const float* centre, std::ptrdiff_
     });
 }
 
-// A region of the host's arrays: from the first vertex of each.
+// A region of the host's arrays.
 struct Rows {
-    float* velocity;
+    float* velocity;  // first vertex of the region
     float* height;
     std::ptrdiff_t stride;
     int width;
     int count;
 };
 
-// Integrates and smooths rows that do not fill their stride. Each is copied into whole groups, so that three of the
-// four neighbours and every store lie on the borders of groups: a load across two cache lines costs two.
+// Integrates and smooths rows shorter than their stride. The stride of the copy is a multiple of four floats, so that
+// most loads are aligned: a load that crosses a cache line costs two.
 bool integrateAndSmooth(const Rows& rows, float k) {
     const auto [v, h, stride, width, count] = rows;
     const std::ptrdiff_t copyStride = (std::ptrdiff_t{width} + 2 + 3) / 4 * 4;
@@ -111,8 +110,8 @@ bool integrateAndSmooth(const Rows& rows, float k) {
     return true;
 }
 
-// The same for rows that fill their stride or overlap: the vertex left of a row is the last one of the row before,
-// which the step moves as well. The copy is laid out as the array is.
+// The same for rows that fill their stride or overlap. There the left neighbour of a row is the last vertex of the
+// previous row, which this step also moves, so the copy has the layout of the array.
 bool integrateAndSmoothContiguous(const Rows& rows, float k) {
     const auto [v, h, stride, width, count] = rows;
     const std::ptrdiff_t length = (count - 1) * stride + width;
@@ -136,7 +135,6 @@ bool stepWaves(
     const int width = region.xEnd - region.xStart;
     const int rows = region.yEnd - region.yStart;
 
-    // A surface that comes to rest ends in denormals and stays there.
     const FlushDenormals flush;
     const std::ptrdiff_t stride = region.stride;
     const std::ptrdiff_t start = region.yStart * stride + region.xStart;
@@ -148,16 +146,16 @@ bool stepWaves(
     };
     bool calm = true;
     int row = 0;
-    // One row that moves settles it.
+    // One row beyond the calm band decides the result; the rest skips the test.
     while (checkCalm && calm && row < rows) calm = pass(std::true_type{}, row++);
     while (row < rows) pass(std::false_type{}, row++);
 
-    // By contract exactly this damping smooths more.
+    // By contract a damping of exactly 0.94f smooths more.
     const float k = damping == 0.94f ? 0.068f : 0.018f;
     const Rows all = {v, h, stride, width, rows};
     const bool isContiguous = stride > 0 && width >= stride;
     if (isContiguous ? integrateAndSmoothContiguous(all, k) : integrateAndSmooth(all, k)) return calm;
-    // Without memory for the copy the surface is only integrated.
+    // Without memory for the copy, integrate without smoothing.
     for (row = 0; row < rows; ++row) integrate(h + row * stride, v + row * stride, h + row * stride, width);
     return calm;
 }

@@ -1,7 +1,7 @@
 #include "gl/precision.glsl"
 #include "gl/density_texel.glsl"
-// Adds ink along the segment from previous to current (mode 2) or around current. Positions are screen pixels, y
-// upwards.
+// Adds ink along the segment from previous to current (mode 2) or around current (other modes). Positions are screen
+// pixels, y up.
 uniform FULL sampler2D Source;
 uniform FULL vec2 Scale;
 uniform FULL vec2 current;

@@ -1,7 +1,7 @@
 #include "gl/precision.glsl"
 #include "gl/density_texel.glsl"
-// Carries the ink back along the velocity and fades it. Velocity texel: R + G/255 and B + A/255 are x and y, raised by
-// 127.
+// Semi-Lagrangian advection of the density, which is then multiplied by Dissipation. The velocity texel holds
+// x = 255 R + G - 127 and y = 255 B + A - 127.
 uniform FULL sampler2D VelocityTexture;
 uniform FULL sampler2D SourceTexture;
 uniform FULL vec2 TimeStep;

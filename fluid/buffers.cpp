@@ -19,13 +19,13 @@ void release(Texture<T>& texture) {
     texture = {};
 }
 
-// The memory for the grid of a larger view would be half the device's.
+// The five buffers of a square grid of this side take 800 MB.
 constexpr int kLargestGrid = kLargestSide / kCellPixels;
 
 template <class T>
 bool renew(Texture<T>& texture, int width, int height) {
     std::free(texture.data);
-    // A view smaller than a cell has a grid of no texels; its block is not null all the same, as null means failure.
+    // A view smaller than a cell has an empty grid. It gets a block of one byte, because null means failure.
     const std::uint64_t bytes =
         std::uint64_t{sizeof(T)} * static_cast<std::uint64_t>(width) * static_cast<std::uint64_t>(height);
     const bool fits = width <= kLargestGrid && height <= kLargestGrid && bytes <= SIZE_MAX / 2;

@@ -1,10 +1,9 @@
-// The engine's CPU buffers: all five of them, or none.
 #pragma once
 
 class Fluid;
 
-// Replaces the buffers by new ones of GridWidth x GridHeight texels, the velocity zero. Without memory for all of them
-// there are none afterwards, which is logged, and the ink stands still while the water goes on.
+// Replaces the engine's five CPU buffers by new ones of GridWidth x GridHeight texels; the velocity is zero. If one
+// allocation fails, frees all of them and logs the failure. Frames then draw the water without moving or adding ink.
 void allocateBuffers(Fluid& engine);
 
 void freeBuffers(Fluid& engine);

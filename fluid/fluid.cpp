@@ -66,7 +66,7 @@ void Fluid::LoadLandscapeBGTextures(AndroidBitmapInfo info, void* pixels) {
     makePictureTexture(landscapeBG, info, pixels);
 }
 
-// By contract without a line of its own.
+// By contract logs nothing.
 void Fluid::LoadWaterTextures(AndroidBitmapInfo info, void* pixels) {
     deleteGroup(glObjects(), kEnvironmentTexture);
     makePictureTexture(environment, info, pixels);

@@ -1,7 +1,7 @@
 // The engine: one object that owns every GL object and every simulation parameter.
 //
-// All methods run on the host's GL thread with its OpenGL ES 2.0 context current. Nothing is reported back: a
-// failure is logged, leaves a GL name of 0 and the call goes on.
+// Call all methods on the host's GL thread with its OpenGL ES 2.0 context current. They report no errors to the caller:
+// a method logs a failure, leaves a GL name of 0 and continues.
 #pragma once
 
 #include <GLES2/gl2.h>
@@ -20,7 +20,7 @@
 #include "tshader/SubtractGradientTShaderImpl.h"
 #include "tshader/texture.h"
 
-// A point or direction in screen pixels, y upwards.
+// A point or direction in screen pixels, y up.
 struct Vector_ {
     float x = 0.0f;
     float y = 0.0f;
@@ -39,17 +39,16 @@ public:
     Fluid() = default;
     Fluid(const Fluid&) = delete;
     Fluid& operator=(const Fluid&) = delete;
-    // Frees the CPU buffers. The GL objects are not deleted: when the library unloads, their context may be gone.
+    // Frees the CPU buffers. Does not delete GL objects: when the library unloads, their context may no longer exist.
     ~Fluid();
 
-    // Set-up, in this order; again after the context was lost, or for another view. Whatever is there is deleted, with
-    // a line in the log that names it, and made anew. Both take the same ink switch. With ink, InitializeGPU leaves the
+    // Set up the engine. Call both in this order with the same `withInk`, and again after a context loss or for another
+    // view. Each deletes and logs the objects that it is about to create again. With ink, InitializeGPU leaves the
     // framebuffer of Density.Pong bound, the viewport at the ink's size, the clear colour 0 and the blend function set.
     void InitializeSetting(int width, int height, bool withInk);
     void InitializeGPU(bool withInk);
 
-    // Make a texture from 32-bit RGBA pixels, `info.width` x `info.height`, rows from the top and without padding.
-    // Null pixels leave its content undefined.
+    // Create a texture from RGBA8 pixels; see makePictureTexture.
     void LoadPortraitBGTextures(AndroidBitmapInfo info, void* pixels);
     void LoadLandscapeBGTextures(AndroidBitmapInfo info, void* pixels);
     void LoadWaterTextures(AndroidBitmapInfo info, void* pixels);
@@ -59,52 +58,45 @@ public:
     void SwapSurfaces(Data_* data);
     // Leaves the framebuffer of `surface` bound.
     void ClearSurface(Surface_ surface, float red, float green, float blue, float alpha);
-    // Ends an off-screen pass: texture units 3 to 0 unbound, unit 0 active, framebuffer 0 bound, blending off.
     void ResetState();
     void CreateQuad();
-    // Draws the whole target with the program in use. Leaves quadvbo bound and attribute 1 enabled.
     void DrawQuad();
 
-    // One step of the ink simulation, with the parameters that the last frame left: moves the velocity field on the
-    // CPU, uploads it, and carries the ink along it on the GPU. `frame` is not read. Draws two numbers of lrand48 when
-    // the touch lies inside the margin. Needs the CPU buffers. Leaves the viewport at the ink's size and framebuffer 0
-    // bound.
+    // Steps the ink simulation: advects and projects the velocity field on the CPU, uploads it, and advects the density
+    // on the GPU. Uses the parameters set by the previous frame. Calls lrand48 twice if the touch is inside the margin.
+    // `frame` is ignored. Requires the CPU buffers. Leaves the viewport at the ink's size and framebuffer 0 bound.
     void Update(int frame);
-    // Adds ink along the segment (x1, y1) to (x2, y2), screen pixels with y downwards: mode 2 a band, any other a disc
-    // at its end. Only records the stroke while the touch lies within BoundaryMargin of an edge.
+    // Adds ink in a band along the segment (x1, y1) to (x2, y2) if `mode` is 2, otherwise in a disc around its end. If
+    // the touch is within BoundaryMargin of an edge, only records the segment. Screen pixels, y down.
     void Inject(int mode, float x1, float y1, float x2, float y2, Color_ color);
-    // Pushes the velocity away from the segment and along it; the same margin holds.
+    // Adds velocity around the segment, with the same margin and coordinates as Inject.
     void Perturb(float x0, float y0, float x1, float y1);
-    // Whether the screen point, y downwards, lies within BoundaryMargin pixels of an edge.
+    // Returns whether the screen point, y down, is within BoundaryMargin pixels of an edge.
     bool isBoundary(int x, int y) const;
 
-    // The two passes over the ink density, from `source` into `destination`. The caller swaps the pair, and sets the
-    // viewport for the first one.
+    // Passes over the density, from `source` into `destination`. The caller swaps the pair and sets the viewport.
     void AdvectDensity(Surface_ velocitySurface, Surface_ source, Surface_ destination, float dissipation);
     void AddInk(Surface_ source, Surface_ destination, int mode, Vector_ previous, Vector_ current, float impulse);
 
-    // The passes over the velocity field; `dest` is none of the inputs, and the caller swaps. See the kernels.
+    // Passes over the velocity field; see the kernels. `dest` must not be an input. The caller swaps the pair.
     void AdvectVelocity(Texture<vec2> velocity, Texture<vec2> source, Texture<vec2> dest, float dissipation);
     void AddVelocity(Texture<vec2> velocity, Texture<vec2> dest, Vector_ previous, Vector_ current);
     void ComputeDivergence(Texture<vec2> velocity, Texture<float> dest, Vector_ point);
     void Jacobi(Texture<float> pressure, Texture<float> divergence, Texture<float> dest);
     void SubtractGradient(Texture<vec2> velocity, Texture<float> pressure, Texture<vec2> dest);
 
-    // Takes over what a gesture of one kind writes.
+    // Copies a gesture preset into the simulation parameters.
     void apply(const InkPreset& preset);
 
-    // Draws the water into the current framebuffer, which is 0 after Update. `positions` and `heightAttribs` hold 3
-    // floats a vertex, `indices` unsigned vertex numbers, `mvp` 16 floats by columns. With ink, the density in
-    // Density.Ping divides the colours. Leaves ripple_program in use, v_buf and i_buf bound and texture units 0 to 3
-    // unbound.
+    // Draws the water; see drawWater. With ink, the density in Density.Ping divides the colours.
     void Ripple_Render(
         const float* positions, const float* heightAttribs, const short* indices, int positionFloats, int heightFloats,
         int indexCount, const float* mvp, int meshSizeWidth, int meshSizeHeight, int numDetailsWidth,
         int numDetailsHeight, float refractiveIndex, float alphaMix, float alphaScale1, float alphaScale2,
         float fresnelRatio, float specularRatio, float exponent, bool withInk, bool landscape);
 
-    Data_ Velocity;  // by contract only Ping is made: the CPU's velocity, packed anew in every frame
-    Data_ Density;   // the ink, two bytes a value
+    Data_ Velocity;  // by contract only Ping exists: the CPU's velocity, packed and uploaded in every frame
+    Data_ Density;   // ink, two bytes per value
     GLuint ripple_program = 0;
     GLuint ripple_vertexShader = 0;
     GLuint ripple_fragmentShader = 0;
@@ -122,21 +114,21 @@ public:
     int GridHeight = 0;
     int InkWidth = 0;  // density targets, texels
     int InkHeight = 0;
-    float Radius = 0.0f;          // of ink and velocity injections, pixels
-    float ImpulseDensity = 0.0f;  // ink of one injection
+    float Radius = 0.0f;          // of injected ink and velocity, pixels
+    float ImpulseDensity = 0.0f;  // density added by one injection
     int NumJacobiIterations = 0;
     float TimeStep = 0.0f;
     float GradientScale = 0.0f;
-    float VelocityDissipation = 0.0f;  // factors at each advection
-    float DensityDissipation = 0.0f;
-    float SourceStrength = 0.0f;  // taken from the divergence within SourceRadius pixels of the touch
-    float SourceRadius = 0.0f;
-    float BackwardStepSize = 0.0f;  // back-trace of the density, 1 for the whole way
+    float VelocityDissipation = 0.0f;  // factor per step
+    float DensityDissipation = 0.0f;   // factor per step
+    float SourceStrength = 0.0f;       // subtracted from the divergence within SourceRadius of the touch
+    float SourceRadius = 0.0f;         // pixels
+    float BackwardStepSize = 0.0f;     // scale of the density's back-trace
     float InkColorOffset = 0.0f;
     float ClearInkValue = 0.0f;  // 1 shows the ink, 0 hides it
     float InkIntensity = 0.0f;   // darkening per unit of density
     int DragMode = 0;            // -1 tap, 0 slow, 1 medium, 2 fast drag
-    int BoundaryMargin = 0;      // pixels along the edges where nothing is injected
+    int BoundaryMargin = 0;      // width of the border without injection, pixels
     GLuint portraitBG = 0;
     GLuint landscapeBG = 0;
     GLuint environment = 0;
@@ -153,15 +145,15 @@ public:
     ComputeDivergenceTShaderImpl ComputeDivergenceKernel;
     AddInkTShaderImpl AddInkKernel;
     AddVelocityTShaderImpl AddVelocityKernel;
-    // Owned blocks of GridWidth x GridHeight texels. A pass reads the first of a pair and writes the other, then the
-    // two records are swapped.
+    // Owned blocks of GridWidth x GridHeight texels. A pass reads one of a pair and writes its Temp, then they are
+    // swapped.
     Texture<vec2> VelocityTex;
     Texture<vec2> VelocityTexTemp;
     Texture<float> PressureTex;
     Texture<float> PressureTexTemp;
     Texture<float> DivergenceTex;
 
-    // Every GL object that a member names, in groups that are deleted together.
+    // Lists every GL object of the engine.
     std::array<GlObject, 22> glObjects() {
         using enum GlKind;
         return {

@@ -16,7 +16,7 @@ void Fluid::AdvectDensity(Surface_ velocitySurface, Surface_ source, Surface_ de
     setUniform(program, "BackwardStepSize", BackwardStepSize);
     setUniform(program, "center", static_cast<float>(touch.x), static_cast<float>(touch.y));
     setUniform(program, "drag", DragMode);
-    setUniform(program, "SourceTexture", 1);  // By contract VelocityTexture keeps its default, 0.
+    setUniform(program, "SourceTexture", 1);  // By contract VelocityTexture keeps its default, unit 0.
     glBindFramebuffer(GL_FRAMEBUFFER, destination.FboHandle);
     bindTextureUnit(GL_TEXTURE0, velocitySurface.TextureHandle);
     bindTextureUnit(GL_TEXTURE1, source.TextureHandle);
@@ -34,7 +34,7 @@ void Fluid::AddInk(Surface_ source, Surface_ destination, int mode, Vector_ prev
     setUniform(program, "normal", segment.normal.x, segment.normal.y);
     setUniform(program, "len", segment.length);
     setUniform(program, "Radius", Radius);
-    setUniform(program, "ImpulseDensity", ImpulseDensity);  // By contract the member, not the argument.
+    setUniform(program, "ImpulseDensity", ImpulseDensity);  // By contract the member; the argument is ignored.
     setUniform(program, "Scale", static_cast<float>(ScreenWidth), static_cast<float>(ScreenHeight));
     setUniform(program, "mode", mode);
     setUniform(program, "Source", 0);

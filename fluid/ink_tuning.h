@@ -1,22 +1,22 @@
-// The feel of the ink: what a set-up, a gesture and the edge of the view write into the engine. Everything that a
-// person tunes stands here; globals.h has the thresholds and lengths of gestures, which an app may change at run time.
+// The tuning constants of the ink: the engine parameters that the set-up, each gesture and the border of the view set.
+// The thresholds and durations of gestures are variables in jni/globals.h, because an app may change them at run time.
 #pragma once
 
-// How ink is laid: by a tap, or by a drag of one of three speeds. The two passes over the density and the velocity's
-// advection branch on these codes.
+// A tap, or the speed class of a drag. The shaders and kernels branch on these values.
 enum StrokeKind { kTap = -1, kSlowDrag = 0, kMediumDrag = 1, kFastDrag = 2 };
 
 struct InkPreset {
     int dragMode;
-    float radius;               // of ink and of pushes, pixels
-    float impulseDensity;       // ink of one injection; a texel holds up to 127
-    float sourceStrength;       // lowers the divergence around the touch, which drives the water apart
+    float radius;               // of injected ink and velocity, pixels
+    float impulseDensity;       // density added by one injection; a texel holds up to 127
+    float sourceStrength;       // subtracted from the divergence around the touch, which drives the flow outwards
     float sourceRadius;         // pixels
-    float velocityDissipation;  // factor on the flow, a frame
-    float densityDissipation;   // factor on the ink, a frame
+    float velocityDissipation;  // factor per frame
+    float densityDissipation;   // factor per frame
 };
 
-// Radius and strength a frame of the tap: the blot grows while it lasts, its source for the first acc_step frames.
+// The radius and the source strength are multiplied by the number of the tap's frame; the strength only for the first
+// acc_step frames, after which it is 0.
 inline constexpr InkPreset kTapPreset = {
     .dragMode = kTap,
     .radius = 8.0f,
@@ -25,9 +25,9 @@ inline constexpr InkPreset kTapPreset = {
     .sourceRadius = 40.0f,
     .velocityDissipation = 0.94f,
     .densityDissipation = 0.92f};
-inline constexpr float kTapBackwardStep = 0.1f;  // a frame of the tap: young blots hardly move
+inline constexpr float kTapBackwardStep = 0.1f;  // back-trace scale per frame of the tap, so that new ink moves slowly
 
-// Radius and strength a unit of pressure weight.
+// The radius and the source strength are multiplied by TouchPressure.
 inline constexpr InkPreset kSlowPreset = {
     .dragMode = kSlowDrag,
     .radius = 40.0f,
@@ -46,7 +46,7 @@ inline constexpr InkPreset kMediumPreset = {
     .velocityDissipation = 0.94f,
     .densityDissipation = 0.92f};
 
-// Also pushes the flow along the stroke.
+// A fast drag also calls Perturb.
 inline constexpr InkPreset kFastPreset = {
     .dragMode = kFastDrag,
     .radius = 30.0f,
@@ -56,7 +56,7 @@ inline constexpr InkPreset kFastPreset = {
     .velocityDissipation = 0.96f,
     .densityDissipation = 0.92f};
 
-// After a set-up, until the first gesture.
+// In force from the set-up to the first gesture.
 inline constexpr InkPreset kSetUpPreset = {
     .dragMode = kSlowDrag,
     .radius = 2.0f,
@@ -66,28 +66,29 @@ inline constexpr InkPreset kSetUpPreset = {
     .velocityDissipation = 0.9f,
     .densityDissipation = 0.92f};
 
-// A released drag sets these factors for the ink that fades.
+// Set when a drag ends, so that velocity and ink fade.
 inline constexpr float kReleasedVelocityDissipation = 0.9f;
 inline constexpr float kReleasedDensityDissipation = 0.9f;
 
-// The solver, from the set-up on.
+// Solver.
 inline constexpr int kCellPixels = 12;  // side of a cell of the velocity grid
 inline constexpr float kCellSize = 2.5f;
 inline constexpr int kJacobiIterations = 5;
-inline constexpr float kTimeStep = 0.25f;  // also written by every ink frame
+inline constexpr float kTimeStep = 0.25f;  // cells per unit of velocity and frame
 inline constexpr float kGradientScale = 0.2f;
-inline constexpr int kLongInkSide = 512;  // of the density, texels along the longer side of the view
+inline constexpr int kLongInkSide = 512;  // density texels along the longer side of the view
 inline constexpr int kShortInkSide = 256;
 
-// How the ink is shown and carried.
-inline constexpr float kBackwardStep = 1.0f;       // whole back-trace; also written by every ink frame
-inline constexpr float kSetUpInkIntensity = 0.2f;  // darkening a unit of density; by contract, no frame shows it
-inline constexpr float kInkIntensity = 0.02f;      // from then on
-inline constexpr float kInkColorOffset = 0.7f;     // a channel is divided by 1 + w * ((1.5 - offset) / colour - 1)
-inline constexpr double kColorRaise = 0.05;        // on each channel of the host's colour, which divides
+// Drawing and advection of the ink. A channel is divided by
+// 1 + intensity * density * ((1.5 - kInkColorOffset) / (colour + kColorRaise) - 1).
+inline constexpr float kBackwardStep = 1.0f;       // scale of the density's back-trace
+inline constexpr float kSetUpInkIntensity = 0.2f;  // by contract set by the set-up, and not used by any frame
+inline constexpr float kInkIntensity = 0.02f;
+inline constexpr float kInkColorOffset = 0.7f;
+inline constexpr double kColorRaise = 0.05;  // keeps the divisor from 0
 
-// Near the edge: how far inside the view, in pixels, a touch must be to inject, and the weaker sources of slow and
-// medium drags that are nearer.
+// Margins: a touch injects only if it is more than this many pixels away from every edge. Slow and medium drags within
+// kMargin have smaller margins and weaker sources.
 inline constexpr int kSetUpMargin = 10;
 inline constexpr int kMargin = 60;
 inline constexpr int kSlowMargin = 12;

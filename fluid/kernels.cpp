@@ -1,18 +1,18 @@
 #include "fluid/fluid.h"
 #include "fluid/touch.h"
 
-// Each wrapper hands its kernel the fields and uniforms of this call and runs it.
+// Each method sets the textures and uniforms of its kernel and runs it.
 
 namespace {
 
-// One cell of the grid in screen pixels.
+// Size of a grid cell in screen pixels.
 vec2 cellSize(const Fluid& f) {
     return Vec2(
         static_cast<float>(f.ScreenWidth) / static_cast<float>(f.GridWidth),
         static_cast<float>(f.ScreenHeight) / static_cast<float>(f.GridHeight));
 }
 
-// One cell of the grid in texture coordinates.
+// Size of a grid cell in texture coordinates.
 vec2 inverseSize(const Fluid& f) {
     return Vec2(1.0f / static_cast<float>(f.GridWidth), 1.0f / static_cast<float>(f.GridHeight));
 }

@@ -70,7 +70,7 @@ void Fluid::InitializeGPU(bool withInk) {
         {ripple_program, ripple_vertexShader, ripple_fragmentShader}, kWaterVert,
         withInk ? kWaterInkFrag : kWaterPlainFrag);
     if (!withInk) {
-        // A set-up for ink leaves its target bound, which the water would draw into if no ink frame has followed.
+        // A previous set-up with ink leaves its framebuffer bound, and without an ink frame nothing else unbinds it.
         if (Density.Pong.FboHandle) glBindFramebuffer(GL_FRAMEBUFFER, 0);
         return;
     }
@@ -98,7 +98,7 @@ void Fluid::InitializeGPU(bool withInk) {
     Density = CreateData(InkWidth, InkHeight);
     allocateBuffers(*this);
     CreateQuad();
-    // By contract, for the host's own blending; the library never enables it.
+    // By contract set for the host; the library never enables blending.
     glBlendFunc(GL_SRC_ALPHA, GL_ONE_MINUS_SRC_ALPHA);
     glViewport(0, 0, InkWidth, InkHeight);
     ClearSurface(Density.Ping, 0.0f, 0.0f, 0.0f, 0.0f);

@@ -15,9 +15,8 @@ namespace {
 
 Scratch<unsigned char> staging("uploading the ink's velocity");
 
-// Chooses how far from the edges a touch must be for its source to act, weakens the source of a slow or medium drag
-// that comes closer, and says whether the touch is far enough. By contract a weakened source stays weak until the next
-// preset.
+// Sets BoundaryMargin for this touch and weakens the source of a slow or medium drag near an edge. Returns whether the
+// touch is inside the margin. By contract a weakened source stays weak until the next preset.
 bool chooseMargin(Fluid& f, const Touch& touch) {
     const auto isTouchInside = [&](int margin) { return isInside(f, touch.x, touch.y, margin); };
     f.BoundaryMargin = kMargin;
@@ -35,30 +34,30 @@ bool chooseMargin(Fluid& f, const Touch& touch) {
     return isTouchInside(f.BoundaryMargin);
 }
 
-// Up to 5 pixels to either side, so that a resting finger does not stir the same cells forever. By contract from
-// lrand48, which the library does not seed.
+// Returns position + a random offset within +-5 pixels, so that the source of a resting finger does not act on the same
+// cells in every frame. By contract uses lrand48, which the library does not seed.
 float jittered(int position) {
     const float random = static_cast<float>(lrand48()) * 4.656613e-10f;
     return static_cast<float>(
         static_cast<double>(static_cast<float>(position)) + (0.5 - static_cast<double>(random)) * 10.0);
 }
 
-// Sets to 0 what the solver could not hold in a float. A touch of enormous pressure makes a source so strong that the
-// pressure overflows, and a velocity that is not a number would spread over the field and stay in it.
-void stillOverflows(const Texture<vec2>& velocity) {
+// Sets velocities beyond +-1e38 and NaN to 0. A huge touch pressure makes the pressure solve overflow, and advection
+// would spread the NaN over the field.
+void zeroOverflows(const Texture<vec2>& velocity) {
     constexpr float kFastest = 1.0e38f;
     for (int j = 0; j < velocity.height; ++j) {
         float* const row = reinterpret_cast<float*>(velocity.row(j));
         forGroups(0, 2 * velocity.width, [=](auto lanes, int i) {
             using F = decltype(lanes);
             const F speed = load<F>(row + i);
-            const auto isHeld = (speed <= kFastest) & (speed >= -kFastest);
-            store(isHeld ? speed : F{}, row + i);
+            const auto isInRange = (speed <= kFastest) & (speed >= -kFastest);
+            store(isInRange ? speed : F{}, row + i);
         });
     }
 }
 
-// Takes out of the field what the source at the touch and the field itself pile up (Stam, Stable Fluids, 1999).
+// Pressure projection (Stam, Stable Fluids, 1999): makes the field divergence-free except for the source at the touch.
 void project(Fluid& f, const Touch& touch) {
     const float x = jittered(touch.x);
     const float y = jittered(touch.y);
@@ -70,7 +69,7 @@ void project(Fluid& f, const Touch& touch) {
     }
     f.SubtractGradient(f.VelocityTex, f.PressureTex, f.VelocityTexTemp);
     std::swap(f.VelocityTex, f.VelocityTexTemp);
-    stillOverflows(f.VelocityTex);
+    zeroOverflows(f.VelocityTex);
 }
 
 void upload(const Texture<vec2>& velocity, const Surface_& surface) {
@@ -88,7 +87,6 @@ void upload(const Texture<vec2>& velocity, const Surface_& surface) {
 void Fluid::Update(int) {
     const Touch touch = latestTouch(*this);
     {
-        // A field that fades away ends in denormals.
         const FlushDenormals flush;
         AdvectVelocity(VelocityTex, VelocityTex, VelocityTexTemp, VelocityDissipation);
         std::swap(VelocityTex, VelocityTexTemp);

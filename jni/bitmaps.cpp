@@ -28,14 +28,14 @@ const struct CopyOwner {
     }
 } copyOwner;
 
-// Bytes of a texture of the slot's size; SIZE_MAX where no block can have as many.
+// Returns the size of an RGBA8 texture in bytes, or SIZE_MAX if no allocation can be that large.
 std::size_t textureBytes(const AndroidBitmapInfo& info) {
     const std::uint64_t texels = std::uint64_t{info.width} * info.height;
     return texels < SIZE_MAX / 4 ? static_cast<std::size_t>(texels) * 4 : SIZE_MAX;
 }
 
-// Bytes that the platform has locked. By contract stride and format do not change what is uploaded, but a bitmap of an
-// 8-bit or 16-bit format ends early, and reading beyond it may crash.
+// Returns how many of the locked bytes may be read. By contract stride and format do not affect the upload, but a
+// bitmap of an 8-bit or 16-bit format is shorter than its RGBA8 size, and reading beyond its end may crash.
 std::size_t lockedBytes(const AndroidBitmapInfo& info) {
     const bool isNarrow = info.format == ANDROID_BITMAP_FORMAT_RGB_565 ||
                           info.format == ANDROID_BITMAP_FORMAT_RGBA_4444 || info.format == ANDROID_BITMAP_FORMAT_A_8;
@@ -50,8 +50,8 @@ void drop(BitmapSlot& slot) {
     slot.bytes = 0;
 }
 
-// Makes the copy `bytes` long, zero beyond its first `kept` bytes, and returns whether there was memory for it. If not,
-// the earlier pixels stay where they are enough for the slot's size.
+// Resizes the copy to `bytes` and sets everything after its first `kept` bytes to 0. Returns false if the allocation
+// fails; the slot then keeps its pixels if they are at least `bytes`, else it has none.
 bool resize(BitmapSlot& slot, std::size_t bytes, std::size_t kept) {
     void* const block = bytes < SIZE_MAX ? std::realloc(slot.pixels, std::max<std::size_t>(bytes, 1)) : nullptr;
     if (!block) {
@@ -78,12 +78,12 @@ void transferBitmap(JNIEnv* env, jobject bitmap, BitmapSlot& slot) {
     }
     const std::size_t bytes = textureBytes(slot.info);
     if (result < 0) {
-        // The earlier pixels may be fewer than the size that the platform has just written.
+        // The platform has already written the new size, which may need more pixels than the slot has.
         if (slot.pixels && slot.bytes < bytes) resize(slot, bytes, slot.bytes);
         return;
     }
-    // Copied, not kept locked: a host that recycles its bitmap early cannot pull the pixels from under us, and after a
-    // lost context the textures are loaded again without another hand-over. Costs one picture of memory.
+    // The copy lets the host recycle its bitmap at once and reload the textures after a context loss without passing
+    // the bitmap again.
     if (locked) {
         const std::size_t copied = std::min(bytes, lockedBytes(slot.info));
         if (resize(slot, bytes, copied)) std::memcpy(slot.pixels, locked, copied);

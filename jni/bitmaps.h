@@ -1,4 +1,4 @@
-// The three bitmaps that the host hands over, as the texture loaders read them.
+// Copies of the three bitmaps that the host passes; the texture loaders read them.
 #pragma once
 
 #include <android/bitmap.h>
@@ -10,12 +10,12 @@
 extern AndroidBitmapInfo bmp_portrait_bg_info;
 extern AndroidBitmapInfo bmp_landscape_bg_info;
 extern AndroidBitmapInfo bmp_water_Info;
-extern std::uint8_t* bmp_portrait_bg_Pixels;  // null until the first hand-over that succeeds
+extern std::uint8_t* bmp_portrait_bg_Pixels;  // null until the first successful transfer
 extern std::uint8_t* bmp_landscapebg_Pixels;
 extern std::uint8_t* bmp_water_Pixels;
 
-// One of the three pairs of variables above. `pixels` is a copy of `bytes` bytes, or null, and never smaller than
-// `info` says.
+// References one pair of the variables above. `pixels` is null or an owned block of `bytes`, at least
+// 4 * info.width * info.height.
 struct BitmapSlot {
     AndroidBitmapInfo& info;
     std::uint8_t*& pixels;
@@ -26,7 +26,6 @@ extern BitmapSlot portraitSlot;
 extern BitmapSlot landscapeSlot;
 extern BitmapSlot waterSlot;
 
-// Copies `bitmap`, 32-bit RGBA without padding between rows, into a slot. A failure is logged. The platform writes the
-// slot's size before it locks the pixels: after a failed lock the slot has the new size and the earlier pixels,
-// followed by zeros where the new size needs more.
+// Copies `bitmap`, RGBA8 without padding between rows, into `slot`. Logs a failure. If only the lock fails, the slot
+// has the new bitmap's size and its earlier pixels, followed by zeros if the new size needs more.
 void transferBitmap(JNIEnv* env, jobject bitmap, BitmapSlot& slot);

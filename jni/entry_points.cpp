@@ -62,7 +62,7 @@ Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onLoadWaterTextures
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_initWaters(
     JNIEnv* env, jobject, jfloatArray positions, jshortArray indices, jint vertexCount, jint meshSizeWidth,
     jint meshSizeHeight, jint numDetailsWidth, jint numDetailsHeight) {
-    const int cells = numDetailsWidth > 1 && numDetailsHeight > 1;  // at least
+    const int cells = numDetailsWidth > 1 && numDetailsHeight > 1;  // 0, or 1 for "at least one"
     const auto fill = [=](bool complete, jfloat* p, jshort* i) {
         if (!complete) return;
         if (p) fillPositions(p, vertexCount, meshSizeWidth, meshSizeHeight, numDetailsWidth, numDetailsHeight);
@@ -71,7 +71,7 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
     withPinned(env, "initWaters", fill, Argument{positions, vertexCount}, Argument{indices, cells});
 }
 
-// By contract rowCount is not read.
+// By contract rowCount is ignored.
 JNIEXPORT jint JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_move(
     JNIEnv* env, jobject, jfloatArray velocity, jfloatArray height, jint xStart, jint yStart, jint xEnd, jint yEnd,
     jint stride, jint, jboolean checkCalm, jfloat damping, jfloat waveSpeed) {
@@ -125,7 +125,7 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
     state = kIdle;
     step = 0;
     fluid.ClearInkValue = 0.0f;
-    fluid.DensityDissipation = 0.0f;  // By contract until the next gesture.
+    fluid.DensityDissipation = 0.0f;  // By contract every frame clears the ink until the next gesture.
     fluid.DragMode = kSlowDrag;
 }
 

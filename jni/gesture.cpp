@@ -8,8 +8,8 @@
 
 namespace {
 
-// Measures the movement since the last touch and returns its length in pixels. The squares wrap around like Java's
-// int; a movement too long for them counts as slow or is sorted by what is left, and either is harmless.
+// Stores the movement since the previous touch in DX and DY and returns its length in pixels. dx^2 + dy^2 wraps like
+// Java's int, so a movement of more than 46,340 pixels may get any speed class.
 float measureMovement(int x, int y) {
     DX = wrappingDifference(x, PREV_POSITION_X);
     DY = wrappingDifference(y, PREV_POSITION_Y);
@@ -43,7 +43,7 @@ void touchWhileTapping(int x, int y, int action) {
         const float distance = measureMovement(x, y);
         if (step >= max_step || distance > static_cast<float>(Andante_threshold)) {
             drag_step = 0;
-            state = kDragging;  // By contract its first frame is of the speed class of the drag before.
+            state = kDragging;  // By contract the first frame has the speed class of the previous drag.
         }
     }
 }
@@ -55,7 +55,7 @@ void touchWhileDragging(int x, int y, int action) {
                                                                        : kSlowDrag;
     if (action != kActionUp) return;
     if (step < max_step && drag_step <= 9) {
-        // Hardly a drag: it goes on as the tap that it came from.
+        // The drag was too short: continue as the tap that it began as.
         state = kTapping;
         return;
     }
@@ -71,7 +71,7 @@ void touchWhileDragging(int x, int y, int action) {
 
 void touch(int x, int y, int action, float pressure) {
     if (action == kActionDown) count = 0;
-    // By contract no pressure makes a slow drag without ink.
+    // By contract a pressure of 0 makes a slow drag without ink.
     const double p = pressure;
     TouchPressure = p > 0.0 ? static_cast<float>(p * p + static_cast<double>(0.2f)) : 0.0f;
     POSITION_X = x;

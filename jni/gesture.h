@@ -1,6 +1,5 @@
-// Sorts touches into taps and drags, and drags by their speed.
 #pragma once
 
-// One touch event: screen pixels with y downwards, the action code of android.view.MotionEvent (0 down, 1 up, 2 move,
-// 3 cancel; any other only moves the position), and the pressure as the platform reports it.
+// Updates the gesture state machine with a touch event: classifies it as a tap or a drag, and a drag by its speed.
+// Screen pixels, y down; `action` is a MotionAction; any other value only changes the position.
 void touch(int x, int y, int action, float pressure);

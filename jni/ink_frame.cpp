@@ -8,24 +8,25 @@
 
 namespace {
 
-// Counts a frame of a gesture, which may be held for as long as a finger has patience.
+// Increments without overflow, because a gesture has no maximum duration.
 void countFrame(int& frames) {
     if (frames < std::numeric_limits<int>::max()) ++frames;
 }
 
-// Whether the last set-up had memory for the flow. Without it nothing would carry ink away, so none is injected.
+// Returns whether the set-up could allocate the velocity field. Without it ink would not move or fade, so none is
+// added.
 bool hasFlow() {
     return fluid.VelocityTex.data != nullptr;
 }
 
-// The renderer divides by the colour, which must not be 0.
+// The renderer divides by each channel, so 0 must not occur.
 Color_ offsetColor(Color_ color) {
     const auto raised = [](float channel) { return static_cast<float>(double{channel} + kColorRaise); };
     return {raised(color.r), raised(color.g), raised(color.b)};
 }
 
-// A blot grows for sim_step frames; its source pushes the water apart for the first acc_step of them. By contract the
-// radius of the first frame is 0, and a tap whose finger keeps moving a little does not end.
+// Injects ink for sim_step frames with a growing radius. The divergence source acts during the first acc_step of them.
+// By contract the radius of the first frame is 0, and a tap does not end while its latest event is a move.
 void stepTap(Color_ color) {
     const float frame = static_cast<float>(step);
     InkPreset preset = kTapPreset;
@@ -68,7 +69,6 @@ void stepDrag(Color_ color) {
     }
     if (hasFlow()) fluid.Inject(fluid.DragMode, startX, startY, endX, endY, color);
     countFrame(drag_step);
-    // The next frame's segment starts where this one ended.
     DRAG_START_X = DRAG_END_X;
     DRAG_START_Y = DRAG_END_Y;
 }
@@ -79,10 +79,9 @@ void stepInk(Color_ hostColor) {
     fluid.InkColorOffset = kInkColorOffset;
     const Color_ color = offsetColor(hostColor);
     if (hasFlow()) {
-        fluid.Update(count);  // By contract with the parameters of the last frame.
+        fluid.Update(count);  // By contract uses the parameters of the previous frame.
     } else {
-        // A set-up leaves the ink's framebuffer bound, which the water must not draw into.
-        fluid.ResetState();
+        fluid.ResetState();  // Unbinds the ink's framebuffer, which the set-up leaves bound.
     }
     count = wrappingDifference(count, -1);
     fluid.BackwardStepSize = kBackwardStep;

@@ -1,40 +1,38 @@
 // The native methods of com.zor.android.visualeffect.tidemark.JniTidemarkRender: the library's whole interface.
-// docs/host.md tells how to write a host around them; where the two differ, this file counts.
+// docs/host.md explains how to write a host; where the two differ, this file is authoritative.
 //
-// Threads. Call every method, also those without GL, on the one thread that owns the OpenGL ES 2.0 context. The
-// library locks nothing, and all methods share one state.
+// Threads. Call every method, including those without GL calls, on the thread that owns the OpenGL ES 2.0 context. All
+// methods share one state without locks.
 //
 // Order.
 //   1. transferPortraitBGBitmap, transferLandscapeBGBitmap, transferWaterBitmap
 //   2. onInitSetting, then onInitGPU
 //   3. onLoadPortraitBGTextures, onLoadLandscapeBGTextures, onLoadWaterTextures
-//   4. initWaters, once for the mesh arrays
-//   5. for every frame: move and ripple as the animation asks, onTouch for each touch event, onDrawFrame once
-// Steps 2 and 3 and onDrawFrame need the context to be current. After the context was lost, repeat steps 2 and 3; for
-// another view size or another mode in the same context, step 2.
+//   4. initWaters, once per pair of mesh arrays
+//   5. in every frame: move and ripple as needed, onTouch for each touch event, onDrawFrame once
+// Steps 2 and 3 and onDrawFrame need a current context. Repeat steps 2 and 3 after a context loss, and step 2 for
+// another view size or ink mode in the same context.
 //
-// The caller guarantees: the thread and the context; arrays at least as long as the counts and regions passed with them
-// ask for; indices that name vertices which exist; bitmaps that stay valid during their hand-over. The library cannot
-// see these, and a mistake in them may crash.
+// The caller guarantees, because the library cannot check it and a violation may crash: the thread and the context;
+// arrays at least as long as the counts and regions passed with them require; indices of existing vertices; bitmaps
+// that stay valid during the transfer.
 //
-// The caller also keeps the order, but a mistake there crashes nothing: before onInitSetting, onDrawFrame draws no
-// water and says so in the log once. A program that failed to build draws nothing; a picture that was not loaded is
-// black.
+// A wrong order does not crash. Before onInitSetting, onDrawFrame draws no water and logs that once. A program that
+// failed to build draws nothing; a picture that was not loaded is black.
 //
-// Any other mistake is harmless. A null array of which the call would use elements, or one that the virtual machine
-// cannot pin (its OutOfMemoryError is then pending), makes the call change nothing, move return true and onDrawFrame
-// leave out the water: it still sets the viewport and steps the ink. The log says so once for each method. Coordinates,
-// pressures, sizes and lighting values may be anything: a view of more than 65,536 pixels a side gets no ink, and a
-// value in the mesh arrays that is not a number stays in them.
+// No other mistake crashes. If a required array is null, or the VM cannot pin it (an OutOfMemoryError is then pending),
+// the call changes nothing, move returns true, and onDrawFrame only sets the viewport and steps the ink. Each method
+// logs this once. Coordinates, pressures, sizes and lighting values may have any value. A view of more than 65,536
+// pixels per side has no ink. NaN in the mesh arrays stays in them.
 #pragma once
 
 #include <jni.h>
 
 extern "C" {
 
-// Copy a picture: 32-bit RGBA, rows from the top, without padding between rows, whatever the bitmap's record says of
-// its stride and format. The bitmap may be recycled afterwards. A failure is logged and leaves the earlier pixels in
-// place; where only the lock failed, the slot has the new bitmap's size.
+// Copy a picture, after which the bitmap may be recycled. The pixels are read as RGBA8, rows from the top, without
+// padding between rows; the bitmap's stride and format are ignored. A failure is logged and keeps the earlier pixels;
+// if only the lock fails, the slot has the new bitmap's size.
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferPortraitBGBitmap(
     JNIEnv* env, jobject, jobject bitmap);
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferLandscapeBGBitmap(
@@ -42,19 +40,20 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
 JNIEXPORT void JNICALL
 Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferWaterBitmap(JNIEnv* env, jobject, jobject bitmap);
 
-// Fixes the view size in pixels and the mode, and makes the three buffers of the mesh. onInitGPU must follow.
+// Sets the view size in pixels and the ink mode, and creates the three mesh buffers. Call onInitGPU next. Without ink
+// only the water is simulated and drawn.
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onInitSetting(
     JNIEnv* env, jobject, jint width, jint height, jboolean withInk);
 
-// Makes the programs and, with ink, its render targets and CPU buffers. With ink it leaves bound what it made last: one
-// of the ink's framebuffers, a viewport of the ink's size, the clear colour 0, 0, 0, 0, and the blend function
+// Creates the programs and, with ink, the render targets and CPU buffers. With ink it leaves this state: one of the
+// ink's framebuffers bound, a viewport of the ink's size, the clear colour 0, 0, 0, 0 and the blend function
 // GL_SRC_ALPHA, GL_ONE_MINUS_SRC_ALPHA. Bind framebuffer 0 and set your own clear colour before you clear the screen.
 //
-// Both methods delete the objects that an earlier set-up made, by their names. After a lost context these names may by
-// chance be those of new objects: set the library up before you make objects of your own.
+// onInitSetting and onInitGPU delete the objects of an earlier set-up by name. After a context loss your new objects
+// may have the same names, so set up the library before you create objects of your own.
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onInitGPU(JNIEnv* env, jobject);
 
-// Upload the pictures taken over last.
+// Upload the pictures transferred last.
 JNIEXPORT void JNICALL
 Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onLoadPortraitBGTextures(JNIEnv* env, jobject);
 JNIEXPORT void JNICALL
@@ -62,36 +61,38 @@ Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onLoadLandscapeBGTe
 JNIEXPORT void JNICALL
 Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onLoadWaterTextures(JNIEnv* env, jobject);
 
-// Fills positions, 3 * vertexCount floats, and indices, 6 * (N - 1) * (N - 1) shorts, for a mesh of N x N vertices
-// (numDetailsWidth = numDetailsHeight = N, 2 to 256) that spans meshSizeWidth x meshSizeHeight model units.
+// Fills positions (3 * vertexCount floats) and indices (6 * (N - 1) * (N - 1) shorts) for a mesh of N x N vertices
+// (numDetailsWidth = numDetailsHeight = N, 2 to 256) and meshSizeWidth x meshSizeHeight model units.
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_initWaters(
     JNIEnv* env, jobject, jfloatArray positions, jshortArray indices, jint vertexCount, jint meshSizeWidth,
     jint meshSizeHeight, jint numDetailsWidth, jint numDetailsHeight);
 
-// One wave step over x in [xStart, xEnd), y in [yStart, yEnd) of the two fields, element y * stride + x. The fields
-// must reach one element beyond the region on each side. rowCount is ignored. True when every updated speed lies
-// within +-0.009, or when checkCalm is false: a whole 1 or 0, so that Java may declare boolean or int.
+// Steps the waves for x in [xStart, xEnd), y in [yStart, yEnd), element y * stride + x of both fields, which must
+// include one more element on each side of the region. rowCount is ignored. Returns 1 if every updated speed is within
+// +-0.009 or checkCalm is false, else 0; Java may declare the result as boolean or int.
 JNIEXPORT jint JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_move(
     JNIEnv* env, jobject, jfloatArray velocity, jfloatArray height, jint xStart, jint yStart, jint xEnd, jint yEnd,
     jint stride, jint rowCount, jboolean checkCalm, jfloat damping, jfloat waveSpeed);
 
-// Adds a cone of radius 3 cells and peak 3 * amplitude to a field of countA * countB floats, element
-// b * countA + a. posA and posB run from -extent / 2 to +extent / 2.
+// Adds a cone of radius 3 cells and height 3 * amplitude to a field of countA * countB floats, element
+// b * countA + a. posA and posB range from -extent / 2 to +extent / 2.
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_ripple(
     JNIEnv* env, jobject, jfloatArray field, jint extentA, jint extentB, jint countA, jint countB, jfloat posA,
     jfloat posB, jfloat amplitude);
 
-// Takes one touch event: pixels of the view from the top left, the action code of android.view.MotionEvent, and the
-// pressure. Drops ink with the next frame when the ink is on. The distance between two touches decides the kind of
-// stroke: give it one move for each frame while the finger moves, and none while it rests.
+// Reports a touch event: view pixels from the top left, the action code of android.view.MotionEvent, and the pressure.
+// With ink, the next frame injects ink. The distance between two events determines the speed class of a drag: send one
+// move per frame while the finger moves, and none while it rests.
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onTouch(
     JNIEnv* env, jobject, jint x, jint y, jint action, jfloat pressure);
 
-// Draws one frame over the whole view and clears nothing: without ink into the current framebuffer, with ink into
-// framebuffer 0, which the ink's passes bind. With ink, each call is also one step of the ink, and with counts of 0
-// nothing else. From the first touch on, each step whose latest touch lies farther than the margin (10 to 60 pixels)
-// from every edge draws two numbers of the process's lrand48: seed it with srand48 to repeat a recording. positions and
-// heightAttribs hold 3 floats a vertex, indices unsigned vertex numbers, mvp 16 floats by columns.
+// Draws one frame over the whole view without clearing: into the current framebuffer without ink, into framebuffer 0
+// with ink. positions and heightAttribs hold 3 floats per vertex, indices unsigned vertex numbers, mvp 16 floats,
+// column-major. You may pass only the visible part of the mesh; the cost of a frame follows the counts.
+//
+// With ink, each call also steps the simulation; with counts of 0 it does nothing else. A step calls the process's
+// lrand48 twice if the latest touch is more than the margin (10 to 60 pixels) away from every edge. To reproduce a
+// recording, seed it with srand48.
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onDrawFrame(
     JNIEnv* env, jobject, jfloatArray positions, jfloatArray heightAttribs, jshortArray indices, jint positionFloats,
     jint heightFloats, jint indexCount, jfloatArray mvp, jint meshSizeWidth, jint meshSizeHeight, jint numDetailsWidth,
@@ -99,13 +100,13 @@ JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRen
     jfloat inkRed, jfloat inkGreen, jfloat inkBlue, jfloat fresnelRatio, jfloat specularRatio, jfloat exponent,
     jboolean landscape);
 
-// Whether ink is shown, not whether any is left: 1 after a touch and after a set-up with ink, 0 after a cancel or
-// clearInkValue. Ink fades by itself: 180 frames after the finger was lifted none is left. A host that wants to rest
-// counts these frames.
+// Returns whether ink is drawn: 1 after a touch or a set-up with ink, 0 after a cancel or clearInkValue. It does not
+// tell whether ink remains. 180 frames after the finger is lifted all ink has faded; a host that pauses must count
+// them.
 JNIEXPORT jint JNICALL
 Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_getClearInkValue(JNIEnv* env, jobject);
 
-// Clears the ink with the next frame, and ends the gesture.
+// Ends the gesture and hides the ink; the next frame clears it.
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_clearInkValue(JNIEnv* env, jobject);
 
 }  // extern "C"

@@ -1,4 +1,4 @@
-// The host's arrays for the length of one native call.
+// Access to the host's arrays during one native call.
 #pragma once
 
 #include <jni.h>
@@ -16,8 +16,8 @@ struct Argument {
 template <class Array>
 Argument(Array, int) -> Argument<Array>;
 
-// The elements of an array, or null: for a null array, without memory for a copy, or, on some virtual machines, for an
-// array without elements.
+// Returns the elements, or null for a null array, if the VM has no memory for a copy, and on some VMs for an empty
+// array.
 inline jfloat* pin(JNIEnv* env, jfloatArray array) {
     return array ? env->GetFloatArrayElements(array, nullptr) : nullptr;
 }
@@ -34,9 +34,9 @@ inline void release(JNIEnv* env, jshortArray array, jshort* elements) {
     if (elements) env->ReleaseShortArrayElements(array, elements, 0);
 }
 
-// Pins the arrays, calls use(complete, elements...), and copies them back, all in the order given. `complete` tells
-// whether each array of which the call uses elements has an address. After the first one that has none, no further one
-// is pinned, as an OutOfMemoryError may be pending, and the log names `method` the first time.
+// Pins the arrays in order, calls use(complete, elements...) and releases them in the same order. `complete` is false
+// if an array whose elements are needed could not be pinned. The remaining arrays are then not pinned, because an
+// OutOfMemoryError may be pending. The first such failure of `method` is logged.
 template <class Use, class... Arrays>
 void withPinned(JNIEnv* env, const char* method, Use use, Argument<Arrays>... arguments) {
     static bool reported = false;

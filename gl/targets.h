@@ -3,8 +3,8 @@
 
 #include <GLES2/gl2.h>
 
-// Largest side of a view with ink, pixels. No GPU has larger textures, and some drivers crash on sizes far beyond their
-// limit instead of reporting an error.
+// Largest side of a target, texels. No GPU has larger textures, and some drivers crash on sizes far beyond their limit
+// instead of reporting an error.
 constexpr int kLargestSide = 65536;
 
 // A framebuffer whose colour attachment 0 is an RGBA8 texture, clamped to its edge and filtered linearly.

@@ -1,4 +1,4 @@
-// Whole frames on the machine's own OpenGL ES driver, each finished before the next begins.
+// Measures whole frames on the machine's OpenGL ES driver, each until glFinish returns.
 #include <GLES2/gl2.h>
 #include <benchmark/benchmark.h>
 
@@ -19,7 +19,7 @@ void frames(benchmark::State& run, Scene kind, int width, int height) {
     }
     run.SetLabel(reinterpret_cast<const char*>(glGetString(GL_RENDERER)));
     FrameScene scene(kind, 128, width, height, 10);
-    glFinish();  // what the driver has put off so far
+    glFinish();  // Completes the work of the set-up before the measurement.
     for (auto _ : run) {
         scene.next();
         glFinish();

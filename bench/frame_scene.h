@@ -1,4 +1,4 @@
-// The host at work, one frame at a time, whatever GL is behind it.
+// Runs the host one frame at a time, with any implementation of GL.
 #pragma once
 
 #include <android/log.h>
@@ -13,7 +13,7 @@ enum class Scene { water, idleInk, drag };
 
 class FrameScene {
 public:
-    // `warmUp` frames into the scene, so that nothing is done for the first time any more.
+    // Draws `warmUp` frames, so that no later frame allocates or initializes anything.
     FrameScene(Scene scene, int vertices, int width, int height, int warmUp)
         : scene_(scene), width_(width), height_(height), host_(lookWith(vertices), width, height, 1) {
         __android_log_set_logger([](const __android_log_message*) {});
@@ -41,7 +41,7 @@ private:
         return look;
     }
 
-    // Round the middle of the view, far enough a frame to be a fast drag.
+    // Moves on a circle around the centre of the view, fast enough for a fast drag.
     void touch(TouchAction action) {
         const float angle = 0.15f * static_cast<float>(frame_);
         const float radius = 0.3f * static_cast<float>(width_);

@@ -1,4 +1,4 @@
-// Whole frames with a GL that only counts: what the CPU pays for them.
+// Measures the CPU time of whole frames with a GL that only counts its calls.
 #include "bench/frames.h"
 
 #include <benchmark/benchmark.h>
@@ -37,7 +37,7 @@ void frames(benchmark::State& run, Scene kind, int vertices, int width, int heig
     run.counters["allocations"] = static_cast<double>(allocations) / kCounted;
 }
 
-// What a mesh takes from the usual lattice under waves, where a view of 9 : 16 shows it.
+// Measures the interpolation of mesh heights from a lattice of 128 vertices per side, for a 9:16 view.
 void meshHeights(benchmark::State& run, int vertices) {
     const Surface waves(128);
     SurfaceMesh mesh(waves.n, vertices, 9.0 / 16, 1.0);
@@ -50,7 +50,7 @@ void meshHeights(benchmark::State& run, int vertices) {
     }
 }
 
-// The ink's part of a frame, `age` frames after a fast drag has ended.
+// Measures the ink's part of a frame, `age` frames after the end of a fast drag.
 void agedInk(benchmark::State& run, int age) {
     __android_log_set_logger([](const __android_log_message*) {});
     resetGestures();

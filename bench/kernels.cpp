@@ -1,4 +1,4 @@
-// Each formula by itself and the CPU's part of an ink frame, in every form.
+// Measures each formula, and all kernels of an ink frame together, with every kernel set.
 #include "bench/kernels.h"
 
 #include <benchmark/benchmark.h>
@@ -10,16 +10,16 @@
 
 namespace {
 
-constexpr const Forms* kForms[] = {&kLibrary, &kScalar, &kAutoVectorized, &kEigen};
+constexpr const KernelSet* kKernelSets[] = {&kLibrary, &kScalar, &kAutoVectorized, &kEigen};
 
-// Waves fade; they start again before they change what a step costs.
+// The surface is reset after so many steps, before the decay of the waves affects the time of a step.
 constexpr int kStepsPerSurface = 64;
 
-void steps(benchmark::State& state, const Forms& forms, Surface start, bool checkCalm) {
+void steps(benchmark::State& state, const KernelSet& kernels, Surface start, bool checkCalm) {
     Surface surface = start;
     int left = kStepsPerSurface;
     for (auto _ : state) {
-        benchmark::DoNotOptimize(surface.step(forms, checkCalm));
+        benchmark::DoNotOptimize(surface.step(kernels, checkCalm));
         if (--left > 0) continue;
         surface = start;
         left = kStepsPerSurface;
@@ -27,7 +27,7 @@ void steps(benchmark::State& state, const Forms& forms, Surface start, bool chec
     state.counters["items"] = static_cast<double>(start.size());
 }
 
-// After `age` steps since a single drop on still water.
+// Returns a calm surface `age` steps after a single drop.
 Surface agedSurface(int vertices, int age) {
     Surface surface(vertices, 0.0f);
     surface.ripple(kLibrary);
@@ -42,16 +42,16 @@ void add(const std::string& name, Body body) {
 
 void addSurface(int n) {
     const std::string size = "/" + std::to_string(n);
-    for (const Forms* forms : kForms) {
-        const std::string form = std::string("/") + forms->name;
-        add("wave step" + size + form, [=](benchmark::State& state) { steps(state, *forms, Surface(n), false); });
-        if (!forms->ripple) continue;
+    for (const KernelSet* kernels : kKernelSets) {
+        const std::string form = std::string("/") + kernels->name;
+        add("wave step" + size + form, [=](benchmark::State& state) { steps(state, *kernels, Surface(n), false); });
+        if (!kernels->ripple) continue;
         add("ripple" + size + form, [=](benchmark::State& state) {
             Surface surface(n);
-            for (auto _ : state) surface.ripple(*forms);
+            for (auto _ : state) surface.ripple(*kernels);
         });
     }
-    // Every speed lies within the band, so every test runs.
+    // On a calm surface the calm test never stops early.
     for (const bool checkCalm : {false, true}) {
         add("calm surface" + size + (checkCalm ? "/tested" : "/untested"),
             [=](benchmark::State& state) { steps(state, kLibrary, Surface(n, 0.0005f), checkCalm); });
@@ -60,26 +60,26 @@ void addSurface(int n) {
 
 void addGrid(int viewWidth, int viewHeight) {
     const std::string size = "/" + std::to_string(viewWidth / 12) + "x" + std::to_string(viewHeight / 12);
-    const auto addPass = [&](const char* what, const Forms& forms, void (*pass)(const Forms&, InkGrid&)) {
-        add(what + size + "/" + forms.name, [=, &forms](benchmark::State& state) {
+    const auto addPass = [&](const char* what, const KernelSet& kernels, void (*pass)(const KernelSet&, InkGrid&)) {
+        add(what + size + "/" + kernels.name, [=, &kernels](benchmark::State& state) {
             InkGrid grid(viewWidth, viewHeight);
             grid.wholeFrame(kLibrary);
             for (auto _ : state) {
-                pass(forms, grid);
+                pass(kernels, grid);
                 benchmark::ClobberMemory();
             }
             state.counters["items"] = grid.width * grid.height;
         });
     };
-    for (const Forms* forms : kForms) {
-        addPass("pressure solve", *forms, [](const Forms& f, InkGrid& grid) { grid.solvePressure(f); });
-        if (!forms->advection) continue;
-        addPass("velocity advection", *forms, [](const Forms& f, InkGrid& grid) { f.advection(grid.advect); });
-        addPass("divergence", *forms, [](const Forms& f, InkGrid& grid) { f.divergence(grid.diverge); });
-        addPass("gradient", *forms, [](const Forms& f, InkGrid& grid) { f.gradient(grid.subtract); });
-        addPass("forcing", *forms, [](const Forms& f, InkGrid& grid) { f.forcing(grid.push); });
-        addPass("packing", *forms, [](const Forms& f, InkGrid& grid) { grid.pack(f); });
-        addPass("ink frame", *forms, [](const Forms& f, InkGrid& grid) { grid.wholeFrame(f); });
+    for (const KernelSet* kernels : kKernelSets) {
+        addPass("pressure solve", *kernels, [](const KernelSet& f, InkGrid& grid) { grid.solvePressure(f); });
+        if (!kernels->advection) continue;
+        addPass("velocity advection", *kernels, [](const KernelSet& f, InkGrid& grid) { f.advection(grid.advect); });
+        addPass("divergence", *kernels, [](const KernelSet& f, InkGrid& grid) { f.divergence(grid.diverge); });
+        addPass("gradient", *kernels, [](const KernelSet& f, InkGrid& grid) { f.gradient(grid.subtract); });
+        addPass("forcing", *kernels, [](const KernelSet& f, InkGrid& grid) { f.forcing(grid.push); });
+        addPass("packing", *kernels, [](const KernelSet& f, InkGrid& grid) { grid.pack(f); });
+        addPass("ink frame", *kernels, [](const KernelSet& f, InkGrid& grid) { grid.wholeFrame(f); });
     }
 }
 

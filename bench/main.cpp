@@ -1,11 +1,11 @@
 #include <benchmark/benchmark.h>
 
-#include "bench/forms_agree.h"
 #include "bench/frames.h"
+#include "bench/kernel_sets_agree.h"
 #include "bench/kernels.h"
 
 int main(int argc, char** argv) {
-    if (!formsAgree()) return 1;
+    if (!kernelSetsAgree()) return 1;
     registerKernels();
     registerFrames();
     benchmark::Initialize(&argc, argv);

@@ -42,7 +42,7 @@ def against(what, other):
     return ratio(f"{what}/{other}", f"{what}/library")
 
 
-rows = []  # what, limit, values of both compilers, the benchmark whose time is shown
+rows = []  # description, goal, values of both compilers, the benchmark whose time is shown
 
 
 def faster(what, than, label, wanted=None):

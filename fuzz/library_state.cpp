@@ -14,13 +14,13 @@
 
 namespace {
 
-constexpr unsigned kModes = ~0x3fU;  // all but the flags of past operations
+constexpr unsigned kModes = ~0x3fU;  // MXCSR without its exception flags
 
 unsigned hostModes = 0;
 
 BitmapSlot* const slots[] = {&portraitSlot, &landscapeSlot, &waterSlot};
 
-// Divided instead of multiplied: once counted in bytes, the product of two sides may be beyond 64 bits.
+// Divides the block's size, because width * height * bytesOfOne may exceed 64 bits.
 void requireRoom(const void* block, std::uint64_t bytesOfOne, std::uint64_t width, std::uint64_t height) {
     require(
         __sanitizer_get_ownership(block) && __sanitizer_get_allocated_size(block) / bytesOfOne >= width * height,
@@ -50,7 +50,7 @@ void resetLibrary() {
     hostModes = _mm_getcsr() & kModes;
 }
 
-void requireSoundLibrary() {
+void requireValidState() {
     for (const BitmapSlot* const slot : slots) {
         if (slot->pixels) requireRoom(slot->pixels, 4, slot->info.width, slot->info.height);
     }
@@ -63,7 +63,7 @@ void requireSoundLibrary() {
 
     const Texture<vec2>& flow = fluid.VelocityTex;
     if (flow.empty()) return;
-    // 0 for numbers, and not a number for anything else: one test at the end, as this runs after every call.
+    // 0 * x is 0 if x is finite, else NaN. One test of the sum is fast, and this runs after every call.
     float zero = 0.0f;
     for (const vec2* v = flow.row(0); v != flow.row(flow.height); ++v) zero += 0.0f * v->x + 0.0f * v->y;
     require(zero == 0.0f, "the flow of the ink is not finite");

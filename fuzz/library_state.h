@@ -1,9 +1,8 @@
-// The library's global state before and after the calls of one execution.
 #pragma once
 
-// Back to what a freshly loaded library has, without log lines.
+// Resets the library to its state after loading and silences its log.
 void resetLibrary();
 
-// What must hold between any two calls: pictures and grids own blocks of the size that they claim, the flow of the ink
-// is made of numbers, and the processor's floating-point modes are the host's.
-void requireSoundLibrary();
+// Checks the invariants between calls: bitmaps and grids own blocks of at least their size, every velocity is finite,
+// and the floating-point modes are those of the host.
+void requireValidState();

@@ -1,6 +1,6 @@
-// Sessions of native calls in any order, with any arguments that a host can pass. Arrays have the length that the
-// counts ask for, which is the host's duty; where that is more than any host has, the call is left out. What the
-// library gets of an array is a block of its very length, beyond which the sanitizer looks.
+// Makes native calls in any order, with any arguments that a host may pass. Arrays have exactly the length that the
+// counts require, which is the host's duty, so that the sanitizer detects an access beyond it. A call that would need a
+// larger array than a host has is skipped.
 #include <algorithm>
 #include <concepts>
 #include <cstddef>
@@ -21,14 +21,14 @@ using Wide = std::int64_t;
 
 constexpr Wide kLongestArray = 1 << 18;   // elements
 constexpr Wide kLargestBitmap = 1 << 20;  // bytes
-constexpr Wide kSessionWork = 2'200'000;  // texels that the ink may compute in one session
+constexpr Wide kSessionWork = 2'200'000;  // grid texels that a session may compute
 constexpr int kMostCalls = 100;
 
 Wide product(Wide a, Wide b) {
     return std::max<Wide>(a, 0) * std::max<Wide>(b, 0);
 }
 
-// Usually there, now and then null or without memory for its copy.
+// An array that is occasionally null or cannot be pinned.
 template <class Array>
 struct Argument : Array {
     Argument(Values& drawn, Wide length) : Array(static_cast<std::size_t>(std::max<Wide>(length, 0))) {
@@ -64,7 +64,8 @@ JNIEnv* const env = [] {
 
 Wide workLeft = 0;
 
-// Whether a session has room for one more frame on the grids; with a view of 16384 x 16384 it has it once.
+// Subtracts one frame's work from the session's limit and returns whether the frame may run. The limit allows one frame
+// of a 16384 x 16384 view.
 bool mayCompute(Wide share = 1) {
     workLeft -= 1 + product(fluid.GridWidth, fluid.GridHeight) / share;
     return workLeft > 0;
@@ -89,7 +90,7 @@ void transfer(Values& values) {
     bitmap.info.stride = strideOf(values, bitmap.info.width);
     bitmap.info.format = values.number(1, 8);
     const bool fails = values.below(16) >= 13;
-    // Rows are packed, unless the record is that of one of Android's narrow formats.
+    // Only a narrow format may have a stride of less than four bytes per pixel.
     const bool isNarrow = bitmap.info.format == ANDROID_BITMAP_FORMAT_RGB_565 ||
                           bitmap.info.format == ANDROID_BITMAP_FORMAT_RGBA_4444 ||
                           bitmap.info.format == ANDROID_BITMAP_FORMAT_A_8;
@@ -98,7 +99,7 @@ void transfer(Values& values) {
     const bool fits = bitmap.info.height == 0 || rowBytes <= kLargestBitmap / Wide{bitmap.info.height};
     std::vector<std::uint8_t> pixels(fits ? static_cast<std::size_t>(rowBytes * bitmap.info.height) : 0);
     pixels.reserve(1);
-    // One beyond max_allocation_size_mb is locked and never read.
+    // The library cannot allocate a copy beyond max_allocation_size_mb, so it must not read these pixels.
     const std::uint64_t texels = std::uint64_t{bitmap.info.width} * bitmap.info.height;
     const bool refused = texels > 1 << 24 && texels < std::uint64_t{1} << 60;
     if ((fits || refused) && !fails) bitmap.pixels = pixels.data();
@@ -185,7 +186,7 @@ void touch(Values& values) {
     native::onTouch(env, nullptr, x, y, action, values.real());
 }
 
-// One frame or several, as a tap lasts for a dozen.
+// Draws up to 16 frames, because a tap lasts for 13.
 void draw(Values& values) {
     const int frames = values.below(16) + 1;
     const int positionFloats = values.number(0, 255);
@@ -206,7 +207,7 @@ void draw(Values& values) {
             env, nullptr, positions.reference, heights.reference, indices.reference, positionFloats, heightFloats,
             indexCount, mvp.reference, sizes[0], sizes[1], sizes[2], sizes[3], look[0], look[1], look[2], look[3],
             look[4], look[5], look[6], look[7], look[8], look[9], landscape);
-        requireSoundLibrary();
+        requireValidState();
     }
 }
 
@@ -214,18 +215,17 @@ void clearInk(Values&) {
     native::clearInkValue(env, nullptr);
 }
 
-void askForInk(Values&) {
+void queryInk(Values&) {
     const int shown = native::getClearInkValue(env, nullptr);
     require(shown == 0 || shown == 1, "the ink is neither shown nor hidden");
 }
 
 constexpr void (*kCalls[])(Values&) = {transfer, setUp, setUpGpu, loadTextures, makeMesh, moveWater,
-                                       ripple,   touch, draw,     clearInk,     askForInk};
+                                       ripple,   touch, draw,     clearInk,     queryInk};
 
 }  // namespace
 
-// Grids that a phone has no memory for are refused at once instead of filling this machine's. What nobody has written
-// is not a number.
+// Allocations beyond a phone's memory fail at once. Uninitialized memory is filled with 0xff, which is NaN as a float.
 extern "C" const char* __asan_default_options() {
     return "allocator_may_return_null=1:max_allocation_size_mb=64:quarantine_size_mb=16"
            ":max_malloc_fill_size=1048576:malloc_fill_byte=255";
@@ -237,8 +237,8 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     Values values(data, size);
     for (int calls = 0; calls < kMostCalls && values.remaining_bytes() > 0; ++calls) {
         values.PickValueInArray(kCalls)(values);
-        require(copiesOut == 0, "an array is still pinned, or was released twice");
-        requireSoundLibrary();
+        require(pinnedCopies == 0, "an array is still pinned, or was released twice");
+        requireValidState();
     }
     return 0;
 }

@@ -3,7 +3,7 @@
 #include <cstdio>
 #include <cstdlib>
 
-// Ends the process, as a sanitizer does, where something does not hold.
+// Reports an error and aborts, as a sanitizer does, unless `holds`.
 inline void require(bool holds, const char* what) {
     if (holds) return;
     std::fprintf(stderr, "ERROR: %s\n", what);

@@ -1,5 +1,5 @@
-// Arguments drawn from the fuzzer's bytes: mostly of a usual size, so that sessions get deep and stay fast, now and
-// then from the edges of their type.
+// Generates arguments from the fuzzer's bytes: usually plausible values, so that sessions are long and fast, sometimes
+// extreme ones.
 #pragma once
 
 #include <fuzzer/FuzzedDataProvider.h>
@@ -31,7 +31,7 @@ public:
 private:
     using Int = std::numeric_limits<int>;
     using Float = std::numeric_limits<float>;
-    // 786432 pixels make the largest ink grid that is tried at all, 2^24 is where floats stop counting.
+    // 65536 is the largest side of a view with ink. A side of 786432 has 65536 grid cells. Floats are exact up to 2^24.
     static constexpr int kEdges[] = {Int::min(), Int::min() + 1, -1,        0,     1,      2,
                                      256,        16384,          65535,     65536, 786432, 1 << 24,
                                      1 << 30,    Int::max() - 1, Int::max()};

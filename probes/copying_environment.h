@@ -1,19 +1,19 @@
-// An environment that hands out copies and copies them back on release, as a virtual machine with a moving collector
-// does. Each is a block of its array's very length.
+// A JNIEnv that returns copies of arrays and copies them back on release, as a VM with a moving collector does. Each
+// copy is a block of exactly the array's size, so that a sanitizer detects an access beyond it.
 #pragma once
 
 #include <algorithm>
 
 #include "host/host_jni.h"
 
-inline int copiesOut = 0;  // not yet released
+inline int pinnedCopies = 0;  // copies not yet released
 
 template <class Array, class Element>
 Element* copyElements(JNIEnv*, auto reference, jboolean*) {
     const auto& values = static_cast<Array*>(reference)->values;
     auto* const copy = new Element[values.size()];
     std::ranges::copy(values, copy);
-    ++copiesOut;
+    ++pinnedCopies;
     return copy;
 }
 
@@ -22,7 +22,7 @@ void copyBack(JNIEnv*, auto reference, auto* copy, jint mode) {
     auto& values = static_cast<Array*>(reference)->values;
     if (mode != JNI_ABORT) std::copy_n(copy, values.size(), values.begin());
     delete[] copy;
-    --copiesOut;
+    --pinnedCopies;
 }
 
 inline JNIEnv* copyingEnvironment() {

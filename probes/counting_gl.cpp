@@ -25,8 +25,8 @@ void makeNames(GLsizei count, GLuint* names) {
     for (GLsizei i = 0; i < count; ++i) names[i] = ++lastName;
 }
 
-// Reads both ends of what is handed over, as a driver would: a sanitizer then sees a size that the block does not have.
-void take(const void* data, GLsizeiptr bytes) {
+// Also reads the first and last byte, so that a sanitizer detects a size beyond the end of the block.
+void countUpload(const void* data, GLsizeiptr bytes) {
     if (!data || bytes <= 0) return;
     const auto* const block = static_cast<const volatile unsigned char*>(data);
     static_cast<void>(block[0]);
@@ -34,7 +34,7 @@ void take(const void* data, GLsizeiptr bytes) {
     uploaded += static_cast<std::size_t>(bytes);
 }
 
-// Without a buffer the offset is an address, and a driver reads there.
+// Without a bound buffer a driver takes the offset as an address.
 void requireBuffer(GLuint buffer, const void* offset) {
     if (!buffer && !offset) std::abort();
 }
@@ -56,7 +56,7 @@ GlUse takeGlUse() {
     return use;
 }
 
-// One line a function: what it takes, and what it does besides being counted.
+// COUNT defines a function that counts its calls and runs `action`; ANSWER one that also returns a value.
 #define COUNT(name, parameters, action)          \
     void GL_APIENTRY name parameters {           \
         static Counter counter = Counter(#name); \
@@ -79,7 +79,7 @@ COUNT(glBindBuffer, (GLenum target, GLuint buffer), (target == GL_ARRAY_BUFFER ?
 COUNT(glBindFramebuffer, (GLenum, GLuint), )
 COUNT(glBindTexture, (GLenum, GLuint), )
 COUNT(glBlendFunc, (GLenum, GLenum), )
-COUNT(glBufferData, (GLenum, GLsizeiptr size, const void* data, GLenum), take(data, size))
+COUNT(glBufferData, (GLenum, GLsizeiptr size, const void* data, GLenum), countUpload(data, size))
 ANSWER(GLenum, glCheckFramebufferStatus, (GLenum), GL_FRAMEBUFFER_COMPLETE)
 COUNT(glClear, (GLbitfield), )
 COUNT(glClearColor, (GLfloat, GLfloat, GLfloat, GLfloat), )
@@ -100,7 +100,7 @@ COUNT(glFramebufferTexture2D, (GLenum, GLenum, GLenum, GLuint, GLint), )
 COUNT(glGenBuffers, (GLsizei count, GLuint* names), makeNames(count, names))
 COUNT(glGenFramebuffers, (GLsizei count, GLuint* names), makeNames(count, names))
 COUNT(glGenTextures, (GLsizei count, GLuint* names), makeNames(count, names))
-// The length tells the names of one program's attributes apart, and that is all that a location is for.
+// The length of its name is a distinct location for each attribute of a program.
 ANSWER(GLint, glGetAttribLocation, (GLuint, const GLchar* name), static_cast<GLint>(std::strlen(name)))
 COUNT(glGetProgramInfoLog, (GLuint, GLsizei, GLsizei*, GLchar*), )
 COUNT(glGetProgramiv, (GLuint, GLenum query, GLint* value), *value = answer(query))
@@ -111,7 +111,7 @@ COUNT(glLinkProgram, (GLuint), )
 COUNT(glShaderSource, (GLuint, GLsizei, const GLchar* const*, const GLint*), )
 COUNT(
     glTexImage2D, (GLenum, GLint, GLint, GLsizei width, GLsizei height, GLint, GLenum, GLenum, const void* pixels),
-    if (pixels) take(pixels, GLsizeiptr{4} * std::max(width, 0) * std::max(height, 0)))
+    if (pixels) countUpload(pixels, GLsizeiptr{4} * std::max(width, 0) * std::max(height, 0)))
 COUNT(glTexParameterf, (GLenum, GLenum, GLfloat), )
 COUNT(glTexParameteri, (GLenum, GLenum, GLint), )
 COUNT(glUniform1f, (GLint, GLfloat), )

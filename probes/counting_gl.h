@@ -1,5 +1,5 @@
-// An OpenGL ES 2.0 that draws nothing: takes the place of the driver's library, counts the calls and succeeds. It
-// defines what this library uses and no more, so whatever else is called does not link.
+// A fake OpenGL ES 2.0 library: counts calls, draws nothing and reports success. It defines only the functions that the
+// library uses, so a call to any other function fails to link.
 #pragma once
 
 #include <cstddef>
@@ -8,14 +8,14 @@
 
 struct GlUse {
     std::map<std::string, int> calls;
-    std::size_t bytes = 0;  // handed over by glBufferData and glTexImage2D
+    std::size_t bytes = 0;  // uploaded by glBufferData and glTexImage2D
 };
 
-// Of shaders and programs. It never writes anything into a log.
+// Results of compiling shaders and linking programs. Info logs are never written.
 struct GlCompiler {
     static inline bool succeeds = true;
     static inline int logLength = 0;
 };
 
-// What was used since the last call.
+// Returns the use since the last call.
 GlUse takeGlUse();

@@ -1,4 +1,4 @@
-// Puts the gestures and the engine back to what a freshly loaded library has.
+// Resets the gestures and the engine to the state after the library is loaded.
 #pragma once
 
 #include <new>

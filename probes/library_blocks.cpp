@@ -3,7 +3,7 @@
 #include <cstddef>
 #include <cstring>
 
-// The names are the linker's.
+// ld's option --wrap prescribes these names.
 extern "C" {
 void* __real_malloc(std::size_t size);
 void* __real_realloc(void* block, std::size_t size);
@@ -22,7 +22,7 @@ void* __wrap_malloc(std::size_t size) {
     void* const block = fails() ? nullptr : __real_malloc(size);
     if (!block) return nullptr;
     ++LibraryBlocks::live;
-    return std::memset(block, '?', size);  // what nobody has written yet shows
+    return std::memset(block, '?', size);  // makes reads of uninitialized memory visible
 }
 
 void* __wrap_realloc(void* block, std::size_t size) {

@@ -1,11 +1,10 @@
-// Small pictures for tests.
 #pragma once
 
 #include <cmath>
 
 #include "host/picture.h"
 
-// Gentle gradients, so that a small error of position stays a small error of colour.
+// Returns a picture of gentle gradients, in which a small position error is a small colour error.
 inline Picture smoothPicture(int width, int height, int variant) {
     Picture picture = {width, height, {}};
     for (int y = 0; y < height; ++y) {

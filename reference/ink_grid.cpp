@@ -66,22 +66,22 @@ InkGrid::InkGrid(int viewWidth, int viewHeight) : width(viewWidth / 12), height(
     push.Radius = 30.0f;
 }
 
-void InkGrid::solvePressure(const Forms& forms) {
+void InkGrid::solvePressure(const KernelSet& kernels) {
     std::ranges::fill(pressure, 0.0f);
     relax.Pressure = {pressure.data(), width, height};
     relax.output = {pressureTemp.data(), width, height};
     for (int i = 0; i < 5; ++i) {
-        forms.jacobi(relax);
+        kernels.jacobi(relax);
         std::swap(relax.Pressure, relax.output);
     }
     subtract.Pressure = relax.Pressure;
 }
 
-void InkGrid::wholeFrame(const Forms& forms) {
-    forms.advection(advect);
-    forms.divergence(diverge);
-    solvePressure(forms);
-    forms.gradient(subtract);
-    pack(forms);
-    forms.forcing(push);
+void InkGrid::wholeFrame(const KernelSet& kernels) {
+    kernels.advection(advect);
+    kernels.divergence(diverge);
+    solvePressure(kernels);
+    kernels.gradient(subtract);
+    pack(kernels);
+    kernels.forcing(push);
 }

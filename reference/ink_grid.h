@@ -1,18 +1,18 @@
-// The velocity grid of one view during a fast drag: the kernels with their textures and uniforms, ready to run. Every
-// pass reads what the pass before it wrote, and the first one reads a field that nothing changes, so that each round
+// The velocity grid of a view during a fast drag: the kernels with their textures and uniforms set. The first pass
+// reads `velocity`, which no pass writes; every other pass reads the result of the one before. Each frame therefore
 // does the same work.
 #pragma once
 
 #include <vector>
 
-#include "reference/forms.h"
+#include "reference/kernel_set.h"
 
 struct InkGrid {
     InkGrid(int viewWidth, int viewHeight);
 
-    void solvePressure(const Forms& forms);  // from zero, five passes
-    void wholeFrame(const Forms& forms);
-    void pack(const Forms& forms) { forms.packing(projected.data(), projected.size(), bytes.data()); }
+    void solvePressure(const KernelSet& kernels);  // five iterations from a pressure of 0
+    void wholeFrame(const KernelSet& kernels);
+    void pack(const KernelSet& kernels) { kernels.packing(projected.data(), projected.size(), bytes.data()); }
 
     int width, height;
     std::vector<vec2> velocity, advected, projected, pushed;

@@ -5,7 +5,7 @@
 #include "fluid/fluid.h"
 #include "fluid/touch.h"
 #include "jni/globals.h"
-#include "reference/forms.h"
+#include "reference/kernel_set.h"
 #include "tests/support/gl_test.h"
 
 namespace {

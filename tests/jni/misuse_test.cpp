@@ -79,7 +79,7 @@ TEST_F(Misuse, aMissingArrayMakesItsCallDoNothing) {
         frame.draw(&failing);
         EXPECT_EQ(gets, 2) << "an exception is pending: no further array may be asked for";
     }
-    EXPECT_EQ(copiesOut, 0) << "what was pinned is released";
+    EXPECT_EQ(pinnedCopies, 0) << "what was pinned is released";
     EXPECT_EQ(binding(GL_ELEMENT_ARRAY_BUFFER_BINDING), 0) << "nothing was drawn";
     EXPECT_EQ(frame.height.values, (std::vector<float>{1, 2, 3, 4}));
     EXPECT_EQ(frame.velocity.values, frame.height.values);

@@ -6,7 +6,7 @@
 #include <limits>
 #include <vector>
 
-#include "reference/forms.h"
+#include "reference/kernel_set.h"
 
 TEST(VelocityPacking, givesTheBytesOfDoublePrecision) {
     const float infinity = std::numeric_limits<float>::infinity();

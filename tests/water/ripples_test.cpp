@@ -5,7 +5,7 @@
 #include <limits>
 #include <vector>
 
-#include "reference/forms.h"
+#include "reference/kernel_set.h"
 
 namespace {
 

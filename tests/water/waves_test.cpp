@@ -7,7 +7,7 @@
 #include <random>
 #include <vector>
 
-#include "reference/forms.h"
+#include "reference/kernel_set.h"
 
 namespace {
 
@@ -20,8 +20,8 @@ struct Surface {
     std::vector<float> v = std::vector<float>(kStride * kRows);
     std::vector<float> h = v;
 
-    bool step(const Forms& forms, const WaveRegion& region, bool checkCalm, float damping, float speed) {
-        return forms.wave(v.data(), h.data(), region, checkCalm, damping, speed);
+    bool step(const KernelSet& kernels, const WaveRegion& region, bool checkCalm, float damping, float speed) {
+        return kernels.wave(v.data(), h.data(), region, checkCalm, damping, speed);
     }
 };
 

@@ -1,13 +1,13 @@
 #include <Eigen/Core>
 
-#include "reference/forms.h"
+#include "reference/kernel_set.h"
 
 namespace {
 
 using Field = Eigen::Array<float, Eigen::Dynamic, Eigen::Dynamic, Eigen::RowMajor>;
 using Window = Eigen::Map<Field, Eigen::Unaligned, Eigen::OuterStride<>>;
 
-// A rows x columns part of a field, `shift` floats away from its own place.
+// Maps rows x columns elements that start at first + shift.
 Window window(float* first, int rows, int columns, int stride, int shift = 0) {
     return {first + shift, rows, columns, Eigen::OuterStride<>(stride)};
 }
@@ -50,7 +50,7 @@ void jacobi(JacobiTShaderImpl& kernel) {
 
 }  // namespace
 
-const Forms kEigen = {
+const KernelSet kEigen = {
     .name = "eigen",
     .wave = wave,
     .jacobi = jacobi,

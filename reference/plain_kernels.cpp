@@ -1,11 +1,11 @@
-// The formulas as plain loops over one value at a time. Compiled twice, with the optimizations that CMakeLists.txt
-// gives to each PLAIN_FORMS. The order of arguments of min and max says what becomes of a value that is not a number:
-// a height stays none, a coordinate is 0, a speed counts as calm and is packed as 127.
+// The formulas as plain loops over one value at a time. CMakeLists.txt compiles this file once per definition of
+// PLAIN_KERNELS. The order of the arguments of min and max determines the result for NaN: a height stays NaN, a
+// coordinate becomes 0, a speed counts as calm, a velocity is packed as 127.
 #include <algorithm>
 #include <cmath>
 #include <vector>
 
-#include "reference/forms.h"
+#include "reference/kernel_set.h"
 
 namespace {
 
@@ -125,7 +125,7 @@ void forcing(AddVelocityTShaderImpl& kernel) {
     }
 }
 
-// Calls texel(i, j, left, right, below, above) with the numbers of the neighbours: only the border is clamped.
+// Calls texel(i, j, left, right, below, above) with the indices of the neighbours, clamped only at the border.
 template <class Texel>
 void withNeighbours(int width, int height, Texel texel) {
     const auto clamped = [=](int i, int j) {
@@ -207,7 +207,7 @@ void packing(const vec2* velocity, std::size_t count, unsigned char* rgba) {
 
 }  // namespace
 
-const Forms PLAIN_FORMS = {
+const KernelSet PLAIN_KERNELS = {
     .name = PLAIN_NAME,
     .wave = wave,
     .jacobi = jacobi,

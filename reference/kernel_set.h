@@ -1,4 +1,4 @@
-// One and the same set of formulas in several forms, so that each can be timed beside the others in one program.
+// Several implementations of the library's formulas. Tests compare their results, benchmarks their times.
 #pragma once
 
 #include <cstddef>
@@ -11,11 +11,11 @@
 #include "water/ripples.h"
 #include "water/waves.h"
 
-struct Forms {
+struct KernelSet {
     const char* name;
     bool (*wave)(float* velocity, float* height, const WaveRegion&, bool checkCalm, float damping, float waveSpeed);
     void (*jacobi)(JacobiTShaderImpl&);
-    // The rest is null where a form has none.
+    // The following are null if the set does not implement them.
     void (*ripple)(const RippleField&, float posA, float posB, float amplitude);
     void (*advection)(AdvectVelocityTShaderImpl&);
     void (*forcing)(AddVelocityTShaderImpl&);
@@ -24,7 +24,7 @@ struct Forms {
     void (*packing)(const vec2* velocity, std::size_t count, unsigned char* rgba);
 };
 
-extern const Forms kLibrary;
-extern const Forms kScalar;          // plain loops, automatic vectorization off
-extern const Forms kAutoVectorized;  // the same loops at -O3
-extern const Forms kEigen;           // array expressions
+extern const KernelSet kLibrary;
+extern const KernelSet kScalar;          // plain loops, automatic vectorization off
+extern const KernelSet kAutoVectorized;  // the same loops at -O3
+extern const KernelSet kEigen;           // array expressions

@@ -1,7 +1,7 @@
-#include "reference/forms.h"
+#include "reference/kernel_set.h"
 #include "tshader/velocity_packing.h"
 
-const Forms kLibrary = {
+const KernelSet kLibrary = {
     .name = "library",
     .wave = stepWaves,
     .jacobi = [](JacobiTShaderImpl& kernel) { kernel.run(); },

@@ -1,6 +1,9 @@
-# Turns host/look.properties into look.h, one documented struct; look_fields.h, the names and limits of its fields;
-# Look.java, the same for Android; look.json, names and ranges for the web page; and look.md, the table of docs/.
-# embed_look(<properties file> <folder>)
+# embed_look(<properties file> <folder>) generates from host/look.properties:
+#   look.h         struct Look
+#   look_fields.h  names and limits of its fields
+#   Look.java      the same class for Android
+#   look.json      names, values and ranges for the web page
+#   look.md        the table of docs/look.md
 function(embed_look properties folder)
     set_property(DIRECTORY APPEND PROPERTY CMAKE_CONFIGURE_DEPENDS ${properties})
     file(STRINGS ${properties} lines)
@@ -58,7 +61,7 @@ function(embed_look properties folder)
 
 #include \"host/look.h\"
 
-// A number of the look and what it keeps to.
+// A field of Look and its limits.
 struct LookField {
     std::string_view name;
     std::variant<int Look::*, float Look::*> member;

@@ -1,7 +1,6 @@
-# Joins GLSL files with the chunks that they include, by paths from the project's root, and turns them into a header of
-# string constants: water/water.vert becomes kWaterVert. The joined sources, which are what a driver gets, also stand
-# beside the header as files.
-# embed_shaders(<header> <source>...)
+# embed_shaders(<header> <source>...) expands the #include lines of GLSL files, with paths from the project's root, and
+# generates a header of string constants: water/water.vert becomes kWaterVert. The expanded sources are also written to
+# files next to the header.
 function(embed_shaders header)
     cmake_path(GET header PARENT_PATH directory)
     set(text "#pragma once\n\n")

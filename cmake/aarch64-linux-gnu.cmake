@@ -1,4 +1,4 @@
-# Debian's cross compiler. Headers that no processor changes come from the build machine.
+# Debian's cross compiler. Architecture-independent headers are found on the build machine.
 set(CMAKE_SYSTEM_NAME Linux)
 set(CMAKE_SYSTEM_PROCESSOR aarch64)
 set(CMAKE_CXX_COMPILER aarch64-linux-gnu-g++)

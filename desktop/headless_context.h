@@ -1,4 +1,4 @@
-// An OpenGL ES 2.0 context without a window: EGL on Mesa's software driver, with a pbuffer as framebuffer 0.
+// An OpenGL ES 2.0 context without a window, from EGL on Mesa's software driver. Framebuffer 0 is a pbuffer.
 #pragma once
 
 #include <memory>
@@ -6,8 +6,8 @@
 
 class HeadlessContext {
 public:
-    // Makes a context with a framebuffer of width x height RGBA8 pixels and makes it current. On failure
-    // returns null and says why, and what to install, in `error`.
+    // Creates a context with a framebuffer of width x height RGBA8 pixels and makes it current. On failure returns null
+    // and stores the reason, with the packages to install, in `error`.
     static std::unique_ptr<HeadlessContext> create(int width, int height, std::string& error);
     ~HeadlessContext();
     HeadlessContext(const HeadlessContext&) = delete;
@@ -15,7 +15,7 @@ public:
 
 private:
     HeadlessContext() = default;
-    // EGL's handles are plain pointers; kept so here to spare the users of this header EGL's.
+    // EGL handles as void*, so that this header need not include EGL's.
     void* display_ = nullptr;
     void* surface_ = nullptr;
     void* context_ = nullptr;

@@ -1,6 +1,5 @@
 #pragma once
 
-// With a current context, keeps Mesa's libraries in memory after their last use: reports made at the exit of the
-// process, such as those of a leak checker, can then name the code that they are about, and the next context starts
-// sooner.
+// Prevents the current context's Mesa libraries from being unloaded. Reports at process exit, such as a leak checker's,
+// can then resolve their symbols, and the next context starts faster.
 void keepDriverLoaded();

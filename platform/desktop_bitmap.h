@@ -1,4 +1,4 @@
-// What a bitmap reference points to where no Java virtual machine runs.
+// The object behind a bitmap's jobject when no Java VM is running.
 #pragma once
 
 #include <android/bitmap.h>
@@ -6,5 +6,5 @@
 struct DesktopBitmap : _jobject {
     AndroidBitmapInfo info = {};
     void* pixels = nullptr;  // not owned; null fails the lock
-    int locks = 0;           // locks not yet undone
+    int locks = 0;           // locks without their unlock
 };

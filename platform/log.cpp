@@ -20,7 +20,7 @@ void __android_log_stderr_logger(const __android_log_message* message) {
 }
 
 int __android_log_print(int prio, const char* tag, const char* fmt, ...) {
-    // Android cuts longer texts as well.
+    // Longer texts are truncated, as on Android.
     char text[4000];
     std::va_list arguments;
     va_start(arguments, fmt);

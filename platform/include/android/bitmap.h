@@ -1,4 +1,4 @@
-// The desktop's <android/bitmap.h>: the calls and the record that the library uses, as Android gives them.
+// The desktop's <android/bitmap.h>, with the subset of Android's declarations that the library uses.
 #pragma once
 
 #include <jni.h>

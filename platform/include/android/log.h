@@ -1,4 +1,4 @@
-// The desktop's <android/log.h>: the few declarations that this project uses, as Android gives them.
+// The desktop's <android/log.h>, with the subset of Android's declarations that this project uses.
 #pragma once
 
 #include <stddef.h>
@@ -34,7 +34,7 @@ struct __android_log_message {
 
 typedef void (*__android_logger_function)(const struct __android_log_message* log_message);
 
-// Where the lines go; at first __android_log_stderr_logger, which writes "E/Tag: text".
+// Sets the function that receives every line. The default is __android_log_stderr_logger, which writes "E/Tag: text".
 void __android_log_set_logger(__android_logger_function logger);
 void __android_log_stderr_logger(const struct __android_log_message* log_message);
 

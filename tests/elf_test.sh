@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
-# elf_test.sh LIBRARY NATIVES_H BYTES [PAGE]: what ships has at most so many bytes, exports the native methods that the header declares and
-# nothing else, needs nothing of the C++ runtime, has no text relocations, leaves nothing writable that the loader could
-# have sealed, and lies in pages of the given size.
+# elf_test.sh LIBRARY NATIVES_H BYTES [PAGE]: checks the shared library. It exports exactly the native methods that the
+# header declares, does not depend on the C++ runtime, has no text relocations, is linked with relro and immediate
+# binding, has segments aligned to PAGE, and is at most BYTES long when stripped.
 set -euo pipefail
 library=$1
 most=$3

@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# layers_test.sh ROOT: fails on an include of a folder that is not below the one that includes it. Of the library the
-# host and its faces see the native methods only, and through one window more.
+# layers_test.sh ROOT: fails if a file includes a folder that is not below its own. The host and everything above it may
+# include only the native methods of the library; host/engine_window.cpp is the one exception.
 set -euo pipefail
 cd "$1"
 library="base tshader gl water fluid jni"

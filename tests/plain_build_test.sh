@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
-# plain_build_test.sh FOLDER: builds a copy of the sources with CMake's defaults and Make, without a network and without
-# what only the desktop program, the tests and the benchmarks need. The library has to be optimized, without a warning, and
-# the sources have to stay as they were.
+# plain_build_test.sh FOLDER: builds a copy of the sources with CMake's defaults, without a network and without the
+# packages that only the desktop program, the tests and the benchmarks need. Fails if the build gives a warning, does not
+# optimize, or changes a source file.
 set -euo pipefail
 fail() {
     echo "The plain build $*" >&2
@@ -16,7 +16,7 @@ listing() {
 }
 before=$(listing)
 offline=(unshare --net)
-# A container may not be allowed a network of its own: then every address leads nowhere.
+# In a container without the permission to create a network namespace, an unreachable proxy blocks downloads instead.
 "${offline[@]}" true 2>/dev/null || offline=(env {http,https}_proxy=http://127.0.0.1:9)
 "${offline[@]}" cmake -S source -B build -DCMAKE_DISABLE_FIND_PACKAGE_{glfw3,CLI11}=ON >configured
 grep 'The desktop program is left out' configured || fail "does not say what is missing"

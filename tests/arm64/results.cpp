@@ -1,8 +1,8 @@
-// Prints a hash of what every hot loop makes of fixed inputs. Two processors agree bit for bit when the two outputs are
-// equal, and a line that differs names the loop.
+// Prints a hash of the results of every hot loop for fixed inputs. If two processors print the same lines, their
+// results are equal bit for bit.
 //
-// Left out, as processors may differ there: the sign and payload of a NaN, and results around the smallest normal
-// number, which one processor flushes to zero before it rounds and another after.
+// The inputs avoid results that may differ between processors: the sign and payload of a NaN, and numbers next to the
+// smallest normal, which some processors flush to zero before rounding and others after.
 #include <cstddef>
 #include <cstdint>
 #include <cstdio>
@@ -16,7 +16,7 @@
 
 namespace {
 
-// FNV-1a over the bytes.
+// Prints the FNV-1a hash of the bytes.
 template <class T>
 void print(const char* what, const std::vector<T>& values) {
     std::uint64_t hash = 0xcbf29ce484222325u;
@@ -54,7 +54,7 @@ void printMesh(int n) {
 void printInk(int viewWidth, int viewHeight, int drag) {
     InkGrid ink(viewWidth, viewHeight);
     ink.advect.drag = drag;
-    // Far out of the grid, where a processor's own conversion to int may give anything.
+    // Samples far outside the grid, where the conversion to int would be undefined without the clamp.
     ink.velocity[7] = {-3.0e38f, 3.0e38f};
     ink.wholeFrame(kLibrary);
     print("advection", ink.advected);

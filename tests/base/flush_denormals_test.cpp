@@ -12,7 +12,7 @@ bool keepsDenormals() {
     return half != 0.0f;
 }
 
-TEST(FlushDenormals, LastsAsLongAsTheOutermostScope) {
+TEST(FlushDenormals, isActiveUntilTheOutermostScopeEnds) {
     ASSERT_TRUE(keepsDenormals());
     {
         const FlushDenormals outer;

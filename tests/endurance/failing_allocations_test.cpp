@@ -1,4 +1,4 @@
-// Each of the library's allocations fails once, and once all of them do.
+// Makes each allocation of the library fail once, then all of them.
 #include <climits>
 #include <map>
 
@@ -23,16 +23,17 @@ protected:
         resetGestures();
     }
 
-    // A blot grows for some frames, and is cleared.
+    // Draws a tap for a few frames, then clears the ink.
     Shown play() const {
         const Look look = {.meshVertices = vertices_};
-        // The pictures are cropped alike for each view, so that one that stays in place is the same.
+        // The transfer through a square view makes the cropping independent of width_, so that a picture kept after a
+        // failure equals the new one.
         WaterHost square(look, 64, 64, 1);
         setUp(square, false, kAllPictures);
         WaterHost host(look, width_, kHeight, 1);
         setUp(host, true);
         srand48(1);
-        // A driver that refuses a shader explains it in a text of its own length.
+        // A shader that does not compile makes the library allocate memory for its info log.
         zorloadShaderScript(GL_VERTEX_SHADER, "void main( {");
         host.touch(TouchAction::down, width_ / 2, kHeight / 2, 1.0f);
         for (int i = 0; i < 3; ++i) {
@@ -49,14 +50,15 @@ protected:
 
     struct Session {
         Shown disturbed, undisturbed;
-        std::string complaint;  // the first in the log, up to its numbers
-        int complaints = 0;
-        int texts = 0;  // of the driver
+        std::string complaint;  // first error line, up to its numbers
+        int complaints = 0;     // error lines about memory
+        int texts = 0;          // logged info logs
     };
 
-    // A set-up in which those requests fail, another one after it, and what there is to see where nothing fails.
+    // Plays once while the requests first ... last fail, checks that the next set-up recovers, and plays once without
+    // failures for comparison.
     Session fail(int first, int last) {
-        // Buffers that only grow ask for memory where they never were as large.
+        // A larger view and mesh make the buffers that never shrink allocate again.
         width_ += 12;
         ++vertices_;
         resetGestures();
@@ -94,18 +96,18 @@ double meanDifference(const std::vector<Rgba>& a, const std::vector<Rgba>& b) {
 
 }  // namespace
 
-TEST_F(FailingAllocations, costWhatTheyAreForAndTheNextSetUpRecovers) {
-    play();  // the pictures that a failed hand-over leaves in place
+TEST_F(FailingAllocations, affectOnlyTheirFeatureUntilTheNextSetUp) {
+    play();  // Transfers pictures that a failed transfer can keep.
     std::map<std::string, int> seen;
     for (int request = 1;; ++request) {
         const auto [disturbed, undisturbed, complaint, complaints, texts] = fail(request, request);
-        if (complaints == 0 && texts == 1) break;  // there are no more
+        if (complaints == 0 && texts == 1) break;  // All requests have failed once.
         SCOPED_TRACE(std::to_string(request) + " " + complaint);
         ++seen[complaint];
-        EXPECT_EQ(complaints, texts) << "either a complaint or a lost text";
+        EXPECT_EQ(complaints, texts) << "a failure is logged, or loses the info log";
         EXPECT_EQ(disturbed.inked == disturbed.water, complaint == "no memory for an ink grid of ");
         EXPECT_EQ(disturbed.water == undisturbed.water, complaint != "no memory for smoothing the water");
-        EXPECT_LT(meanDifference(disturbed.water, undisturbed.water), 0.5) << "one step may be a little rougher";
+        EXPECT_LT(meanDifference(disturbed.water, undisturbed.water), 0.5) << "one step may lack smoothing";
     }
     const std::map<std::string, int> wanted = {
         {"", 1},

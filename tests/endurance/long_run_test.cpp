@@ -1,4 +1,4 @@
-// A day of touches, as fast as the machine computes it.
+// Simulates a day of touches without waiting between frames.
 #include <gtest/gtest.h>
 
 #include <algorithm>
@@ -17,7 +17,7 @@
 
 namespace {
 
-// Looks, when it is asked to, at what the library gives back to its host.
+// While `looking`, checks the arrays that the library releases to the host.
 bool looking = false;
 bool finite = true;
 const JNINativeInterface_* const host = hostEnvironment()->functions;
@@ -28,7 +28,7 @@ void lookAt(const float* values, std::size_t number) {
 
 class LongRun : public testing::Test {
 protected:
-    // What a frame in one view and mode costs: calls, bytes.
+    // View width, ink mode, calls and uploaded bytes of a frame.
     using Cost = std::tuple<int, bool, std::map<std::string, int>, std::size_t>;
 
     void SetUp() override {
@@ -41,7 +41,7 @@ protected:
         };
         srand48(11);
         setUp(kAllPictures);
-        // The buffers that only grow are grown by then: the larger view comes first.
+        // The first frame uses the larger view, so that the scratch buffers reach their final size.
         water.touch(TouchAction::down, 0, 0, 1.0f);
         water.advance(1.0 / 60);
         water.draw();
@@ -74,7 +74,7 @@ protected:
         while (length-- > 0 && !HasFailure()) frame();
     }
 
-    // A stroke or its beginning, at up to any speed, and what happens between two.
+    // Plays a stroke or part of it with random pauses, then a random event: rain, clearing, a pause or a set-up.
     void play(const Stroke& stroke) {
         const auto events = below(2 * static_cast<unsigned>(stroke.size()));
         for (const StrokeEvent& event : std::span(stroke).first(std::min<std::size_t>(events, stroke.size()))) {
@@ -85,7 +85,7 @@ protected:
         const unsigned event = below(15);
         if (event < 4) water.rain(event < 2);
         if (event == 5) water.clearInk();
-        if (event == 6) {  // nobody looked for a while, and the frame after it makes up for some of the ink
+        if (event == 6) {  // A pause of an hour; the next frame makes several ink steps.
             water.advance(3600.0);
             water.draw();
         }
@@ -97,7 +97,7 @@ protected:
     JNINativeInterface_ watching = *host;
     LogRecorder log;
     std::mt19937 random{3};
-    int width = 252;  // or 204, which makes it the portrait view
+    int width = 252;  // or 204 for a portrait view
     bool withInk = true;
     WaterHost water{Look{.meshVertices = 16}, width, 240, 5};
     int frames = 0;
@@ -106,7 +106,7 @@ protected:
 
 }  // namespace
 
-TEST_F(LongRun, aDayNeitherGrowsNorSlowsDownNorLeavesTheNumbers) {
+TEST_F(LongRun, memoryAndCostStayConstantAndValuesFinite) {
     const int hour = isFullLength() ? 216'000 : 5000;  // frames
     const std::vector<Stroke> strokes = strokesOfAllKinds();
     const int blocks = LibraryBlocks::live;
@@ -117,7 +117,7 @@ TEST_F(LongRun, aDayNeitherGrowsNorSlowsDownNorLeavesTheNumbers) {
         play(strokes[below(static_cast<unsigned>(strokes.size()))]);
         EXPECT_EQ(LibraryBlocks::live, blocks);
     }
-    EXPECT_EQ(atFirst.size(), 2U * 3) << "two views, each without ink, with it and with more of it";
+    EXPECT_EQ(atFirst.size(), 2U * 3) << "two views, each without ink, with advection, and with injection as well";
     EXPECT_TRUE(atFirst == atLast);
     std::cout << frames << " frames, " << blocks << " blocks\n";
 }

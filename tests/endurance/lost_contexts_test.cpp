@@ -1,4 +1,4 @@
-// A context that is lost in the middle of a gesture, over and over.
+// Loses the context in the middle of many gestures.
 #include <algorithm>
 #include <functional>
 #include <random>
@@ -14,7 +14,7 @@ namespace {
 // Buffers, textures, framebuffers, programs, shaders.
 using GlObjects = std::array<int, 5>;
 
-// Drivers give out small names first. Those never bound do not count.
+// Counts the live objects. Drivers assign small names first; a name that was never bound does not count.
 GlObjects liveObjects() {
     GlObjects live = {};
     for (GLuint name = 1; name < 500; ++name) {
@@ -42,7 +42,7 @@ protected:
         bool operator==(const Mode&) const = default;
     };
 
-    // In a new context and a library freshly loaded, but for its buffers.
+    // Creates a host in a new context, with the library in its state after loading.
     WaterHost start() {
         renewContext(kLonger, kLonger);
         resetGestures();
@@ -57,7 +57,7 @@ protected:
             {reinterpret_cast<const char*>(pixels.data()), pixels.size() * sizeof pixels[0]});
     }
 
-    // What a first set-up of the mode makes, once its first frame has bound it all.
+    // Counts the objects of a first set-up, after a frame has bound them all.
     GlObjects firstSetUp(bool withInk) {
         WaterHost host = start();
         setUp(host, withInk, kAllPictures);
@@ -67,19 +67,19 @@ protected:
         return liveObjects();
     }
 
-    // In the middle of each stroke the library is set up again, in a context that lives or in a new one.
+    // Sets up the library again, in the current context or in a new one.
     void setUpAgain(WaterHost& host, const Mode& mode, bool inNewContext) {
         EXPECT_EQ(glGetError(), GLenum{GL_NO_ERROR});
         if (inNewContext) renewContext(kLonger, kLonger);
         hadInk_ = mode.withInk || (hadInk_ && !inNewContext);
         host.resize(mode.width, mode.height);
         setUp(host, mode.withInk);
-        // A context does not know the names of a lost one.
+        // Deleting a program name of a lost context sets GL_INVALID_VALUE.
         const GLenum error = glGetError();
         EXPECT_TRUE(error == GL_NO_ERROR || error == GL_INVALID_VALUE) << error;
         host.draw();
-        // The water alone leaves the objects of the ink as they are. Where it follows a lost context with ink, an
-        // object whose name a member of the ink still holds from there is spared.
+        // A set-up without ink keeps the ink's objects. After a lost context with ink, it also keeps an object whose
+        // name equals a stale name of the ink; see gl/objects.h.
         const GlObjects live = liveObjects();
         EXPECT_TRUE(
             live == first_[hadInk_] ||
@@ -89,21 +89,21 @@ protected:
     }
 
     GlObjects first_[2];
-    bool hadInk_ = false;  // this context
+    bool hadInk_ = false;  // in the current context
 };
 
 }  // namespace
 
-TEST_F(LostContexts, costOneSetUpEvenInTheMiddleOfAStroke) {
+TEST_F(LostContexts, recoverWithOneSetUpDuringAStroke) {
     const std::vector<Stroke> strokes = strokesOfAllKinds();
     first_[false] = firstSetUp(false);
     first_[true] = firstSetUp(true);
     const int blocks = LibraryBlocks::live;
     const int losses = isFullLength() ? 1000 : 20;
     std::vector<std::size_t> undisturbed;
-    int strokesGoneOn = 0;
-    // First the same fingers on the same water where nothing is lost. The ink is the library's and is not compared, so
-    // it need not be drawn.
+    int continuedStrokes = 0;
+    // The first round records the pictures of the water without losses. It does not draw the ink, which is not
+    // compared.
     for (const bool losing : {false, true}) {
         WaterHost host = start();
         setUp(host, false, kAllPictures);
@@ -142,10 +142,10 @@ TEST_F(LostContexts, costOneSetUpEvenInTheMiddleOfAStroke) {
                 continue;
             }
             ASSERT_EQ(water, undisturbed[static_cast<std::size_t>(n)]);
-            strokesGoneOn += inked != water && before.withInk && inNewContext;
+            continuedStrokes += inked != water && before.withInk && inNewContext;
             ASSERT_TRUE(inked == water || mode.withInk);
             ASSERT_LE(LibraryBlocks::live, blocks);
         }
     }
-    EXPECT_GT(strokesGoneOn, losses / 8);
+    EXPECT_GT(continuedStrokes, losses / 8);
 }

@@ -1,4 +1,3 @@
-// The strokes of long sessions.
 #pragma once
 
 #include <cmath>
@@ -11,19 +10,18 @@
 #include "host/water_host.h"
 #include "probes/smooth_picture.h"
 
-// Whether the environment asks for sessions of full length; those of an ordinary test run are short.
 inline bool isFullLength() {
-    const char* const wish = std::getenv("TIDEMARK_ENDURANCE");
-    return wish && std::string_view(wish) == "full";
+    const char* const length = std::getenv("TIDEMARK_ENDURANCE");
+    return length && std::string_view(length) == "full";
 }
 
 struct StrokeEvent {
     TouchAction action;
-    double x, y;  // shares of the view; some lie beyond its edges
+    double x, y;  // fractions of the view; some are outside 0 to 1
 };
 using Stroke = std::vector<StrokeEvent>;
 
-// Taps, and curves of each speed that the ink tells apart on a view of about 240 pixels. A few are cancelled.
+// Returns taps and curves of each speed class on a view of about 240 pixels. Some end with a cancel.
 inline std::vector<Stroke> strokesOfAllKinds() {
     std::mt19937 random(1);
     std::normal_distribution<double> place(0.5, 0.15);
@@ -46,7 +44,7 @@ inline std::vector<Stroke> strokesOfAllKinds() {
     return strokes;
 }
 
-// Sets the library up and loads its pictures, which are handed over where they are due.
+// Sets up the library and loads its pictures. `due` selects the pictures to transfer first.
 inline void setUp(WaterHost& host, bool withInk, unsigned due = 0) {
     static const Pictures pictures = {smoothPicture(24, 32, 1), smoothPicture(32, 24, 2), smoothPicture(8, 8, 3)};
     static const PictureSource source = sourceOf(pictures);

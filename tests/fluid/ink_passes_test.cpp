@@ -26,7 +26,7 @@ float decoded(const Rgba& texel) {
     return static_cast<float>(texel[0]) + static_cast<float>(texel[1]) / 255.0f;
 }
 
-// `centre` is where the kernel looks for the first texel.
+// Runs shaderMain for every texel; `centre` is the fragment coordinate of the first one.
 template <class Kernel>
 Density everyTexel(Kernel& kernel, float centre) {
     Density values(kTexels);
@@ -38,18 +38,18 @@ Density everyTexel(Kernel& kernel, float centre) {
     return values;
 }
 
-// The passes on a small target, against the CPU kernels of the same operations.
+// Compares the GPU passes on a small target with the CPU kernels.
 class InkPasses : public GlTest {
 protected:
     void SetUp() override {
         GlTest::SetUp();
-        // Screen positions beyond 1,024 and squares beyond 65,504 are out of half precision's reach.
+        // Positions above 1,024 lose precision in a half float, and squares above 65,504 overflow it.
         engine.InitializeSetting(1200, 2000, true);
         engine.GridWidth = engine.InkWidth = kWidth;
         engine.GridHeight = engine.InkHeight = kHeight;
         engine.InitializeGPU(true);
         glBindFramebuffer(GL_FRAMEBUFFER, 0);
-        // Smooth, so that the filter's weights matter little, with all fractions in it.
+        // A smooth density, so that the precision of the filter weights has little effect. It contains all fractions.
         std::vector<Rgba> texels;
         for (std::size_t i = 0; i < kTexels; ++i) {
             const double along = 0.21 * static_cast<double>(i % kWidth), up = 0.13 * static_cast<double>(i / kWidth);
@@ -61,7 +61,7 @@ protected:
         fill(engine.Density.Ping, texels.data());
     }
 
-    // Mesa's software rasteriser of last resort is exact; the other one filters in 8 bits.
+    // Mesa's softpipe filters exactly, llvmpipe with weights of 8 bits.
     static bool isExact() {
         const char* driver = std::getenv("GALLIUM_DRIVER");
         return driver && std::string_view(driver) == "softpipe";
@@ -86,7 +86,7 @@ protected:
 
 }  // namespace
 
-TEST_F(InkPasses, injectionAddsWhatTheKernelAdds) {
+TEST_F(InkPasses, injectionMatchesTheKernel) {
     AddInkTShaderImpl kernel;
     kernel.Source = {before.data(), kWidth, kHeight};
     kernel.Scale = Vec2(1200.0f / kWidth, 2000.0f / kHeight);
@@ -105,12 +105,12 @@ TEST_F(InkPasses, injectionAddsWhatTheKernelAdds) {
             engine.AddInk(
                 engine.Density.Ping, engine.Density.Pong, mode, {previous.x, previous.y}, {903.3f, 1503.3f}, 7);
             const Density expected = everyTexel(kernel, 0.5f);
-            EXPECT_EQ(largestDifference(expected, before) > 0.2, mode != 2 || hasLength) << "adds something";
+            EXPECT_EQ(largestDifference(expected, before) > 0.2, mode != 2 || hasLength) << "the pass adds ink";
             EXPECT_LE(
                 largestDifference(densityOf(engine.Density.Pong), expected), 0.5 / 255 + (isExact() ? 1e-3 : 2e-3));
         }
     }
-    // What lies at the very ends of a segment is beside it.
+    // The ends of the segment are exclusive.
     kernel.Scale = kernel.normal = Vec2(0, 1);
     kernel.previous = Vec2(0);
     kernel.len = 4;
@@ -123,9 +123,9 @@ TEST_F(InkPasses, injectionAddsWhatTheKernelAdds) {
     EXPECT_EQ((std::array{none.normal.x, none.normal.y, none.length}), (std::array{0.0f, 0.0f, 1.0f}));
 }
 
-// With a velocity grid of the density's own size both samplers address the same texels: the kernel's runs from 0 at the
-// first texel's centre to 1 at the last one's, so it gets coordinates measured from there.
-TEST_F(InkPasses, advectionCarriesWhatTheKernelCarries) {
+// The velocity grid has the density's size. The kernel's sampler has 0 at the first texel's centre and 1 at the last
+// one's, so the kernel gets coordinates relative to the first centre.
+TEST_F(InkPasses, advectionMatchesTheKernel) {
     std::vector<vec2> velocity;
     for (std::size_t i = 0; i < kTexels; ++i) {
         const auto a = static_cast<float>(i);
@@ -140,7 +140,7 @@ TEST_F(InkPasses, advectionCarriesWhatTheKernelCarries) {
     kernel.InverseSize = Vec2(1.0f / (kWidth - 1), 1.0f / (kHeight - 1));
     kernel.Scale = Vec2(1200.0f / kWidth, 2000.0f / kHeight);
     kernel.TimeStep = 0.9f * 0.25f;
-    // 85 pixels beside the centre of texel (12, 21): just outside the reach of the touch.
+    // 85 pixels from the centre of texel (12, 21), which is just outside the touch's radius of 80.
     POSITION_X = 710;
     POSITION_Y = 925;
     kernel.center = Vec2(710, 1075) - 0.5f * kernel.Scale;
@@ -152,8 +152,8 @@ TEST_F(InkPasses, advectionCarriesWhatTheKernelCarries) {
             kernel.Dissipation = 0.92f * backward;
             glViewport(0, 0, kWidth, kHeight);
             engine.AdvectDensity(engine.Velocity.Ping, engine.Density.Ping, engine.Density.Pong, 0.92f * backward);
-            // The packed velocity is rounded down by up to 1 / 255, which moves a sample a little; neighbours differ
-            // by up to 13. The other driver also rounds a filtered whole part to a whole number, twice.
+            // Packing rounds the velocity down by up to 1 / 255, and neighbouring densities differ by up to 13.
+            // llvmpipe also rounds the filtered whole part to an integer, twice.
             EXPECT_LE(
                 largestDifference(densityOf(engine.Density.Pong), everyTexel(kernel, 0.0f)), isExact() ? 0.016 : 1.0);
         }
@@ -165,10 +165,10 @@ TEST_F(InkPasses, advectionCarriesWhatTheKernelCarries) {
         kernel.shaderMain(Vec4(12, 20, 0, 0), carried[static_cast<std::size_t>(i)]);
     }
     EXPECT_NE(carried[0], carried[1]);
-    EXPECT_EQ(carried[1], carried[2]) << "beyond 80 pixels, and at 80, the touch does not matter";
+    EXPECT_EQ(carried[1], carried[2]) << "at 80 pixels and beyond, the touch has no effect";
 }
 
-TEST_F(InkPasses, injectionKeepsAwayFromTheEdgesButRecordsTheStroke) {
+TEST_F(InkPasses, injectionNearAnEdgeOnlyRecordsTheStroke) {
     engine.BoundaryMargin = 60;
     engine.Radius = 100;
     const GLuint ping = engine.Density.Ping.TextureHandle;
@@ -176,7 +176,7 @@ TEST_F(InkPasses, injectionKeepsAwayFromTheEdgesButRecordsTheStroke) {
     for (const int x : {60, 61}) {
         POSITION_X = x;
         engine.Inject(-1, 600, 900, 625, 975, {0.1f, 0.2f, 0.3f});
-        EXPECT_EQ(engine.Density.Ping.TextureHandle != ping, x == 61) << "a pass and a swap";
+        EXPECT_EQ(engine.Density.Ping.TextureHandle != ping, x == 61) << "an injection swaps the pair";
         EXPECT_EQ(std::pair(engine.Current.x, engine.Current.y), std::pair(625.0f, 1025.0f));
         EXPECT_EQ(std::pair(engine.Previous.x, engine.Previous.y), std::pair(600.0f, 1100.0f));
         EXPECT_EQ(engine.InkColor.b, 0.3f);

@@ -47,11 +47,11 @@ TEST_F(Setup, logsEveryStepAndEveryObjectThatItReplaces) {
                    "I CreateQuad\nI glDelete quadvbo = \n");
 }
 
-TEST_F(Setup, sizesFollowTheViewAndParametersHaveTheirValues) {
+TEST_F(Setup, setsSizesAndParameters) {
     engine.InitializeSetting(320, 200, false);
     EXPECT_EQ(std::pair(engine.ScreenWidth, engine.ScreenHeight), std::pair(320, 200));
     EXPECT_EQ((std::array{engine.InkColor.r, engine.InkColor.g, engine.InkColor.b}), (std::array{1.0f, 1.0f, 1.0f}));
-    EXPECT_EQ(engine.ClearInkValue, 0.0f) << "nothing of the ink is set without it";
+    EXPECT_EQ(engine.ClearInkValue, 0.0f) << "a set-up without ink sets no ink parameter";
     for (const auto& [view, grid, ink] :
          {std::tuple(std::pair(1085, 1920), std::pair(90, 160), std::pair(256, 512)),
           {{1920, 1080}, {160, 90}, {512, 256}},
@@ -71,7 +71,7 @@ TEST_F(Setup, sizesFollowTheViewAndParametersHaveTheirValues) {
     EXPECT_EQ((std::array{f.NumJacobiIterations, f.DragMode, f.BoundaryMargin}), (std::array{5, 0, 10}));
 }
 
-TEST_F(Setup, leavesAClearedDensityAndTheStatedState) {
+TEST_F(Setup, clearsTheFieldsAndLeavesTheDocumentedState) {
     setUp(1080, 1920, true);
     std::ranges::fill_n(engine.VelocityTex.data, 90 * 160, vec2{1.0f, 1.0f});
     engine.ClearSurface(engine.Density.Ping, 1, 1, 1, 1);
@@ -93,5 +93,5 @@ TEST_F(Setup, leavesAClearedDensityAndTheStatedState) {
 
     setUp(1080, 1920, true);
     setUp(1080, 1920, false);
-    EXPECT_EQ(binding(GL_FRAMEBUFFER_BINDING), 0) << "the water has no ink frame that would bind it";
+    EXPECT_EQ(binding(GL_FRAMEBUFFER_BINDING), 0) << "a set-up without ink binds framebuffer 0";
 }

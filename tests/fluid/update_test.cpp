@@ -12,8 +12,8 @@ namespace {
 constexpr int kWidth = 365;
 constexpr int kHeight = 610;
 
-// A touch by its distance from the left and from the lower edge, and how far from the edges it must be in an update
-// whose source starts with strength 7 and radius 90.
+// A touch, with its distances from the left and lower edges, and the resulting margin and source of an update. The
+// source is initially of strength 7 and radius 90.
 struct Row {
     int drag, x, up, margin;
     float strength, radius;
@@ -60,7 +60,7 @@ protected:
 
 }  // namespace
 
-TEST_F(Update, movesTheFieldAsThePlainLoopsDoAndUploadsIt) {
+TEST_F(Update, matchesThePlainLoopsAndUploadsTheField) {
     std::mt19937 random(1);
     std::uniform_real_distribution<float> speed(-150.0f, 150.0f);
     DX = 11;
@@ -87,7 +87,7 @@ TEST_F(Update, movesTheFieldAsThePlainLoopsDoAndUploadsIt) {
         plain.advect.Dissipation = engine.VelocityDissipation;
         plain.diverge.SourceStrength = row.strength;
         plain.diverge.SourceRadius = row.radius;
-        // A projected frame draws twice from the generator, any other not at all.
+        // Update calls lrand48 twice if it projects, otherwise never.
         srand48(row.x);
         if (row.projects) {
             plain.diverge.center.x = jittered(row.x);
@@ -125,7 +125,7 @@ TEST_F(Update, movesTheFieldAsThePlainLoopsDoAndUploadsIt) {
         EXPECT_EQ(readPixels(engine.GridWidth, engine.GridHeight), packed);
         glBindFramebuffer(GL_FRAMEBUFFER, 0);
 
-        // A push of 50 pixels up and to the right, wherever the touch is.
+        // The segment is independent of the touch.
         std::ranges::copy(plain.projected, engine.VelocityTex.data);
         engine.Perturb(100, kHeight - 150.0f, 130, kHeight - 190.0f);
         plain.push.previous = {100, 150};
@@ -139,8 +139,8 @@ TEST_F(Update, movesTheFieldAsThePlainLoopsDoAndUploadsIt) {
 }
 
 #ifdef __SSE2__
-// The processor notes whether it met a denormal that it was not told to take for zero.
-TEST_F(Update, noPassIsSlowedDownByDenormals) {
+// MXCSR records whether an operation had a denormal operand while denormals-are-zero was off.
+TEST_F(Update, flushesDenormals) {
     const auto meetsDenormals = [this](const auto& pass) {
         std::ranges::fill_n(engine.VelocityTex.data, static_cast<int>(field().size()), vec2{1e-40f, 1e-40f});
         _mm_setcsr(_mm_getcsr() & ~_MM_EXCEPT_MASK);

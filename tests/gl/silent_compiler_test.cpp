@@ -10,10 +10,10 @@
 
 using Lines = std::vector<std::string>;
 
-TEST(SilentCompiler, aFailureWithoutAReasonIsLoggedAsShortAsItIs) {
+TEST(SilentCompiler, logsAFailureOnlyIfTheDriverReportsAnInfoLog) {
     LogRecorder log;
     GlCompiler::succeeds = false;
-    for (const int length : {0, 1, 40}) {  // the last driver promises a text and gives none
+    for (const int length : {0, 1, 40}) {  // The driver reports a length and never writes a text.
         GlCompiler::logLength = length;
         EXPECT_EQ(zorloadShaderScript(GL_VERTEX_SHADER, ""), 0u);
         EXPECT_EQ(zorCreateShaderProgram(1, 2), 0u);

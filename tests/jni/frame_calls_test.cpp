@@ -1,4 +1,4 @@
-// Every GL call of a frame, counted by name: a call too many is paid in every frame on a phone.
+// Counts the GL calls and uploaded bytes of a frame, because every frame on a phone pays for an extra one.
 #include <gtest/gtest.h>
 
 #include <array>
@@ -19,13 +19,12 @@ constexpr int kMeshBytes = 2 * 12 * sizeof(float) + 6 * sizeof(short);
 constexpr int kQuadBytes = 4 * 4 * sizeof(short);
 constexpr int kGridBytes = (480 / 12) * (800 / 12) * 4;
 
-// What a frame calls and hands over: the water alone, with ink that is carried, and with ink that is added as well.
 struct Use {
     int calls, bytes;
 };
-constexpr Use kWater = {65, kMeshBytes};
-constexpr Use kCarried = {116, kMeshBytes + kQuadBytes + kGridBytes};
-constexpr Use kAdded = {157, kMeshBytes + 2 * kQuadBytes + kGridBytes};
+constexpr Use kWater = {65, kMeshBytes};                                    // without ink
+constexpr Use kAdvected = {116, kMeshBytes + kQuadBytes + kGridBytes};      // with ink advection
+constexpr Use kInjected = {157, kMeshBytes + 2 * kQuadBytes + kGridBytes};  // with advection and injection
 
 class FrameCalls : public testing::Test {
 protected:
@@ -53,29 +52,29 @@ protected:
 
 }  // namespace
 
-TEST_F(FrameCalls, areThoseOfTheTable) {
+TEST_F(FrameCalls, matchTheTable) {
     start(false);
     expectFrame(kWater);
     start(true);
-    expectFrame(kCarried);
+    expectFrame(kAdvected);
     touch(3, 400, kActionDown, 1.0f);
-    for (int i = 0; i < 13; ++i) expectFrame(kCarried);
-    // A tap inside the margin adds ink in its first ten frames.
+    for (int i = 0; i < 13; ++i) expectFrame(kAdvected);
+    // A tap inside the margin injects ink in its first ten frames.
     touch(240, 400, kActionDown, 1.0f);
-    for (int i = 0; i < 13; ++i) expectFrame(i < sim_step ? kAdded : kCarried);
-    // A fast drag pushes the flow without the GPU.
+    for (int i = 0; i < 13; ++i) expectFrame(i < sim_step ? kInjected : kAdvected);
+    // Perturb, which a fast drag calls, runs on the CPU only.
     touch(100, 400, kActionDown, 1.0f);
     for (int i = 1; i <= 6; ++i) {
         touch(100 + 30 * i, 400, kActionMove, 1.0f);
-        expectFrame(kAdded);
+        expectFrame(kInjected);
     }
     EXPECT_EQ(fluid.DragMode, kFastDrag);
-    // Narrower than a cell: the flow's texture has no texels, and is specified all the same.
+    // In a view narrower than a cell, the velocity texture has no texels and is still specified.
     start(true, 11);
-    expectFrame({kCarried.calls, kMeshBytes + kQuadBytes});
+    expectFrame({kAdvected.calls, kMeshBytes + kQuadBytes});
 }
 
-TEST_F(FrameCalls, deleteObjectsOfEqualNamesAndOtherKinds) {
+TEST_F(FrameCalls, deleteEqualNamesOfDifferentKinds) {
     GLuint shader = 7, program = 7, buffer = 7, stale = 7;
     const GlObject objects[] = {
         {kQuadBuffer, GlKind::shader, &shader},
@@ -85,11 +84,11 @@ TEST_F(FrameCalls, deleteObjectsOfEqualNamesAndOtherKinds) {
     takeGlUse();
     deleteGroup(objects, kQuadBuffer);
     EXPECT_EQ(takeGlUse().calls, (std::map<std::string, int>{{"glDeleteShader", 1}, {"glDeleteProgram", 1}}))
-        << "but not what two members name, of which one is stale";
+        << "a buffer name that two members have is not deleted";
     EXPECT_EQ((std::array{shader, program, buffer, stale}), (std::array<GLuint, 4>{0, 0, 0, 7}));
 }
 
-TEST_F(FrameCalls, ofALateFrameDrawTheWaterOnce) {
+TEST_F(FrameCalls, lateFrameDrawsTheWaterOnce) {
     WaterHost host(Look{}, 480, 800, 1);
     host.setUp(true);
     host.touch(TouchAction::down, 240, 400, 1.0f);

@@ -12,13 +12,12 @@
 
 namespace {
 
-// What apps hand over.
 static_assert(kActionDown == 0 && kActionUp == 1 && kActionMove == 2 && kActionCancel == 3);
 constexpr int kOther = 9;
 
-// One event, and what it leaves behind.
+// A touch event and the expected state after it.
 struct Row {
-    int addSteps = 0;  // frames that the ink step counted before the event
+    int addSteps = 0;  // frames between the previous event and this one
     int x = 50, y = 50, action = kActionDown;
     int state = kIdle, step = 0, dragStep = 0, speed = kTap;
     float shown = 1.0f;
@@ -30,9 +29,9 @@ struct Gesture {
 };
 
 const Gesture kGestures[] = {
-    {"nothing begins but with a touch-down",
+    {"only a touch-down starts a gesture",
      {{.action = kActionUp}, {.action = kActionMove}, {.action = kOther}, {.action = kActionCancel, .shown = 0}}},
-    {"a tap keeps its finger within two pixels",
+    {"a movement of two pixels stays a tap",
      {{.action = kActionDown, .state = kTapping},
       {.addSteps = 3, .x = 52, .action = kActionMove, .state = kTapping, .step = 3},
       {.action = kActionMove, .state = kTapping, .step = 3},
@@ -40,7 +39,7 @@ const Gesture kGestures[] = {
       {.action = kActionUp, .state = kTapping, .step = 3},
       {.x = 60, .action = kActionDown, .state = kTapping, .step = 1},
       {.x = 90, .action = kActionCancel, .shown = 0}}},
-    {"a longer way makes it a drag, which has a speed",
+    {"a longer movement starts a drag with a speed class",
      {{.action = kActionDown, .state = kTapping},
       {.x = 52, .y = 52, .action = kActionMove, .state = kDragging},
       {.addSteps = 4, .x = 54, .y = 52, .action = kActionMove, .state = kDragging, .dragStep = 4, .speed = kSlowDrag},
@@ -50,17 +49,17 @@ const Gesture kGestures[] = {
       {.x = 67, .y = 63, .action = kActionDown, .state = kDragging, .dragStep = 4, .speed = kSlowDrag},
       {.x = 80, .y = 63, .action = kOther, .state = kDragging, .dragStep = 4, .speed = kFastDrag},
       {.x = 81, .y = 63, .action = kActionCancel, .dragStep = 4, .speed = kSlowDrag, .shown = 0}}},
-    {"so does any movement once its time is over",
+    {"after 12 frames any movement starts a drag",
      {{.action = kActionDown, .state = kTapping},
       {.addSteps = 11, .action = kActionMove, .state = kTapping, .step = 11},
       {.addSteps = 1, .action = kActionMove, .state = kDragging, .step = 12},
       {.action = kActionUp, .speed = kSlowDrag}}},
-    {"a drag of nine frames goes on as the tap that it was, and the next one counts anew",
+    {"a drag of nine frames returns to the tap, and the next drag counts from 0",
      {{.action = kActionDown, .state = kTapping},
       {.addSteps = 3, .x = 59, .action = kActionMove, .state = kDragging, .step = 3},
       {.addSteps = 9, .x = 59, .action = kActionUp, .state = kTapping, .step = 3, .dragStep = 9, .speed = kSlowDrag},
       {.action = kActionMove, .state = kDragging, .step = 3, .speed = kSlowDrag}}},
-    {"a longer one ends",
+    {"a drag of ten frames ends",
      {{.action = kActionDown, .state = kTapping},
       {.addSteps = 3, .x = 59, .action = kActionMove, .state = kDragging, .step = 3},
       {.addSteps = 10, .x = 59, .action = kActionUp, .speed = kSlowDrag}}},
@@ -88,7 +87,7 @@ TEST(Gesture, followsItsTransitionTable) {
     }
 }
 
-TEST(Gesture, theReleaseOfADragLeavesTheInkToFade) {
+TEST(Gesture, endOfADragLetsTheInkFade) {
     resetGestures();
     state = kDragging;
     drag_step = 10;
@@ -99,7 +98,7 @@ TEST(Gesture, theReleaseOfADragLeavesTheInkToFade) {
         (std::array{0.0f, 0.9f, 0.9f}));
 }
 
-TEST(Gesture, measuresMovementsAndStartsSegmentsOnlyInsideAGesture) {
+TEST(Gesture, measuresMovementOnlyDuringAGesture) {
     using Values = std::array<int, 7>;
     const auto after = [](int x, int y, int action) {
         touch(x, y, action, 1.0f);
@@ -107,17 +106,17 @@ TEST(Gesture, measuresMovementsAndStartsSegmentsOnlyInsideAGesture) {
     };
     resetGestures();
     count = 7;
-    EXPECT_EQ(after(50, 60, kActionDown), (Values{0, 0, 50, 60, 50, 60, 0})) << "the way to a touch-down is none";
+    EXPECT_EQ(after(50, 60, kActionDown), (Values{0, 0, 50, 60, 50, 60, 0})) << "a touch-down is no movement";
     count = 7;
-    EXPECT_EQ(after(57, 40, kActionMove), (Values{7, -20, 50, 60, 50, 60, 7})) << "the frame moves the segment";
+    EXPECT_EQ(after(57, 40, kActionMove), (Values{7, -20, 50, 60, 50, 60, 7})) << "only a frame moves the segment";
     EXPECT_EQ(after(58, 42, kActionCancel), (Values{1, 2, 50, 60, 50, 60, 7}));
     EXPECT_EQ(after(9, 9, kActionMove), (Values{1, 2, 50, 60, 50, 60, 7})) << "without a gesture";
     EXPECT_EQ(after(20, 30, kActionDown), (Values{1, 2, 20, 30, 20, 30, 0}));
-    EXPECT_EQ(after(25, 35, kActionDown), (Values{1, 2, 25, 35, 25, 35, 0})) << "starts anew";
+    EXPECT_EQ(after(25, 35, kActionDown), (Values{1, 2, 25, 35, 25, 35, 0})) << "a second touch-down restarts the tap";
     EXPECT_EQ(after(60, 9, kActionCancel), (Values{1, 2, 25, 35, 25, 35, 0})) << "a cancelled tap";
 }
 
-TEST(Gesture, weighsThePressureAndTakesAnyValue) {
+TEST(Gesture, weighsPressureAndAcceptsAnyValue) {
     const float inf = std::numeric_limits<float>::infinity();
     const auto weightOf = [](float pressure) {
         resetGestures();
@@ -125,7 +124,7 @@ TEST(Gesture, weighsThePressureAndTakesAnyValue) {
         return TouchPressure;
     };
     EXPECT_FLOAT_EQ(weightOf(1.0f), 1.2f);
-    // The sum is rounded once, from the single-precision 0.2 widened; these two tell it from a double 0.2.
+    // The sum is computed in double precision from 0.2f; a double 0.2 would give other results for these two.
     EXPECT_EQ(weightOf(0.1f), static_cast<float>(double{0.1f} * double{0.1f} + double{0.2f}));
     EXPECT_EQ(weightOf(0.0001f), std::nextafter(0.2f, 1.0f));
     for (const float none : {0.0f, -1.0f, -inf, std::nanf("")}) EXPECT_EQ(weightOf(none), 0.0f);

@@ -13,10 +13,9 @@ namespace {
 
 constexpr int kLast = std::numeric_limits<int>::max();
 
-// What a gesture writes: mode, radius, ink, source strength and radius, and what is left of flow and ink each frame.
 using Preset = std::array<float, 7>;
 
-Preset written() {
+Preset currentPreset() {
     return {
         static_cast<float>(fluid.DragMode),
         fluid.Radius,
@@ -40,8 +39,8 @@ protected:
         srand48(3);
     }
 
-    // The densest ink, 255 steps a unit.
-    static int densest() {
+    // Returns the maximum density in units of 1 / 255.
+    static int maxDensity() {
         glBindFramebuffer(GL_FRAMEBUFFER, fluid.Density.Ping.FboHandle);
         int most = 0;
         for (const Rgba& texel : readPixels(fluid.InkWidth, fluid.InkHeight)) {
@@ -54,7 +53,7 @@ protected:
 
 }  // namespace
 
-TEST_F(InkFrame, aTapGrowsForTenFramesAndEndsAfterThirteen) {
+TEST_F(InkFrame, tapGrowsForTenFramesAndEndsAfterThirteen) {
     touch(240, 400, kActionDown, 1.0f);
     for (int i = 0; i <= 12; ++i) {
         SCOPED_TRACE(i);
@@ -68,47 +67,48 @@ TEST_F(InkFrame, aTapGrowsForTenFramesAndEndsAfterThirteen) {
         glGetUniformfv(
             fluid.advect_density_program, glGetUniformLocation(fluid.advect_density_program, "BackwardStepSize"),
             &uploaded);
-        EXPECT_EQ(uploaded, backward) << "the update works with what the last frame left";
+        EXPECT_EQ(uploaded, backward) << "the update uses the parameters of the previous frame";
         EXPECT_EQ(fluid.TimeStep, 0.25f);
         const auto frame = static_cast<float>(i);
-        EXPECT_EQ(written(), (Preset{-1, 8 * frame, 200, i < 5 ? 12 * frame : 0, 40, 0.94f, 0.92f}));
+        EXPECT_EQ(currentPreset(), (Preset{-1, 8 * frame, 200, i < 5 ? 12 * frame : 0, 40, 0.94f, 0.92f}));
         EXPECT_EQ(fluid.BackwardStepSize, i < 10 ? 0.1f * frame : 1.0f);
         EXPECT_EQ(fluid.Density.Ping.TextureHandle == ping, i < 10) << "an injection swaps once more";
-        EXPECT_EQ(densest() > 0, i > 0) << "a radius of 0 adds nothing";
+        EXPECT_EQ(maxDensity() > 0, i > 0) << "a radius of 0 adds nothing";
     }
     EXPECT_EQ((std::array{state, step, count}), (std::array{0, 0, 13}));
     EXPECT_EQ(fluid.InkColor.r, static_cast<float>(0.05));
     EXPECT_EQ(fluid.InkColor.b, static_cast<float>(double{0.2f} + 0.05));
     EXPECT_EQ(std::pair(fluid.InkIntensity, fluid.InkColorOffset), std::pair(0.02f, 0.7f));
     frames(200);
-    // 0.92 of six 255ths or less rounds to itself; the picture's 8 bits show less than a hundredth of a level of that.
-    EXPECT_LE(densest(), 6) << "and the blot fades away";
+    // 0.92 * 6 / 255 rounds to 6 / 255, so the decay stops there, where the ink is invisible in 8 bits.
+    EXPECT_LE(maxDensity(), 6) << "the ink fades";
     EXPECT_EQ(fluid.Radius, 96.0f) << "presets stay until the next gesture";
 }
 
-TEST_F(InkFrame, aTapUnderAMovingFingerLastsAsLongAsItMoves) {
+TEST_F(InkFrame, tapLastsWhileItsFingerMoves) {
     touch(240, 400, kActionDown, 1.0f);
     touch(241, 401, kActionMove, 1.0f);
     frames(20);
     EXPECT_EQ(std::pair(state, step), std::pair(+kTapping, 20));
-    EXPECT_EQ(std::pair(fluid.Previous.x, fluid.Previous.y), std::pair(240.0f, 400.0f)) << "its last movement";
+    EXPECT_EQ(std::pair(fluid.Previous.x, fluid.Previous.y), std::pair(240.0f, 400.0f))
+        << "a segment of the last movement";
     EXPECT_EQ(std::pair(fluid.Current.x, fluid.Current.y), std::pair(241.0f, 399.0f));
     step = kLast - 2;
     count = kLast - 1;
     frames(5);
-    EXPECT_EQ(std::pair(state, step), std::pair(+kTapping, kLast)) << "held for years, it stops counting";
-    EXPECT_EQ(count, -kLast + 2) << "and the frames since the touch-down begin again";
+    EXPECT_EQ(std::pair(state, step), std::pair(+kTapping, kLast)) << "step saturates";
+    EXPECT_EQ(count, -kLast + 2) << "count wraps";
     touch(241, 401, kActionUp, 1.0f);
     frames(1);
     EXPECT_EQ(std::pair(state, step), std::pair(+kIdle, 0));
 }
 
-TEST_F(InkFrame, dragsWriteThePresetOfTheirSpeed) {
+TEST_F(InkFrame, dragsApplyThePresetOfTheirSpeed) {
     touch(100, 400, kActionDown, 0.5f);
     touch(103, 400, kActionMove, 0.5f);
-    const Preset before = written();
+    const Preset before = currentPreset();
     frames(1);
-    EXPECT_EQ(written(), before) << "until the first measured movement";
+    EXPECT_EQ(currentPreset(), before) << "until the first measured movement";
     const float weight = 0.45f;
     int x = 103, y = 400;
     for (const auto& [way, preset] :
@@ -121,10 +121,10 @@ TEST_F(InkFrame, dragsWriteThePresetOfTheirSpeed) {
         touch(x += way, ++y, kActionMove, 0.5f);
         const vec2* const velocity = fluid.VelocityTex.data;
         frames(1);
-        EXPECT_EQ(written(), preset);
+        EXPECT_EQ(currentPreset(), preset);
         const auto [from, to] = std::pair(fluid.Previous, fluid.Current);
         EXPECT_TRUE(std::ranges::equal(std::array{from.x, from.y, to.x, to.y}, segment)) << "segments join";
-        // Two swaps of the pair in Update; a push adds a third.
+        // Update swaps the pair twice, Perturb once more.
         EXPECT_EQ(fluid.VelocityTex.data != velocity, preset[0] == 2);
     }
     EXPECT_EQ(drag_step, 5);
@@ -133,8 +133,7 @@ TEST_F(InkFrame, dragsWriteThePresetOfTheirSpeed) {
     EXPECT_EQ(drag_step, kLast);
 }
 
-// The solver's floats overflow; a velocity that is not a number would stay in the flow.
-TEST_F(InkFrame, anEnormousPressureIsTakenAsItIsAndTheFlowStaysFinite) {
+TEST_F(InkFrame, hugePressureKeepsTheVelocityFinite) {
     for (const float pressure : {1e18f, std::numeric_limits<float>::infinity()}) {
         for (const int x : {240, 243, 244, 245}) touch(x, 400, x == 240 ? kActionDown : kActionMove, pressure);
         frames(3);
@@ -148,14 +147,14 @@ TEST_F(InkFrame, anEnormousPressureIsTakenAsItIsAndTheFlowStaysFinite) {
     }
 }
 
-TEST_F(InkFrame, clearedInkAndInkThatWasSwitchedOffComeBackWithTheNextTouch) {
+TEST_F(InkFrame, inkReturnsWithTheNextTouch) {
     touch(240, 400, kActionDown, 1.0f);
     frames(6);
-    EXPECT_GT(densest(), 0);
+    EXPECT_GT(maxDensity(), 0);
     native::clearInkValue(hostEnvironment(), nullptr);
     EXPECT_EQ(native::getClearInkValue(hostEnvironment(), nullptr), 0);
     frames(1);
-    EXPECT_EQ(densest(), 0);
+    EXPECT_EQ(maxDensity(), 0);
     EXPECT_EQ((std::array{state, step, fluid.DragMode}), (std::array{0, 0, 0}));
 
     touch(100, 400, kActionDown, 1.0f);
@@ -166,10 +165,10 @@ TEST_F(InkFrame, clearedInkAndInkThatWasSwitchedOffComeBackWithTheNextTouch) {
     Frame::setUp(480, 800, false);
     touch(160, 400, kActionMove, 1.0f);
     Frame::setUp(480, 800, true);
-    EXPECT_EQ(densest(), 0);
+    EXPECT_EQ(maxDensity(), 0);
     touch(180, 400, kActionMove, 1.0f);
     Frame().draw();
     EXPECT_NEAR(fluid.InkColor.r, 0.15f, 1e-6f);
-    EXPECT_GT(densest(), 0) << "the stroke goes on";
+    EXPECT_GT(maxDensity(), 0) << "the stroke continues";
     EXPECT_EQ(std::pair(fluid.Previous.x, fluid.Current.x), std::pair(140.0f, 180.0f));
 }

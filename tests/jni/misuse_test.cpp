@@ -1,5 +1,5 @@
-// What a host gets wrong must not take its app down. Any call with any value is tried by the fuzz target; here stands
-// what it cannot see.
+// A host's mistakes must not crash its app. The fuzz target tries any call with any value; these tests cover logging,
+// pending exceptions and the behaviour of a real driver.
 #include <algorithm>
 
 #include "jni/gesture.h"
@@ -39,18 +39,17 @@ protected:
 
 }  // namespace
 
-TEST_F(Misuse, nothingIsDrawnBeforeASetUpAndThatIsLoggedOnce) {
+TEST_F(Misuse, drawingBeforeSetUpIsSkippedAndLoggedOnce) {
     bWithInk = true;
     drag(100, 100);
-    native::onInitGPU(env, nullptr);  // half a set-up, whose ink has no texels
+    native::onInitGPU(env, nullptr);  // Without onInitSetting the ink has no texels.
     frame.draw();
     static int times = 0;
-    EXPECT_EQ(times += logged("E Ripple_Render() without the buffers of onInitSetting()"), 1)
-        << "in the process's life";
+    EXPECT_EQ(times += logged("E Ripple_Render() without the buffers of onInitSetting()"), 1) << "once per process";
     ignoreErrors();
 }
 
-TEST_F(Misuse, aMissingArrayMakesItsCallDoNothing) {
+TEST_F(Misuse, callWithAMissingArrayDoesNothing) {
     static int gets, getToFail;
     static JNINativeInterface_ functions = *env->functions;
     functions.GetFloatArrayElements = [](JNIEnv*, jfloatArray array, jboolean* isCopy) -> jfloat* {
@@ -70,30 +69,30 @@ TEST_F(Misuse, aMissingArrayMakesItsCallDoNothing) {
         Frame::draw(env, &frame.positions, nullptr, &frame.indices, &frame.mvp);
         Frame::draw(env, &frame.positions, &frame.heights, nullptr, &frame.mvp);
         Frame::draw(env, &frame.positions, &frame.heights, &frame.indices, nullptr);
-        // A virtual machine without memory for the second copy that it is asked for.
+        // The VM has no memory for the second copy.
         gets = 0;
         getToFail = 2;
         EXPECT_TRUE(move(&failing, &frame.velocity, &frame.height));
         EXPECT_EQ(gets, 2);
         gets = 0;
         frame.draw(&failing);
-        EXPECT_EQ(gets, 2) << "an exception is pending: no further array may be asked for";
+        EXPECT_EQ(gets, 2) << "no further array may be pinned while an exception is pending";
     }
-    EXPECT_EQ(pinnedCopies, 0) << "what was pinned is released";
+    EXPECT_EQ(pinnedCopies, 0) << "every pinned array is released";
     EXPECT_EQ(binding(GL_ELEMENT_ARRAY_BUFFER_BINDING), 0) << "nothing was drawn";
     EXPECT_EQ(frame.height.values, (std::vector<float>{1, 2, 3, 4}));
     EXPECT_EQ(frame.velocity.values, frame.height.values);
     EXPECT_EQ(frame.indices.values, std::vector<short>(6));
-    EXPECT_EQ(count, 10) << "the ink is stepped all the same";
+    EXPECT_EQ(count, 10) << "the ink is still stepped";
     static std::vector<std::string> lines;
     std::ranges::copy(log.take(), std::back_inserter(lines));
     const std::vector<std::string> expected = {
         "E initWaters() without an array", "E move() without an array", "E ripple() without an array",
         "E onDrawFrame() without an array"};
-    EXPECT_EQ(lines, expected) << "each once in the life of the process";
+    EXPECT_EQ(lines, expected) << "each once per process";
 }
 
-TEST_F(Misuse, arraysOfWhichNothingIsUsedAndAProgramThatFailedStopNoDraw) {
+TEST_F(Misuse, unusedNullArraysAndAFailedProgramDoNotPreventADraw) {
     Frame::setUp(kSide, kSide, true);
     Frame::draw(env, nullptr, nullptr, nullptr, &frame.mvp, 0);
     EXPECT_EQ(binding(GL_ELEMENT_ARRAY_BUFFER_BINDING), static_cast<int>(fluid.i_buf));
@@ -105,23 +104,23 @@ TEST_F(Misuse, arraysOfWhichNothingIsUsedAndAProgramThatFailedStopNoDraw) {
     ignoreErrors();
 }
 
-// On the real driver, which crashes where it trusts its caller. A good set-up recovers from all of it.
-TEST_F(Misuse, anyViewAndAnyOrderOfSetUpIsSurvived) {
+// Runs on a real driver, which may crash on invalid calls. A valid set-up recovers from all of them.
+TEST_F(Misuse, anyViewAndSetUpOrderIsSafe) {
     for (const auto& [width, height] :
          {std::pair(0, 0), {1, 1}, {11, 4000}, {0, 64}, {-5, 64}, {-7, -100}, {16384, 16384}}) {
         Frame::setUp(width, height, true);
         drag(width / 2, height / 2);
     }
-    // More texels than any machine has memory for; and a grid longer than floats can count.
+    // A grid that no machine has memory for, and one with columns beyond the exact integers of a float.
     for (const auto& [width, height, grid] :
          {std::tuple(2000000000, 2000000000, "166666666 x 166666666"), {2147483647, 12, "178956970 x 1"}}) {
         log.take();
         Frame::setUp(width, height, true);
         EXPECT_EQ(logged(std::string("E no memory for an ink grid of ") + grid), 1);
         drag(1000000, 6);
-        EXPECT_TRUE(log.take().empty()) << "the water goes on";
+        EXPECT_TRUE(log.take().empty()) << "the water is still drawn";
     }
-    // The set-up stops half-way, in the other mode, or starts at its end, and no picture was handed over.
+    // Incomplete set-ups, in the other mode or in the wrong order, without pictures.
     native::onLoadWaterTextures(env, nullptr);
     native::onInitSetting(env, nullptr, 200, 100, true);
     drag(200, 100);
@@ -137,5 +136,5 @@ TEST_F(Misuse, anyViewAndAnyOrderOfSetUpIsSurvived) {
     const GLuint ping = fluid.Density.Ping.TextureHandle;
     touch(240, 400, kActionDown, 1.0f);
     frame.draw();
-    EXPECT_EQ(fluid.Density.Ping.TextureHandle, ping) << "carried, and added to";
+    EXPECT_EQ(fluid.Density.Ping.TextureHandle, ping) << "advection and injection each swap the pair";
 }

@@ -8,8 +8,7 @@
 #include "tests/support/frame.h"
 #include "tests/support/log_recorder.h"
 
-// A slot as it is after bitmaps that fail in every way, each of a size of its own.
-TEST(Natives, copyABitmapAndKeepItsPixelsWhenTheNextOneFails) {
+TEST(Natives, copyBitmapsAndKeepTheirPixelsOnFailure) {
     struct Slot {
         void (*transfer)(JNIEnv*, jobject, jobject);
         AndroidBitmapInfo& info;
@@ -32,7 +31,7 @@ TEST(Natives, copyABitmapAndKeepItsPixelsWhenTheNextOneFails) {
             slot.transfer(copyingEnvironment(), nullptr, &bitmap);
             EXPECT_EQ(bitmap.locks, 0);
             EXPECT_EQ(std::pair(slot.info.width, slot.info.height), std::pair(width, height));
-            std::ranges::fill(pixels, std::uint8_t{0});  // recycled at once
+            std::ranges::fill(pixels, std::uint8_t{0});  // The host recycles the bitmap.
         };
         const auto holds = [&slot](int count, int zeros) {
             int right = 0;
@@ -40,19 +39,19 @@ TEST(Natives, copyABitmapAndKeepItsPixelsWhenTheNextOneFails) {
             return right == count + zeros;
         };
         handOver(4, 2, false);
-        EXPECT_EQ(slot.kept, nullptr) << "nothing was ever locked";
+        EXPECT_EQ(slot.kept, nullptr) << "no bitmap was ever locked";
         handOver(2, 3, true);
-        EXPECT_TRUE(holds(2 * 3 * 4, 0)) << "whatever the stride says";
+        EXPECT_TRUE(holds(2 * 3 * 4, 0)) << "the stride is ignored";
         handOver(1, 3, false);
         handOver(4, 3, false);
-        EXPECT_TRUE(holds(2 * 3 * 4, 2 * 3 * 4)) << "grown by zeros";
+        EXPECT_TRUE(holds(2 * 3 * 4, 2 * 3 * 4)) << "the new size is filled with zeros";
         handOver(4, 4, true, 8, ANDROID_BITMAP_FORMAT_RGB_565);
-        EXPECT_TRUE(holds(4 * 4 * 2, 4 * 4 * 2)) << "half as long as it should be";
+        EXPECT_TRUE(holds(4 * 4 * 2, 4 * 4 * 2)) << "a 16-bit bitmap is read to its end, then zeros follow";
         const std::uint8_t* const before = slot.kept;
         slot.transfer(copyingEnvironment(), nullptr, nullptr);
         EXPECT_EQ(slot.kept, before);
         handOver(1u << 31, 1u << 31, false);
-        EXPECT_EQ(slot.kept, nullptr) << "no memory has as much";
+        EXPECT_EQ(slot.kept, nullptr) << "no allocation can be that large";
         const std::string lock = "E AndroidBitmap_lockPixels () failed! error = -3";
         const std::vector<std::string> lines = {lock, lock,
                                                 lock, "E AndroidBitmap_getInfo () failed! error = -1",
@@ -61,8 +60,8 @@ TEST(Natives, copyABitmapAndKeepItsPixelsWhenTheNextOneFails) {
     }
 }
 
-// A virtual machine may have no address for an array without elements.
-TEST(Natives, fillWhatHasElementsBesideWhatHasNone) {
+// A VM may return null for an empty array; the other array is still filled.
+TEST(Natives, fillOneArrayIfTheOtherIsEmpty) {
     JNINativeInterface_ functions = *copyingEnvironment()->functions;
     JNIEnv sparing = {&functions};
     FloatArray none(0), one(3);

@@ -1,4 +1,4 @@
-// The native methods of a frame, over the arrays of one square cell.
+// Calls the native methods of a frame with the arrays of a mesh of one cell.
 #pragma once
 
 #include "host/native_names.h"

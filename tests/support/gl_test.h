@@ -1,4 +1,5 @@
-// A test with a fresh OpenGL ES 2.0 context of Mesa's software driver, and no GL error at its end.
+// A test fixture with a new OpenGL ES 2.0 context of Mesa's software driver. Fails on a GL error that is left at the
+// end.
 #pragma once
 
 #include <GLES2/gl2.h>
@@ -23,17 +24,17 @@ protected:
     void SetUp() override { renewContext(); }
     void TearDown() override { loseContext(); }
 
-    // Loses everything that the last context held.
+    // Replaces the context; the objects of the previous one are lost.
     void renewContext(int width = kSide, int height = kSide) {
         loseContext();
-        // An OpenGL ES 2.0 driver, so that the use of anything newer shows.
+        // Mesa would otherwise create a newer context, which accepts more.
         setenv("MESA_GLES_VERSION_OVERRIDE", "2.0", 1);
         std::string error;
         context_ = HeadlessContext::create(width, height, error);
         ASSERT_TRUE(context_) << error;
     }
 
-    // Rows from the bottom.
+    // Returns rows from the bottom.
     static std::vector<Rgba> readPixels(int width = kSide, int height = kSide) {
         std::vector<Rgba> pixels(static_cast<std::size_t>(width) * static_cast<std::size_t>(height));
         glReadPixels(0, 0, width, height, GL_RGBA, GL_UNSIGNED_BYTE, pixels.data());
@@ -64,6 +65,6 @@ private:
     }
 
     std::unique_ptr<HeadlessContext> context_;
-    // A context with programs was lost: the next set-up deletes names that the new one does not know.
+    // True after losing a context with programs: the next set-up deletes names that the new context does not have.
     bool staleNames_ = false;
 };

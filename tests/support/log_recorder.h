@@ -1,4 +1,4 @@
-// Records what the library logs while it lives, as "I text" and "E text".
+// Records the log lines during its lifetime, as "I text" and "E text".
 #pragma once
 
 #include <android/log.h>
@@ -17,7 +17,7 @@ public:
     }
     ~LogRecorder() { __android_log_set_logger(__android_log_stderr_logger); }
 
-    // What was logged since the last call.
+    // Returns the lines since the last call.
     std::vector<std::string> take() { return std::exchange(lines, {}); }
 
 private:

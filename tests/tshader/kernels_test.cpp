@@ -16,7 +16,8 @@ std::span<const float> floats(const std::vector<T>& texels) {
     return {reinterpret_cast<const float*>(texels.data()), texels.size() * sizeof(T) / sizeof(float)};
 }
 
-// Not merely close: four texels at once add in the order of one. A texel that a pass misses stays no number.
+// Expects exact equality, because four lanes add in the same order as one. NaN equals nothing, so a texel that a pass
+// does not write fails.
 template <class T>
 void expectSame(const char* what, const std::vector<T>& actual, const std::vector<T>& expected) {
     EXPECT_TRUE(std::ranges::equal(floats(actual), floats(expected))) << what;
@@ -30,7 +31,7 @@ void setSegment(AddVelocityTShaderImpl& push, vec2 from, vec2 to) {
     push.normal = (to - from) / push.len;
 }
 
-// A grid whose every pass has work to do around the touch, and whose outputs are no numbers yet.
+// A grid in which every pass has an effect around the touch. The outputs are initialized with NaN.
 struct Scene : InkGrid {
     Scene(int columns, int rows, int drag, vec2 touch, vec2 from, vec2 to) : InkGrid(12 * columns, 12 * rows) {
         for (auto* const texels : {&advected, &projected, &pushed}) std::ranges::fill(*texels, Vec2(kNan));
@@ -46,7 +47,7 @@ struct Scene : InkGrid {
 template <class Kernel, class T>
 void expectSameFragments(Kernel& kernel, const std::vector<T>& texels, int border = 0) {
     const std::vector<T> rows = texels;
-    // A pass lays the touch over the texels' corners, a fragment over their centres.
+    // run measures the distance to the touch from a texel's corner, shaderMain from its centre.
     if constexpr (requires { kernel.center; }) kernel.center = kernel.center + 0.5f * kernel.Scale;
     for (int j = border; j < kernel.output.height - border; ++j) {
         for (int i = border; i < kernel.output.width - border; ++i) {
@@ -64,8 +65,8 @@ void expectSameFragments(Kernel& kernel, const std::vector<T>& texels, int borde
 
 }  // namespace
 
-// On whole pixels, many a texel lies exactly at the reach of the touch or of the segment.
-TEST(Kernels, doWhatThePlainLoopsDoAtEverySizeAndTouch) {
+// Touches at integer pixels put many texels exactly at the radius of the touch or of the segment.
+TEST(Kernels, matchThePlainLoops) {
     std::mt19937 random(4);
     const auto pixel = [&random] { return static_cast<float>(static_cast<int>(random() % 300) - 80); };
     for (const int width : {1, 2, 3, 4, 5, 6, 7, 9, 13, 90, 91}) {
@@ -74,12 +75,12 @@ TEST(Kernels, doWhatThePlainLoopsDoAtEverySizeAndTouch) {
                 SCOPED_TRACE(testing::Message() << width << " x " << height << ", drag " << drag);
                 const vec2 touch = {pixel(), pixel()}, from = {pixel(), pixel()};
                 vec2 to = {pixel(), pixel()};
-                if (drag == 0) to.x = from.x;  // the push reaches farthest along an axis
+                if (drag == 0) to.x = from.x;  // Axis-parallel segments affect the most texels.
                 if (drag == 1) to.y = from.y;
                 if (width == 5) to = from;
                 Scene actual(width, height, drag, touch, from, to);
                 Scene expected(width, height, drag, touch, from, to);
-                // Trace back along anything, and sample numbers.
+                // The back-trace uses extreme velocities; the sampled values are finite.
                 std::vector<vec2> wild = actual.velocity;
                 const float wildest[] = {kNan, kInfinity, -kInfinity, 3e38f, -3e38f, 1e9f, -1e9f};
                 for (std::size_t i = 0; i < wild.size(); i += 3) wild[i] = {wildest[i % 7], wildest[i / 3 % 7]};
@@ -99,7 +100,7 @@ TEST(Kernels, doWhatThePlainLoopsDoAtEverySizeAndTouch) {
     }
 }
 
-TEST(Kernels, canBePlacedAndDoNothingWithoutTexels) {
+TEST(Kernels, supportPlacementNewAndEmptyGrids) {
     alignas(JacobiTShaderImpl) unsigned char place[sizeof(JacobiTShaderImpl)];
     auto* const placed = new (place) JacobiTShaderImpl;
     placed->run();
@@ -109,7 +110,7 @@ TEST(Kernels, canBePlacedAndDoNothingWithoutTexels) {
     InkGrid(36, 0).wholeFrame(kLibrary);
 }
 
-TEST(Kernels, shaderMainReadsTheSameTexelsAsRun) {
+TEST(Kernels, shaderMainMatchesRun) {
     Scene scene(23, 17, 2, {40.0f, 30.0f}, {15.0f, -10.0f}, {140.0f, 130.0f});
     scene.wholeFrame(kLibrary);
     expectSameFragments(scene.advect, scene.advected);

@@ -15,11 +15,11 @@ TEST(Vectors, roundAndCompareLikeTheShaders) {
     EXPECT_FALSE(isLE(Vec4(0.0f, 0.0f, 0.0f, kNan), 1.0f) || isGT(Vec4(kNan, 2.0f, 2.0f, 2.0f), 1.0f));
 }
 
-TEST(Samplers, spanTheTextureAndNeverLeaveIt) {
+TEST(Samplers, coverTheTextureAndNeverReadOutside) {
     std::vector<float> texels(13, 1.0f);
     texels.front() = 0.0f;
     texels[11] = 5.0f;
-    texels.back() = kNan;  // which no weight hides
+    texels.back() = kNan;  // Outside the texture; reading it gives NaN even with a weight of 0.
     const Texture<float> t = {texels.data(), 4, 3};
     for (const float x : {kNan, -1e30f, 0.0f, 0.4f, 1.0f, 3e38f}) {
         const bool first = !(x > 0.0f), last = x >= 1.0f;
@@ -27,7 +27,7 @@ TEST(Samplers, spanTheTextureAndNeverLeaveIt) {
         EXPECT_EQ(texture2D(t, Vec2(x, x)), corner) << x;
         EXPECT_NEAR(texture2DLinear(t, Vec2(x, x)), corner, 1e-6f) << x;
     }
-    // The second texel's centre lies a third of the way from the first one's to the last one's.
+    // The second texel's centre is at 1/3.
     EXPECT_FLOAT_EQ(texture2DLinear(t, Vec2(0.5f / 3.0f, 0.0f)), 0.5f);
     EXPECT_EQ(texture2D(t, Vec2(0.49f / 3.0f, 0.0f)), 0.0f);
     for (const Texture<float>& empty : {Texture<float>{}, {texels.data(), 0, 3}, {texels.data(), 3, 0}}) {

@@ -8,11 +8,11 @@
 
 #include "reference/kernel_set.h"
 
-TEST(VelocityPacking, givesTheBytesOfDoublePrecision) {
+TEST(VelocityPacking, matchesDoublePrecision) {
     const float infinity = std::numeric_limits<float>::infinity();
     std::vector<vec2> velocity = {
         {std::nanf(""), 1e-40f}, {infinity, -infinity}, {300.0f, -300.0f}, {0.0f, -0.0f}, {std::nanf(""), -1.5f}};
-    // Around every step of the fraction byte, whole numbers among them: there a byte could tip over.
+    // Values next to every step of the fraction byte, where rounding could change a byte.
     for (int n = -300; n < 255 * 255; ++n) {
         float below = static_cast<float>(n) / 255.0f - 127.0f, above = below;
         for (int k = 0; k < 3; ++k) {

@@ -20,7 +20,7 @@ TEST(Mesh, positionsRunColumnByColumnFromTheTopLeftCorner) {
     EXPECT_EQ(p[6], 77.0f) << "only vertexCount vertices are written";
 }
 
-TEST(Mesh, indicesListTwoCounterClockwiseTrianglesACell) {
+TEST(Mesh, indicesListTwoCounterClockwiseTrianglesPerCell) {
     Indices i(24, 77);
     fillIndices(i.data(), 3, 3);
     EXPECT_EQ(i, (Indices{0, 1, 4, 0, 4, 3, 3, 4, 7, 3, 7, 6, 1, 2, 5, 1, 5, 4, 4, 5, 8, 4, 8, 7}));

@@ -27,7 +27,7 @@ Vec3 normalized(const Vec3& v) {
     return {v[0] / length, v[1] / length, v[2] / length};
 }
 
-// Stripes, each of which takes many texels of a picture.
+// A picture of wide stripes.
 struct Stripes {
     int width, height;
     double along, across;
@@ -57,8 +57,9 @@ constexpr Stripes kPortrait = {128, 64, 12, 5};
 constexpr Stripes kLandscape = {64, 128, -5, 14};
 constexpr Stripes kSurface = {32, 32, 5, 3};
 
-// Clip space is model space turned by a quarter: up becomes left. Every vertex meets the centre of a pixel, so that
-// nothing is interpolated: column c and row r of the mesh are row c, from the bottom, and column r of the view.
+// The transform rotates model space by 90 degrees counter-clockwise: up becomes left. Every vertex is at the centre of
+// a pixel, so no value is interpolated: the vertex in column c and row r is the pixel in row c from the bottom, column
+// r.
 constexpr float kLeft = 2.0f * (kView - 1) / kView / kHeight;
 constexpr float kUp = 2.0f * (kView - 1) / kView / kWidth;
 constexpr std::array<float, 16> kTransform = {0, kUp, 0, 0, -kLeft, 0, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1};
@@ -67,7 +68,7 @@ Vec3 transformed(double x, double y, double z) {
     return {-kLeft * y, kUp * x, z};
 }
 
-// What the shaders draw at a vertex at (x, y) with the height h and the neighbours' heights hx and hy.
+// Computes the shaders' colour of a vertex at (x, y); h holds its height and those of its neighbours in x and y.
 Vec3 colorAt(double x, double y, const float* h, const WaterLight& light, const Stripes& picture, double brightest) {
     double nx = (double{h[0]} - double{h[1]}) * 0.25;
     double ny = (double{h[0]} - double{h[2]}) * 0.25;
@@ -103,7 +104,7 @@ protected:
         GlTest::SetUp();
         fillPositions(positions.data(), kPixels, kWidth, kHeight, kView, kView);
         fillIndices(indices.data(), kView, kView);
-        // From flat to steep along the view, with no likeness between neighbours.
+        // Random heights; the slopes increase along the view.
         std::mt19937 random(1);
         std::uniform_real_distribution<float> height(-1.6f, 1.6f);
         for (std::size_t i = 0; i < kPixels; ++i) {
@@ -132,14 +133,14 @@ protected:
             light.exponent, withInk, landscape);
     }
 
-    // `divisor` is what the ink of a row of pixels divides a channel by.
+    // Compares the picture with colorAt, divided by divisor(row, channel).
     using Divisor = std::function<double(std::size_t row, std::size_t channel)>;
     void expectFormulas(
         bool landscape, const Divisor& divisor = [](auto...) { return 1.0; }) {
         draw(landscape);
         const std::vector<Rgba> pixels = readPixels(kView, kView);
-        // The driver filters pictures with weights of 8 bits, and computes mediump in half precision where it can. It
-        // may leave out what lies exactly on the mesh's edge.
+        // The tolerance covers 8-bit filter weights and half-precision mediump. The driver may omit pixels exactly on
+        // the mesh's edge.
         for (std::size_t c = 1; c < kView - 1; ++c) {
             for (std::size_t r = 1; r < kView - 1; ++r) {
                 const std::size_t i = c * kView + r;
@@ -164,15 +165,15 @@ protected:
 
 }  // namespace
 
-TEST_F(Renderer, everyVertexFollowsTheFormulas) {
+TEST_F(Renderer, pixelsMatchTheFormulas) {
     expectFormulas(false);
     expectFormulas(true);
     heights.assign(heights.size(), 0.0f);
     expectFormulas(false);
 }
 
-// Fractions alone in the density show whether they are read, a slope up the view whether it is the right way up.
-TEST_F(Renderer, inkDividesEachChannelByItsTintUnlessItIsHidden) {
+// The density's fraction byte detects a shader that ignores it; its vertical gradient detects a flipped texture.
+TEST_F(Renderer, visibleInkDividesEachChannel) {
     setUp(true);
     engine.InkColor = {0.2f, 0.45f, 0.8f};
     engine.InkColorOffset = 0.7f;
@@ -190,7 +191,7 @@ TEST_F(Renderer, inkDividesEachChannelByItsTintUnlessItIsHidden) {
     }
 }
 
-TEST_F(Renderer, leavesTheStatedStateBehind) {
+TEST_F(Renderer, leavesTheDocumentedState) {
     setUp(true);
     log.take();
     glViewport(0, 0, 3, 3);

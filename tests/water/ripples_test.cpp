@@ -9,7 +9,7 @@
 
 namespace {
 
-// Room around the field shows what is written beside it.
+// Elements before and after the field, which must not change.
 constexpr int kGuard = 40;
 
 struct Field {
@@ -21,9 +21,7 @@ struct Field {
 
 }  // namespace
 
-// For centres everywhere on fields of odd sizes: the cells 0, 1 and count - 1 of either axis and all that lies outside
-// stay as they are.
-TEST(Ripples, everyCentreAddsWhatThePlainLoopAdds) {
+TEST(Ripples, matchThePlainLoop) {
     for (const int countA : {3, 5, 7, 12, 17}) {
         for (const int countB : {1, 3, 6, 11}) {
             for (float a = -40.0f; a < 40.0f; a += 1.7f) {

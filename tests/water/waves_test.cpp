@@ -31,9 +31,9 @@ bool same(const std::vector<float>& a, const std::vector<float>& b) {
 
 }  // namespace
 
-// Exact, as grouped and single vertices add in the same order. The untouched rest is the guard. Rows of 20 and more
-// fill the stride, so that their ends are neighbours of each other.
-TEST(Waves, everyWidthAndOffsetTakesThePlainStep) {
+// Expects exact equality, because four lanes add in the same order as one; the arrays outside the region must not
+// change. Rows of 20 or more fill the stride, so the end of one row is the neighbour of the next.
+TEST(Waves, matchThePlainLoopAtEveryWidthAndOffset) {
     std::mt19937 random(1);
     std::uniform_real_distribution<float> height(-120.0f, 120.0f);
     const float wild[] = {kNan, kInfinity, -kInfinity};
@@ -61,8 +61,8 @@ TEST(Waves, everyWidthAndOffsetTakesThePlainStep) {
     }
 }
 
-// Every vertex of a row in turn, so that grouped and single ones are both asked.
-TEST(Waves, calmMeansEverySpeedWithinTheBandBothEndsIncluded) {
+// Tests every vertex of a row, because the first four are computed as a group and the rest one by one.
+TEST(Waves, calmIfEverySpeedIsWithinTheInclusiveBand) {
     for (int x = 1; x <= 7; ++x) {
         SCOPED_TRACE(x);
         const auto isCalm = [x](float speed, float other, bool check) {
@@ -74,8 +74,8 @@ TEST(Waves, calmMeansEverySpeedWithinTheBandBothEndsIncluded) {
         EXPECT_TRUE(isCalm(0.009f, -0.009f, true));
         EXPECT_FALSE(isCalm(std::nextafter(0.009f, 1.0f), 0.0f, true));
         EXPECT_FALSE(isCalm(0.0f, std::nextafter(-0.009f, -1.0f), true));
-        EXPECT_TRUE(isCalm(kNan, 0.0f, true)) << "a speed that is not a number counts as calm";
-        EXPECT_FALSE(isCalm(kNan, 1.0f, true)) << "and hides no moving one";
+        EXPECT_TRUE(isCalm(kNan, 0.0f, true)) << "NaN counts as calm";
+        EXPECT_FALSE(isCalm(kNan, 1.0f, true)) << "NaN does not hide a fast vertex";
         EXPECT_TRUE(isCalm(5.0f, 5.0f, false));
     }
     Surface moving;
@@ -86,8 +86,8 @@ TEST(Waves, calmMeansEverySpeedWithinTheBandBothEndsIncluded) {
     EXPECT_EQ(moving.v, before.v) << "an empty region changes nothing";
 }
 
-// The lowest standing wave of a fixed square turns at the speed that the wave equation gives it.
-TEST(Waves, aStandingWaveSwingsAtItsOwnFrequency) {
+// The lowest standing wave of a square with a fixed border has a known frequency.
+TEST(Waves, standingWaveHasTheAnalyticFrequency) {
     constexpr int n = 33;
     constexpr std::size_t middle = 16 * n + 16;
     std::vector<float> v(n * n), h(n * n);
@@ -95,7 +95,7 @@ TEST(Waves, aStandingWaveSwingsAtItsOwnFrequency) {
     for (int i = 0; i < n * n; ++i) {
         h[static_cast<std::size_t>(i)] = static_cast<float>(std::sin(k * (i % n)) * std::sin(k * (i / n)));
     }
-    // Semi-implicit steps: 2 - 2 cos(w) = speed * 8 sin^2(k / 2), lightly smoothed away in passing.
+    // Semi-implicit steps give 2 - 2 cos(w) = waveSpeed * 8 sin^2(k / 2); smoothing changes w only slightly.
     const double w = std::acos(1.0 - 0.2 * 4.0 * std::pow(std::sin(k / 2), 2));
     int crossing = 0;
     while (h[middle] > 0.0f && ++crossing < 1000) {

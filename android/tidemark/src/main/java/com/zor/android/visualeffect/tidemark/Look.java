@@ -7,8 +7,8 @@ import java.io.InputStream;
 import java.util.Properties;
 
 /**
- * How the water looks and moves. Each value has a range in which it looks well, and limits that a look must keep to.
- * Change the fields before you hand them on, or load them from a file that your app ships.
+ * Parameters of the water's appearance and motion. Each field has a recommended range and hard limits. Set the fields
+ * before you pass the object, or load them from a file in your app.
  *
  * <p>Generated from {@code host/look.properties}.
  */
@@ -161,20 +161,20 @@ public final class Look implements Cloneable {
      */
     public int framesToFade = 180;
 
-    /** Takes each value with its name and its limits, and gives back the one to go on with. */
+    /** Called for each field; returns its new value. */
     interface Values {
         double next(String name, double value, double least, double most, boolean isWhole);
     }
 
     /**
-     * Reads {@code key = number} lines, in the form of {@code java.util.Properties}. What they do not name keeps its
-     * default.
+     * Reads {@code key = number} lines in the format of {@code java.util.Properties}. Fields without a line keep their
+     * defaults.
      *
-     * @param text stays open
-     * @return a look of its own
-     * @throws IOException where the text cannot be read
-     * @throws IllegalArgumentException naming the key, when it is none of the fields above or when its value is not a
-     *     number of the field's type or beyond its limits
+     * @param text the lines; not closed
+     * @return a new look
+     * @throws IOException if the text cannot be read
+     * @throws IllegalArgumentException if a key is not a field, or its value is not a number of the field's type within
+     *     the limits; the message names the key
      */
     @NotNull
     public static Look load(@NotNull InputStream text) throws IOException {
@@ -186,9 +186,9 @@ public final class Look implements Cloneable {
     }
 
     /**
-     * The way back of {@link #load}.
+     * Converts the look to properties that {@link #load} can read.
      *
-     * @return all values, for {@code Properties.store} to write
+     * @return all fields
      */
     @NotNull
     public Properties toProperties() {
@@ -231,14 +231,14 @@ public final class Look implements Cloneable {
         framesToFade = (int) values.next("framesToFade", framesToFade, 0, 10000, true);
     }
 
-    /** The value itself, or an {@code IllegalArgumentException} where it is beyond its limits or no number. */
+    /** Returns the value; throws {@code IllegalArgumentException} if it is NaN or outside its limits. */
     static double checked(String name, double value, double least, double most, boolean isWhole) {
         if (value >= least && value <= most) return value;
         throw new IllegalArgumentException(
                 name + " must be " + (float) least + " to " + (float) most + ", not " + (float) value);
     }
 
-    /** A look of its own, so that later changes do not reach the other. */
+    /** Returns an independent copy. */
     @NotNull
     @Override
     public Look clone() {

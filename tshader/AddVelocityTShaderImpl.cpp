@@ -16,8 +16,8 @@ struct Range {
     int first, end;
 };
 
-// Returns the new velocity at p. It changes if the projection of p onto the segment is strictly between the ends. By
-// contract the push grows with the distance d: u + d * (0.1 * (p - foot) + 0.1 * (current - foot)).
+// Returns the new velocity at p. It changes if the projection of p onto the segment is strictly between the ends.
+// By contract the push grows with the distance d: u + d * (0.1 * (p - foot) + 0.1 * (current - foot)).
 template <class F>
 Pair<F> push(Pair<F> velocity, F px, F py, const Segment& segment) {
     const F t = segment.normal.x * (px - segment.previous.x) + segment.normal.y * (py - segment.previous.y);

@@ -94,8 +94,8 @@ lines = [
     "Medians of 21 repetitions in random order, with both compilers in turn and the baseline instruction set (no `-march`).",
     "",
     "*Scalar* is the same formula as a plain loop at `-O2` without automatic vectorization, *-O3* the same loop with it, and",
-    "*Eigen* the same formula as array expressions. A ratio says how many times as long the other form takes, or the first of",
-    "the two that are named. A bold ratio misses its goal. Sizes are vertices along a side of the water's mesh, and texels of",
+    "*Eigen* the same formula as array expressions. \"A against B\" is the time of B / the time of A for kernels, and A / B for",
+    "surfaces, ink and frames. A bold ratio misses its goal. Sizes are vertices per side of the water's mesh, and texels of",
     "the ink's grid.",
     "",
     "![Times faster than plain scalar loops](bench.svg)",
@@ -111,7 +111,7 @@ for what, limit, values, timed in rows:
 
 lines += [
     "",
-    "Whole frames of the host, with the vertices along a side of the mesh and the size of the view. CPU time is",
+    "Whole frames of the host, with the vertices per side of the mesh and the size of the view. The CPU time is",
     "measured with a GL that only counts its calls. The last column is a whole frame with the software driver",
     f"({next(iter(driver_runs.values()))['label']}), which also draws on the CPU.",
     "",
@@ -133,8 +133,8 @@ for name in frames:
 
 lines += [
     "",
-    "Growth: nanoseconds for each vertex or texel, with g++. Where the work grows linearly, a row stays level. The waves of a",
-    "whole frame live on a lattice of 128 a side, whatever the mesh, and of the mesh only what the view shows is computed.",
+    "Scaling: nanoseconds per vertex or texel, with g++. A row is constant if the time grows linearly. A whole frame computes",
+    "its waves on a lattice of 128 per side for any mesh, and only the visible part of the mesh.",
     "",
 ]
 lines += [f"| | {' | '.join(map(str, MESHES))} |", "|---|" + "---|" * len(MESHES)]

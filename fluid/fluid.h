@@ -74,7 +74,8 @@ public:
     // Returns whether the screen point, y down, is within BoundaryMargin pixels of an edge.
     bool isBoundary(int x, int y) const;
 
-    // Passes over the density, from `source` into `destination`. The caller swaps the pair and sets the viewport.
+    // Passes over the density, from `source` into `destination`. The caller swaps the pair. AdvectDensity uses the
+    // current viewport, AddInk sets the ink's.
     void AdvectDensity(Surface_ velocitySurface, Surface_ source, Surface_ destination, float dissipation);
     void AddInk(Surface_ source, Surface_ destination, int mode, Vector_ previous, Vector_ current, float impulse);
 

@@ -10,19 +10,6 @@ const here = dirname(fileURLToPath(import.meta.url));
 const root = join(here, '../..');
 const most = 90_000;  // bytes, compressed
 
-// The looks' numbers without what explains them.
-const properties = {
-    name: 'properties',
-    setup: ({ onLoad }) =>
-        onLoad({ filter: /look\.properties$/ }, ({ path }) => {
-            const entries = readFileSync(path, 'utf8').matchAll(/# range (\S+) to (\S+), limits .*\n(\w+) = (\S+)/g);
-            const keys = [...entries].map(([, min, max, name, value]) => ({
-                name, value: Number(value), min: Number(min), max: Number(max), whole: !value.includes('.'),
-            }));
-            return { loader: 'json', contents: JSON.stringify(keys) };
-        }),
-};
-
 rmSync(join(here, 'dist'), { recursive: true, force: true });
 mkdirSync(join(here, 'dist'));
 const module = join(here, 'dist/tidemark-water.js');
@@ -35,7 +22,6 @@ await build({
     format: 'esm',
     target: 'es2022',
     loader: { '.webp': 'binary' },
-    plugins: [properties],
     legalComments: 'none',
 });
 copyFileSync(join(root, 'build/web/tidemark-water.wasm'), wasm);

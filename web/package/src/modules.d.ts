@@ -1,5 +1,5 @@
-// What the bundler and the compiler of the WebAssembly make.
-declare module '*.properties' {
+// What the bundler, the build of the look and the compiler of the WebAssembly make.
+declare module '*/look.json' {
     const keys: { name: string; value: number; min: number; max: number; whole: boolean }[];
     export default keys;
 }

@@ -1,9 +1,10 @@
 // The water of one canvas: what is chosen flows in, touches come from the pointers, frames out of the loop.
 import { borrow, contextOf, giveBack, offer, type Borrower } from './contexts.js';
 import { WaterError } from './errors.js';
-import { lookOf, presets, withinRange, type Choices } from './look.js';
+import { lookOf, withinRange, type Choices } from './look.js';
 import { compile, Frame, instantiate, Slot, type Native, type Touch } from './native.js';
 import { loadPicture, plainPicture, shippedLight, upload, uploadCover, type Picture, type Source } from './pictures.js';
+import { presets } from './presets.js';
 import { followPointers, type Touched } from './pointers.js';
 
 export interface Options extends Choices {

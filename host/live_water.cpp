@@ -145,7 +145,8 @@ LiveWater::Frame LiveWater::frame(double now) {
         return isRunning_ ? Frame::waiting : Frame::resting;
     }
     host_.draw();
-    if (pace_.frameDrawn(now, host_.inkMoves() ? 1.0 / 60 : 0.0)) {
+    // Frames of no time, those of water that stands still, follow no pace.
+    if (seconds > 0.0 && pace_.frameDrawn(now, std::max(shortestFrame_, host_.inkMoves() ? 1.0 / 60 : 0.0))) {
         host_.setMeshShare(pace_.level().mesh);
         fitSurface();
     }

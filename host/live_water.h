@@ -39,6 +39,9 @@ public:
     // How many pixels are drawn for a density-independent one at most; automatic at first.
     void setQuality(Quality quality);
 
+    // The least seconds that the face lets pass between two frames, 0 at first: these are not late then.
+    void setShortestFrame(double seconds) { shortestFrame_ = seconds; }
+
     int width() const { return wanted_.width; }
     int height() const { return wanted_.height; }
     void resized();
@@ -101,6 +104,7 @@ private:
     std::vector<Touch> touches_;
 
     double longestFrame_ = Look{}.longestFrame;
+    double shortestFrame_ = 0.0;
     bool isRunning_ = false;  // or the last frame was before a rest
     double now_ = 0.0;        // of the last frame
 

@@ -30,6 +30,7 @@ struct {
 
 // clang-format off
 EM_JS(void, useContext, (), {
+    if (GL.currentContext) GL.deleteContext(GL.currentContext.handle);
     GL.makeContextCurrent(GL.registerContext(Module["context"], {majorVersion: 1}));
 });
 
@@ -90,6 +91,9 @@ EMSCRIPTEN_KEEPALIVE void setView(double width, double height, double density, d
 EMSCRIPTEN_KEEPALIVE void setQuality(int quality) {
     water->setQuality(static_cast<Quality>(quality));
 }
+EMSCRIPTEN_KEEPALIVE void setShortestFrame(double seconds) {
+    water->setShortestFrame(seconds);
+}
 // What the canvas is to have after frame() has answered `resize`; then resized().
 EMSCRIPTEN_KEEPALIVE int width() {
     return water->width();
@@ -131,6 +135,7 @@ EMSCRIPTEN_KEEPALIVE void redraw() {
     water->redraw();
 }
 EMSCRIPTEN_KEEPALIVE void renewContext() {
+    useContext();
     forgetObjects();
     water->renewContext();
 }

@@ -13,4 +13,18 @@ export class WaterError extends Error {
     constructor(readonly code: ErrorCode, message: string) {
         super(message);
     }
+
+    /** Whether this water cannot be drawn any more. */
+    get isFatal(): boolean {
+        return ['webgl', 'simd', 'csp', 'module'].includes(this.code);
+    }
+}
+
+const said = new Set<string>();
+
+/** On the console, the same once a page. */
+export function warnOnce(text: string): void {
+    if (said.has(text)) return;
+    said.add(text);
+    console.warn(`tidemark-water: ${text}`);
 }

@@ -3,6 +3,10 @@ declare module '*/look.json' {
     const keys: { name: string; value: number; min: number; max: number; whole: boolean }[];
     export default keys;
 }
+declare module '*.css' {
+    const text: string;
+    export default text;
+}
 declare module '*.webp' {
     const bytes: Uint8Array<ArrayBuffer>;
     export default bytes;

@@ -5,7 +5,7 @@ import { WaterError } from './errors.js';
 import type { Look } from './look.js';
 
 // The action codes of the library.
-export enum Touch {
+export enum TouchAction {
     down = 0,
     up = 1,
     move = 2,
@@ -30,13 +30,27 @@ const vectors = new Uint8Array([
     0, 97, 115, 109, 1, 0, 0, 0, 1, 4, 1, 96, 0, 0, 3, 2, 1, 0, 10, 9, 1, 7, 0, 65, 0, 253, 15, 26, 11,
 ]);
 
+/** Compiled, or its address. */
+export type ModuleSource = string | URL | WebAssembly.Module;
+
+let source: ModuleSource | undefined;
+let compiled: Promise<WebAssembly.Module> | undefined;
+
+/** Where tidemark-water.wasm is, for waters from now on; beside the script where nothing else is said. */
+export function setModule(module: ModuleSource): void {
+    source = module;
+    compiled = undefined;
+}
+
 async function fetchModule(): Promise<WebAssembly.Module> {
     if (typeof WebAssembly !== 'object' || !WebAssembly.validate(vectors)) {
         throw new WaterError('simd', 'This browser has no WebAssembly with SIMD.');
     }
-    const url = new URL('tidemark-water.wasm', import.meta.url);
+    if (source instanceof WebAssembly.Module) return source;
+    const url = source ?? new URL('tidemark-water.wasm', import.meta.url);
+    const mend = 'setModule() says where it is, see "Bundlers" in the README of tidemark-water';
     const response = await fetch(url).catch(() => null);
-    if (!response?.ok) throw new WaterError('module', `${url} does not load.`);
+    if (!response?.ok) throw new WaterError('module', `${url} does not load. ${mend}.`);
     try {
         // Not streaming: that would ask every server for the right type of content, for a few dozen kilobytes.
         return await WebAssembly.compile(await response.arrayBuffer());
@@ -45,11 +59,9 @@ async function fetchModule(): Promise<WebAssembly.Module> {
         if (/CSP|content security|unsafe-eval/i.test(text)) {
             throw new WaterError('csp', "The content security policy needs script-src 'wasm-unsafe-eval'.");
         }
-        throw new WaterError('module', `${url} is no module: ${text}`);
+        throw new WaterError('module', `${url} is no module: ${text}. ${mend}.`);
     }
 }
-
-let compiled: Promise<WebAssembly.Module> | undefined;
 
 // A module that did not load is tried again with the next water.
 export function compile(): Promise<WebAssembly.Module> {
@@ -63,6 +75,7 @@ export function compile(): Promise<WebAssembly.Module> {
 export type Load = (slot: Slot, width: number, height: number) => void;
 
 interface Instance {
+    context: WebGLRenderingContext;
     HEAPU8: Uint8Array;
     _begin(seed: number): void;
     _nameToFill(): number;
@@ -70,6 +83,7 @@ interface Instance {
     _applyLook(): void;
     _setView(width: number, height: number, density: number, seconds: number): void;
     _setQuality(quality: number): void;
+    _setShortestFrame(seconds: number): void;
     _width(): number;
     _height(): number;
     _resized(): void;
@@ -84,7 +98,14 @@ interface Instance {
     _renewContext(): void;
     _frame(seconds: number): number;
 }
-export type Native = Instance & { setLook(look: Look): void };
+export interface Native extends Instance {
+    setLook(look: Look): void;
+    /** After a lost context: the same, restored, or another one. */
+    renew(context: WebGLRenderingContext): void;
+}
+
+// The compiler's glue marks the canvas, which may outlive the water.
+const unmark = ({ canvas }: WebGLRenderingContext) => delete (canvas as { GLctxObject?: unknown }).GLctxObject;
 
 export async function instantiate(
     module: WebAssembly.Module, context: WebGLRenderingContext, load: Load, seed: number,
@@ -100,7 +121,7 @@ export async function instantiate(
         }).then(resolve, reject);
     }) as Instance;
     instance._begin(seed);
-    delete (context.canvas as { GLctxObject?: unknown }).GLctxObject;  // the canvas may outlive the water
+    unmark(context);
     return Object.assign(instance, {
         setLook(look: Look) {
             const place = instance._nameToFill();
@@ -109,6 +130,11 @@ export async function instantiate(
                 if (!instance._setLookValue(value)) console.warn(`tidemark-water: the look refuses ${name} = ${value}.`);
             }
             instance._applyLook();
+        },
+        renew(context: WebGLRenderingContext) {
+            instance.context = context;
+            instance._renewContext();
+            unmark(context);
         },
     });
 }

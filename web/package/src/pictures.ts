@@ -22,7 +22,7 @@ function canvasOf(width: number, height: number): HTMLCanvasElement {
     return canvas;
 }
 
-async function loadImage(url: string, blob?: Blob): Promise<HTMLImageElement> {
+async function loadImage(url: string, priority: 'high' | 'low' | 'auto', blob?: Blob): Promise<HTMLImageElement> {
     const image = new Image();
     let address: URL;
     try {
@@ -30,8 +30,9 @@ async function loadImage(url: string, blob?: Blob): Promise<HTMLImageElement> {
     } catch {
         throw new WaterError('load', `${url} is no address.`);
     }
-    const away = !blob && address.origin !== location.origin && !/^(data|blob):/.test(address.href);
-    if (away) image.crossOrigin = 'anonymous';
+    // Also where the address is the page's own: it may lead to another server, and a frame may be a sandbox.
+    if (/^https?:/.test(address.protocol)) image.crossOrigin = 'anonymous';
+    image.fetchPriority = priority;
     image.src = url;
     const loaded = await new Promise<boolean>((resolve) => {
         image.onload = () => resolve(true);
@@ -42,9 +43,12 @@ async function loadImage(url: string, blob?: Blob): Promise<HTMLImageElement> {
         return image;
     }
     if (blob) throw new WaterError('decode', 'The file is not a picture that this browser can show.');
-    // Only a request with cookies could tell a refusal from a missing file.
-    if (away) throw new WaterError('cross-origin', `${url} does not load, or its server does not allow this page to use it.`);
-    const response = await fetch(url).catch(() => null);
+    // Only a request with cookies could tell another server's refusal from a missing file.
+    const away = image.crossOrigin && address.origin !== self.origin;
+    const response = away ? null : await fetch(url, { mode: 'no-cors' }).catch(() => null);
+    if (away || response?.type === 'opaque') {
+        throw new WaterError('cross-origin', `${url} does not load, or its server does not send Access-Control-Allow-Origin for this page.`);
+    }
     if (response?.ok) throw new WaterError('decode', `${url} is not a picture that this browser can show.`);
     throw new WaterError('load', `${url} does not load.`);
 }
@@ -80,11 +84,11 @@ async function loadVideo(video: HTMLVideoElement): Promise<void> {
     });
 }
 
-export async function loadPicture(source: Source): Promise<Picture> {
-    return probe(await load(source));
+export async function loadPicture(source: Source, priority: 'high' | 'low' | 'auto' = 'auto'): Promise<Picture> {
+    return probe(await load(source, priority));
 }
 
-async function load(source: Source): Promise<Picture> {
+async function load(source: Source, priority: 'high' | 'low' | 'auto'): Promise<Picture> {
     if (source instanceof HTMLVideoElement) {
         await loadVideo(source);
         let time = -1;
@@ -105,29 +109,44 @@ async function load(source: Source): Promise<Picture> {
         image = source;
     } else if (source instanceof Blob) {
         const url = URL.createObjectURL(source);
-        image = await loadImage(url, source).finally(() => URL.revokeObjectURL(url));
+        image = await loadImage(url, priority, source).finally(() => URL.revokeObjectURL(url));
     } else {
-        image = await loadImage(String(source));
+        image = await loadImage(String(source), priority);
     }
     // A drawing may have proportions and no size.
     return still(image, () => [image.naturalWidth || 1024, image.naturalHeight || 1024]);
 }
 
+// Where of a picture a view shows its part: 0 is left or top, 1 right or bottom.
+export type Place = readonly [x: number, y: number];
+
+/** The place that a computed `object-position` names in percents. */
+export function placeOf(position: string): Place {
+    const share = (text = '') => (text.endsWith('%') ? Math.min(Math.max(parseFloat(text) / 100, 0), 1) : 0.5);
+    const [x, y] = position.split(' ');
+    return [share(x), share(y)];
+}
+
+/** Covers the whole canvas. */
+export function drawCover(canvas: HTMLCanvasElement, picture: Picture, [x, y]: Place): void {
+    const { width, height } = canvas;
+    const [fullWidth, fullHeight] = picture.size();
+    const scale = Math.min(fullWidth / width, fullHeight / height);
+    const context = canvas.getContext('2d', { alpha: false })!;
+    context.imageSmoothingQuality = 'high';
+    if (!(scale > 0)) return;
+    context.drawImage(picture.drawable, (fullWidth - width * scale) * x, (fullHeight - height * scale) * y,
+        width * scale, height * scale, 0, 0, width, height);
+}
+
 let scratch: HTMLCanvasElement | undefined;
 
-/** Fills the texture that is bound with the middle of the picture, scaled to width x height. Rows go from the top. */
-export function uploadCover(gl: WebGLRenderingContext, picture: Picture, width: number, height: number): void {
+/** Fills the texture that is bound with a part of the picture, scaled to width x height. Rows go from the top. */
+export function uploadCover(gl: WebGLRenderingContext, picture: Picture, width: number, height: number, place: Place): void {
     scratch ??= canvasOf(width, height);
     if (scratch.width !== width) scratch.width = width;
     if (scratch.height !== height) scratch.height = height;
-    const [fullWidth, fullHeight] = picture.size();
-    const scale = Math.min(fullWidth / width, fullHeight / height);
-    const context = scratch.getContext('2d', { alpha: false })!;
-    context.imageSmoothingQuality = 'high';
-    if (scale > 0) {
-        context.drawImage(picture.drawable, (fullWidth - width * scale) / 2, (fullHeight - height * scale) / 2,
-            width * scale, height * scale, 0, 0, width, height);
-    }
+    drawCover(scratch, picture, place);
     try {
         upload(gl, scratch);
     } catch {  // a canvas that was drawn on since
@@ -157,4 +176,13 @@ export function plainPicture(): Picture {
     context.fillStyle = depth;
     context.fillRect(0, 0, 256, 256);
     return still(canvas, () => [256, 256]);
+}
+
+/** What `mix-blend-mode: hard-light` leaves out: lighter than this it adds light, darker it takes some. */
+export function greyPicture(): Picture {
+    const canvas = canvasOf(1, 1);
+    const context = canvas.getContext('2d')!;
+    context.fillStyle = '#808080';
+    context.fillRect(0, 0, 1, 1);
+    return still(canvas, () => [1, 1]);
 }

@@ -1,49 +1,71 @@
 // Pointer events to touches. The pointer that comes down first draws; every other one, and a mouse that hovers, only
 // ripples.
-import { Touch } from './native.js';
+import { TouchAction } from './native.js';
 
 // Of a pointer that only ripples: pixels from one ripple to the next, and their height as a share of a touch's.
 const spacing = 14;
 const hoverHeight = 0.25;
 const fingerHeight = 0.3;
+const placeEvent = 'tidemark-place';
 
+/** Places are shares of the box, from its top left corner. */
 export interface Touched {
     hovers(): boolean;
     presses(): boolean;
-    touch(action: Touch, event: PointerEvent): void;
-    ripple(event: PointerEvent, height: number): void;
+    touch(action: TouchAction, x: number, y: number, event: PointerEvent): void;
+    ripple(x: number, y: number, height: number): void;
 }
 
-/** Events stay where they are, so that what lies on the water can be clicked, selected and scrolled. */
-export function followPointers(target: EventTarget, water: Touched, signal: AbortSignal): void {
+/**
+ * Events stay where they are, so that what lies on the water can be clicked, selected and scrolled.
+ * @param target where pointers count: the box or, for those of the whole page, the window
+ */
+export function followPointers(box: HTMLElement, target: EventTarget, water: Touched, signal: AbortSignal): void {
+    const view = box.ownerDocument.defaultView ?? window;
     let drawing: number | null = null;
     const lastRipple = new Map<number, [number, number]>();  // of each pointer that only ripples
 
+    // Only the browser can undo every transform between the window and the box, and it does so for events.
+    let offset = [0, 0];
+    box.addEventListener(placeEvent, (event) => {
+        offset = [(event as PointerEvent).offsetX, (event as PointerEvent).offsetY];
+    }, { signal });
+    const place = ({ clientX, clientY }: PointerEvent): [number, number] => {
+        box.dispatchEvent(new PointerEvent(placeEvent, { clientX, clientY }));
+        return [offset[0]! / (box.clientWidth || 1), offset[1]! / (box.clientHeight || 1)];
+    };
+    const isInside = (shares: number[]) => shares.every((share) => share >= 0 && share <= 1);
+
+    const touch = (action: TouchAction, event: PointerEvent) => water.touch(action, ...place(event), event);
+    const ripple = (event: PointerEvent, height: number) => {
+        const [x, y] = place(event);
+        if (isInside([x, y])) water.ripple(x, y, height);
+    };
     const trail = (event: PointerEvent, height: number) => {
         const { pointerId, clientX, clientY } = event;
         const [x, y] = lastRipple.get(pointerId) ?? [-spacing, -spacing];
         if (Math.hypot(clientX - x, clientY - y) < spacing) return;
         lastRipple.set(pointerId, [clientX, clientY]);
-        water.ripple(event, height);
+        ripple(event, height);
     };
-    const end = (action: Touch) => (event: PointerEvent) => {
+    const end = (action: TouchAction) => (event: PointerEvent) => {
         lastRipple.delete(event.pointerId);
         if (event.pointerId !== drawing) return;
         drawing = null;
-        water.touch(action, event);
+        touch(action, event);
     };
     // Of the window before anybody can stop them, or a stroke would never end.
     const listen = (on: EventTarget, type: string, call: (event: PointerEvent) => void) =>
-        on.addEventListener(type, call as EventListener, { signal, passive: true, capture: on === window });
+        on.addEventListener(type, call as EventListener, { signal, passive: true, capture: on === view });
 
     listen(target, 'pointerdown', (event) => {
-        if (!water.presses() || event.button !== 0) return;
+        if (!water.presses() || event.button !== 0 || !isInside(place(event))) return;
         if (drawing === null || drawing === event.pointerId) {
             drawing = event.pointerId;
-            water.touch(Touch.down, event);
+            touch(TouchAction.down, event);
         } else {
             lastRipple.set(event.pointerId, [event.clientX, event.clientY]);
-            water.ripple(event, 1);
+            ripple(event, 1);
         }
     });
     listen(target, 'pointermove', (event) => {
@@ -55,14 +77,14 @@ export function followPointers(target: EventTarget, water: Touched, signal: Abor
         }
     });
     // A stroke goes on beyond the edges.
-    listen(window, 'pointermove', (event) => {
+    listen(view, 'pointermove', (event) => {
         if (event.pointerId !== drawing) return;
-        if (event.buttons === 0) return end(Touch.up)(event);
+        if (event.buttons === 0) return end(TouchAction.up)(event);
         // All that the device has reported since the last frame.
         const reports = event.getCoalescedEvents?.() ?? [];
-        for (const report of reports.length > 0 ? reports : [event]) water.touch(Touch.move, report);
+        for (const report of reports.length > 0 ? reports : [event]) touch(TouchAction.move, report);
     });
-    listen(window, 'pointerup', end(Touch.up));
-    listen(window, 'pointercancel', end(Touch.cancel));
+    listen(view, 'pointerup', end(TouchAction.up));
+    listen(view, 'pointercancel', end(TouchAction.cancel));
     listen(target, 'pointerleave', ({ pointerId }) => lastRipple.delete(pointerId));
 }

@@ -9,8 +9,7 @@ export interface Preset {
     rain?: number;  // drops a second
 }
 
-/** What each changes of the defaults. */
-export const presets: Readonly<Record<string, Preset>> = {
+const named = {
     'clear-lake': { title: 'Clear lake', look: {} },
     'summer-rain': { title: 'Summer rain', look: { calmingTime: 3.6 }, ink: false, rain: 16 },
     'heavy-glass': {
@@ -34,4 +33,9 @@ export const presets: Readonly<Record<string, Preset>> = {
         title: 'Deep swell',
         look: { dropRadius: 0.032, meshExtent: 20, calmingTime: 12.5, ringSpeed: 0.43, touchAmplitude: 3 },
     },
-};
+} satisfies Record<string, Preset>;
+
+export type PresetName = keyof typeof named;
+
+/** What each changes of the defaults. */
+export const presets: Readonly<Record<string, Preset>> = named;

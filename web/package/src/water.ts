@@ -1,28 +1,27 @@
 // The water of one canvas: what is chosen flows in, touches come from the pointers, frames out of the loop.
-import { borrow, contextOf, giveBack, offer, type Borrower } from './contexts.js';
-import { WaterError } from './errors.js';
-import { lookOf, withinRange, type Choices } from './look.js';
-import { compile, Frame, instantiate, Slot, type Native, type Touch } from './native.js';
-import { loadPicture, plainPicture, shippedLight, upload, uploadCover, type Picture, type Source } from './pictures.js';
+import { check, type Options } from './attributes.js';
+import { Chooser } from './chooser.js';
+import { WaterError, warnOnce } from './errors.js';
+import { borrow, contextOf, giveBack, offer, restored, takenFrom, type Claim } from './lease.js';
+import { lookOf } from './look.js';
+import { Loop, type Cost } from './loop.js';
+import { compile, Frame, instantiate, Slot, TouchAction, type Native } from './native.js';
+import { drawCover, placeOf, plainPicture, upload, uploadCover, type Picture, type Source } from './pictures.js';
+import { followPointers } from './pointers.js';
 import { presets } from './presets.js';
-import { followPointers, type Touched } from './pointers.js';
+import { Sight } from './sight.js';
 
-export interface Options extends Choices {
-    /** What lies under the water. Without one it is plain deep water; an empty text waits for setPicture(). */
-    src?: Source | null;
-    /** The same for a canvas that is higher than wide. */
-    srcPortrait?: Source | null;
-    /** What the waves throw back, a square picture; the package's own by default. */
-    light?: Source | null;
-    /** Whether touches drop ink. */
-    ink?: boolean | null;
-    /** What moves the water: "hover", "press" or both, or "none". */
-    interaction?: string | null;
-    /** "auto" keeps to the visitor's wish for reduced motion: then only touches move the water. */
-    motion?: 'auto' | 'full' | 'reduced' | null;
-    /** Whether one drop falls by itself. */
-    firstDrop?: boolean | null;
-}
+// Of its context. A `live` water draws; a `parked` one has given the context back and shows its last frame; from a
+// `lost` one the browser has taken it, and its picture shows without water.
+//
+//   none    -> opening       once it can be seen
+//   opening -> live, lost
+//   live    -> parked        out of view, or another water needs the context more
+//   live    -> lost
+//   parked  -> opening       when something moves
+//   lost    -> opening       when the browser has room again, after some seconds, and at a touch
+//   any     -> dead          destroyed, or there is no way to draw
+type State = 'none' | 'opening' | 'live' | 'parked' | 'lost' | 'dead';
 
 export interface DropOptions {
     /** 1 is a touch. With ink, 0.3 to 1.5. */
@@ -34,20 +33,23 @@ export interface WaterEvents extends Record<'ready' | 'calm' | 'wake' | 'context
     error: CustomEvent<WaterError>;
 }
 
-/** Milliseconds; see `Water.cost`. */
-export interface Cost {
-    frame: number;
-    work: number;
+/** Of an element that has its water in a canvas of its own. */
+export interface Stage {
+    /** Has the size of the canvas, and hears the pointers. */
+    box: HTMLElement;
+    /** Lies below the canvas, and shows where that has no context. */
+    still: HTMLCanvasElement;
 }
 
 const qualities = ['auto', 'low', 'medium', 'high'];  // in the host's order
 const backgrounds = (1 << Slot.portrait) | (1 << Slot.landscape);
 const parkAfter = 4000;    // milliseconds out of view
 const touchCounts = 3000;  // milliseconds that a touched water is not taken its context
+const firstRetry = 4000;   // milliseconds until a context that was taken is asked for again; then twice as many
+const lastRetry = 60_000;
 const lightSide = 512;
 
-// Steady enough to be read.
-const blend = (old: number, value: number) => (old ? old + 0.1 * (value - old) : value);
+const taken = new WeakSet<HTMLCanvasElement>();  // by a water
 
 export interface Water {
     addEventListener<Type extends keyof WaterEvents>(
@@ -58,373 +60,400 @@ export interface Water {
     removeEventListener(type: string, listener: EventListenerOrEventListenerObject | null, options?: boolean | EventListenerOptions): void;
 }
 
-export class Water extends EventTarget implements Borrower, Touched {
-    /** Settles with the first picture, or fails with a `WaterError`. */
+export class Water extends EventTarget {
+    /** Settles with the first picture that can be seen, or fails with a `WaterError` where there is none. */
     readonly ready: Promise<void>;
-    /** Smoothed: from one frame drawn to the next, and of it in the library. */
-    readonly cost: Cost = { frame: 0, work: 0 };
     /** Whether the water rests; then no frames are asked for. */
     calm = true;
 
+    private readonly box: HTMLElement;
+    private readonly still: HTMLCanvasElement;
     private readonly end = new AbortController();
-    private readonly reducedMotion = matchMedia('(prefers-reduced-motion: reduce)');
-    private readonly resized = new ResizeObserver(() => this.fit());
-    private readonly seen = new IntersectionObserver(
-        (entries) => this.setInView(entries.at(-1)!.isIntersecting), { rootMargin: '100px' });
+    private readonly sight: Sight;
+    private readonly reducedMotion: MediaQueryList;
+    private readonly loop: Loop;
+    private readonly chooser: Chooser;
+    private readonly claim: Claim = {
+        urgency: () => this.urgency(),
+        park: () => this.park(),
+        resume: () => (this.state === 'lost' ? void this.open() : this.wake()),
+    };
     private settle!: { resolve: () => void; reject: (error: unknown) => void };
+    private pointers: AbortController | undefined;
     private native: Native | undefined;
     private gl: WebGLRenderingContext | undefined;
     private lose: WEBGL_lose_context | null = null;
     private longestSide = Infinity;  // that the graphics can draw
-    private live = false;     // the context is there, and the library in it
-    private opening = false;
-    private failed = false;
-    private parked = false;
-    private shown = false;
-    private inView = false;
-    private paused = false;
-    private stale = true;     // a frame is due, even while it is paused
-    private lost = false;     // the browser has taken the context
-    private asked = 0;
-    private lastFrame = 0;
-    private lastTouch = -touchCounts;
-    private parkTimer = 0;
-    private dropTimer = 0;
-    private view = '';        // that the library has
-    private given = '';       // and the look
-    private leftOut = '';     // of which the console has been told
-    private picture: Picture | undefined;
-    private pictureTicket = 0;
-    private pictureSource: Source | null | undefined;
-    private light: Picture | ImageBitmap | undefined;
-    private lightSource: Source | null | undefined;
 
-    /**
-     * @param target where pointers are listened to
-     * @param still shows the last frame while the context is lent to another water
-     */
-    constructor(
-        readonly canvas: HTMLCanvasElement,
-        private options: Options = {},
-        target: EventTarget = canvas,
-        private readonly still?: HTMLCanvasElement,
-    ) {
+    private state: State = 'none';
+    private turn = 0;          // of the state
+    private shown = false;     // the first picture was seen
+    private stale = true;      // a frame is due, even while it is paused
+    private kept = false;      // the still has what shows
+    private drawing = false;   // a stroke, which has to be ended
+    private isHeard = false;   // what fails, by a listener
+    private lastTouch = -touchCounts;
+    private liveSince = 0;
+    private retry = firstRetry;
+    private timers: Record<string, number> = {};
+    private waiting: (() => void) | undefined;  // the drop to fall with the next frame
+    private viewSize = '';     // that the library has
+    private given = '';        // and what was chosen
+
+    constructor(public canvas: HTMLCanvasElement, private readonly options: Options = {}, private readonly stage?: Stage) {
         super();
+        if (taken.has(canvas)) throw new Error('This canvas has a water, which is to be destroyed first.');
+        taken.add(canvas);
+        this.box = stage?.box ?? canvas;
+        this.still = stage?.still ?? document.createElement('canvas');
         this.ready = new Promise((resolve, reject) => (this.settle = { resolve, reject }));
         this.ready.catch(() => {});
         const { signal } = this.end;
-        followPointers(target, this, signal);
-        document.addEventListener('visibilitychange', () => this.update(), { signal });
+        this.sight = new Sight(this.box, { seen: () => this.seen(), resized: () => this.fit() }, signal);
+        this.loop = new Loop(this.sight.view, (now) => this.draw(now));
+        this.chooser = new Chooser({
+            pictureChanged: () => this.changed(backgrounds),
+            lightChanged: () => this.changed(1 << Slot.light),
+            failed: (error, isNeeded) => this.fail(error, isNeeded),
+            moved: () => this.wake(),
+        });
+        this.reducedMotion = this.sight.view.matchMedia('(prefers-reduced-motion: reduce)');
         this.reducedMotion.addEventListener('change', () => this.apply(), { signal });
-        this.watchDensity();
-        canvas.addEventListener('webglcontextlost', () => this.contextLost(), { signal });
-        canvas.addEventListener('webglcontextrestored', () => this.contextRestored(), { signal });
-        this.fit();
-        this.resized.observe(canvas);
-        this.seen.observe(canvas);
+        this.watchContext();
         compile().catch((error) => this.fail(error));
-        this.choosePictures();
+        this.set(options);
+    }
+
+    /** Smoothed: from one frame drawn to the next, and of it in the library. */
+    get cost(): Cost {
+        return this.loop.cost;
     }
 
     /** Changes what is named. */
     set(options: Options): void {
+        const { paused } = this.options;
+        if ('pointers' in options || !this.pointers) this.follow(options.pointers === 'page');
+        // The frame that is kept is the one that shows, because each frame moves the ink.
+        if (options.paused && !paused && this.state === 'live') this.keep();
         Object.assign(this.options, options);
-        this.choosePictures();
+        check(options);
+        this.choosePictures('src' in options || 'srcPortrait' in options);
         this.apply();
+        if (paused && !this.options.paused) this.stale = true;
+        this.update();
     }
 
     /** Settles when the picture is there; of several asked for, the last one stays. */
     async setPicture(source: Source | null, portrait: Source | null = null): Promise<void> {
         Object.assign(this.options, { src: source, srcPortrait: portrait });
-        await this.choosePicture(true);
+        await this.chooser.choosePicture(this.options, this.isPortrait(), true);
     }
 
-    /** A drop at a point of the canvas, in CSS pixels from its top left corner. */
+    /** A drop at a point of the canvas, in CSS pixels from its top left corner, if it can be seen and the water moves. */
     drop(x: number, y: number, { strength = 1, ink = false }: DropOptions = {}): void {
-        const column = x / (this.canvas.clientWidth || 1);
-        const row = y / (this.canvas.clientHeight || 1);
-        const fall = () => {
-            if (ink) this.native?._drop(column, row, strength, performance.now() / 1000);
-            else this.native?._splash(column, row, strength);
-        };
-        if (this.shown) fall();
-        else this.addEventListener('ready', fall, { once: true, signal: this.end.signal });
-        this.touched();
+        const column = x / (this.box.clientWidth || 1);
+        const row = y / (this.box.clientHeight || 1);
+        this.let((native) => {
+            if (ink) native._drop(column, row, strength, performance.now() / 1000);
+            else native._splash(column, row, strength);
+        });
     }
 
     clearInk(): void {
         this.native?._clearInk();
+        this.stale = true;
         this.wake();
     }
 
     /** The water stands still until play(). */
     pause(): void {
-        this.paused = true;
-        this.update();
+        this.set({ paused: true });
     }
-
     play(): void {
-        this.paused = false;
-        this.update();
+        this.set({ paused: false });
     }
 
-    toBlob(type = 'image/png', quality?: number): Promise<Blob> {
-        let from = this.canvas;
-        // The canvas is readable only in the task that has drawn.
-        if (!this.drawAgain()) {
-            if (!this.still || this.still.width === 1) return Promise.reject(new Error('no picture yet'));
-            from = this.still;
-        }
+    async toBlob(type = 'image/png', quality?: number): Promise<Blob> {
+        if (!this.keep()) throw new Error('no picture yet');
         return new Promise((resolve, reject) =>
-            from.toBlob((blob) => (blob ? resolve(blob) : reject(new Error(`no ${type}`))), type, quality));
+            this.still.toBlob((blob) => (blob ? resolve(blob) : reject(new Error(`no ${type}`))), type, quality));
     }
 
     /** Ends everything; nothing that was made here stays but the canvas. */
     destroy(): void {
         if (this.end.signal.aborted) return;
         this.end.abort();
-        this.resized.disconnect();
-        this.seen.disconnect();
-        cancelAnimationFrame(this.asked);
-        clearTimeout(this.parkTimer);
-        clearTimeout(this.dropTimer);
+        this.pointers?.abort();
+        this.die();
+        this.chooser.end();
+        for (const timer of Object.values(this.timers)) clearTimeout(timer);
         if (!this.gl?.isContextLost()) this.lose?.loseContext();
-        this.canvas.style.visibility = '';
-        this.native = this.gl = this.picture = this.light = undefined;
-        this.live = false;
+        taken.delete(this.canvas);
+        this.hide(false);
+        this.native = this.gl = undefined;
         this.settle.reject(new Error('destroyed'));
-        giveBack(this);
-        offer();
     }
 
-    // What the pointers ask for.
-
-    hovers(): boolean {
-        return this.interactions().includes('hover') && !this.reduced();
-    }
-    presses(): boolean {
-        return this.interactions().includes('press');
-    }
-    touch(action: Touch, event: PointerEvent): void {
-        const pressure = event.pointerType === 'pen' ? event.pressure : -1;  // that of others is made up
-        this.native?._touch(action, ...this.place(event), pressure, event.timeStamp / 1000);
-        this.touched();
-    }
-    ripple(event: PointerEvent, height: number): void {
-        this.native?._splash(...this.place(event), height);
-        this.touched();
+    override addEventListener(type: string, listener: EventListenerOrEventListenerObject | null, options?: boolean | AddEventListenerOptions): void {
+        this.isHeard ||= type === 'error';
+        super.addEventListener(type, listener, options);
     }
 
-    // What the other waters ask for.
-
-    urgency(): number {
-        if (this.opening) return 5;
-        if (!this.running()) return 0;
-        if (!this.shown) return this.picture ? 4 : 1;
-        if (!this.still || performance.now() - this.lastTouch < touchCounts) return 3;
-        return this.calm ? 1 : 2;
-    }
-    park(): void {
-        if (this.opening) return;  // and then it waits for its time again
-        if (!this.live) return giveBack(this);
-        const { canvas, still } = this;
-        this.stale = !still || !this.shown || !this.drawAgain();
-        if (still && !this.stale) {
-            still.width = canvas.width;
-            still.height = canvas.height;
-            still.getContext('2d', { alpha: false })!.drawImage(canvas, 0, 0);
-        }
-        canvas.style.visibility = 'hidden';
-        this.live = false;
-        this.parked = true;
-        this.lose?.loseContext();
-        giveBack(this);
-        if (!this.calm && this.running()) this.wake();
-        offer();
-    }
-    resume(): void {
-        this.wake();
-    }
-
-    private interactions(): string[] {
-        return (this.options.interaction ?? 'press').split(/\s+/);
+    private get picture(): Picture | undefined {
+        return this.chooser.picture;
     }
     private reduced(): boolean {
         const { motion } = this.options;
         return motion === 'reduced' || (motion !== 'full' && this.reducedMotion.matches);
     }
+    private isPortrait(): boolean {
+        return this.box.clientHeight > this.box.clientWidth;
+    }
     private running(): boolean {
-        return this.inView && (!this.paused || this.stale) && !this.failed && !document.hidden && !this.end.signal.aborted;
+        return this.sight.visible && (!this.options.paused || this.stale) && this.state !== 'dead';
+    }
+    private urgency(): number {
+        if (this.state === 'opening') return 5;
+        if (!this.running()) return 0;
+        if (!this.shown) return this.picture ? 4 : 1;
+        if (!this.stage || performance.now() - this.lastTouch < touchCounts) return 3;
+        return this.calm ? 1 : 2;
     }
 
-    private place({ clientX, clientY }: PointerEvent): [number, number] {
-        const { left, top, width, height } = this.canvas.getBoundingClientRect();
-        return [(clientX - left) / (width || 1), (clientY - top) / (height || 1)];
+    private follow(isPage: boolean): void {
+        this.pointers?.abort();
+        if (this.drawing) this.native?._touch(TouchAction.cancel, 0, 0, -1, performance.now() / 1000);
+        this.drawing = false;
+        this.pointers = new AbortController();
+        const wants = (word: string) => (this.options.interaction ?? 'press').split(/\s+/).includes(word);
+        followPointers(this.box, isPage ? this.sight.view : this.box, {
+            hovers: () => wants('hover') && !this.reduced(),
+            presses: () => wants('press'),
+            ripple: (x, y, height) => this.let((native) => native._splash(x, y, height)),
+            touch: (action, x, y, event) => {
+                const pressure = event.pointerType === 'pen' ? event.pressure : -1;  // that of others is made up
+                const touch = () => this.native!._touch(action, x, y, pressure, event.timeStamp / 1000);
+                if (action === TouchAction.down) {
+                    const isLive = this.shown && this.state === 'live';
+                    this.let(isLive ? () => (touch(), (this.drawing = true)) : (native) => native._drop(x, y, 1, performance.now() / 1000));
+                } else if (this.drawing && action === TouchAction.move) {
+                    if (this.state === 'live') this.let(touch);
+                } else if (this.drawing) {
+                    this.drawing = false;
+                    touch();
+                    this.wake();
+                }
+            },
+        }, this.pointers.signal);
     }
 
-    // The one of the two pictures that is shown.
-    private slot(): Slot {
-        return this.canvas.width > this.canvas.height ? Slot.landscape : Slot.portrait;
-    }
-
-    private fail(error: unknown): void {
-        if (this.end.signal.aborted || this.failed) return;
-        const known = error instanceof WaterError ? error : new WaterError('module', String(error));
-        if (!this.shown) this.settle.reject(known);
-        if (['webgl', 'simd', 'csp', 'module'].includes(known.code)) this.failed = true;
-        this.dispatchEvent(new CustomEvent('error', { detail: known }));
-    }
-
-    private touched(): void {
+    // Nothing falls that cannot be seen to fall. Before there is water, the first drop waits for it.
+    private let(fall: (native: Native) => void): void {
+        if (!this.sight.visible || this.options.paused || this.state === 'dead') return;
         this.lastTouch = performance.now();
-        this.wake();
+        if (this.shown && this.state === 'live') fall(this.native!);
+        else this.waiting ??= () => fall(this.native!);
+        if (this.state === 'lost') void this.open();
+        else this.wake();
     }
 
-    private setInView(inView: boolean): void {
-        this.inView = inView;
-        clearTimeout(this.parkTimer);
-        if (!inView) this.parkTimer = setTimeout(() => this.park(), parkAfter);
+    private fail(error: unknown, isNeeded = true): void {
+        if (this.state === 'dead') return;
+        const known = error instanceof WaterError ? error : new WaterError('module', String(error));
+        if (isNeeded && !this.shown) this.settle.reject(known);
+        if (known.isFatal) {
+            this.keepPicture();
+            this.die();
+        }
+        this.dispatchEvent(new CustomEvent('error', { detail: known }));
+        if (!this.isHeard) warnOnce(`${known.code}: ${known.message}`);
+    }
+
+    private die(): void {
+        this.enter('dead');
+        this.loop.stop();
+        this.hide(true);
+        this.waiting = undefined;
+        giveBack(this.claim);
+        offer();
+    }
+
+    private enter(state: State): number {
+        this.state = state;
+        clearTimeout(this.timers.retry);
+        return ++this.turn;
+    }
+
+    private seen(): void {
+        if (this.end.signal.aborted) return;
+        clearTimeout(this.timers.park);
+        if (!this.sight.inView) this.timers.park = window.setTimeout(() => this.park(), parkAfter);
+        this.choosePictures();
         this.update();
     }
 
     // The loop follows from the state.
     private update(): void {
-        if (!this.running()) {
-            cancelAnimationFrame(this.asked);
-            this.asked = 0;
-            return;
-        }
-        // The still serves until something moves.
-        if (this.parked && this.calm && !this.stale) return;
-        this.wake();
+        if (!this.running()) this.loop.stop();
+        else if (this.state === 'lost') void this.open();
+        // A still serves until something moves.
+        else if (this.state !== 'parked' || !this.calm || this.stale) this.wake();
     }
 
     private wake(): void {
-        if (!this.running() || this.lost) return;
-        if (!this.live) void this.open();
-        else if (this.picture && this.light) this.asked ||= requestAnimationFrame(this.draw);
+        if (!this.running()) return;
+        if (this.state === 'none' || this.state === 'parked') void this.open();
+        else if (this.state === 'live' && this.picture && this.chooser.light) this.loop.wake();
     }
 
     private async open(): Promise<void> {
-        if (this.live || this.opening || this.failed || !borrow(this)) return;
-        this.opening = true;
+        const from = this.state;
+        const isTaken = from === 'lost' && this.gl!.isContextLost();
+        if (isTaken && !this.stage) return;  // a canvas of the page has no other context
+        if (from === 'opening' || from === 'live' || from === 'dead' || !borrow(this.claim)) return;
+        const turn = this.enter('opening');
+        const isOver = () => turn !== this.turn;
         try {
             const module = await compile();
-            if (this.end.signal.aborted) return;
-            const held = contextOf(this.canvas);
-            if (!held) throw new WaterError('webgl', 'This browser has no WebGL, or has switched it off.');
-            this.gl = held.gl;
-            this.lose = held.lose;
-            if (held.gl.isContextLost()) await this.restore();
-            if (this.end.signal.aborted) return;
-            if (this.native) {
-                this.native._renewContext();
-            } else {
-                const { gl } = held;
-                const load = (slot: Slot, width: number, height: number) => this.load(slot, width, height);
-                const native = await instantiate(module, gl, load, 1 + Math.floor(Math.random() * 1e6));
-                if (this.end.signal.aborted) return;
-                this.native = native;
-                this.longestSide = Math.min(gl.getParameter(gl.MAX_TEXTURE_SIZE), ...gl.getParameter(gl.MAX_VIEWPORT_DIMS));
-                if (this.picture) native._picturesChanged(backgrounds);
-                if (this.light) native._picturesChanged(1 << Slot.light);
-                this.view = '';
-            }
-            this.live = true;
-            this.apply();
-            if (!this.inView) this.setInView(false);
+            if (isOver()) return;
+            if (isTaken) this.replaceCanvas();
+            const context = contextOf(this.canvas);
+            if (!context) throw new WaterError('webgl', 'This browser has no WebGL, or has switched it off.');
+            const { gl } = context;
+            this.gl = gl;
+            this.lose = context.lose;
+            const isBack = !gl.isContextLost() || await restored(context);
+            if (isOver()) return;
+            if (isBack && this.native) this.native.renew(gl);
+            else if (isBack) this.native = await this.begin(module, gl);
+            if (isOver()) return;
+            if (gl.isContextLost()) return this.lost();
         } catch (error) {
-            giveBack(this);
-            this.fail(error);
-        } finally {
-            this.opening = false;
+            if (!isOver()) this.fail(error);
+            return;
         }
-        this.update();
-    }
-
-    private restore(): Promise<void> {
-        return new Promise((resolve) => {
-            this.canvas.addEventListener('webglcontextrestored', () => resolve(), { once: true, signal: this.end.signal });
-            // Only after the loss has been told.
-            setTimeout(() => this.gl?.isContextLost() && this.lose?.restoreContext(), 0);
-        });
-    }
-
-    private contextLost(): void {
-        if (!this.live) return;
-        this.live = false;
-        this.lost = true;
-        this.dispatchEvent(new Event('contextlost'));
-    }
-    private contextRestored(): void {
-        if (!this.lost) return;
-        this.lost = false;
+        this.enter('live');
+        this.liveSince = performance.now();
         this.stale = true;
-        this.dispatchEvent(new Event('contextrestored'));
-        this.wake();
+        this.apply();
+        if (from === 'lost') this.dispatchEvent(new Event('contextrestored'));
+        this.seen();
     }
 
-    // Where the window moves to a display of another density, nothing else tells so.
-    private watchDensity(): void {
-        const density = matchMedia(`(resolution: ${devicePixelRatio}dppx)`);
-        density.addEventListener('change', () => (this.fit(), this.watchDensity()), { once: true, signal: this.end.signal });
+    private async begin(module: WebAssembly.Module, gl: WebGLRenderingContext): Promise<Native> {
+        const load = (slot: Slot, width: number, height: number) => this.load(slot, width, height);
+        const native = await instantiate(module, gl, load, 1 + Math.floor(Math.random() * 1e6));
+        this.longestSide = Math.min(gl.getParameter(gl.MAX_TEXTURE_SIZE), ...gl.getParameter(gl.MAX_VIEWPORT_DIMS));
+        if (this.picture) native._picturesChanged(backgrounds);
+        if (this.chooser.light) native._picturesChanged(1 << Slot.light);
+        this.viewSize = this.given = '';
+        return native;
+    }
+
+    private watchContext(): void {
+        const { signal } = this.end;
+        this.canvas.addEventListener('webglcontextlost', () => this.state === 'live' && this.lost(), { signal });
+        this.canvas.addEventListener('webglcontextrestored', () => this.state === 'lost' && void this.open(), { signal });
+    }
+
+    // A context that the browser has taken comes back when it likes; a new one takes another.
+    private replaceCanvas(): void {
+        const old = this.canvas;
+        this.canvas = old.ownerDocument.createElement('canvas');
+        for (const { name, value } of old.attributes) if (name !== 'style') this.canvas.setAttribute(name, value);
+        const hasFocus = (old.getRootNode() as ShadowRoot).activeElement === old;
+        old.replaceWith(this.canvas);
+        if (hasFocus) this.canvas.focus({ preventScroll: true });
+        this.hide(true);
+        this.watchContext();
+    }
+
+    private lost(): void {
+        this.enter('lost');
+        takenFrom(this.claim);
+        this.loop.stop();
+        this.keepPicture();
+        this.hide(true);
+        this.dispatchEvent(new Event('contextlost'));
+        if (performance.now() - this.liveSince > lastRetry) this.retry = firstRetry;
+        this.timers.retry = window.setTimeout(() => this.update(), this.retry);
+        this.retry = Math.min(2 * this.retry, lastRetry);
+    }
+
+    private park(): void {
+        if (this.state === 'opening') return;  // and then it waits for its time again
+        if (this.state !== 'live') return giveBack(this.claim);
+        this.stale = !this.shown || !this.keep() || !this.stage;
+        this.hide(true);
+        this.enter('parked');
+        this.loop.stop();
+        this.lose?.loseContext();
+        giveBack(this.claim);
+        if (!this.calm) this.wake();
+        offer();
+    }
+
+    // Without its own transition: the still has the same picture.
+    private hide(isHidden: boolean): void {
+        const { style } = this.canvas;
+        const opacity = isHidden ? '0' : '';
+        if (style.opacity === opacity) return;
+        style.transition = 'none';
+        style.opacity = opacity;
+    }
+
+    // False where there is nothing to draw on. A canvas with WebGL can be read only in the task that has drawn.
+    private keep(): boolean {
+        const { native, picture } = this;
+        if (this.kept) return true;
+        if (this.state !== 'live' || !native || !picture || !this.chooser.light) return false;
+        native._redraw();
+        if (this.frame(native, this.loop.last) !== Frame.drawn || this.gl!.isContextLost()) return false;
+        this.copy();
+        return true;
+    }
+
+    private copy(): void {
+        const { still, canvas } = this;
+        still.width = canvas.width;
+        still.height = canvas.height;
+        still.getContext('2d', { alpha: false })!.drawImage(canvas, 0, 0);
+        this.kept = true;
+    }
+
+    // Water at rest looks so.
+    private keepPicture(): void {
+        const { still, canvas, picture } = this;
+        if (!picture || !this.shown) return;
+        still.width = canvas.width;
+        still.height = canvas.height;
+        drawCover(still, picture, this.place());
+        this.kept = true;
+    }
+
+    private place() {
+        return placeOf(getComputedStyle(this.canvas).objectPosition);
     }
 
     private fit(): void {
-        const { clientWidth, clientHeight } = this.canvas;
-        if (!clientWidth || !clientHeight) return;  // not laid out now
+        const { clientWidth, clientHeight } = this.box;
+        if (!clientWidth || !clientHeight || this.end.signal.aborted) return;  // not laid out now
         const most = this.longestSide / Math.max(clientWidth, clientHeight);
-        const view = [clientWidth, clientHeight, Math.min(devicePixelRatio, most)] as const;
-        if (this.view === String(view)) return;
-        this.view = String(view);
-        this.native?._setView(...view, this.paused ? 0 : performance.now() / 1000);
+        const size = [clientWidth, clientHeight, Math.min(this.sight.view.devicePixelRatio, most)] as const;
+        if (this.viewSize === String(size)) return;
+        this.viewSize = String(size);
+        this.native?._setView(...size, this.options.paused ? 0 : performance.now() / 1000);
         this.stale = true;
         this.choosePictures();
         this.wake();
     }
 
-    private choosePictures(): void {
-        this.choosePicture().catch(() => {});
-        this.chooseLight().catch((error) => this.fail(error));
+    private choosePictures(isAsked = false): void {
+        if (this.options.loading === 'lazy' && !this.sight.isNear) return;
+        this.chooser.choose(this.options, this.isPortrait(), isAsked);
     }
 
-    private async chooseLight(): Promise<void> {
-        const { light: source = null } = this.options;
-        if (source === this.lightSource) return;
-        this.lightSource = source;
-        const isLast = () => source === this.lightSource && !this.end.signal.aborted;
-        const loaded = source && await loadPicture(source).catch((error) => isLast() && this.fail(error));
-        const light = loaded || (source && this.light) || await shippedLight();
-        if (!isLast()) return;
-        this.light = light;
-        this.tell(1 << Slot.light);
-    }
-
-    // A picture that did not load is tried again only when it is asked for anew.
-    private async choosePicture(anew = false): Promise<void> {
-        const { src = null, srcPortrait = null } = this.options;
-        const source = this.canvas.clientHeight > this.canvas.clientWidth && srcPortrait ? srcPortrait : src;
-        if ((source === this.pictureSource && !anew) || source === '') return;
-        this.pictureSource = source;
-        const ticket = ++this.pictureTicket;
-        try {
-            const picture = source ? await loadPicture(source) : plainPicture();
-            if (ticket !== this.pictureTicket || this.end.signal.aborted) return;
-            this.picture = picture;
-            if (source instanceof HTMLVideoElement) {
-                for (const type of ['play', 'seeked']) {
-                    source.addEventListener(type, () => this.wake(), { signal: this.end.signal });
-                }
-            }
-        } catch (error) {
-            if (ticket !== this.pictureTicket) return;
-            this.fail(error);
-            throw error;
-        }
-        this.tell(backgrounds);
-    }
-
-    private tell(pictures: number): void {
+    private changed(pictures: number): void {
         this.native?._picturesChanged(pictures);
         this.stale = true;
         this.wake();
@@ -432,96 +461,88 @@ export class Water extends EventTarget implements Borrower, Touched {
 
     // Called by the library's host in the middle of a frame. What is not shown keeps its one pixel.
     private load(slot: Slot, width: number, height: number): void {
-        const { gl, light, picture } = this;
-        if (!gl || !picture || !light) return;
-        const cover = (part: 'picture' | 'light', shown: Picture, ...size: [number, number]) => {
+        const { gl, chooser } = this;
+        const cover = (part: 'picture' | 'light', ...size: [number, number]) => {
             try {
-                uploadCover(gl, shown, ...size);
+                uploadCover(gl!, chooser[part] as Picture, ...size, this.place());
             } catch (error) {
-                uploadCover(gl, (this[part] = plainPicture()), ...size);
+                uploadCover(gl!, (chooser[part] = plainPicture()), ...size, this.place());
                 queueMicrotask(() => this.fail(error));  // who hears of it may call in, which is not for the middle of a frame
             }
         };
-        if (slot === this.slot()) cover('picture', picture, width, height);
+        if (slot === this.slot()) cover('picture', width, height);
         if (slot !== Slot.light) return;
-        if ('drawable' in light) cover('light', light, lightSide, lightSide);
-        else upload(gl, light);
+        if ('drawable' in chooser.light!) cover('light', lightSide, lightSide);
+        else upload(gl!, chooser.light!);
+    }
+
+    // The one of the two pictures that is shown.
+    private slot(): Slot {
+        return this.canvas.width > this.canvas.height ? Slot.landscape : Slot.portrait;
     }
 
     private apply(): void {
         const { native, options } = this;
+        this.loop.most = options.fps || Infinity;
         if (!native) return;
         this.fit();
-        native._setQuality(Math.max(0, qualities.indexOf(options.quality ?? 'auto')));
         const preset = presets[options.preset ?? ''];
-        const rain = this.reduced() ? 0 : options.rain ?? preset?.rain ?? 0;
         const look = lookOf(options);
-        const text = JSON.stringify(look);
-        if (text !== this.given) native.setLook(look);
-        this.given = text;
-        this.warn();
-        this.stale = true;
-        native._setInk(options.ink ?? preset?.ink ?? false);
-        native._setRain(rain > 0);
+        const quality = Math.max(0, qualities.indexOf(options.quality ?? 'auto'));
+        const ink = options.ink ?? preset?.ink ?? false;
+        const given = JSON.stringify([look, quality, ink]);
+        if (given !== this.given) {
+            native.setLook(look);
+            native._setQuality(quality);
+            native._setInk(ink);
+            this.stale = true;
+        }
+        this.given = given;
+        native._setShortestFrame(1 / this.loop.most);
+        native._setRain(!options.paused && !this.reduced() && (options.rain ?? preset?.rain ?? 0) > 0);
         this.wake();
-    }
-
-    // Of what is left out of the look.
-    private warn(): void {
-        const { look } = this.options;
-        const known = withinRange(look ?? {});
-        const names = Object.keys(look ?? {}).filter((name) => !(name in known)).join(', ');
-        if (names !== this.leftOut && names) console.warn(`tidemark-water: the look has no such numbers: ${names}.`);
-        this.leftOut = names;
-    }
-
-    // False where there is nothing to draw on.
-    private drawAgain(): boolean {
-        if (!this.live || this.failed || !this.native || !this.picture || !this.light) return false;
-        this.native._redraw();
-        return this.frame(this.native, this.lastFrame) === Frame.drawn;
     }
 
     // In one task with the frame, because a canvas that gets another size is empty until something is drawn.
     private frame(native: Native, now: number): Frame {
         const frame: Frame = native._frame(now / 1000);
         if (frame !== Frame.resize) return frame;
+        const { canvas } = this;
+        const { clientWidth, clientHeight } = canvas;
         const slot = this.slot();
-        this.canvas.width = native._width();
-        this.canvas.height = native._height();
+        canvas.width = native._width();
+        canvas.height = native._height();
+        // One without a size in CSS would grow with its pixels.
+        if (canvas.clientWidth !== clientWidth) canvas.style.width = `${clientWidth}px`;
+        if (canvas.clientHeight !== clientHeight) canvas.style.height = `${clientHeight}px`;
         native._resized();
         if (slot !== this.slot()) native._picturesChanged(backgrounds);
         return native._frame(now / 1000);
     }
 
-    private readonly draw = (now: number): void => {
-        this.asked = 0;
-        const { native, picture } = this;
-        if (!this.live || !native || !picture || !this.light || !this.running()) return;
-        if (this.gl?.isContextLost()) return;  // the event that tells so is still to come
-        const start = performance.now();
-        if (this.paused) {  // and its clock as well
-            now = this.lastFrame;
-            native._redraw();
-        }
+    private draw(now: number): Frame | null {
+        const { native, picture, options: { paused } } = this;
+        if (this.state !== 'live' || !native || !picture || !this.chooser.light) return null;
+        this.sight.look();
+        if (!this.running() || this.gl!.isContextLost()) return null;  // the event of the loss is still to come
+        if (paused) native._redraw();
         if (picture.changed()) native._picturesChanged(1 << this.slot());
         let frame: Frame;
         try {
-            frame = this.frame(native, now);
+            frame = this.frame(native, paused ? this.loop.last : now);
         } catch (error) {
-            return this.fail(error);
+            this.fail(error);
+            return null;
         }
+        if (this.gl!.isContextLost()) return null;
         const isFitted = this.canvas.width === native._width() && this.canvas.height === native._height();
         if (frame !== Frame.waiting && isFitted) this.stale = false;
-        if (frame === Frame.drawn) {
-            this.cost.frame = blend(this.cost.frame, this.calm ? 0 : now - this.lastFrame);
-            this.cost.work = blend(this.cost.work, performance.now() - start);
-            this.lastFrame = now;
-            this.show();
-        }
-        this.setCalm(frame === Frame.resting);
-        if (!this.calm || picture.moving()) this.wake();
-    };
+        if (frame === Frame.drawn) this.show();
+        if (frame === Frame.drawn && paused) this.copy();
+        if (!paused) this.setCalm(frame === Frame.resting);
+        if (frame !== Frame.resting || picture.moving()) this.wake();
+        return paused ? null : frame;
+    }
 
     private setCalm(calm: boolean): void {
         if (calm === this.calm) return;
@@ -531,19 +552,20 @@ export class Water extends EventTarget implements Borrower, Touched {
     }
 
     private show(): void {
-        if (this.parked) {
-            this.parked = false;
-            this.canvas.style.visibility = '';
-            if (this.still) this.still.width = this.still.height = 1;
-        }
+        this.hide(false);
+        if (this.kept) this.still.width = this.still.height = 1;
+        this.kept = false;
+        const { waiting } = this;
+        this.waiting = undefined;
+        waiting?.();
         if (this.shown) return;
         this.shown = true;
         this.settle.resolve();
         this.dispatchEvent(new Event('ready'));
         offer();
         if (!this.options.firstDrop || this.reduced()) return;
-        const { clientWidth, clientHeight } = this.canvas;
-        this.dropTimer = setTimeout(() => this.drop(0.5 * clientWidth, 0.42 * clientHeight), 700);
+        const { clientWidth, clientHeight } = this.box;
+        this.timers.drop = window.setTimeout(() => this.drop(0.5 * clientWidth, 0.42 * clientHeight), 700);
     }
 }
 

@@ -1,0 +1,9 @@
+// Water in canvases of the page's own.
+export type { Options } from './attributes.js';
+export { WaterError, type ErrorCode } from './errors.js';
+export { defaultLook, lookKeys, lookOf, type Choices, type Look, type LookKey, type Quality } from './look.js';
+export type { Cost } from './loop.js';
+export { setModule, type ModuleSource } from './native.js';
+export type { Source } from './pictures.js';
+export { presets, type Preset, type PresetName } from './presets.js';
+export { createWater, Water, type DropOptions, type WaterEvents } from './water.js';

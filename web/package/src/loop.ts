@@ -1,0 +1,51 @@
+// Frames of one water, as long as it moves.
+import { Frame } from './native.js';
+
+/** Milliseconds; see `Water.cost`. */
+export interface Cost {
+    frame: number;
+    work: number;
+}
+
+// Frames of a display come a little earlier or later than its rate says.
+const jitter = 3;  // milliseconds
+
+// Steady enough to be read.
+const blend = (old: number, value: number) => (old ? old + 0.1 * (value - old) : value);
+
+export class Loop {
+    readonly cost: Cost = { frame: 0, work: 0 };
+    /** Frames a second at most. */
+    most = Infinity;
+    /** When the last frame was drawn, in milliseconds. */
+    last = 0;
+
+    private asked = 0;
+    private follows = false;  // the last frame has followed another
+
+    /** `draw` asks for the next frame itself, with wake(). */
+    constructor(private readonly view: Window, private readonly draw: (now: number) => Frame | null) {}
+
+    wake(): void {
+        this.asked ||= this.view.requestAnimationFrame(this.run);
+    }
+
+    stop(): void {
+        this.view.cancelAnimationFrame(this.asked);
+        this.asked = 0;
+        this.follows = false;
+    }
+
+    private readonly run = (now: number): void => {
+        this.asked = 0;
+        if (this.follows && now - this.last < 1000 / this.most - jitter) return this.wake();
+        const start = performance.now();
+        const frame = this.draw(now);
+        if (frame === Frame.drawn) {
+            this.cost.frame = blend(this.cost.frame, this.follows ? now - this.last : 0);
+            this.cost.work = blend(this.cost.work, performance.now() - start);
+            this.last = now;
+        }
+        this.follows = this.asked !== 0;
+    };
+}

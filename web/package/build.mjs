@@ -10,6 +10,24 @@ const here = dirname(fileURLToPath(import.meta.url));
 const root = join(here, '../..');
 const most = 90_000;  // bytes, compressed
 
+// What editors read of the element: the comments of its attributes.
+function manifest() {
+    const table = readFileSync(join(here, 'src/attributes.ts'), 'utf8');
+    const entries = table.matchAll(/\/\*\*\n +\* (.*)\n +\* @default (.*)\n +\*\/\n +(\w+): \{ kind: '(\w+)'/g);
+    const attributes = [...entries].map(([, description, without, fieldName, kind]) => ({
+        name: fieldName === 'fetchPriority' ? 'fetchpriority' : fieldName.replace(/[A-Z]/g, (letter) => `-${letter.toLowerCase()}`),
+        fieldName, description, default: without, type: { text: { flag: 'boolean', number: 'number' }[kind] ?? 'string' },
+    }));
+    const events = ['ready', 'calm', 'wake', 'error', 'contextlost', 'contextrestored'].map((name) => ({ name, type: { text: 'CustomEvent' } }));
+    const declaration = {
+        kind: 'class', customElement: true, name: 'WaterElement', tagName: 'tidemark-water', attributes, events,
+        slots: [{ name: '', description: 'what is above the water' }, { name: 'fallback', description: 'shows until the water does' }],
+        cssParts: [{ name: 'water' }, { name: 'marker', description: 'where a key lets a drop fall' }],
+        cssStates: ['ready', 'calm', 'paused', 'failed'].map((name) => ({ name })),
+    };
+    return { schemaVersion: '2.1.0', modules: [{ kind: 'javascript-module', path: 'dist/tidemark-water.js', declarations: [declaration] }] };
+}
+
 rmSync(join(here, 'dist'), { recursive: true, force: true });
 mkdirSync(join(here, 'dist'));
 const dist = join(here, 'dist');
@@ -30,6 +48,7 @@ const { metafile } = await build({
 copyFileSync(join(here, 'src/style.css'), join(dist, 'style.css'));
 copyFileSync(join(root, 'build/web/tidemark-water.wasm'), join(dist, 'tidemark-water.wasm'));
 execFileSync('npx', ['tsc', '--project', here], { cwd: here, stdio: 'inherit' });
+writeFileSync(join(dist, 'custom-elements.json'), JSON.stringify(manifest(), null, 4));
 writeFileSync(join(here, 'licenses.txt'),
     ['LICENSE', 'THIRD_PARTY.md'].map((name) => readFileSync(join(root, name), 'utf8')).join('\n'));
 

@@ -10,16 +10,16 @@ const script = '<script type="module" src="tidemark-water.js"></script>';
 const types = { html: 'text/html', js: 'text/javascript', css: 'text/css', wasm: 'application/wasm', png: 'image/png', webp: 'image/webp' };
 
 // A page at an address of its own, with the built package beside it and pictures at hand.
-async function show(page, html, { headers = {}, files = {}, folder = dist, at = 'http://pond.test/page.html' } = {}) {
+async function show(page, html, { headers = {}, files = {}, folder = dist, at = 'http://pond.test/page.html', until } = {}) {
     files = { 'pond.png': slope(64, 64).buffer, 'words.png': 'words', 'page.html': `<!doctype html><html lang="en">${html}`, ...files };
-    await page.route('**/*.test/**', (route) => {
+    await page.route('**/*.test/**', async (route) => {
         const name = new URL(route.request().url()).pathname.slice(1);
-        const body = files[name] ?? (existsSync(join(folder, name)) && readFileSync(join(folder, name)));
+        const body = await files[name] ?? (existsSync(join(folder, name)) && readFileSync(join(folder, name)));
         if (!body) return route.fulfill({ status: 404 });
         const only = { 'access-control-allow-origin': 'http://pond.test' };  // without it, any page may
         return route.fulfill({ body, headers: { 'content-type': types[name.split('.').pop()], ...only, ...headers } });
     });
-    await page.goto(at);
+    await page.goto(at, { waitUntil: until });
 }
 const element = (page) => page.locator('tidemark-water');
 
@@ -270,6 +270,221 @@ test('a high element shows the portrait, and off screen a still picture until it
     expect(await live()).toBe(false);
     await element(page).click();
     await expect.poll(live).toBe(true);
+});
+
+test('contexts that the page\'s other graphics take come back, and until then the picture shows', async ({ page, problems }) => {
+    test.slow();
+    await page.setViewportSize({ width: 300, height: 400 });
+    await show(page, `${script}<tidemark-water src="pond.png"></tidemark-water><tidemark-water src="pond.png" id="opening"></tidemark-water>`);
+    await expect(page.locator('tidemark-water[shown]')).toHaveCount(2);
+    const states = () => element(page).evaluateAll((all) => all.map(({ water }) => water.state));
+    const red = async (water) => PNG.sync.read(await water.screenshot()).data[4 * 250];
+    const first = element(page).first();
+    await page.evaluate(() => {
+        window.others = Array.from({ length: 16 }, () => {
+            const gl = document.createElement('canvas').getContext('webgl');
+            gl.clear(gl.COLOR_BUFFER_BIT);
+            return gl;
+        });
+    });
+    await expect.poll(states).toEqual(['lost', 'lost']);
+    expect(await red(first)).toBeGreaterThan(180);  // 255 to the right, and white is told by its green
+    await expect.poll(states, { timeout: 30_000 }).toEqual(['live', 'live']);  // by itself
+    await first.evaluate(({ water }) => water.lose.loseContext());
+    await expect.poll(async () => (await states())[0]).toBe('lost');
+    await first.click();
+    await expect.poll(async () => (await states())[0], { timeout: 3000 }).toBe('live');
+    await expect.poll(() => red(first)).toBeGreaterThan(180);
+    // One that is taken while the water is made shows no black.
+    expect(await page.evaluate(async () => {
+        const { getContext } = HTMLCanvasElement.prototype;
+        HTMLCanvasElement.prototype.getContext = function (kind, ...more) {
+            const gl = getContext.call(this, kind, ...more);
+            if (kind === 'webgl') gl.getExtension('WEBGL_lose_context').loseContext();
+            return gl;
+        };
+        const water = Object.assign(document.createElement('tidemark-water'), { src: 'pond.png' });
+        const told = [];
+        for (const type of ['ready', 'contextlost']) water.addEventListener(type, () => told.push(type));
+        document.body.prepend(water);
+        while (told.length === 0) await new Promise(requestAnimationFrame);
+        HTMLCanvasElement.prototype.getContext = getContext;
+        while (told.length === 1) await new Promise(requestAnimationFrame);
+        return [...told, water.water.state];
+    })).toEqual(['contextlost', 'ready', 'live']);
+    expect(problems.splice(0).filter((text) => !/Too many active WebGL contexts|loseContext/.test(text))).toEqual([]);
+});
+
+test('drops land where the pointer is, however the water is turned', async ({ page }) => {
+    await show(page, `${script}<body style="margin: 150px"><tidemark-water src="pond.png" style="width: 200px; height: 300px"></tidemark-water>`);
+    await element(page).and(page.locator('[shown]')).waitFor();
+    const turns = ['none', 'rotate(30deg)', 'scaleX(-1)', 'perspective(500px) rotateY(50deg)'];
+    for (const turn of turns) {
+        // Of a mark at 30, 60 the browser tells the place.
+        expect(await element(page).evaluate((water, turn) => {
+            water.style.transform = turn;
+            const mark = water.appendChild(Object.assign(document.createElement('b'), { style: 'position: absolute; left: 30px; top: 60px' }));
+            const { x, y } = mark.getBoundingClientRect();
+            mark.remove();
+            const seen = [];
+            water.water.native._touch = (...touch) => seen.push(touch);
+            for (const type of ['pointerdown', 'pointerup']) {
+                water.dispatchEvent(new PointerEvent(type, { clientX: x, clientY: y, pointerId: 1, button: 0, buttons: 1, bubbles: true }));
+            }
+            return seen.map(([, left, top]) => [Math.round(200 * left), Math.round(300 * top)]);
+        }, turn), turn).toEqual([[30, 60], [30, 60]]);
+    }
+});
+
+test('after a click the keys scroll; from the keyboard they drop, and focus() works', async ({ page }) => {
+    await show(page, `${script}<tidemark-water src="pond.png"></tidemark-water><p style="height: 3000px">`);
+    await element(page).and(page.locator('[shown]')).waitFor();
+    const fallen = () => element(page).evaluate(({ water }) => water.fallen);
+    await element(page).evaluate(({ water }) => {
+        water.fallen = 0;
+        water.native._drop = () => ++water.fallen;
+    });
+    const top = () => page.evaluate(() => scrollY);
+    await element(page).click();
+    await expect(async () => {
+        await page.keyboard.press('Space');
+        expect(await top()).toBeGreaterThan(50);
+    }).toPass();
+    expect(await fallen()).toBe(0);
+    await page.evaluate(() => scrollTo(0, 0));
+    await expect.poll(top).toBe(0);
+    await element(page).evaluate((water) => { document.activeElement.blur(); water.focus(); });
+    await page.keyboard.press('Space');
+    expect(await fallen()).toBe(1);
+    expect(await top()).toBe(0);
+});
+
+test('nothing jumps while the script is on its way, and a picture of two sources is the fallback', async ({ page }) => {
+    await page.addInitScript(() => {
+        window.shift = 0;
+        new PerformanceObserver((list) => list.getEntries().forEach(({ value }) => (window.shift += value))).observe({ type: 'layout-shift', buffered: true });
+    });
+    let go;
+    const late = new Promise((resolve) => (go = () => resolve(readFileSync(join(dist, 'tidemark-water.js')))));
+    await show(page, `<link rel="stylesheet" href="style.css"><style>img { height: auto; max-width: 100%; }</style>
+        <script type="module" async src="tidemark-water.js"></script>
+        <tidemark-water><picture slot="fallback"><source srcset="pond.png" media="(min-width: 1px)"><img src="none.png" alt="A pond"></picture></tidemark-water><p>Text</p>`,
+        { until: 'commit', files: { 'tidemark-water.js': late } });
+    const image = page.locator('img');
+    await expect.poll(() => image.evaluate(({ clientWidth, clientHeight }) => [clientWidth, clientHeight])).toEqual([184, 160]);
+    await page.waitForTimeout(300);
+    go();
+    await element(page).and(page.locator('[shown]')).waitFor();
+    expect(await image.evaluate(({ clientWidth, clientHeight }) => [clientWidth, clientHeight])).toEqual([184, 160]);
+    expect(await element(page).evaluate(({ water }) => water.picture.size())).toEqual([64, 64]);
+    expect(await page.evaluate(() => window.shift)).toBe(0);
+});
+
+test.describe('dense canvas', () => {
+    test.use({ deviceScaleFactor: 2 });
+    test('a canvas without a size keeps its own, has one water, and waits for few drops', async ({ page, problems }) => {
+        await show(page, '<canvas></canvas>');
+        expect(await page.evaluate(async () => {
+            const { createWater } = await import('./core.js');
+            const defined = customElements.get('tidemark-water');
+            const canvas = document.querySelector('canvas');
+            const water = createWater(canvas, { light: 'none.png' });
+            for (let i = 0; i < 20_000; ++i) water.drop(1, 1);
+            await water.ready;  // the light is not needed
+            let second = null;
+            try {
+                createWater(canvas);
+            } catch (error) {
+                second = error.message;
+            }
+            await new Promise((resolve) => setTimeout(resolve, 500));
+            return [defined, second, water.state, canvas.clientWidth, canvas.width];
+        })).toEqual([undefined, expect.stringMatching(/destroyed first/), 'live', 300, 600]);
+        expect(problems.splice(0).every((text) => /none\.png/.test(text))).toBe(true);
+    });
+});
+
+test('pictures: lazy ones far below wait, others come as asked, failed ones are tried again, videos leave nothing', async ({ page, problems }) => {
+    const asked = [];
+    page.on('request', (request) => asked.push(request));
+    await show(page, `${script}<tidemark-water src="pond.png" fetchpriority="high"></tidemark-water><div style="height: 5000px"></div>
+        <tidemark-water id="far" loading="lazy" src="lazy.png"></tidemark-water>`);
+    const first = element(page).first();
+    await first.and(page.locator('[shown]')).waitFor();
+    const names = () => asked.map((request) => request.url().split('/').pop());
+    expect(names()).not.toContain('lazy.png');
+    // The address may lead to another server.
+    expect(await first.evaluate(({ water: { picture: { drawable } } }) => [drawable.crossOrigin, drawable.fetchPriority])).toEqual(['anonymous', 'high']);
+    await page.evaluate(() => document.querySelector('#far').scrollIntoView());
+    await expect.poll(names).toContain('lazy.png');
+    await page.evaluate(() => { document.querySelector('#far').src = 'lazy.png'; });
+    await expect.poll(() => names().filter((name) => name === 'lazy.png').length).toBeGreaterThan(2);  // one to find out why
+    expect(await first.evaluate(async (water) => {
+        const source = document.createElement('canvas').getContext('2d');
+        const video = Object.assign(document.createElement('video'), { srcObject: source.canvas.captureStream(), muted: true });
+        source.fillRect(0, 0, 9, 9);
+        await video.play();
+        let listening = 0;
+        const { addEventListener } = video;
+        video.addEventListener = function (type, listener, options) {
+            if (!options?.once) {
+                ++listening;
+                options.signal.addEventListener('abort', () => --listening);
+            }
+            return addEventListener.call(this, type, listener, options);
+        };
+        for (let i = 0; i < 5; ++i) {
+            await water.setPicture(video);
+            await water.setPicture(null);
+        }
+        return listening;
+    })).toBe(0);
+    expect(problems.splice(0).every((text) => /404|lazy\.png/.test(text))).toBe(true);
+});
+
+test('in another window strokes end, and in a sandboxed frame pictures show', async ({ page }) => {
+    await show(page, `${script}<tidemark-water src="pond.png"></tidemark-water><iframe sandbox="allow-scripts" src="frame.html"></iframe><iframe id="other" src="about:blank"></iframe>`,
+        { files: { 'frame.html': `<!doctype html>${script}<tidemark-water src="pond.png"></tidemark-water>` }, headers: { 'access-control-allow-origin': '*' } });
+    await page.frameLocator('iframe').first().locator('tidemark-water[shown]').waitFor();
+    expect(await element(page).evaluate(async (water) => {
+        const { contentDocument, contentWindow } = document.querySelector('#other');
+        contentDocument.body.append(water);
+        await new Promise((resolve) => water.addEventListener('ready', resolve));
+        const seen = [];
+        water.water.native._touch = (action) => seen.push(action);
+        const send = (target, type, buttons) => target.dispatchEvent(new contentWindow.PointerEvent(type, { clientX: 20, clientY: 20, pointerId: 1, button: 0, buttons, bubbles: true }));
+        send(water, 'pointerdown', 1);
+        send(contentDocument.body, 'pointerup', 0);
+        return seen;
+    })).toEqual([0, 1]);
+});
+
+test('people who do not see it: names, tab stops and rings', async ({ page }) => {
+    await page.emulateMedia({ forcedColors: 'active' });
+    await show(page, `<title>Ponds</title>${script}<main><h1>Ponds</h1>
+        <tidemark-water id="plain"></tidemark-water><tidemark-water id="decor" label=""></tidemark-water><tidemark-water id="hover" interaction="hover" label="Pond"></tidemark-water>
+        <button>Buy <tidemark-water id="in-button"></tidemark-water></button><a href="#x">More <tidemark-water id="in-link"></tidemark-water></a></main>`);
+    await expect(page.locator('tidemark-water[shown]').first()).toBeVisible();
+    const roles = await element(page).evaluateAll((all) => all.map(({ id, water: { canvas } }) =>
+        [id, canvas.getAttribute('role'), canvas.ariaLabel, canvas.tabIndex, canvas.ariaHidden]));
+    expect(roles).toEqual([['plain', 'button', 'Water: press to let a drop fall', 0, null], ['decor', null, null, -1, 'true'],
+        ['hover', 'img', 'Pond', -1, null], ['in-button', null, null, -1, 'true'], ['in-link', null, null, -1, 'true']]);
+    await page.addScriptTag({ path: new URL('../node_modules/axe-core/axe.min.js', import.meta.url).pathname });
+    const found = await page.evaluate(async () => (await window.axe.run()).violations.map(({ id, nodes }) => `${id}: ${nodes[0].html}`));
+    expect(found).toEqual([]);
+    await page.keyboard.press('Tab');
+    await expect(element(page).first().locator('canvas').last()).toHaveCSS('outline-style', 'solid');
+});
+
+test('both spellings of an attribute count, what is unknown is named once, and states can be styled', async ({ page, problems }) => {
+    await show(page, `${script}<tidemark-water inkcolor="#ff0000" srcportrait="pond.png" firstdrop fetchpriority="high" look='{"exponent": 9}'></tidemark-water>
+        <tidemark-water preset="lake" quality="best" rain="much"></tidemark-water><tidemark-water preset="lake" ink-color="red" paused></tidemark-water>`);
+    await expect(page.locator('tidemark-water[shown]')).toHaveCount(3);
+    expect(await element(page).first().evaluate(({ inkColor, srcPortrait, firstDrop, fetchPriority, look }) =>
+        [inkColor, srcPortrait, firstDrop, fetchPriority, look])).toEqual(['#ff0000', 'pond.png', true, 'high', { exponent: 9 }]);
+    expect(await element(page).evaluateAll((all) => all.map((water) => [water.matches(':state(ready)'), water.matches(':state(paused)')])))
+        .toEqual([[true, false], [true, false], [true, true]]);
+    expect(problems.splice(0).map((text) => /: (\w+)/.exec(text)[1])).toEqual(['preset', 'rain', 'quality', 'inkColor']);
 });
 
 test.describe('dense', () => {

@@ -1,5 +1,5 @@
 // Water in canvases of the page's own.
-export type { Options } from './attributes.js';
+export type { Options, Properties } from './attributes.js';
 export { WaterError, type ErrorCode } from './errors.js';
 export { defaultLook, lookKeys, lookOf, type Choices, type Look, type LookKey, type Quality } from './look.js';
 export type { Cost } from './loop.js';

@@ -476,6 +476,31 @@ test('people who do not see it: names, tab stops and rings', async ({ page }) =>
     await expect(element(page).first().locator('canvas').last()).toHaveCSS('outline-style', 'solid');
 });
 
+test('the README has the attributes that the element has', () => {
+    const { attributes } = JSON.parse(readFileSync(join(dist, 'custom-elements.json'))).modules[0].declarations[0];
+    const rows = attributes.map(({ name, description, default: without }) => `| \`${name}\` | ${description} | ${without} |\n`);
+    expect(readFileSync(join(dist, '../README.md'), 'utf8')).toContain(`| attribute | | without it |\n|---|---|---|\n${rows.join('')}\n`);
+    const script = "import('./core.js').then(() => import('./tidemark-water.js')).then(({ WaterElement }) => console.log(WaterElement.observedAttributes.join()))";
+    const known = execFileSync('node', ['-e', script], { cwd: dist, encoding: 'utf8' }).trim().split(',');
+    for (const { name, fieldName } of attributes) expect(known).toEqual(expect.arrayContaining([name, fieldName.toLowerCase()]));
+    expect(new Set(attributes.flatMap(({ name, fieldName }) => [name, fieldName.toLowerCase()])).size).toBe(known.length);
+});
+
+test('transparent water leaves the page as it is, lights it, and takes the pointers of the whole page', async ({ page }) => {
+    await show(page, `${script}<style>html { background: #345; } tidemark-water { position: fixed; inset: 0; pointer-events: none; }</style>
+        <tidemark-water transparent pointers="page" look='{"touchAmplitude": 4}'></tidemark-water><p style="margin: 150px 0">Text</p>`);
+    await element(page).and(page.locator('[shown]')).waitFor();
+    const light = async () => {
+        const { data } = PNG.sync.read(await page.screenshot({ animations: 'disabled' }));
+        return [Math.max(...data.filter((_, i) => i % 4 === 0 && i < 4 * 200 * 120)), data[2]];
+    };
+    await expect.poll(async () => (await light()).map((value, i) => Math.abs(value - [0x33, 0x55][i]) < 3)).toEqual([true, true]);
+    await expect(async () => {
+        await page.mouse.click(100, 60);
+        expect((await light())[0]).toBeGreaterThan(0x60);
+    }).toPass();
+});
+
 test('both spellings of an attribute count, what is unknown is named once, and states can be styled', async ({ page, problems }) => {
     await show(page, `${script}<tidemark-water inkcolor="#ff0000" srcportrait="pond.png" firstdrop fetchpriority="high" look='{"exponent": 9}'></tidemark-water>
         <tidemark-water preset="lake" quality="best" rain="much"></tidemark-water><tidemark-water preset="lake" ink-color="red" paused></tidemark-water>`);
@@ -511,7 +536,7 @@ test('the packed package works in a fresh project, with and without a bundler', 
         npm run --silent build
         tsc --noEmit --strict --skipLibCheck --jsx react-jsx --module esnext --moduleResolution bundler --types vite/client react.tsx`], { cwd: outputDir });
     await page.setViewportSize({ width: 1000, height: 700 });
-    for (const name of ['plain', 'background', 'dist/react', 'dist/vue', 'esbuild', 'iframe']) {
+    for (const name of ['plain', 'background', 'over', 'dist/react', 'dist/vue', 'esbuild', 'iframe']) {
         await show(page, '', { folder: outputDir, at: `http://pond.test/${name}.html` });
         const inside = name === 'iframe' ? page.frameLocator('iframe') : page;
         await inside.locator(name === 'esbuild' ? 'canvas[width="952"]' : 'tidemark-water[shown]').first().waitFor();

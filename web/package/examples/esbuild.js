@@ -1,4 +1,4 @@
-import { createWater } from 'tidemark-water';
+import { createWater } from 'tidemark-water/core';
 
 // What lies under the water moves: here a canvas that is drawn on.
 const source = document.createElement('canvas');

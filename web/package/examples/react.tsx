@@ -1,7 +1,9 @@
 import { useEffect, useRef, useState } from 'react';
 import { createRoot } from 'react-dom/client';
-import type { WaterElement } from 'tidemark-water';
+import { setModule, type WaterElement } from 'tidemark-water';
 import 'tidemark-water/react';
+import 'tidemark-water/style.css';
+import module from 'tidemark-water/tidemark-water.wasm?url';
 import pebbles from './pebbles.webp';
 
 function Hero() {
@@ -12,7 +14,7 @@ function Hero() {
         return () => clearInterval(timer);
     }, []);
     return (
-        <tidemark-water ref={water} className="hero" src={pebbles} ink inkColor="#4d1a80" rain={raining ? 14 : 0} look={{ touchAmplitude: 3 }}>
+        <tidemark-water ref={water} className="hero" src={pebbles} ink inkColor="#4d1a80" onready={() => console.log('ready')} rain={raining ? 14 : 0} look={{ touchAmplitude: 3 }}>
             <h1>React</h1>
             <p>Attributes, numbers and objects are properties.</p>
             <button className="button" onClick={() => setRaining(!raining)}>{raining ? 'Let it stop' : 'Let it rain'}</button>
@@ -20,4 +22,5 @@ function Hero() {
     );
 }
 
+setModule(module);
 createRoot(document.body).render(<Hero />);

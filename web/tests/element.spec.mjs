@@ -487,7 +487,7 @@ test('the README has the attributes that the element has', () => {
 });
 
 test('transparent water leaves the page as it is, lights it, and takes the pointers of the whole page', async ({ page }) => {
-    await show(page, `${script}<style>html { background: #345; } body { margin: 0; }</style>
+    await show(page, `${script}<style>html { background: #345; } body { margin: 0; } tidemark-water { pointer-events: none; }</style>
         <tidemark-water transparent pointers="page" look='{"touchAmplitude": 4}' style="height: 140px"><p style="margin: 60px 0">Text</p></tidemark-water>`);
     await element(page).and(page.locator('[shown]')).waitFor();
     const light = async () => {

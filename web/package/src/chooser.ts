@@ -1,7 +1,8 @@
 // Which picture is under the water and which light on it. Of several asked for, the last one stays.
 import type { Options } from './attributes.js';
 import type { WaterError } from './errors.js';
-import { greyPicture, loadPicture, plainPicture, shippedLight, type Picture, type Source } from './pictures.js';
+import { Slot } from './native.js';
+import { greyPicture, loadPicture, plainPicture, shippedLight, upload, uploadCover, type Picture, type Place, type Source } from './pictures.js';
 
 interface Told {
     pictureChanged(): void;
@@ -12,6 +13,7 @@ interface Told {
     moved(): void;
 }
 
+const lightSide = 512;
 const nothingYet = Symbol();
 const grey = Symbol();
 type Chosen = Source | symbol | null;
@@ -67,6 +69,23 @@ export class Chooser {
         if (!isLast()) return;
         this.light = light;
         this.told.lightChanged();
+    }
+
+    /** Fills the texture that is bound, in the middle of a frame. */
+    fill(gl: WebGLRenderingContext, slot: Slot, width: number, height: number, place: Place): void {
+        if (slot !== Slot.light) this.cover(gl, 'picture', width, height, place);
+        else if (this.light instanceof ImageBitmap) upload(gl, this.light);
+        else this.cover(gl, 'light', lightSide, lightSide, place);
+    }
+
+    private cover(gl: WebGLRenderingContext, part: 'picture' | 'light', ...size: [number, number, Place]): void {
+        try {
+            uploadCover(gl, this[part] as Picture, ...size);
+        } catch (error) {
+            uploadCover(gl, (this[part] = plainPicture()), ...size);
+            // Who hears of it may call in, which is not for the middle of a frame.
+            queueMicrotask(() => this.told.failed(error as WaterError, part === 'picture'));
+        }
     }
 
     end(): void {

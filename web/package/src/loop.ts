@@ -1,5 +1,5 @@
 // Frames of one water, as long as it moves.
-import { Frame } from './native.js';
+import { backgrounds, Frame, type Native } from './native.js';
 
 /** Milliseconds; see `Water.cost`. */
 export interface Cost {
@@ -49,3 +49,22 @@ export class Loop {
         this.follows = this.asked !== 0;
     };
 }
+
+/** Draws the frame of `now`, in milliseconds, and gives the canvas the pixels that the library asks for. */
+export function drawFrame(native: Native, canvas: HTMLCanvasElement, now: number): Frame {
+    const frame: Frame = native._frame(now / 1000);
+    if (frame !== Frame.resize) return frame;
+    const { clientWidth, clientHeight } = canvas;
+    const wasWide = isWide(canvas);
+    canvas.width = native._width();
+    canvas.height = native._height();
+    // One without a size in CSS would grow with its pixels.
+    if (canvas.clientWidth !== clientWidth) canvas.style.width = `${clientWidth}px`;
+    if (canvas.clientHeight !== clientHeight) canvas.style.height = `${clientHeight}px`;
+    native._resized();
+    if (wasWide !== isWide(canvas)) native._picturesChanged(backgrounds);
+    // In the same task, because the canvas is empty now.
+    return native._frame(now / 1000);
+}
+
+export const isWide = ({ width, height }: HTMLCanvasElement): boolean => width > height;

@@ -25,6 +25,9 @@ export enum Slot {
     light = 2,
 }
 
+/** Both pictures that may be under the water, for `_picturesChanged`. */
+export const backgrounds = (1 << Slot.portrait) | (1 << Slot.landscape);
+
 // The smallest module with a vector in it: a function that makes one and drops it.
 const vectors = new Uint8Array([
     0, 97, 115, 109, 1, 0, 0, 0, 1, 4, 1, 96, 0, 0, 3, 2, 1, 0, 10, 9, 1, 7, 0, 65, 0, 253, 15, 26, 11,

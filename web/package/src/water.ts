@@ -4,12 +4,13 @@ import { Chooser } from './chooser.js';
 import { WaterError, warnOnce } from './errors.js';
 import { borrow, contextOf, giveBack, offer, restored, takenFrom, type Claim } from './lease.js';
 import { lookOf } from './look.js';
-import { Loop, type Cost } from './loop.js';
-import { compile, Frame, instantiate, Slot, TouchAction, type Native } from './native.js';
-import { drawCover, placeOf, plainPicture, upload, uploadCover, type Picture, type Source } from './pictures.js';
+import { drawFrame, isWide, Loop, type Cost } from './loop.js';
+import { backgrounds, compile, Frame, instantiate, Slot, TouchAction, type Native } from './native.js';
+import { placeOf, type Picture, type Source } from './pictures.js';
 import { followPointers } from './pointers.js';
 import { presets } from './presets.js';
 import { Sight } from './sight.js';
+import { Still } from './still.js';
 
 // Of its context. A `live` water draws; a `parked` one has given the context back and shows its last frame; from a
 // `lost` one the browser has taken it, and its picture shows without water.
@@ -42,12 +43,10 @@ export interface Stage {
 }
 
 const qualities = ['auto', 'low', 'medium', 'high'];  // in the host's order
-const backgrounds = (1 << Slot.portrait) | (1 << Slot.landscape);
 const parkAfter = 4000;    // milliseconds out of view
 const touchCounts = 3000;  // milliseconds that a touched water is not taken its context
 const firstRetry = 4000;   // milliseconds until a context that was taken is asked for again; then twice as many
 const lastRetry = 60_000;
-const lightSide = 512;
 
 const taken = new WeakSet<HTMLCanvasElement>();  // by a water
 
@@ -67,7 +66,7 @@ export class Water extends EventTarget {
     calm = true;
 
     private readonly box: HTMLElement;
-    private readonly still: HTMLCanvasElement;
+    private readonly still: Still;
     private readonly end = new AbortController();
     private readonly sight: Sight;
     private readonly reducedMotion: MediaQueryList;
@@ -89,7 +88,6 @@ export class Water extends EventTarget {
     private turn = 0;          // of the state
     private shown = false;     // the first picture was seen
     private stale = true;      // a frame is due, even while it is paused
-    private kept = false;      // the still has what shows
     private drawing = false;   // a stroke, which has to be ended
     private isHeard = false;   // what fails, by a listener
     private lastTouch = -touchCounts;
@@ -105,7 +103,7 @@ export class Water extends EventTarget {
         if (taken.has(canvas)) throw new Error('This canvas has a water, which is to be destroyed first.');
         taken.add(canvas);
         this.box = stage?.box ?? canvas;
-        this.still = stage?.still ?? document.createElement('canvas');
+        this.still = new Still(stage?.still ?? document.createElement('canvas'));
         this.ready = new Promise((resolve, reject) => (this.settle = { resolve, reject }));
         this.ready.catch(() => {});
         const { signal } = this.end;
@@ -175,8 +173,7 @@ export class Water extends EventTarget {
 
     async toBlob(type = 'image/png', quality?: number): Promise<Blob> {
         if (!this.keep()) throw new Error('no picture yet');
-        return new Promise((resolve, reject) =>
-            this.still.toBlob((blob) => (blob ? resolve(blob) : reject(new Error(`no ${type}`))), type, quality));
+        return this.still.blob(type, quality);
     }
 
     /** Ends everything; nothing that was made here stays but the canvas. */
@@ -201,6 +198,10 @@ export class Water extends EventTarget {
 
     private get picture(): Picture | undefined {
         return this.chooser.picture;
+    }
+    // The one of the two pictures that is shown.
+    private slot(): Slot {
+        return isWide(this.canvas) ? Slot.landscape : Slot.portrait;
     }
     private reduced(): boolean {
         const { motion } = this.options;
@@ -303,7 +304,7 @@ export class Water extends EventTarget {
     private wake(): void {
         if (!this.running()) return;
         if (this.state === 'none' || this.state === 'parked') void this.open();
-        else if (this.state === 'live' && this.picture && this.chooser.light) this.loop.wake();
+        else if (this.isComplete()) this.loop.wake();
     }
 
     private async open(): Promise<void> {
@@ -341,7 +342,11 @@ export class Water extends EventTarget {
     }
 
     private async begin(module: WebAssembly.Module, gl: WebGLRenderingContext): Promise<Native> {
-        const load = (slot: Slot, width: number, height: number) => this.load(slot, width, height);
+        // What is not shown keeps its one pixel.
+        const load = (slot: Slot, width: number, height: number) => {
+            if (slot !== Slot.light && slot !== this.slot()) return;
+            this.chooser.fill(this.gl!, slot, width, height, placeOf(getComputedStyle(this.canvas).objectPosition));
+        };
         const native = await instantiate(module, gl, load, 1 + Math.floor(Math.random() * 1e6));
         this.longestSide = Math.min(gl.getParameter(gl.MAX_TEXTURE_SIZE), ...gl.getParameter(gl.MAX_VIEWPORT_DIMS));
         if (this.picture) native._picturesChanged(backgrounds);
@@ -402,37 +407,23 @@ export class Water extends EventTarget {
         style.opacity = opacity;
     }
 
-    // False where there is nothing to draw on. A canvas with WebGL can be read only in the task that has drawn.
+    // False where there is nothing to draw on.
     private keep(): boolean {
-        const { native, picture } = this;
-        if (this.kept) return true;
-        if (this.state !== 'live' || !native || !picture || !this.chooser.light) return false;
+        const { native, still } = this;
+        if (still.isKept) return true;
+        if (!native || !this.isComplete()) return false;
         native._redraw();
-        if (this.frame(native, this.loop.last) !== Frame.drawn || this.gl!.isContextLost()) return false;
-        this.copy();
+        if (drawFrame(native, this.canvas, this.loop.last) !== Frame.drawn || this.gl!.isContextLost()) return false;
+        still.copy(this.canvas);
         return true;
     }
 
-    private copy(): void {
-        const { still, canvas } = this;
-        still.width = canvas.width;
-        still.height = canvas.height;
-        still.getContext('2d', { alpha: false })!.drawImage(canvas, 0, 0);
-        this.kept = true;
-    }
-
-    // Water at rest looks so.
     private keepPicture(): void {
-        const { still, canvas, picture } = this;
-        if (!picture || !this.shown) return;
-        still.width = canvas.width;
-        still.height = canvas.height;
-        drawCover(still, picture, this.place());
-        this.kept = true;
+        if (this.picture && this.shown) this.still.show(this.picture, this.canvas);
     }
 
-    private place() {
-        return placeOf(getComputedStyle(this.canvas).objectPosition);
+    private isComplete(): boolean {
+        return this.state === 'live' && Boolean(this.picture && this.chooser.light);
     }
 
     private fit(): void {
@@ -459,28 +450,6 @@ export class Water extends EventTarget {
         this.wake();
     }
 
-    // Called by the library's host in the middle of a frame. What is not shown keeps its one pixel.
-    private load(slot: Slot, width: number, height: number): void {
-        const { gl, chooser } = this;
-        const cover = (part: 'picture' | 'light', ...size: [number, number]) => {
-            try {
-                uploadCover(gl!, chooser[part] as Picture, ...size, this.place());
-            } catch (error) {
-                uploadCover(gl!, (chooser[part] = plainPicture()), ...size, this.place());
-                queueMicrotask(() => this.fail(error));  // who hears of it may call in, which is not for the middle of a frame
-            }
-        };
-        if (slot === this.slot()) cover('picture', width, height);
-        if (slot !== Slot.light) return;
-        if ('drawable' in chooser.light!) cover('light', lightSide, lightSide);
-        else upload(gl!, chooser.light!);
-    }
-
-    // The one of the two pictures that is shown.
-    private slot(): Slot {
-        return this.canvas.width > this.canvas.height ? Slot.landscape : Slot.portrait;
-    }
-
     private apply(): void {
         const { native, options } = this;
         this.loop.most = options.fps || Infinity;
@@ -503,33 +472,16 @@ export class Water extends EventTarget {
         this.wake();
     }
 
-    // In one task with the frame, because a canvas that gets another size is empty until something is drawn.
-    private frame(native: Native, now: number): Frame {
-        const frame: Frame = native._frame(now / 1000);
-        if (frame !== Frame.resize) return frame;
-        const { canvas } = this;
-        const { clientWidth, clientHeight } = canvas;
-        const slot = this.slot();
-        canvas.width = native._width();
-        canvas.height = native._height();
-        // One without a size in CSS would grow with its pixels.
-        if (canvas.clientWidth !== clientWidth) canvas.style.width = `${clientWidth}px`;
-        if (canvas.clientHeight !== clientHeight) canvas.style.height = `${clientHeight}px`;
-        native._resized();
-        if (slot !== this.slot()) native._picturesChanged(backgrounds);
-        return native._frame(now / 1000);
-    }
-
     private draw(now: number): Frame | null {
         const { native, picture, options: { paused } } = this;
-        if (this.state !== 'live' || !native || !picture || !this.chooser.light) return null;
+        if (!native || !picture || !this.isComplete()) return null;
         this.sight.look();
         if (!this.running() || this.gl!.isContextLost()) return null;  // the event of the loss is still to come
         if (paused) native._redraw();
         if (picture.changed()) native._picturesChanged(1 << this.slot());
         let frame: Frame;
         try {
-            frame = this.frame(native, paused ? this.loop.last : now);
+            frame = drawFrame(native, this.canvas, paused ? this.loop.last : now);
         } catch (error) {
             this.fail(error);
             return null;
@@ -538,7 +490,7 @@ export class Water extends EventTarget {
         const isFitted = this.canvas.width === native._width() && this.canvas.height === native._height();
         if (frame !== Frame.waiting && isFitted) this.stale = false;
         if (frame === Frame.drawn) this.show();
-        if (frame === Frame.drawn && paused) this.copy();
+        if (frame === Frame.drawn && paused) this.still.copy(this.canvas);
         if (!paused) this.setCalm(frame === Frame.resting);
         if (frame !== Frame.resting || picture.moving()) this.wake();
         return paused ? null : frame;
@@ -553,8 +505,7 @@ export class Water extends EventTarget {
 
     private show(): void {
         this.hide(false);
-        if (this.kept) this.still.width = this.still.height = 1;
-        this.kept = false;
+        this.still.forget();
         const { waiting } = this;
         this.waiting = undefined;
         waiting?.();

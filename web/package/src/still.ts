@@ -1,0 +1,37 @@
+// A picture of the water, for where it cannot be drawn. A canvas with WebGL can be read only in the task that has drawn.
+import { drawCover, placeOf, type Picture } from './pictures.js';
+
+export class Still {
+    /** Whether it has what the water shows. */
+    isKept = false;
+
+    constructor(private readonly canvas: HTMLCanvasElement) {}
+
+    copy(from: HTMLCanvasElement): void {
+        this.resize(from.width, from.height);
+        this.canvas.getContext('2d', { alpha: false })!.drawImage(from, 0, 0);
+        this.isKept = true;
+    }
+
+    /** Water at rest looks like its picture. */
+    show(picture: Picture, { width, height }: HTMLCanvasElement): void {
+        this.resize(width, height);
+        drawCover(this.canvas, picture, placeOf(getComputedStyle(this.canvas).objectPosition));
+        this.isKept = true;
+    }
+
+    forget(): void {
+        if (this.isKept) this.resize(1, 1);
+        this.isKept = false;
+    }
+
+    blob(type: string, quality?: number): Promise<Blob> {
+        return new Promise((resolve, reject) =>
+            this.canvas.toBlob((blob) => (blob ? resolve(blob) : reject(new Error(`no ${type}`))), type, quality));
+    }
+
+    private resize(width: number, height: number): void {
+        this.canvas.width = width;
+        this.canvas.height = height;
+    }
+}

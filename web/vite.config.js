@@ -1,10 +1,49 @@
 import { createHash } from 'node:crypto';
 import { readdirSync, readFileSync, statSync, writeFileSync } from 'node:fs';
-import { join } from 'node:path';
+import { join, posix } from 'node:path';
+import { Marked } from 'marked';
 import { defineConfig } from 'vite';
 
 const out = new URL('dist', import.meta.url).pathname;
 const largestSite = 1_000_000;  // bytes before compression
+
+// The documents that the page links to, as pages with links between them. What is not among them is named without a link.
+const documents = ['README.md', 'web/README.md', 'web/package/README.md', 'android/README.md',
+    ...['bench', 'contract', 'engine', 'host', 'look', 'promises'].map((name) => `docs/${name}.md`)];
+
+function renderDocuments() {
+    const pageOf = (path) => path.replace(/\.md$/, '.html');
+    const render = (path) => {
+        const marked = new Marked({
+            renderer: {
+                image: () => '',
+                link({ href, tokens }) {
+                    const text = this.parser.parseInline(tokens);
+                    if (/^https?:/.test(href)) return `<a href="${href}">${text}</a>`;
+                    const [file, place] = href.split('#');
+                    const target = file ? posix.join(posix.dirname(path), file) : path;
+                    return documents.includes(target) ? `<a href="${posix.relative(posix.dirname(path), pageOf(target))}${place ? `#${place}` : ''}">${text}</a>` : text;
+                },
+                heading({ tokens, depth }) {
+                    const text = this.parser.parseInline(tokens);
+                    return `<h${depth} id="${text.toLowerCase().replace(/[^\w ]/g, '').replaceAll(' ', '-')}">${text}</h${depth}>`;
+                },
+            },
+        });
+        const text = readFileSync(new URL(`../${path}`, import.meta.url), 'utf8');
+        const top = '../'.repeat(path.split('/').length);
+        return `<!doctype html><html lang="en"><head><meta charset="utf-8"><title>${/^# (.*)/m.exec(text)[1]}</title>
+<meta name="viewport" content="width=device-width, initial-scale=1"><link rel="icon" href="${top}favicon.svg"><link rel="stylesheet" href="${top}documents.css"></head>
+<body><p><a href="${top}">Tidemark</a></p>${marked.parse(text)}</body></html>`;
+    };
+    return {
+        name: 'render-documents',
+        apply: 'build',
+        generateBundle() {
+            for (const path of documents) this.emitFile({ type: 'asset', fileName: `documents/${pageOf(path)}`, source: render(path) });
+        },
+    };
+}
 
 // Adds the licenses, and the service worker, which has to know every file of the site and to change with each.
 function completeSite() {
@@ -60,5 +99,5 @@ export default defineConfig({
     server: { fs: { allow: ['..'] } },  // host/look.properties and build/web
     // So strict that a page with scripts of its own in the HTML, or styles, would not work.
     preview: { headers: { 'content-security-policy': "default-src 'self'; script-src 'self' 'wasm-unsafe-eval'; img-src * blob: data:" } },
-    plugins: [hurry(), completeSite()],
+    plugins: [hurry(), renderDocuments(), completeSite()],
 });

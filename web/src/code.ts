@@ -1,12 +1,14 @@
 // The chosen values for a page of one's own and for the hosts.
 import { defaultLook, lookKeys, lookOf } from 'tidemark-water';
-import { defaultSettings, withPreset, type Settings } from './settings';
+import { addressOf, usualPreset, withPreset, type Settings } from './settings';
+
+const pictureOf = ({ picture }: Settings) => addressOf(picture) ?? 'picture.jpg';
 
 // What an element or a canvas is told.
 function choices({ preset, ink, inkColor, rain, look }: Settings): Record<string, unknown> {
     const usual = withPreset(preset);
     return {
-        ...(preset !== defaultSettings().preset && { preset }),
+        ...(preset !== usualPreset && { preset }),
         ...(ink && { ink, ...(inkColor !== usual.inkColor && { inkColor }) }),
         ...(rain !== usual.rain && { rain }),
         ...(Object.keys(look).length > 0 && { look }),
@@ -20,11 +22,11 @@ export function toHtml(settings: Settings): string {
         return typeof value === 'object' ? ` ${attribute}='${JSON.stringify(value)}'` : ` ${attribute}="${value}"`;
     });
     const off = !settings.ink ? ' ink="off"' : '';
-    return `<script type="module" src="tidemark-water.js"></script>\n<tidemark-water src="picture.jpg"${words.join('')}${off}></tidemark-water>\n`;
+    return `<script type="module" src="tidemark-water.js"></script>\n<tidemark-water src="${pictureOf(settings)}"${words.join('')}${off}></tidemark-water>\n`;
 }
 
-export function toJavaScript(settings: Settings): string {
-    const options = { src: 'picture.jpg', ...choices(settings), ink: settings.ink };
+function toJavaScript(settings: Settings): string {
+    const options = { src: pictureOf(settings), ...choices(settings), ink: settings.ink };
     return `import { createWater } from 'tidemark-water';\ncreateWater(document.querySelector('canvas'), ${JSON.stringify(options, null, 4)});\n`;
 }
 
@@ -39,6 +41,8 @@ function statements(settings: Settings): string {
     return `${assignments.join('')}water.setLook(look);\nwater.setInk(${settings.ink});\nwater.setRain(${settings.rain > 0});\n`;
 }
 
-export const toCpp = (settings: Settings): string => `Look look;\n${statements(settings)}`;
-
-export const toJava = (settings: Settings): string => `Look look = new Look();\n${statements(settings)}`;
+export const codes: Readonly<Record<string, (settings: Settings) => string>> = {
+    JavaScript: toJavaScript,
+    Java: (settings) => `Look look = new Look();\n${statements(settings)}`,
+    'C++': (settings) => `Look look;\n${statements(settings)}`,
+};

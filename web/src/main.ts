@@ -1,21 +1,23 @@
 // The page around the element: settings flow from the controls into it and into the address.
 import './style.css';
-import { WaterError, type ErrorCode, type WaterElement } from 'tidemark-water';
+import type { ErrorCode, WaterElement } from 'tidemark-water';
+import { makeHistory } from './history';
 import { makePanel } from './panel';
-import { paint } from './pictures';
-import { fromHash, src, toHash, type Settings } from './settings';
+import { makePictures, offered } from './pictures';
+import { randomSettings } from './random';
+import { canRecord, record, type Recording } from './record';
+import { fromHash, toHash, type Settings } from './settings';
+import { copy, download } from './share';
 
 const element = <T extends HTMLElement>(id: string) => document.querySelector<T>(`#${id}`)!;
 const water = element<WaterElement>('water');
 const settings: Settings = fromHash(location.hash);
+const past = makeHistory(settings);
 const usualRain = 14;
+const isSmall = () => matchMedia('(max-width: 900px), (max-height: 560px)').matches;
 
-let photos: File[] = [];
-let asked: Settings['picture'] | null = null;
-let shown: Settings['picture'] | null = null;
-let lastTicket = 0;  // of the picture asked for last
-let repaintDue = 0;
-let addressDue = 0;
+let recording: Recording | undefined;
+let settleDue = 0;
 let messageDue = 0;
 
 const sentences: Partial<Record<ErrorCode, string>> = {
@@ -27,7 +29,7 @@ const sentences: Partial<Record<ErrorCode, string>> = {
     load: 'That picture does not load.',
 };
 
-// Goes by itself, unless it tells that nothing works.
+// Goes by itself, unless it tells what lasts.
 function say(text: string, stays = false): void {
     clearTimeout(messageDue);
     element('message').textContent = text;
@@ -35,105 +37,141 @@ function say(text: string, stays = false): void {
     if (!stays) messageDue = window.setTimeout(() => say('', true), 5000);
 }
 
-// Of a file that no image shows, false.
-async function isPortrait(file: File): Promise<boolean> {
-    const image = new Image();
-    image.src = URL.createObjectURL(file);
-    await new Promise((resolve) => (image.onload = image.onerror = resolve));
-    URL.revokeObjectURL(image.src);
-    return image.naturalHeight > image.naturalWidth;
-}
+const pictures = makePictures(water, (shown, reason) => {
+    if (shown) settings.picture = shown;
+    if (reason) say(reason);
+    panel.refresh();
+});
 
-async function showPicture(): Promise<void> {
-    const ticket = ++lastTicket;
-    const isLast = () => ticket === lastTicket;
-    asked = settings.picture;
-    const busy = window.setTimeout(() => document.body.classList.add('busy'), 150);
+function settle(): void {
+    past.settle();
+    panel.refresh();
     try {
-        if (asked === 'photo') {
-            const [first, second] = photos;
-            const turned = second && (await isPortrait(first!));
-            if (!isLast()) return;
-            await water.setPicture(turned ? second : first!, (turned ? first : second) ?? null);
-        } else if (asked === 'src') {
-            await water.setPicture(src);
-        } else {
-            const density = Math.min(devicePixelRatio, 2, 2048 / Math.max(water.clientWidth, water.clientHeight));
-            const bitmap = await paint(asked, Math.round(water.clientWidth * density), Math.round(water.clientHeight * density));
-            if (isLast()) await water.setPicture(bitmap);
-        }
-        if (isLast()) shown = asked;
-    } catch (error) {
-        if (!isLast()) return;
-        asked = shown;
-        if (shown) settings.picture = shown;
-        // The element has told its own errors.
-        if (!(error instanceof WaterError)) say(String((error as Error).message));
-        panel.refresh();
-    } finally {
-        clearTimeout(busy);
-        if (isLast()) document.body.classList.remove('busy');
+        history.replaceState(null, '', `#${toHash(settings)}`);
+    } catch {
+        // Some browsers refuse more than a hundred in ten seconds. Then the next change brings it.
     }
 }
 
-const apply = () => {
-    if (settings.picture === 'photo' && photos.length === 0) {
-        settings.picture = asked ?? 'pool';
-        element('files').click();
-    }
-    const { preset, ink, inkColor, rain, look } = settings;
+function apply(): void {
+    const { picture, preset, ink, inkColor, rain, look } = settings;
     Object.assign(water, { preset, ink, inkColor, rain, look: { ...look } });
     element('ink').ariaPressed = String(ink);
     element('rain').ariaPressed = String(rain > 0);
-    if (settings.picture !== asked) void showPicture();
+    pictures.show(picture);
     panel.refresh();
-    // Some browsers refuse more than a hundred changes in ten seconds.
-    clearTimeout(addressDue);
-    addressDue = window.setTimeout(() => {
-        try {
-            history.replaceState(null, '', `#${toHash(settings)}`);
-        } catch {
-            // Then the next change brings it.
-        }
-    }, 300);
-};
-const panel = makePanel(element('panel'), settings, apply);
+    clearTimeout(settleDue);
+    settleDue = window.setTimeout(settle, 300);
+}
 
-async function takePhotos(files: File[]): Promise<void> {
-    if (files.length === 0) return;
-    photos = files;
-    settings.picture = 'photo';
-    if (asked === 'photo') void showPicture();
+function replace(chosen: Settings): void {
+    Object.assign(settings, chosen);
     apply();
 }
-function toggle(name: 'ink' | 'rain'): void {
-    if (name === 'ink') settings.ink = !settings.ink;
-    else settings.rain = settings.rain > 0 ? 0 : usualRain;
-    apply();
-}
-function togglePanel(open = element('panel').hidden): void {
-    element('panel').hidden = !open;
-    element('look').ariaPressed = String(open);
-}
+
+const toggleInk = () => replace({ ...settings, ink: !settings.ink });
+const toggleRain = () => replace({ ...settings, rain: settings.rain > 0 ? 0 : usualRain });
+const random = () => replace(randomSettings(settings));
+const undo = () => (past.undo(), apply());
+const openFiles = () => element('files').click();
 const hideHint = () => element('hint').classList.add('gone');
 
-element('ink').onclick = () => toggle('ink');
-element('rain').onclick = () => toggle('rain');
-element('clear').onclick = () => water.clearInk();
-element('photo').onclick = () => element('files').click();
-element('look').onclick = () => togglePanel();
+async function copied(text: string, what: string): Promise<void> {
+    say((await copy(text)) ? `${what} copied.` : `This browser does not let the page copy. Please select the text and copy it.`);
+}
+async function savePicture(): Promise<void> {
+    await water.toBlob('image/png').then((blob) => download(blob, 'tidemark.png'), () => say('There is no picture to save yet.'));
+}
+function toggleFullScreen(): void {
+    if (document.fullscreenElement) void document.exitFullscreen();
+    else document.documentElement.requestFullscreen().catch(() => say('This browser does not let the page fill the screen.'));
+}
+async function toggleRecording(): Promise<void> {
+    if (recording) return recording.stop();
+    try {
+        recording = record(water.water!.canvas);
+        document.body.classList.add('recording');
+        element('record').textContent = 'Stop recording';
+        say('Recording: move the water. “Stop” ends it, or a minute.');
+        const clip = await recording.clip;
+        if (clip.size > 0) download(clip, `tidemark.${clip.type.split('/')[1]}`);
+        else say('Nothing moved, so there is no clip.');
+    } catch {
+        say('This browser could not record the water.');
+    }
+    recording = undefined;
+    document.body.classList.remove('recording');
+    element('record').textContent = 'Record a clip';
+}
+
+function toggle(part: 'panel' | 'share', open = element(part).hidden): void {
+    element(part).hidden = !open;
+    element(part === 'panel' ? 'look' : 'more').ariaExpanded = String(open);
+    if (part === 'panel' && open && water.hasAttribute('shown')) void panel.drawThumbnails();
+}
+const panel = makePanel(element('panel'), settings, {
+    changed: apply,
+    chooseOwnPicture: () => (pictures.hasPhoto && settings.picture !== 'photo' ? replace({ ...settings, picture: 'photo' }) : openFiles()),
+    random,
+    undo,
+    canUndo: past.canUndo,
+    copy: copied,
+});
+
+function take(pictureOrFiles: File[] | string): void {
+    if (typeof pictureOrFiles === 'string') return replace({ ...settings, picture: pictureOrFiles });
+    pictures.takePhotos(pictureOrFiles);
+    replace({ ...settings, picture: 'photo' });
+}
+
+const buttons: Record<string, () => unknown> = {
+    ink: toggleInk,
+    rain: toggleRain,
+    clear: () => water.clearInk(),
+    picture: openFiles,
+    more: () => (recording ? toggleRecording() : toggle('share')),
+    full: toggleFullScreen,
+    look: () => toggle('panel'),
+    link: () => copied(`${location.href.split('#')[0]}#${toHash(settings)}`, 'The link is'),
+    save: savePicture,
+    record: toggleRecording,
+};
+for (const [id, press] of Object.entries(buttons)) element(id).onclick = press;
+element('full').hidden = !document.fullscreenEnabled;
+element('record').hidden = !canRecord;
+
+const keys: Record<string, () => unknown> = {
+    i: toggleInk,
+    r: toggleRain,
+    c: () => water.clearInk(),
+    n: random,
+    f: toggleFullScreen,
+    escape: () => (element('share').hidden ? toggle('panel', false) : toggle('share', false)),
+};
+addEventListener('keydown', (event) => {
+    const key = event.key.toLowerCase();  // Caps Lock
+    if (event.altKey) return;
+    if (!event.ctrlKey && !event.metaKey) return void keys[key]?.();
+    if (key !== 'z' || event.shiftKey) return;
+    event.preventDefault();
+    undo();
+});
+addEventListener('pointerdown', ({ target }) => {
+    if (!(target as Element).closest('#share, #more')) toggle('share', false);
+});
+element('share').onclick = () => toggle('share', false);
+
 element<HTMLInputElement>('files').onchange = ({ target }) => {
     const input = target as HTMLInputElement;
-    void takePhotos([...input.files!]);
+    if (input.files!.length > 0) take([...input.files!]);
     input.value = '';  // the same file again is a change as well
 };
-addEventListener('keydown', ({ key, target, ctrlKey, metaKey, altKey }) => {
-    if (target instanceof HTMLInputElement || ctrlKey || metaKey || altKey) return;
-    if (key === 'i') toggle('ink');
-    if (key === 'r') toggle('rain');
-    if (key === 'c') water.clearInk();
-    if (key === 'Escape') togglePanel(false);
-});
+function takeOffered(data: DataTransfer | null): void {
+    const pictureOrFiles = offered(data);
+    if (pictureOrFiles) take(pictureOrFiles);
+    else say('That is neither a picture nor the address of one.');
+}
+addEventListener('paste', ({ clipboardData }) => takeOffered(clipboardData));
 addEventListener('dragover', (event) => {
     event.preventDefault();
     document.body.classList.add('dropping');
@@ -144,20 +182,18 @@ addEventListener('dragleave', ({ relatedTarget }) => {
 addEventListener('drop', (event) => {
     event.preventDefault();
     document.body.classList.remove('dropping');
-    void takePhotos([...event.dataTransfer!.files]);
+    takeOffered(event.dataTransfer);
 });
 addEventListener('hashchange', () => {
-    Object.assign(settings, fromHash(location.hash), asked === 'photo' ? { picture: asked } : {});
-    apply();
-});
-// Painted pictures fit one size; until the next is painted the last one serves, cropped.
-addEventListener('resize', () => {
-    clearTimeout(repaintDue);
-    if (asked && asked !== 'photo' && asked !== 'src') repaintDue = window.setTimeout(showPicture, 250);
+    const chosen = fromHash(location.hash);
+    replace(settings.picture === 'photo' ? { ...chosen, picture: 'photo' } : chosen);
 });
 
 water.addEventListener('pointerdown', hideHint);
-water.addEventListener('ready', () => setTimeout(hideHint, 9000));
+water.addEventListener('ready', () => {
+    setTimeout(hideHint, 9000);
+    if (!element('panel').hidden) setTimeout(() => void panel.drawThumbnails(), 1000);
+});
 water.addEventListener('error', ({ detail: { code, message } }) => {
     say(sentences[code] ?? message, ['webgl', 'simd', 'csp', 'module'].includes(code));
 });
@@ -167,8 +203,9 @@ setInterval(() => {
     if (!element('panel').hidden && water.water) panel.showStatus(water.water);
 }, 500);
 
-if (new URLSearchParams(location.search).get('ui') === '0') document.body.classList.add('bare');
-togglePanel(!matchMedia('(max-width: 900px), (max-height: 560px)').matches);
+const isBare = new URLSearchParams(location.search).get('ui') === '0';
+if (isBare) document.body.classList.add('bare');
+toggle('panel', !isBare && !isSmall());
 apply();
 // For the browser's console.
 Object.assign(window, { tidemark: { settings, apply, water } });

@@ -1,8 +1,7 @@
 // A worker that paints the built-in pictures, so that the water does not wait for them.
 import createPainter, { type Painter } from '../../build/web/tidemark-painter.js';
 import url from '../../build/web/tidemark-painter.wasm?url';
-
-export type Painting = 'pool' | 'river' | 'shore';
+import { tone, type Ground } from './grounds';
 
 export interface Painted {
     id: number;
@@ -11,7 +10,7 @@ export interface Painted {
 
 interface Task {
     id: number;
-    painting: Painting;
+    ground: Ground;
     width: number;
     height: number;
 }
@@ -19,11 +18,12 @@ interface Task {
 const loaded: Promise<Painter> = createPainter({ locateFile: () => url });
 loaded.catch(() => {});  // told with the first task
 
-async function paint({ painting, width, height }: Task): Promise<ImageBitmap> {
+async function paint({ ground, width, height }: Task): Promise<ImageBitmap> {
     const module = await loaded;
-    const fill = { pool: module._paintTiledPool, river: module._paintRiverBed, shore: module._paintSandyShore }[painting];
+    const fill = { pool: module._paintTiledPool, river: module._paintRiverBed, shore: module._paintSandyShore }[ground.painting];
     const place = fill(width, height);
     const pixels = new Uint8ClampedArray(module.HEAPU8.slice(place, place + 4 * width * height).buffer);
+    tone(pixels, ground);
     return createImageBitmap(new ImageData(pixels, width, height));
 }
 

@@ -1,36 +1,88 @@
-// The painted pictures, out of a worker, which is started anew where it failed.
-import type { Painted, Painting } from './painter';
+// What lies under the water: a painting, an address, or the visitor's own photos, of which the portrait one shows in
+// portrait and the landscape one in landscape.
+import { WaterError, type WaterElement } from 'tidemark-water';
+import { grounds } from './grounds';
+import { paint } from './paintings';
+import { addressOf } from './settings';
 
-const waiting = new Map<number, { resolve(bitmap: ImageBitmap): void; reject(error: Error): void }>();
-let lastId = 0;
-let worker: Worker | undefined;
-
-declare global {
-    var painter: Worker | null | undefined;  // which the built page starts before its scripts are there
+async function isPortrait(file: File): Promise<boolean> {
+    const image = new Image();
+    image.src = URL.createObjectURL(file);
+    await image.decode().catch(() => {});  // and then it has no size
+    URL.revokeObjectURL(image.src);
+    return image.naturalHeight > image.naturalWidth;
 }
 
-function startWorker(): Worker {
-    const started = globalThis.painter ?? new Worker(new URL('./painter.ts', import.meta.url), { type: 'module' });
-    globalThis.painter = null;
-    const fail = () => {
-        for (const { reject } of waiting.values()) reject(new Error('The painted pictures do not load. Please try again.'));
-        waiting.clear();
-        started.terminate();
-        worker = undefined;
-    };
-    started.onerror = fail;
-    started.onmessage = ({ data: { id, bitmap } }: MessageEvent<Painted>) => {
-        if (!bitmap) return fail();
-        waiting.get(id)?.resolve(bitmap);
-        waiting.delete(id);
-    };
-    return started;
+export interface Pictures {
+    readonly hasPhoto: boolean;
+    takePhotos(files: File[]): void;
+    /** Shows what `picture` names, unless it was the last one asked for. */
+    show(picture: string): void;
 }
 
-export function paint(painting: Painting, width: number, height: number): Promise<ImageBitmap> {
-    return new Promise((resolve, reject) => {
-        waiting.set(++lastId, { resolve, reject });
-        worker ??= startWorker();
-        worker.postMessage({ id: lastId, painting, width, height });
+// `failed` is told what shows instead, and why if the water has not said so itself.
+export function makePictures(water: WaterElement, failed: (shown: string | null, reason?: string) => void): Pictures {
+    let photos: File[] = [];
+    let asked: string | null = null;
+    let shown: string | null = null;
+    let lastTicket = 0;  // of the picture asked for last
+    let repaintDue = 0;
+
+    async function load(picture: string, isLast: () => boolean): Promise<void> {
+        const ground = grounds[picture];
+        if (ground) {
+            const density = Math.min(devicePixelRatio, 2, 2048 / Math.max(water.clientWidth, water.clientHeight));
+            const bitmap = await paint(ground, Math.round(water.clientWidth * density), Math.round(water.clientHeight * density));
+            if (isLast()) await water.setPicture(bitmap);
+        } else if (picture === 'photo') {
+            const [first, second] = photos;
+            const turned = second && (await isPortrait(first!));
+            if (isLast()) await water.setPicture(turned ? second : first!, (turned ? first : second) ?? null);
+        } else {
+            await water.setPicture(picture);
+        }
+    }
+
+    async function replace(picture: string): Promise<void> {
+        const ticket = ++lastTicket;
+        const isLast = () => ticket === lastTicket;
+        asked = picture;
+        const busy = setTimeout(() => document.body.classList.add('busy'), 150);
+        try {
+            await load(picture, isLast);
+            if (isLast()) shown = picture;
+        } catch (error) {
+            if (!isLast()) return;
+            asked = shown;
+            failed(shown, error instanceof WaterError ? undefined : (error as Error).message);
+        } finally {
+            clearTimeout(busy);
+            if (isLast()) document.body.classList.remove('busy');
+        }
+    }
+
+    // Paintings fit one size; until the next is painted the last one serves, cropped.
+    addEventListener('resize', () => {
+        clearTimeout(repaintDue);
+        repaintDue = window.setTimeout(() => asked && grounds[asked] && void replace(asked), 250);
     });
+
+    return {
+        get hasPhoto() {
+            return photos.length > 0;
+        },
+        takePhotos(files) {
+            photos = files;
+            void replace('photo');
+        },
+        show: (picture) => void (picture !== asked && replace(picture)),
+    };
+}
+
+// What was dropped or pasted: pictures, or the address of one.
+export function offered(data: DataTransfer | null): File[] | string | null {
+    const files = [...(data?.files ?? [])];
+    if (files.length > 0) return files;
+    const text = data?.getData('text/uri-list') || data?.getData('text/plain') || '';
+    return addressOf(text.trim().split('\n')[0]!);
 }

@@ -1,11 +1,9 @@
-// All that the visitor chooses, and its form in the address bar: what differs from the defaults.
+// All that the visitor chooses, and its form in the address bar: what differs from the preset.
 import { lookKeys, presets, type Look } from 'tidemark-water';
-
-export const pictureNames = { pool: 'Tiled pool', river: 'River bed', shore: 'Sandy shore', photo: 'Your photo…' };
-export type PictureName = keyof typeof pictureNames;
+import { groundOf, grounds } from './grounds';
 
 export interface Settings {
-    picture: PictureName | 'src';
+    picture: string;  // a name of `grounds`, an address, or "photo"
     preset: string;
     ink: boolean;
     inkColor: string;
@@ -13,41 +11,57 @@ export interface Settings {
     look: Look;    // what differs from the preset
 }
 
-// A picture of its own, which the page's address brings.
-export const src = new URLSearchParams(location.search).get('src');
-
-const usualPicture = src ? 'src' : 'pool';
 const usualInk = '#0d2673';
-const usualPreset = 'clear-lake';
+export const usualPreset = 'clear-lake';
 
-// A preset is a whole look.
-export function withPreset(preset: string): Omit<Settings, 'picture'> {
-    const { ink = true, inkColor = usualInk, rain = 0 } = presets[preset]!;
-    return { preset, ink, inkColor, rain, look: {} };
+// The address of a picture, absolute, which no name of a painting is; null for anything else.
+export function addressOf(text: string, base?: string): string | null {
+    try {
+        const { href, protocol } = new URL(text, base);
+        return /^https?:$/.test(protocol) ? href : null;
+    } catch {
+        return null;
+    }
 }
 
-export const defaultSettings = (): Settings => ({ picture: usualPicture, ...withPreset(usualPreset) });
+// A picture that the page's address brings, as for a frame in another page.
+const src = new URLSearchParams(location.search).get('src');
+const brought = src && addressOf(src, location.href);
+const isOwn = (picture: string) => !Object.hasOwn(grounds, picture);
+
+// A preset is a whole look with a picture, which gives way to one of the visitor's own.
+export function withPreset(preset: string, picture = brought ?? ''): Settings {
+    const { ink = true, inkColor = usualInk, rain = 0 } = presets[preset]!;
+    return { picture: picture && isOwn(picture) ? picture : groundOf(preset), preset, ink, inkColor, rain, look: {} };
+}
+
+function differences(settings: Settings): [string, string][] {
+    const usual = withPreset(settings.preset);
+    const words: [string, string][] = [];
+    // A photo stays with its owner.
+    if (settings.picture !== usual.picture && settings.picture !== 'photo') words.push(['picture', settings.picture]);
+    if (settings.ink !== usual.ink) words.push(['ink', settings.ink ? '1' : '0']);
+    if (settings.inkColor !== usual.inkColor) words.push(['inkColor', settings.inkColor]);
+    if (settings.rain !== usual.rain) words.push(['rain', String(settings.rain)]);
+    return [...words, ...Object.entries(settings.look).map(([name, value]): [string, string] => [name, String(value)])];
+}
+
+// Whether more than the preset was chosen; a picture of the visitor's own goes with any.
+export const isChanged = (settings: Settings): boolean =>
+    differences(settings).some(([name]) => name !== 'picture' || !isOwn(settings.picture));
 
 export function toHash(settings: Settings): string {
-    const usual = { picture: usualPicture, ...withPreset(settings.preset) };
-    const words = new URLSearchParams();
-    if (settings.preset !== usualPreset) words.set('preset', settings.preset);
-    // A photo stays with its owner.
-    if (settings.picture !== usual.picture && settings.picture !== 'photo') words.set('picture', settings.picture);
-    if (settings.ink !== usual.ink) words.set('ink', settings.ink ? '1' : '0');
-    if (settings.inkColor !== usual.inkColor) words.set('inkColor', settings.inkColor);
-    if (settings.rain !== usual.rain) words.set('rain', String(settings.rain));
-    for (const [name, value] of Object.entries(settings.look)) words.set(name, String(value));
-    return words.toString();
+    const preset = settings.preset !== usualPreset ? [['preset', settings.preset]] : [];
+    return new URLSearchParams([...preset, ...differences(settings)]).toString();
 }
 
 // Of a link that was cut or made up, takes what can be used.
 export function fromHash(hash: string): Settings {
     const words = new URLSearchParams(hash.replace(/^#/, ''));
     const preset = words.get('preset') ?? '';
-    const settings = { ...defaultSettings(), ...(Object.hasOwn(presets, preset) && withPreset(preset)) };
+    const settings = withPreset(Object.hasOwn(presets, preset) ? preset : usualPreset);
     const picture = words.get('picture') ?? '';
-    if (Object.hasOwn(pictureNames, picture) && picture !== 'photo') settings.picture = picture as PictureName;
+    settings.picture = (isOwn(picture) ? addressOf(picture) : picture) ?? settings.picture;
     if (words.has('ink')) settings.ink = words.get('ink') === '1';
     const color = words.get('inkColor') ?? '';
     if (/^#[0-9a-f]{6}$/i.test(color)) settings.inkColor = color;

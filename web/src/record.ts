@@ -1,0 +1,33 @@
+// Clips of a canvas, in the first of these forms that the browser writes.
+const types = ['video/mp4;codecs=avc1', 'video/webm;codecs=vp9', 'video/webm'];
+const longest = 60_000;  // milliseconds
+
+export const canRecord = typeof MediaRecorder === 'function' && 'captureStream' in HTMLCanvasElement.prototype;
+
+export interface Recording {
+    stop(): void;
+    /** Settles when it has ended, by itself after a minute; empty where nothing was drawn. */
+    clip: Promise<Blob>;
+}
+
+export function record(canvas: HTMLCanvasElement): Recording {
+    const stream = canvas.captureStream();
+    const recorder = new MediaRecorder(stream, {
+        mimeType: types.find((type) => MediaRecorder.isTypeSupported(type)),
+        videoBitsPerSecond: 12_000_000,
+    });
+    const parts: Blob[] = [];
+    const stop = () => recorder.state !== 'inactive' && recorder.stop();
+    const end = setTimeout(stop, longest);
+    const clip = new Promise<Blob>((resolve, reject) => {
+        recorder.ondataavailable = ({ data }) => parts.push(data);
+        recorder.onerror = () => reject(new Error('This browser could not record the water.'));
+        recorder.onstop = () => {
+            clearTimeout(end);
+            for (const track of stream.getTracks()) track.stop();
+            resolve(new Blob(parts, { type: recorder.mimeType.split(';')[0] }));
+        };
+    });
+    recorder.start();
+    return { stop, clip };
+}

@@ -1,0 +1,67 @@
+// Small pictures of the grounds, and of each preset: its water after two drops, drawn once on a small stage behind the
+// page and kept for the next visit. A preset that has changed since is drawn again.
+import { createWater, presets } from 'tidemark-water';
+import { groundOf, grounds } from './grounds';
+import { paint } from './paintings';
+
+const [width, height] = [144, 108];
+const wait = (milliseconds: number) => new Promise((resolve) => setTimeout(resolve, milliseconds));
+
+export async function drawGround(name: string): Promise<string> {
+    const bitmap = await paint(grounds[name]!, width, height);
+    const canvas = document.createElement('canvas');
+    Object.assign(canvas, { width, height }).getContext('2d')!.drawImage(bitmap, 0, 0);
+    return canvas.toDataURL('image/webp', 0.85);
+}
+
+async function draw(preset: string): Promise<string> {
+    const canvas = document.createElement('canvas');
+    canvas.className = 'stage';
+    document.body.append(canvas);
+    const src = await paint(grounds[groundOf(preset)]!, 2 * width, 2 * height);
+    const water = createWater(canvas, { src, preset, interaction: 'none', rain: 0 });
+    try {
+        await water.ready;
+        const ink = presets[preset]!.ink ?? true;
+        water.drop(0.6 * width, 0.4 * height, { ink });
+        await wait(350);
+        water.drop(0.3 * width, 0.7 * height, { ink, strength: 0.7 });
+        await wait(350);
+        const blob = await water.toBlob('image/webp', 0.85);
+        return await new Promise((resolve) => {
+            const reader = new FileReader();
+            reader.onload = () => resolve(String(reader.result));
+            reader.readAsDataURL(blob);
+        });
+    } finally {
+        water.destroy();
+        canvas.remove();
+    }
+}
+
+// A frame of another site may be refused what is kept.
+function kept(key: string, value?: string): string | null {
+    try {
+        if (value) localStorage.setItem(key, value);
+        return localStorage.getItem(key);
+    } catch {
+        return null;
+    }
+}
+
+/** Calls `show` for each preset as its picture comes; those that cannot be drawn stay away. */
+export async function drawThumbnails(show: (preset: string, url: string) => void): Promise<void> {
+    for (const [preset, values] of Object.entries(presets)) {
+        const key = `tidemark thumbnail ${preset}`;
+        const of = JSON.stringify([values, grounds[groundOf(preset)]]);
+        const [drawnOf, url] = kept(key)?.split('\n') ?? [];
+        if (url && drawnOf === of) {
+            show(preset, url);
+            continue;
+        }
+        const drawn = await draw(preset).catch(() => null);
+        if (!drawn) return;
+        kept(key, `${of}\n${drawn}`);
+        show(preset, drawn);
+    }
+}

@@ -3,6 +3,7 @@ import { readdirSync, readFileSync, statSync, writeFileSync } from 'node:fs';
 import { join, posix } from 'node:path';
 import { Marked } from 'marked';
 import { defineConfig } from 'vite';
+import { groundOf, grounds, usualPreset } from './src/grounds';
 
 const out = new URL('dist', import.meta.url).pathname;
 const largestSite = 1_000_000;  // bytes before compression
@@ -45,20 +46,25 @@ function renderDocuments() {
     };
 }
 
+// What shared links show needs a whole address, where one is known.
+const site = process.env.SITE ?? '.';
+
 // Adds the licenses, and the service worker, which has to know every file of the site and to change with each.
 function completeSite() {
     return {
         name: 'complete-site',
         apply: 'build',
+        transformIndexHtml: (html) => html.replace('./card.jpg', `${site}/card.jpg`),
         closeBundle() {
             const text = (name) => readFileSync(new URL(`../${name}`, import.meta.url), 'utf8');
             writeFileSync(join(out, 'licenses.txt'), `${text('LICENSE')}\n${text('THIRD_PARTY.md')}`);
             const paths = readdirSync(out, { recursive: true }).filter((path) => statSync(join(out, path)).isFile()).sort();
+            const offline = paths.filter((path) => path !== 'card.jpg');  // which only other sites show
             const hash = createHash('sha256');
             for (const path of paths) hash.update(path).update(readFileSync(join(out, path)));
             const code = readFileSync(new URL('src/service_worker.js', import.meta.url), 'utf8')
                 .replace("'VERSION'", JSON.stringify(hash.digest('hex').slice(0, 16)))
-                .replace("['FILES']", JSON.stringify(['./', ...paths]));
+                .replace("['FILES']", JSON.stringify(['./', ...offline]));
             writeFileSync(join(out, 'service_worker.js'), code);
             const bytes = [...paths, 'service_worker.js'].reduce((sum, path) => sum + statSync(join(out, path)).size, 0);
             if (bytes >= largestSite) throw new Error(`the site has ${bytes} bytes, more than ${largestSite}`);
@@ -71,7 +77,8 @@ function completeSite() {
 // first picture.
 function hurry() {
     const tags = [
-        [/\/early_painter-/, (src) => ({ tag: 'script', attrs: { src } })],
+        // Below what tells the size of the view.
+        [/\/early_painter-/, (src) => ({ tag: 'script', attrs: { src }, injectTo: 'head' })],
         [/\/painter-|painter.*\.wasm$/, (href) => ({ tag: 'link', attrs: { rel: 'prefetch', href } })],  // for the worker
         [/\.wasm$/, (href) => ({ tag: 'link', attrs: { rel: 'preload', as: 'fetch', crossorigin: true, href } })],
     ];
@@ -80,20 +87,22 @@ function hurry() {
         apply: 'build',
         generateBundle(_, bundle) {
             const painter = Object.keys(bundle).find((file) => file.includes('/painter-'));
-            const source = readFileSync(new URL('src/early_painter.js', import.meta.url), 'utf8').replace('PAINTER', `./${painter}`);
+            const source = readFileSync(new URL('src/early_painter.js', import.meta.url), 'utf8')
+                .replace('PAINTER', `./${painter}`).replace('GROUND', JSON.stringify(grounds[groundOf(usualPreset)]));
             this.emitFile({ type: 'asset', name: 'early_painter.js', source });
         },
         transformIndexHtml: {
             order: 'post',
             handler: (html, { bundle }) => Object.keys(bundle).flatMap((file) => {
                 const tag = tags.find(([pattern]) => pattern.test(file))?.[1](`./${file}`);
-                return tag ? [{ ...tag, injectTo: 'head-prepend' }] : [];
+                return tag ? [{ injectTo: 'head-prepend', ...tag }] : [];
             }),
         },
     };
 }
 
 export default defineConfig({
+    appType: 'mpa',  // what is not there is missing, and not this page
     base: './',  // any folder of any server
     worker: { format: 'es' },
     server: { fs: { allow: ['..'] } },  // host/look.properties and build/web

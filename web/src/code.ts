@@ -1,6 +1,7 @@
 // The chosen values for a page of one's own and for the hosts.
 import { defaultLook, lookKeys, lookOf } from 'tidemark-water';
-import { addressOf, usualPreset, withPreset, type Settings } from './settings';
+import { usualPreset } from './grounds';
+import { addressOf, withPreset, type Settings } from './settings';
 
 const pictureOf = ({ picture }: Settings) => addressOf(picture) ?? 'picture.jpg';
 

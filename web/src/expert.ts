@@ -29,6 +29,6 @@ export const expertSliders = (controls: Controls, settings: Settings): HTMLEleme
                 const { [name]: _, ...others } = settings.look;
                 settings.look = value < key.min ? others : { ...others, [name]: Number(value.toFixed(4)) };
             },
-            word: (value) => (value < key.min ? 'auto' : String(value)),
+            word: (value) => (value < key.min ? 'auto' : String(Number(value.toFixed(4)))),
         });
     });

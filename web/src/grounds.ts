@@ -18,6 +18,8 @@ export const grounds: Readonly<Record<string, Ground>> = {
     deep: { title: 'Deep sea', painting: 'shore', grey: 0.6, tint: [0.3, 0.62, 0.84] },
 };
 
+export const usualPreset = 'clear-lake';
+
 const ofPresets: Readonly<Record<string, string>> = {
     'clear-lake': 'pool', 'summer-rain': 'river', 'heavy-glass': 'glass', quicksilver: 'silver', honey: 'amber',
     'red-ink': 'shore', 'deep-swell': 'deep',

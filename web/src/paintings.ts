@@ -4,14 +4,19 @@ import type { Painted } from './painter';
 
 const waiting = new Map<number, { resolve(bitmap: ImageBitmap): void; reject(error: Error): void }>();
 let lastId = 0;
-let worker: Worker | undefined;
+let worker: Painter | undefined;
 
+// The built page starts one before its scripts are there, and asks it for a picture, with the id 0.
+interface Painter extends Worker {
+    asked?: string;
+    painted?: Painted;
+}
 declare global {
-    var painter: Worker | null | undefined;  // which the built page starts before its scripts are there
+    var painter: Painter | null | undefined;
 }
 
-function startWorker(): Worker {
-    const started = globalThis.painter ?? new Worker(new URL('./painter.ts', import.meta.url), { type: 'module' });
+function startWorker(): Painter {
+    const started: Painter = globalThis.painter ?? new Worker(new URL('./painter.ts', import.meta.url), { type: 'module' });
     globalThis.painter = null;
     const fail = () => {
         for (const { reject } of waiting.values()) reject(new Error('The painted pictures do not load. Please try again.'));
@@ -20,7 +25,7 @@ function startWorker(): Worker {
         worker = undefined;
     };
     started.onerror = fail;
-    started.onmessage = ({ data: { id, bitmap } }: MessageEvent<Painted>) => {
+    started.onmessage = ({ data: { id, bitmap } }: { data: Painted }) => {
         if (!bitmap) return fail();
         waiting.get(id)?.resolve(bitmap);
         waiting.delete(id);
@@ -30,8 +35,12 @@ function startWorker(): Worker {
 
 export function paint(ground: Ground, width: number, height: number): Promise<ImageBitmap> {
     return new Promise((resolve, reject) => {
-        waiting.set(++lastId, { resolve, reject });
         worker ??= startWorker();
-        worker.postMessage({ id: lastId, ground, width, height });
+        const isAsked = worker.asked === JSON.stringify([ground, width, height]);
+        const id = isAsked ? 0 : ++lastId;
+        waiting.set(id, { resolve, reject });
+        if (!isAsked) return worker.postMessage({ id, ground, width, height });
+        worker.asked = undefined;  // a bitmap serves once
+        if (worker.painted) worker.onmessage!(new MessageEvent('message', { data: worker.painted }));
     });
 }

@@ -47,7 +47,7 @@ export function makePanel(root: HTMLElement, settings: Settings, actions: PanelA
     const pictures = Object.entries(grounds).map(([name, { title }]) => {
         return { name, swatch: controls.choice(title, () => settings.picture === name, () => (settings.picture = name)) };
     });
-    const own = button('Your own…', actions.chooseOwnPicture);
+    const own = make('button', { type: 'button', ariaLabel: 'Your own picture', onclick: actions.chooseOwnPicture }, '+');
     follow(() => (own.ariaPressed = String(!Object.hasOwn(grounds, settings.picture))));
 
     const swatches = Object.entries(inks).map(([title, color]) => {

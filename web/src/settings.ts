@@ -1,6 +1,6 @@
 // All that the visitor chooses, and its form in the address bar: what differs from the preset.
 import { lookKeys, presets, type Look } from 'tidemark-water';
-import { groundOf, grounds } from './grounds';
+import { groundOf, grounds, usualPreset } from './grounds';
 
 export interface Settings {
     picture: string;  // a name of `grounds`, an address, or "photo"
@@ -12,7 +12,6 @@ export interface Settings {
 }
 
 const usualInk = '#0d2673';
-export const usualPreset = 'clear-lake';
 
 // The address of a picture, absolute, which no name of a painting is; null for anything else.
 export function addressOf(text: string, base?: string): string | null {

@@ -19,14 +19,14 @@ async function draw(preset: string): Promise<string> {
     canvas.className = 'stage';
     document.body.append(canvas);
     const src = await paint(grounds[groundOf(preset)]!, 2 * width, 2 * height);
-    const water = createWater(canvas, { src, preset, interaction: 'none', rain: 0 });
+    const water = createWater(canvas, { src, preset, interaction: 'none' });
     try {
         await water.ready;
-        const ink = presets[preset]!.ink ?? true;
-        water.drop(0.6 * width, 0.4 * height, { ink });
-        await wait(350);
-        water.drop(0.3 * width, 0.7 * height, { ink, strength: 0.7 });
-        await wait(350);
+        water.drop(0.62 * width, 0.42 * height);
+        await wait(400);
+        // Ink, where the preset has it, is the first to vanish.
+        for (const x of [0.24, 0.3, 0.37]) water.drop(x * width, (0.9 - x) * height, { ink: presets[preset]!.ink ?? true });
+        await wait(200);
         const blob = await water.toBlob('image/webp', 0.85);
         return await new Promise((resolve) => {
             const reader = new FileReader();

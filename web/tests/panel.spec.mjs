@@ -1,7 +1,8 @@
 // The panel: what is chosen reaches the water, and leaves the page as code and as a link.
 import { execFileSync } from 'node:child_process';
-import { copyFileSync, mkdirSync, writeFileSync } from 'node:fs';
+import { copyFileSync, mkdirSync, readFileSync, writeFileSync } from 'node:fs';
 import { join } from 'node:path';
+import { PNG } from 'pngjs';
 import { difference, expect, open, pixelsAfter, takeOver, test } from './page.mjs';
 
 const root = new URL('../..', import.meta.url).pathname;
@@ -12,6 +13,7 @@ const openPanel = async (page, hash) => {
     await page.getByText('Expert').click();
 };
 const slide = (page, name, value) => page.getByLabel(name, { exact: true }).fill(String(value));
+const press = (page, name) => page.getByRole('button', { name, exact: true }).click();
 
 // A tap and a short stroke on water that was never touched, to where their waves are in full view.
 const touchAndRun = () => {
@@ -45,12 +47,28 @@ test('the value of every slider reaches the water under its own name', async ({ 
     }
 });
 
-test('a link brings the same look, and a bad one the nearest', async ({ page }) => {
+test('every value that the file says is seen has its slider, with what the file says about it', async ({ page }) => {
     await openPanel(page);
-    await slide(page, 'calmingTime', 9);
-    await page.getByRole('button', { name: 'Violet' }).click();
+    const hidden = ['inkRed', 'inkGreen', 'inkBlue', 'rainDropsPerSecond', 'framesToFade', 'stepsToRest', 'longestFrame', 'alphaScale2'];
+    const file = readFileSync(join(root, 'host/look.properties'), 'utf8').matchAll(/# (\w+)[^\n]*\n(?:# .*\n)*(\w+) = /g);
+    for (const [, word, name] of file) {
+        const title = name[0].toUpperCase() + name.slice(1).replace(/[A-Z0-9]+/g, (part) => ` ${part.toLowerCase()}`);
+        const slider = page.getByLabel(title, { exact: true });
+        await expect(slider, name).toHaveCount(hidden.includes(name) ? 0 : 1);
+        if (!hidden.includes(name)) await expect(slider, name).toHaveAccessibleDescription(new RegExp(word));
+    }
+    await slide(page, 'Damping', 0.95);
+    expect(await settings(page)).toMatchObject({ look: { damping: 0.95 } });
+    await page.getByLabel('Damping').press('Home');  // leaves the choice to the library again
+    expect(await settings(page)).toMatchObject({ look: {} });
+});
+
+test('a link brings the same look, and a bad one the nearest', async ({ page, baseURL }) => {
+    await openPanel(page);
+    await slide(page, 'Calming time', 9);
+    await press(page, 'Violet');
     await page.click('#rain');
-    await page.getByRole('button', { name: 'River bed' }).click();
+    await press(page, 'River bed');
     const chosen = await settings(page);
     expect(chosen).toMatchObject({ picture: 'river', inkColor: '#4d1a80', rain: 14, look: { calmingTime: 9 } });
     await expect.poll(() => page.url()).toContain('river');
@@ -61,17 +79,135 @@ test('a link brings the same look, and a bad one the nearest', async ({ page }) 
     await page.evaluate(() => { location.hash = 'ringSpeed=9&meshExtent=1e9&calmingTime=x&exponent=&picture=toString&preset=valueOf&inkColor=red&rain=-1'; });
     await expect.poll(() => settings(page)).toMatchObject(
         { picture: 'pool', preset: 'clear-lake', inkColor: '#0d2673', rain: 0, look: { ringSpeed: 1, meshExtent: 64 } });
-    await page.getByRole('button', { name: 'Honey' }).click();
-    expect(await settings(page)).toMatchObject({ preset: 'honey', inkColor: '#994d05', look: {} });
+    const address = `${baseURL}favicon.svg`;
+    await page.evaluate((address) => { location.hash = `picture=${encodeURIComponent(address)}`; }, address);
+    await expect.poll(() => settings(page)).toMatchObject({ picture: address, look: {} });
+    await press(page, 'Honey');
+    expect(await settings(page)).toMatchObject({ picture: address, preset: 'honey', inkColor: '#994d05' });
+});
+
+test('a preset brings its picture and is marked where it was changed; each change can be taken back', async ({ page }) => {
+    await openPanel(page);
+    const settled = () => page.waitForTimeout(400);  // until when changes count as one
+    const back = page.getByRole('button', { name: /^Back to/ });
+    await press(page, 'Honey');
+    await settled();
+    const honey = await settings(page);
+    expect(honey).toMatchObject({ preset: 'honey', picture: 'amber', look: {} });
+    await expect(back).toBeHidden();
+    for (const value of [5, 6, 7]) await slide(page, 'Calming time', value);
+    await settled();
+    await expect(page.getByRole('button', { name: 'Honey changed' })).toHaveAttribute('aria-pressed', 'true');
+    const changed = await settings(page);
+    await back.click();
+    expect(await settings(page)).toEqual(honey);
+    await expect(back).toBeHidden();
+    await page.keyboard.press('Control+z');
+    expect(await settings(page)).toEqual(changed);
+    await press(page, 'Undo');  // of three moves of the slider, which were one change
+    expect(await settings(page)).toEqual(honey);
+    await press(page, 'Random');
+    await settled();
+    await press(page, 'Undo');
+    expect(await settings(page)).toEqual(honey);
+    await press(page, 'Undo');
+    expect(await settings(page)).toMatchObject({ preset: 'clear-lake', picture: 'pool' });
+    await expect(page.getByRole('button', { name: 'Undo' })).toBeDisabled();
+});
+
+test('every preset gets a picture of its own, which is kept for the next visit', async ({ page }) => {
+    test.slow();
+    await page.addInitScript(() => {
+        window.stages = 0;
+        new MutationObserver(() => (window.stages += document.querySelectorAll('.stage').length)).observe(document, { subtree: true, childList: true });
+    });
+    await openPanel(page);
+    const urls = () => page.evaluate(() => [...document.querySelectorAll('.tiles button:not(.random) i')].map(({ style }) => style.backgroundImage));
+    const kept = () => page.evaluate(() => Object.keys(localStorage).filter((key) => key.startsWith('tidemark thumbnail')).length);
+    await expect.poll(kept, { timeout: 90_000 }).toBe(7);
+    const drawn = await urls();
+    expect(new Set(drawn).size).toBe(7);
+    expect(drawn.every((url) => url.startsWith('url("data:image/'))).toBe(true);
+    expect(await page.evaluate(() => window.stages)).toBeGreaterThan(0);
+    await page.reload();
+    await expect.poll(urls).toEqual(drawn);
+    expect(await page.evaluate(() => window.stages)).toBe(0);
+});
+
+test('the keys work with Caps Lock and while a slider has the focus', async ({ page }) => {
+    await openPanel(page);
+    await page.getByLabel('Rain', { exact: true }).focus();
+    await page.keyboard.press('R');
+    expect(await settings(page)).toMatchObject({ rain: 14 });
+    await page.keyboard.press('I');
+    expect(await settings(page)).toMatchObject({ ink: false });
+});
+
+test('pictures and addresses are taken where they are dropped or pasted', async ({ page, baseURL }) => {
+    await openPanel(page);
+    const give = (type, text) => page.evaluate(([type, text]) => {
+        const data = new DataTransfer();
+        if (text.startsWith('<svg')) data.items.add(new File([text], 'drawing.svg', { type: 'image/svg+xml' }));
+        else data.setData('text/plain', text);
+        const options = { dataTransfer: data, clipboardData: data, bubbles: true, cancelable: true };
+        document.body.dispatchEvent(type === 'drop' ? new DragEvent(type, options) : new ClipboardEvent(type, options));
+    }, [type, text]);
+    const size = () => page.evaluate(() => window.tidemark.water.water.picture.size());
+    for (const [side, type] of [[30, 'drop'], [40, 'paste']]) {
+        await give(type, `<svg xmlns="http://www.w3.org/2000/svg" width="${side}" height="${side}"/>`);
+        await expect.poll(size).toEqual([side, side]);
+        expect(await settings(page)).toMatchObject({ picture: 'photo' });
+    }
+    await give('paste', `${baseURL}favicon.svg`);
+    await expect.poll(() => settings(page)).toMatchObject({ picture: `${baseURL}favicon.svg` });
+    await expect.poll(() => page.url()).toContain('favicon.svg');
+    await give('paste', 'only words');
+    await expect(page.locator('#message.shown')).toHaveText(/neither a picture/);
+});
+
+test('a link, a picture and a clip leave the page', async ({ page, context }) => {
+    test.slow();
+    await context.grantPermissions(['clipboard-read', 'clipboard-write']);
+    await openPanel(page, '#preset=honey');
+    const share = async (name) => (await page.click('#more'), await press(page, name));
+    await share('Copy link');
+    await expect(page.locator('#message')).toHaveText('The link is copied.');
+    expect(await page.evaluate(() => navigator.clipboard.readText())).toMatch(/#preset=honey$/);
+
+    const saved = page.waitForEvent('download');
+    await share('Save picture');
+    const { width, height } = PNG.sync.read(readFileSync(await (await saved).path()));
+    expect([width, height]).toEqual(await page.evaluate(() => [window.tidemark.water.water.canvas.width, window.tidemark.water.water.canvas.height]));
+
+    await share('Record a clip');
+    await page.mouse.move(200, 300);
+    await page.mouse.down();
+    await page.mouse.move(500, 500, { steps: 8 });
+    await page.mouse.up();
+    await page.waitForTimeout(1500);
+    const recorded = page.waitForEvent('download');
+    await page.click('#more');
+    const clip = await recorded;
+    const file = clip.suggestedFilename();
+    expect(file).toMatch(/^tidemark\.(webm|mp4)$/);
+    const format = execFileSync('ffprobe', ['-v', 'error', '-count_frames', '-select_streams', 'v', '-show_entries', 'stream=width,nb_read_frames', '-of', 'json', await clip.path()]);
+    const [stream] = JSON.parse(format).streams;
+    expect(stream.width).toBeGreaterThan(100);
+    expect(Number(stream.nb_read_frames)).toBeGreaterThan(2);
+    await expect(page.locator('body')).not.toHaveClass(/recording/);
 });
 
 test('the copied code compiles in both languages and holds the values', async ({ page, context }, { outputDir }) => {
     test.slow();
     await context.grantPermissions(['clipboard-read', 'clipboard-write']);
     await openPanel(page, '#calmingTime=9.51&meshExtent=33&exponent=77&inkRed=0.125&rain=9');
+    await page.getByText('For developers').click();
     const copied = async (language) => {
-        await page.getByTitle(`Copy as ${language}`, { exact: true }).click();
-        return page.evaluate(() => navigator.clipboard.readText());
+        if (language !== 'HTML') await press(page, language);
+        await press(page, `Copy as ${language}`);
+        const text = await page.evaluate(() => navigator.clipboard.readText());
+        await expect(page.getByLabel(language, { exact: true }).locator('code')).toHaveText(text.trim());
+        return text;
     };
     expect(await copied('HTML')).not.toContain('ink="off"');
     await page.keyboard.press('i');

@@ -1,9 +1,10 @@
-// The page as a site: screens, a missing network, and browsers that cannot show it.
+// The page as a site: screens, links, a missing network, and browsers that cannot show it.
 import { difference, expect, flatPixels, open, screenshotPath, takeOver, test } from './page.mjs';
 
 const screens = {
     desktop: { viewport: { width: 1440, height: 900 } },
     phone: { viewport: { width: 390, height: 844 }, deviceScaleFactor: 3, isMobile: true, hasTouch: true },
+    'small-phone': { viewport: { width: 320, height: 568 }, deviceScaleFactor: 2, isMobile: true, hasTouch: true },
     'phone-landscape': { viewport: { width: 844, height: 390 }, deviceScaleFactor: 3, isMobile: true, hasTouch: true },
 };
 for (const [name, screen] of Object.entries(screens)) {
@@ -18,13 +19,50 @@ for (const [name, screen] of Object.entries(screens)) {
             const density = Math.min(screen.deviceScaleFactor ?? 1, 2);
             expect(await canvas.evaluate(({ width, height }) => [width, height])).toEqual([width * density, height * density]);
             expect(await page.evaluate(() => document.documentElement.scrollHeight <= innerHeight)).toBe(true);
-            for (const tool of await page.locator('#tools button').all()) await expect(tool).toBeInViewport({ ratio: 1 });
+            for (const tool of await page.locator('#tools button').all()) {
+                await expect(tool).toBeInViewport({ ratio: 1 });
+                expect(await tool.evaluate(({ scrollWidth, clientWidth }) => scrollWidth - clientWidth)).toBe(0);
+            }
             if (screen.hasTouch) await page.touchscreen.tap(width / 2, height / 2);
             else await page.mouse.click(width / 2, height / 2);
             await expect(page.locator('#hint')).toHaveClass(/gone/);
+            if (screen.hasTouch) await page.click('#look');
+            await expect(page.getByRole('button', { name: 'Clear lake' })).toBeInViewport({ ratio: 1 });
+            expect(await page.locator('#panel').evaluate(({ scrollWidth, clientWidth }) => scrollWidth - clientWidth)).toBe(0);
         });
     });
 }
+
+test('its links, icons and picture exist, and so do those of its documents', async ({ page, baseURL }) => {
+    await page.goto('./');
+    const { icons } = await (await page.request.get('./manifest.webmanifest')).json();
+    const addresses = new Set(icons.map(({ src }) => new URL(src, baseURL).href));
+    const collect = async () => {
+        const places = await page.evaluate(() => [...document.querySelectorAll('[href], meta[property="og:image"]')].map(({ href, content }) => href ?? content));
+        for (const place of places) addresses.add(new URL(place, page.url()).href.split('#')[0]);
+    };
+    await collect();
+    for (const address of addresses) {  // and those that are found on the way
+        if (!address.startsWith(baseURL)) continue;
+        expect((await page.request.get(address)).ok(), address).toBe(true);
+        if (!address.endsWith('.html')) continue;
+        await page.goto(address);
+        await collect();
+    }
+    expect([...addresses].filter((address) => address.endsWith('.html')).length).toBeGreaterThan(6);
+});
+
+// The browser reports what the policy refuses as an error of the page; without it nothing would be reported.
+test('the strict content security policy is in force', async ({ page, problems }) => {
+    await page.goto('./');
+    const ran = await page.evaluate(() => {
+        document.head.append(Object.assign(document.createElement('script'), { textContent: 'window.ran = true' }));
+        document.head.append(Object.assign(document.createElement('style'), { textContent: 'h1 { width: 1px }' }));
+        return [window.ran, getComputedStyle(document.querySelector('h1')).width === '1px'];
+    });
+    expect(ran).toEqual([undefined, false]);
+    expect(problems.splice(0).filter((text) => /Content Security Policy/.test(text)).length).toBeGreaterThan(1);
+});
 
 test('opens without a network once it has been loaded, and no two pictures look alike', async ({ page, context, baseURL }) => {
     const [older, neighbour] = [`tidemark ${baseURL} 1`, `tidemark ${baseURL}else/ 1`];
@@ -42,13 +80,13 @@ test('opens without a network once it has been loaded, and no two pictures look 
     expect(kept).not.toContain(older);
     await context.setOffline(true);
     const seen = [];
-    for (const picture of ['river', 'pool', 'shore']) {
+    for (const picture of ['river', 'pool', 'shore', 'amber']) {
         await page.goto('about:blank');
         await open(page, `#picture=${picture}`);
         await takeOver(page);
         seen.push(await flatPixels(page));
     }
-    for (const [a, b] of [[0, 1], [1, 2], [0, 2]]) expect(difference(seen[a], seen[b])).toBeGreaterThan(15);
+    for (const [a, b] of [[0, 1], [1, 2], [0, 2], [0, 3]]) expect(difference(seen[a], seen[b])).toBeGreaterThan(15);
 });
 
 test('a worker that is gone is told and started anew; of two pictures the last chosen stays', async ({ page }) => {

@@ -3,6 +3,7 @@
 import { readFileSync } from 'node:fs';
 import { chromium } from '@playwright/test';
 import { preview } from 'vite';
+import { takeOver } from './tests/page.mjs';
 import config from './tests/playwright.config.mjs';
 
 const fileOf = (name) => new URL(`public/${name}`, import.meta.url).pathname;
@@ -14,13 +15,20 @@ await page.goto(server.resolvedUrls.local[0]);
 await page.waitForSelector('#water[shown]');
 await page.addStyleTag({ content: `#tools, #panel, #hint, #brand nav { display: none }
     #brand { padding: 44px 52px 80px } #brand h1 { font-size: 68px } #brand p { font-size: 27px; margin-top: 10px }` });
-await page.mouse.click(840, 250);
-await page.waitForTimeout(900);
-await page.mouse.move(260, 480);
-await page.mouse.down();
-for (let x = 260; x <= 700; x += 20) await page.mouse.move(x, 470 + 60 * Math.sin(x / 70));
-await page.mouse.up();
-await page.waitForTimeout(150);
+await takeOver(page);
+await page.evaluate(() => {
+    const { water } = document.querySelector('tidemark-water');
+    water.drop(850, 330);
+    window.frames(34);
+    water.drop(560, 470, { strength: 0.7 });
+    window.frames(20);
+    for (let step = 0; step <= 24; ++step) {
+        window.touch(step ? 2 : 0, 620 + 16 * step, 500 - 60 * Math.sin(step / 5));
+        window.frames(1);
+    }
+    window.touch(1, 1004, 500 - 60 * Math.sin(24 / 5));
+    window.frames(6);
+});
 await page.screenshot({ path: fileOf('card.jpg'), type: 'jpeg', quality: 82 });
 
 // Filled to the edges, which phones cut in a shape of their own.

@@ -1,19 +1,21 @@
-// What was chosen before, so that a change can be taken back. One drag of a slider is one change.
+// What was chosen before, so that a change can be taken back. What changes until settle() is one change, as the drag of
+// a slider is.
 import type { Settings } from './settings';
 
 export function makeHistory(settings: Settings) {
     const past: Settings[] = [];
     let last = structuredClone(settings);
+    const isSettled = () => JSON.stringify(settings) === JSON.stringify(last);
+    const settle = () => {
+        if (isSettled()) return;
+        past.push(last);
+        last = structuredClone(settings);
+    };
     return {
-        /** The settings stay as they are for now. */
-        settle(): void {
-            if (JSON.stringify(settings) === JSON.stringify(last)) return;
-            past.push(last);
-            last = structuredClone(settings);
-        },
-        canUndo: (): boolean => past.length > 0 || JSON.stringify(settings) !== JSON.stringify(last),
+        settle,
+        canUndo: (): boolean => past.length > 0 || !isSettled(),
         undo(): void {
-            this.settle();
+            settle();
             last = past.pop() ?? last;
             Object.assign(settings, structuredClone(last));
         },

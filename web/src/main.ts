@@ -17,7 +17,7 @@ const usualRain = 14;
 const isSmall = () => matchMedia('(max-width: 900px), (max-height: 560px)').matches;
 
 let recording: Recording | undefined;
-let settleDue = 0;
+let addressDue = 0;
 let messageDue = 0;
 
 const sentences: Partial<Record<ErrorCode, string>> = {
@@ -43,9 +43,7 @@ const pictures = makePictures(water, (shown, reason) => {
     panel.refresh();
 });
 
-function settle(): void {
-    past.settle();
-    panel.refresh();
+function writeAddress(): void {
     try {
         history.replaceState(null, '', `#${toHash(settings)}`);
     } catch {
@@ -60,12 +58,13 @@ function apply(): void {
     element('rain').ariaPressed = String(rain > 0);
     pictures.show(picture);
     panel.refresh();
-    clearTimeout(settleDue);
-    settleDue = window.setTimeout(settle, 300);
+    clearTimeout(addressDue);
+    addressDue = window.setTimeout(writeAddress, 300);
 }
 
 function replace(chosen: Settings): void {
     Object.assign(settings, chosen);
+    past.settle();
     apply();
 }
 
@@ -123,6 +122,8 @@ function take(pictureOrFiles: File[] | string): void {
     pictures.takePhotos(pictureOrFiles);
     replace({ ...settings, picture: 'photo' });
 }
+
+for (const type of ['change', 'click']) element('panel').addEventListener(type, past.settle);
 
 const buttons: Record<string, () => unknown> = {
     ink: toggleInk,

@@ -5,7 +5,11 @@ import { groundOf, grounds } from './grounds';
 import { paint } from './paintings';
 
 const [width, height] = [144, 108];
-const wait = (milliseconds: number) => new Promise((resolve) => setTimeout(resolve, milliseconds));
+
+async function frames(count: number): Promise<void> {
+    while (count-- > 0) await new Promise(requestAnimationFrame);
+}
+
 
 export async function drawGround(name: string): Promise<string> {
     const bitmap = await paint(grounds[name]!, width, height);
@@ -22,11 +26,11 @@ async function draw(preset: string): Promise<string> {
     const water = createWater(canvas, { src, preset, interaction: 'none' });
     try {
         await water.ready;
-        water.drop(0.62 * width, 0.42 * height);
-        await wait(400);
+        water.drop(0.62 * width, 0.42 * height, { strength: 1.5 });
+        await frames(32);
         // Ink, where the preset has it, is the first to vanish.
-        for (const x of [0.24, 0.3, 0.37]) water.drop(x * width, (0.9 - x) * height, { ink: presets[preset]!.ink ?? true });
-        await wait(200);
+        water.drop(0.3 * width, 0.65 * height, { ink: presets[preset]!.ink ?? false, strength: 1.5 });
+        await frames(10);
         const blob = await water.toBlob('image/webp', 0.85);
         return await new Promise((resolve) => {
             const reader = new FileReader();

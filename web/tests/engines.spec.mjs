@@ -69,7 +69,7 @@ for (const [name, start] of Object.entries({ firefox, webkit })) {
                 const { width, data } = PNG.sync.read(await look());
                 return Math.min(...Array.from({ length: 200 }, (_, x) => data[4 * (300 * width + 80 + x)]));
             };
-            for (const [size, ...extent] of [['desktop', 1200, 900], ['phone', 390, 844]]) {
+            for (const [size, ...extent] of [['desktop', 1200, 900], ['small-phone', 320, 568], ['phone', 390, 844]]) {
                 await engine.resize(...extent);
                 await engine.show(baseURL);
                 await expect.poll(() => run(() => document.querySelector('#water[shown]') !== null)).toBe(true);
@@ -91,7 +91,7 @@ for (const [name, start] of Object.entries({ firefox, webkit })) {
 
             // WebKit refuses more than a hundred addresses in ten seconds.
             await run(() => {
-                const slider = document.querySelector('[aria-label=Rain]');
+                const slider = [...document.querySelectorAll('#panel label')].find(({ textContent }) => textContent === 'Rain').control;
                 for (let i = 0; i < 180; ++i) Object.assign(slider, { value: i % 60 }).dispatchEvent(new Event('input'));
             });
             await expect.poll(() => run(() => location.hash)).toBe('#rain=59');

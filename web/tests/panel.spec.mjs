@@ -8,8 +8,9 @@ import { difference, expect, open, pixelsAfter, takeOver, test } from './page.mj
 const root = new URL('../..', import.meta.url).pathname;
 const settings = (page) => page.evaluate(() => structuredClone(window.tidemark.settings));
 const openPanel = async (page, hash) => {
-    await page.setViewportSize({ width: 1000, height: 800 });
+    await page.setViewportSize({ width: 340, height: 480 });
     await open(page, hash);
+    await page.click('#look');
     await page.getByText('Expert').click();
 };
 const slide = (page, name, value) => page.getByLabel(name, { exact: true }).fill(String(value));
@@ -75,6 +76,7 @@ test('a link brings the same look, and a bad one the nearest', async ({ page, ba
     await page.reload();
     await page.waitForSelector('#water[shown]');
     expect(await settings(page)).toEqual(chosen);
+    await page.click('#look');
 
     await page.evaluate(() => { location.hash = 'ringSpeed=9&meshExtent=1e9&calmingTime=x&exponent=&picture=toString&preset=valueOf&inkColor=red&rain=-1'; });
     await expect.poll(() => settings(page)).toMatchObject(
@@ -88,15 +90,15 @@ test('a link brings the same look, and a bad one the nearest', async ({ page, ba
 
 test('a preset brings its picture and is marked where it was changed; each change can be taken back', async ({ page }) => {
     await openPanel(page);
-    const settled = () => page.waitForTimeout(400);  // until when changes count as one
     const back = page.getByRole('button', { name: /^Back to/ });
     await press(page, 'Honey');
-    await settled();
     const honey = await settings(page);
     expect(honey).toMatchObject({ preset: 'honey', picture: 'amber', look: {} });
     await expect(back).toBeHidden();
-    for (const value of [5, 6, 7]) await slide(page, 'Calming time', value);
-    await settled();
+    await page.getByLabel('Calming time').evaluate((slider) => {
+        for (const value of [5, 6, 7]) Object.assign(slider, { value }).dispatchEvent(new Event('input'));
+        slider.dispatchEvent(new Event('change', { bubbles: true }));
+    });
     await expect(page.getByRole('button', { name: 'Honey changed' })).toHaveAttribute('aria-pressed', 'true');
     const changed = await settings(page);
     await back.click();
@@ -104,10 +106,9 @@ test('a preset brings its picture and is marked where it was changed; each chang
     await expect(back).toBeHidden();
     await page.keyboard.press('Control+z');
     expect(await settings(page)).toEqual(changed);
-    await press(page, 'Undo');  // of three moves of the slider, which were one change
+    await press(page, 'Undo');  // of the drag
     expect(await settings(page)).toEqual(honey);
     await press(page, 'Random');
-    await settled();
     await press(page, 'Undo');
     expect(await settings(page)).toEqual(honey);
     await press(page, 'Undo');
@@ -121,7 +122,9 @@ test('every preset gets a picture of its own, which is kept for the next visit',
         window.stages = 0;
         new MutationObserver(() => (window.stages += document.querySelectorAll('.stage').length)).observe(document, { subtree: true, childList: true });
     });
-    await openPanel(page);
+    await page.setViewportSize({ width: 340, height: 480 });
+    await open(page);
+    await page.click('#look');
     const urls = () => page.evaluate(() => [...document.querySelectorAll('.tiles button:not(.random) i')].map(({ style }) => style.backgroundImage));
     const kept = () => page.evaluate(() => Object.keys(localStorage).filter((key) => key.startsWith('tidemark thumbnail')).length);
     await expect.poll(kept, { timeout: 90_000 }).toBe(7);
@@ -130,6 +133,8 @@ test('every preset gets a picture of its own, which is kept for the next visit',
     expect(drawn.every((url) => url.startsWith('url("data:image/'))).toBe(true);
     expect(await page.evaluate(() => window.stages)).toBeGreaterThan(0);
     await page.reload();
+    await page.waitForSelector('#water[shown]');
+    await page.click('#look');
     await expect.poll(urls).toEqual(drawn);
     expect(await page.evaluate(() => window.stages)).toBe(0);
 });
@@ -180,11 +185,13 @@ test('a link, a picture and a clip leave the page', async ({ page, context }) =>
     expect([width, height]).toEqual(await page.evaluate(() => [window.tidemark.water.water.canvas.width, window.tidemark.water.water.canvas.height]));
 
     await share('Record a clip');
-    await page.mouse.move(200, 300);
-    await page.mouse.down();
-    await page.mouse.move(500, 500, { steps: 8 });
-    await page.mouse.up();
-    await page.waitForTimeout(1500);
+    await page.evaluate(async () => {
+        const { water } = window.tidemark;
+        for (let frames = 0; frames < 8; ++frames) {
+            water.drop(40 + 20 * frames, 90);
+            await new Promise(requestAnimationFrame);
+        }
+    });
     const recorded = page.waitForEvent('download');
     await page.click('#more');
     const clip = await recorded;

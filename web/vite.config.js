@@ -8,7 +8,8 @@ import { groundOf, grounds, usualPreset } from './src/grounds';
 const out = new URL('dist', import.meta.url).pathname;
 const largestSite = 1_000_000;  // bytes before compression
 
-// The documents that the page links to, as pages with links between them. What is not among them is named without a link.
+// The documents that the page links to, as pages with links between them. What is not among them is named without a
+// link, and pictures, which would double the site, are described.
 const documents = ['README.md', 'web/README.md', 'web/package/README.md', 'android/README.md',
     ...['bench', 'contract', 'engine', 'host', 'look', 'promises'].map((name) => `docs/${name}.md`)];
 
@@ -17,7 +18,8 @@ function renderDocuments() {
     const render = (path) => {
         const marked = new Marked({
             renderer: {
-                image: () => '',
+                image: ({ text }) => `<em>${text}</em>`,
+                html: ({ text }) => text.replace(/<img[^>]*alt="([^"]*)"[^>]*>/g, '<em>$1</em>'),
                 link({ href, tokens }) {
                     const text = this.parser.parseInline(tokens);
                     if (/^https?:/.test(href)) return `<a href="${href}">${text}</a>`;

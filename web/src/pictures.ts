@@ -13,6 +13,11 @@ async function isPortrait(file: File): Promise<boolean> {
     return image.naturalHeight > image.naturalWidth;
 }
 
+function sizeOf({ clientWidth, clientHeight }: WaterElement): [number, number] {
+    const density = Math.min(devicePixelRatio, 2, 2048 / Math.max(clientWidth, clientHeight));
+    return [Math.round(clientWidth * density), Math.round(clientHeight * density)];
+}
+
 export interface Pictures {
     readonly hasPhoto: boolean;
     takePhotos(files: File[]): void;
@@ -27,12 +32,14 @@ export function makePictures(water: WaterElement, failed: (shown: string | null,
     let shown: string | null = null;
     let lastTicket = 0;  // of the picture asked for last
     let repaintDue = 0;
+    let painted = '';    // the size of the last painting
 
     async function load(picture: string, isLast: () => boolean): Promise<void> {
         const ground = grounds[picture];
         if (ground) {
-            const density = Math.min(devicePixelRatio, 2, 2048 / Math.max(water.clientWidth, water.clientHeight));
-            const bitmap = await paint(ground, Math.round(water.clientWidth * density), Math.round(water.clientHeight * density));
+            const size = sizeOf(water);
+            painted = String(size);
+            const bitmap = await paint(ground, ...size);
             if (isLast()) await water.setPicture(bitmap);
         } else if (picture === 'photo') {
             const [first, second] = photos;
@@ -64,7 +71,9 @@ export function makePictures(water: WaterElement, failed: (shown: string | null,
     // Paintings fit one size; until the next is painted the last one serves, cropped.
     addEventListener('resize', () => {
         clearTimeout(repaintDue);
-        repaintDue = window.setTimeout(() => asked && grounds[asked] && void replace(asked), 250);
+        repaintDue = window.setTimeout(() => {
+            if (asked && grounds[asked] && String(sizeOf(water)) !== painted) void replace(asked);
+        }, 250);
     });
 
     return {

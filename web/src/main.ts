@@ -37,7 +37,10 @@ function say(text: string, stays = false): void {
     if (!stays) messageDue = window.setTimeout(() => say('', true), 5000);
 }
 
+const showTools = () => document.body.classList.add('open');
+
 const pictures = makePictures(water, (shown, reason) => {
+    showTools();
     if (shown) settings.picture = shown;
     if (reason) say(reason);
     panel.refresh();
@@ -192,6 +195,7 @@ addEventListener('hashchange', () => {
 
 water.addEventListener('pointerdown', hideHint);
 water.addEventListener('ready', () => {
+    showTools();
     setTimeout(hideHint, 9000);
     if (!element('panel').hidden) setTimeout(() => void panel.drawThumbnails(), 1000);
 });

@@ -36,8 +36,8 @@ std::string readLine(const std::string& line, Look& look) {
 
 }  // namespace
 
-std::optional<Look> parseLook(std::istream& text, const std::string& name, std::string& error) {
-    Look look;
+std::optional<Look> parseLook(std::istream& text, const std::string& name, std::string& error, const Look& base) {
+    Look look = base;
     std::string line;
     for (int number = 1; std::getline(text, line); ++number) {
         line = trimmed(line);
@@ -51,10 +51,10 @@ std::optional<Look> parseLook(std::istream& text, const std::string& name, std::
     return look;
 }
 
-std::optional<Look> loadLook(const std::string& path, std::string& error) {
+std::optional<Look> loadLook(const std::string& path, std::string& error, const Look& base) {
     constexpr std::size_t kMostBytes = 1 << 20;
     const std::optional<std::string> content = readFile(path, "the look", kMostBytes, error);
     if (!content) return std::nullopt;
     std::istringstream text(*content);
-    return parseLook(text, path, error);
+    return parseLook(text, path, error, base);
 }

@@ -5,6 +5,7 @@
 #include <map>
 #include <optional>
 #include <string>
+#include <vector>
 
 #include "host/log_filter.h"
 #include "preview/preview.h"
@@ -24,6 +25,8 @@ int main(int argc, char** argv) {
     std::string size = "540x960";
     double density = 1.0;
     std::optional<Quality> quality;
+    std::string preset;
+    std::optional<Ground> ground;
     std::string ink;
     bool noInk = false;
     bool verbose = false;
@@ -34,10 +37,21 @@ int main(int argc, char** argv) {
     const auto file = [&](const char* name, std::string& path, const char* help) {
         app.add_option(name, path, help)->type_name("FILE");
     };
+    std::vector<std::string> presets;
+    for (const Preset& named : kPresets) presets.emplace_back(named.name);
+    app.add_option("--preset", preset, "Look, ground, ink and rain with a name")
+        ->check(CLI::IsMember(presets))
+        ->type_name("NAME");
+    app.add_option("--ground", ground, "Painted picture under the water; default: pool")
+        ->transform(CLI::CheckedTransformer(
+            std::map<std::string, Ground>{{"pool", Ground::pool}, {"river", Ground::river}, {"shore", Ground::shore}}))
+        ->type_name("pool|river|shore");
     file("--portrait", options.portrait, "Picture under the water in portrait (PNG or JPEG)");
     file("--landscape", options.landscape, "Picture under the water in landscape (PNG or JPEG)");
     file("--light", options.light, "Picture of the light on the waves (PNG or JPEG)");
-    file("--look", options.look, "Values of the look: lines of \"key = number\", as in host/look.properties");
+    file(
+        "--look", options.look,
+        "Values of the look, above those of the preset: lines of \"key = number\", as in host/look.properties");
     file("--script", options.script, "Touches to play: lines of \"time_ms action x y pressure\"");
     app.add_flag("--rain", options.rain, "Let it rain; without --script it always does");
     app.add_option("--size", size, "Size of the view in pixels")->type_name("WxH")->capture_default_str();
@@ -95,6 +109,14 @@ int main(int argc, char** argv) {
     if (options.framesPerSecond < 4 || options.framesPerSecond > 240) return fail("--fps must be 4 to 240");
     if (*inkOption && !(options.inkColor = parseInkColor(ink, error))) return fail("--ink " + error);
     options.withInk = !noInk;
+    for (const Preset& named : kPresets) {
+        if (named.name != preset) continue;
+        options.base = named.look;
+        options.ground = named.ground;
+        options.rain |= named.rain;
+        options.withInk = (named.ink || *inkOption) && !noInk;
+    }
+    options.ground = ground.value_or(options.ground);
     if (!verbose) quietenLog();
 
     if (inWindow) return runWindow(options, error) ? 0 : fail(error);

@@ -5,11 +5,14 @@
 #include <optional>
 #include <string>
 
+#include "host/presets.h"
 #include "preview/arguments.h"
 
 // What is left empty is the built-in picture or look, no script, or no such output.
 struct PreviewOptions {
     std::string portrait, landscape, light;  // files
+    Ground ground = Ground::pool;            // the built-in picture
+    Look base;                               // what the file of the look does not name
     std::string look;                        // file
     std::string script;                      // file
     bool rain = false;

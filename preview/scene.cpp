@@ -12,6 +12,18 @@
 
 namespace {
 
+Picture paintGround(Ground ground, int width, int height) {
+    switch (ground) {
+        case Ground::pool:
+            return tiledPool(width, height);
+        case Ground::river:
+            return riverBed(width, height);
+        case Ground::shore:
+            break;
+    }
+    return sandyShore(width, height);
+}
+
 // The picture of `file`, or the built-in one where there is no file.
 std::optional<Picture> choosePicture(
     const std::string& file, const std::function<Picture()>& builtIn, std::string& error) {
@@ -27,10 +39,10 @@ std::optional<Pictures> choosePictures(const PreviewOptions& options, std::strin
     const int shorter = std::max(1, static_cast<int>(std::min(width, height) * shrink));
     const int longer = std::max(1, static_cast<int>(std::max(width, height) * shrink));
     std::optional<Picture> portrait = choosePicture(
-        options.portrait, [&] { return riverBed(shorter, longer); }, error);
+        options.portrait, [&] { return paintGround(options.ground, shorter, longer); }, error);
     if (!portrait) return std::nullopt;
     std::optional<Picture> landscape = choosePicture(
-        options.landscape, [&] { return riverBed(longer, shorter); }, error);
+        options.landscape, [&] { return paintGround(options.ground, longer, shorter); }, error);
     if (!landscape) return std::nullopt;
     std::optional<Picture> water = choosePicture(
         options.light, [] { return waterLight(512); }, error);
@@ -61,7 +73,7 @@ void fitToDriver(const PreviewOptions& options, Pictures& pictures) {
 }
 
 std::optional<Look> chooseLook(const PreviewOptions& options, std::string& error) {
-    std::optional<Look> look = options.look.empty() ? Look{} : loadLook(options.look, error);
+    std::optional<Look> look = options.look.empty() ? options.base : loadLook(options.look, error, options.base);
     if (look && options.inkColor) {
         look->inkRed = options.inkColor->red;
         look->inkGreen = options.inkColor->green;

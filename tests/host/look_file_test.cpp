@@ -6,6 +6,7 @@
 #include <sstream>
 
 #include "host/look_values.h"
+#include "host/presets.h"
 
 static std::optional<Look> read(const std::string& text, std::string& error) {
     std::istringstream stream(text);
@@ -42,6 +43,13 @@ TEST(LookFile, NamesTheLineThatIsWrong) {
         EXPECT_FALSE(read("waveSpeed = 0.5\npictureZoom = 0.1\n" + std::string(line) + "\n", error)) << line;
         EXPECT_EQ(error.rfind("a.look:3: ", 0), 0U) << error;
         EXPECT_NE(error.find(reason), std::string::npos) << error;
+    }
+}
+
+TEST(LookValues, OfThePresetsAreWithinTheirLimits) {
+    for (const Preset& preset : kPresets) {
+        const LookField* const invalid = firstInvalid(preset.look);
+        EXPECT_EQ(invalid, nullptr) << preset.name << ": " << invalid->name;
     }
 }
 

@@ -58,6 +58,11 @@ void LiveWater::resized() {
 const LookField* LiveWater::setLook(const Look& look) {
     const LookField* const invalid = firstInvalid(look);
     if (invalid) return invalid;
+    const auto changesShade = [&](PictureSlot slot) {
+        return shadeOf(host_.look(), slot, 1.0f) != shadeOf(look, slot, 1.0f);
+    };
+    if (changesShade(PictureSlot::portrait)) pictureDue_ |= known_ & kBackgrounds;
+    if (changesShade(PictureSlot::light)) pictureDue_ |= known_ & kLightPicture;
     host_.setLook(look);
     longestFrame_ = double{look.longestFrame};
     return nullptr;

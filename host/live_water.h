@@ -12,6 +12,7 @@
 #include "host/look.h"
 #include "host/pace.h"
 #include "host/picture_source.h"
+#include "host/shade.h"
 #include "host/view_size.h"
 #include "host/water_host.h"
 
@@ -54,6 +55,10 @@ public:
     void setInk(bool withInk);
 
     void setRain(bool falling) { host_.rain(falling); }
+
+    // Lets the breeze blow for good. Otherwise it sinks some seconds after the last ripple was raised, and the water
+    // rests.
+    void setBreezeAlways(bool always) { host_.blowAlways(always); }
     void clearInk() { host_.clearInk(); }
 
     // One touch at the time at which it was reported. The place is a share of the view's width and height, from its top
@@ -65,6 +70,10 @@ public:
 
     // Nothing is drawn before all three pictures were there once. `which` is a sum of k...Picture.
     void picturesChanged(unsigned which);
+
+    // What a face multiplies a picture's colours by before it hands it over, see shade.h. A look that changes it has
+    // the pictures handed over again.
+    Shade shade(PictureSlot slot, float brightness) const { return shadeOf(host_.look(), slot, brightness); }
 
     // Where the framebuffer has lost the last frame.
     void redraw() { host_.redraw(); }

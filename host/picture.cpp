@@ -6,6 +6,7 @@
 
 #include "host/host_jni.h"
 #include "host/native_names.h"
+#include "host/shade.h"
 #include "platform/desktop_bitmap.h"
 
 namespace {
@@ -57,6 +58,24 @@ Picture shrunk(const Picture& picture, const std::vector<Span>& columns, const s
     return result;
 }
 
+float brightness(const Picture& picture) {
+    double sum = 0.0;
+    for (std::size_t i = 0; i < picture.rgba.size(); i += 4) {
+        sum += picture.rgba[i] + picture.rgba[i + 1] + picture.rgba[i + 2];
+    }
+    return static_cast<float>(sum / (255.0 * 0.75 * static_cast<double>(picture.rgba.size())));
+}
+
+Picture shaded(Picture picture, PictureSlot slot, const Look& look) {
+    const Shade shade = shadeOf(look, slot, brightness(picture));
+    if (shade == Shade{1.0f, 1.0f, 1.0f}) return picture;
+    const float factors[] = {shade.red, shade.green, shade.blue, 1.0f};
+    for (std::size_t i = 0; i < picture.rgba.size(); ++i) {
+        picture.rgba[i] = static_cast<std::uint8_t>(static_cast<float>(picture.rgba[i]) * factors[i % 4] + 0.5f);
+    }
+    return picture;
+}
+
 }  // namespace
 
 Picture fitted(const Picture& picture, int width, int height) {
@@ -87,10 +106,17 @@ void handOver(PictureSlot slot, const Picture& picture) {
     transfer(hostEnvironment(), nullptr, &bitmap);
 }
 
-PictureSource sourceOf(const Pictures& pictures) {
-    const auto give = [&pictures](PictureSlot slot, int width, int height) {
-        if (slot == PictureSlot::light) return handOver(slot, pictures.light);
-        handOver(slot, fitted(slot == PictureSlot::portrait ? pictures.portrait : pictures.landscape, width, height));
+PictureSource sourceOf(const Pictures& pictures, const Look& look) {
+    const auto give = [&pictures, look](PictureSlot slot, int width, int height) {
+        if (slot == PictureSlot::light) return handOver(slot, shaded(pictures.light, slot, look));
+        const Picture& ground = slot == PictureSlot::portrait ? pictures.portrait : pictures.landscape;
+        handOver(slot, shaded(fitted(ground, width, height), slot, look));
     };
     return {give, nullptr};
+}
+
+PictureSource sourceOf(const Pictures& pictures) {
+    Look plain;
+    plain.wet = 0.0f;
+    return sourceOf(pictures, plain);
 }

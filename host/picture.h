@@ -6,6 +6,8 @@
 
 #include "host/picture_source.h"
 
+struct Look;
+
 // Rows from the top, four bytes a pixel in R, G, B, A order, no padding.
 struct Picture {
     int width = 0;
@@ -27,5 +29,6 @@ Picture fitted(const Picture& picture, int width, int height);
 // Hands a picture over as it is.
 void handOver(PictureSlot slot, const Picture& picture);
 
-// Hands over pictures that stay where they are.
+// Hands over pictures that stay where they are, in the colours that the look gives them, or in their own.
+PictureSource sourceOf(const Pictures& pictures, const Look& look);
 PictureSource sourceOf(const Pictures& pictures);

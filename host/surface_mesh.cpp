@@ -132,12 +132,16 @@ void SurfaceMesh::turnDiagonals(int column, std::int16_t* indices) {
 }
 
 void SurfaceMesh::gather(
-    const float* heights, const float* velocity, float since, float* attribs, std::int16_t* indices) {
+    const float* heights, const float* velocity, float since, float* attribs, std::int16_t* indices,
+    const Breeze* breeze) {
     const int columns = padded(columns_.points);
     const int rows = padded(rows_.seen.count);
     for (int c = 0; c < columns; ++c) {
-        const auto first = at(columns_.from + std::min(c, columns_.points - 1), points_) + rows_.from;
-        advance(heights + first, velocity + first, since, rows_.points, lattice_.data() + at(c, rows_.points));
+        const int column = columns_.from + std::min(c, columns_.points - 1);
+        const auto first = at(column, points_) + rows_.from;
+        float* const line = lattice_.data() + at(c, rows_.points);
+        advance(heights + first, velocity + first, since, rows_.points, line);
+        if (breeze) breeze->add(column, rows_.from, rows_.points, line);
     }
     turn(lattice_.data(), columns, rows_.points, latticeRows_.data());
     for (int r = 0; r < rows_.seen.count; ++r) {

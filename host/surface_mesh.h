@@ -5,6 +5,8 @@
 #include <cstdint>
 #include <vector>
 
+#include "host/breeze.h"
+
 class SurfaceMesh {
 public:
     // A square of `vertices` a side over a lattice of `points` a side, each at least 2, of which only a middle part is
@@ -31,8 +33,11 @@ public:
     // of linear symmetry, 1987).
     //
     // `heights`, `velocity`: points * points values in the same order, and what each gains a step; `since`: steps
-    // passed since then; `attribs`: 3 values a vertex; `indices`: as laid by layCells().
-    void gather(const float* heights, const float* velocity, float since, float* attribs, std::int16_t* indices);
+    // passed since then; `attribs`: 3 values a vertex; `indices`: as laid by layCells(); `breeze`: is added
+    // to the heights.
+    void gather(
+        const float* heights, const float* velocity, float since, float* attribs, std::int16_t* indices,
+        const Breeze* breeze = nullptr);
 
 private:
     // Where a vertex lies along an axis: between points `cell` and `cell` + 1 of those that are read. The weights are

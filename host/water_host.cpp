@@ -8,18 +8,20 @@
 
 namespace {
 
-constexpr double kInkStep = 1.0 / 60;
 constexpr int kMostInkSteps = 4;
 
-// The ink follows a finger so much later, in seconds: by a report of a digitizer of 60 Hz and a quarter of a step, so
-// that a step lies between two reports.
-constexpr double kInkDelay = 1.25 * kInkStep;
+// The ink follows a finger so much later, in seconds: by a report of a digitizer of 60 Hz and a quarter more, so that a
+// step lies between two reports.
+constexpr double kInkDelay = 1.25 / 60;
 
 // The first step may be taken so much too early, so that a frame in time for it is not followed by one with two.
-constexpr double kEarly = 0.3 * kInkStep;
+constexpr double kEarly = 0.3 / 60;
 
 // A drop is raised in so many steps of the waves, whose shares are those of a half period of the sine.
 constexpr int kDropSteps = 8;
+
+// A crater follows the crest of a drop that rebounds, and a lower crest the crater.
+constexpr int kRebounds = 2;
 constexpr double kHalfTurn = 3.141592653589793;
 
 // More drops at a time than any hand or rain raises.
@@ -27,6 +29,11 @@ constexpr std::size_t kMostDrops = 2048;
 
 constexpr float kLightestTouch = 0.3f;
 constexpr float kHeaviestTouch = 1.5f;
+
+// The breeze blows for so long after the last drop, and takes so long to rise and to sink, in seconds.
+constexpr double kBreezeSeconds = 4.0;
+constexpr double kRisingSeconds = 1.5;
+constexpr double kSinkingSeconds = 4.0;
 
 // Nearer to a step than this, in steps, the heights are those of the step.
 constexpr float kAtStep = 0.0625f;
@@ -63,7 +70,7 @@ std::vector<float> resampled(const std::vector<float>& field, int from, int to) 
 }  // namespace
 
 WaterHost::WaterHost(const Look& look, int width, int height, std::uint32_t seed)
-    : look_(look), random_(seed), calmSteps_(look_.stepsToRest), lattice_{} {
+    : look_(look), random_(seed), calmSteps_(look_.stepsToRest), breeze_({}), lattice_{} {
     resize(width, height);
 }
 
@@ -99,6 +106,7 @@ void WaterHost::fit() {
         velocity_.values = resampled(velocity_.values, old.points, lattice_.points);
         heights_.values = resampled(heights_.values, old.points, lattice_.points);
     }
+    if (lattice_.points != old.points || lattice_.cell != old.cell) breeze_ = Breeze(lattice_);
     const float pixel =
         static_cast<float>(lattice_.extent) / look_.pictureZoom / static_cast<float>(std::max(width_, height_));
     const float oldWidth = std::exchange(visibleWidth_, pixel * static_cast<float>(width_));
@@ -208,7 +216,7 @@ void WaterHost::touch(TouchAction action, double x, double y, float weight, doub
 
 void WaterHost::raiseTouchRipples(TouchAction action, Place place, float amplitude) {
     if (action == TouchAction::down) {
-        raise(place, amplitude);
+        raise(place, amplitude, look_.rebound);
     } else if (action == TouchAction::move && fingerDown_) {
         const float spacing =
             look_.trailCells * static_cast<float>(lattice_.extent) / static_cast<float>(lattice_.points - 1);
@@ -218,14 +226,14 @@ void WaterHost::raiseTouchRipples(TouchAction action, Place place, float amplitu
         if (ripples < 1) return;
         for (int i = 1; i <= ripples; ++i) {
             const float t = static_cast<float>(i) / static_cast<float>(ripples);
-            raise({trail_.x + dx * t, trail_.y + dy * t}, amplitude * look_.trailShare);
+            raise({trail_.x + dx * t, trail_.y + dy * t}, amplitude * look_.trailShare, 0.0f);
         }
     }
     trail_ = place;
 }
 
 void WaterHost::splash(double x, double y, float weight) {
-    if (isSetUp_) raise(modelPlace(x, y), look_.touchAmplitude * weight);
+    if (isSetUp_) raise(modelPlace(x, y), look_.touchAmplitude * weight, look_.rebound);
 }
 
 void WaterHost::clearInk() {
@@ -244,9 +252,17 @@ bool WaterHost::advance(double seconds) {
         growDrops();
         if (calmSteps_ < look_.stepsToRest) stepWater();
     }
+    breathe(passed);
     if (calmSteps_ < look_.stepsToRest) changed_ = true;
     startInk();
     return inkMoves() ? time_ >= due() : changed_;
+}
+
+void WaterHost::breathe(double seconds) {
+    if (!isBreezy()) return;
+    changed_ = true;
+    gust_ += isStirred() ? seconds / kRisingSeconds : -seconds / kSinkingSeconds;
+    gust_ = std::clamp(gust_, 0.0, 1.0);
 }
 
 // The first step is that of the first touch, so that strokes are the same at any frame rate. Where its time would lie
@@ -254,15 +270,15 @@ bool WaterHost::advance(double seconds) {
 // it is moved a little.
 void WaterHost::startInk() {
     if (inkStart_ < 0.0 || time_ < inkStart_ - kEarly) return;
-    const double due = std::min((time_ - inkStart_) / kInkStep + 1.0, double{kMostInkSteps});
+    const double due = std::min((time_ - inkStart_) / inkStep() + 1.0, double{kMostInkSteps});
     const double share = due - std::floor(due);
     const double calm = share > 0.5 ? std::max(share, 0.65) : std::min(share, 0.35);
-    inkTime_ = time_ - (std::floor(due) + calm) * kInkStep;
+    inkTime_ = time_ - (std::floor(due) + calm) * inkStep();
     inkStart_ = -1.0;
 }
 
 double WaterHost::due() const {
-    if (inkMoves() && !isLost_) return inkTime_ + 0.5 * kInkStep;
+    if (inkMoves() && !isLost_) return inkTime_ + 0.5 * inkStep();
     return isStill() && inkStart_ >= 0.0 ? inkStart_ - kEarly : time_;
 }
 
@@ -287,23 +303,28 @@ void WaterHost::dropRain() {
     if (draw() * static_cast<float>(lattice_.stepsPerSecond) >= look_.rainDropsPerSecond) return;
     const float x = (draw() - 0.5f) * visibleWidth_;
     const float y = (draw() - 0.5f) * visibleHeight_;
-    raise({x, y}, look_.rainAmplitude * (0.5f + 0.5f * draw()));
+    raise({x, y}, look_.rainAmplitude * (0.5f + 0.5f * draw()), look_.rebound);
 }
 
-void WaterHost::raise(Place place, float amplitude) {
+void WaterHost::raise(Place place, float amplitude, float rebound) {
     if (!std::isfinite(amplitude) || !std::isfinite(place.x) || !std::isfinite(place.y)) return;
     if (drops_.size() >= kMostDrops) return;
-    drops_.push_back({place.x, place.y, std::clamp(amplitude, -kMostAmplitude, kMostAmplitude), 0});
+    calmAt_ = time_ + kBreezeSeconds;
+    drops_.push_back({place.x, place.y, std::clamp(amplitude, -kMostAmplitude, kMostAmplitude), rebound, 0});
 }
 
-// One step of every drop. The shares of all its steps, sin(pi (i + 1/2) / n) sin(pi / 2n), sum up to 1.
+// One step of every drop. The shares of the steps of its crest, sin(pi (i + 1/2) / n) sin(pi / 2n), sum up to 1; those
+// that follow, to what the rebound leaves of it.
 void WaterHost::growDrops() {
     if (drops_.empty()) return;
     for (Drop& drop : drops_) {
+        const double left = std::pow(double{drop.rebound}, drop.step / kDropSteps);
         const double phase = kHalfTurn * (drop.step++ + 0.5) / kDropSteps;
-        addRipple(drop, static_cast<float>(std::sin(phase) * std::sin(kHalfTurn / (2 * kDropSteps))));
+        addRipple(drop, static_cast<float>(left * std::sin(phase) * std::sin(kHalfTurn / (2 * kDropSteps))));
     }
-    std::erase_if(drops_, [](const Drop& drop) { return drop.step >= kDropSteps; });
+    std::erase_if(drops_, [](const Drop& drop) {
+        return drop.step >= (drop.rebound > 0.0f ? kDropSteps * (1 + kRebounds) : kDropSteps);
+    });
     calmSteps_ = 0;
     isGathered_ = false;
 }
@@ -325,11 +346,13 @@ void WaterHost::gatherHeights() {
     const bool moves = calmSteps_ < look_.stepsToRest;
     const auto since = static_cast<float>(dueSteps_);
     const bool atStep = !moves || std::abs(since) < kAtStep;
-    if (atStep && isGathered_) return;
+    if (atStep && isGathered_ && !isBreezy()) return;
+    const double strength = gust_ * gust_ * (3.0 - 2.0 * gust_);
+    breeze_.blow(look_.breeze * static_cast<float>(strength), time_);
     mesh_.gather(
         heights_.values.data(), velocity_.values.data(), atStep ? 0.0f : since, heightAttribs_.values.data(),
-        indices_.values.data());
-    isGathered_ = atStep;
+        indices_.values.data(), isBreezy() ? &breeze_ : nullptr);
+    isGathered_ = atStep && !isBreezy();
 }
 
 void WaterHost::draw() {
@@ -338,17 +361,17 @@ void WaterHost::draw() {
     int steps = 1;
     const bool moves = inkMoves();
     if (moves) {
-        const double due = (time_ - inkTime_) / kInkStep;
+        const double due = (time_ - inkTime_) / inkStep();
         const double whole = std::floor(due + 0.5);
         steps = static_cast<int>(std::clamp(whole, 1.0, double{kMostInkSteps}));
         // Steps that are left out take no time. A frame that comes early does not bring the next steps to the middle
         // between two frames, where the jitter of a clock would decide between none and two.
         const double behind = due < 0.4 ? -0.25 : due - std::max(whole, 1.0);
-        inkTime_ = time_ - (behind + steps) * kInkStep;
+        inkTime_ = time_ - (behind + steps) * inkStep();
     }
     for (int i = 1; i <= steps; ++i) {
         if (moves) {
-            inkTime_ += kInkStep;
+            inkTime_ += inkStep();
             for (const Touch& touch : strokes_.step(inkTime_ - kInkDelay)) {
                 const auto pixel = [](float place) { return static_cast<jint>(std::lround(place)); };
                 native::onTouch(

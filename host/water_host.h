@@ -9,6 +9,7 @@
 #include <random>
 #include <vector>
 
+#include "host/breeze.h"
 #include "host/host_jni.h"
 #include "host/look.h"
 #include "host/picture_source.h"
@@ -36,6 +37,7 @@ public:
 
     // Takes over all values, which are within their limits; the water and the ink stay.
     void setLook(const Look& look);
+    const Look& look() const { return look_; }
 
     // Draws with a share of the vertices along each side that the size of the view asks for, where the look leaves the
     // mesh to the host.
@@ -60,6 +62,9 @@ public:
     // Lets rain fall, `look.rainDropsPerSecond` drops a second, until it is switched off.
     void rain(bool falling) { raining_ = falling; }
 
+    // Lets the breeze blow for good. Otherwise it sinks some seconds after the last ripple was raised.
+    void blowAlways(bool always) { blowsAlways_ = always; }
+
     // Advances the water by `seconds` and says whether there is something to draw: while ink lives, when a step of it
     // is due, as each frame moves it; otherwise when the picture has changed since the last draw.
     bool advance(double seconds);
@@ -70,7 +75,8 @@ public:
     // Whether the picture stays as it is, however much time passes, until the next call that changes something.
     bool isResting() const;
 
-    // Whether ink lives, each step of which needs a frame: at most 60 frames a second are drawn then.
+    // Whether ink lives, each step of which needs a frame: at most look.inkStepsPerSecond frames a second are drawn
+    // then.
     bool inkMoves() const { return withInk_ && inkStart_ < 0.0 && (strokes_.isActive() || inkSteps_ > 0); }
 
     // Draws a frame: without ink into the current framebuffer, with ink into framebuffer 0. With ink, moves it by the
@@ -90,6 +96,7 @@ private:
     struct Drop {
         float x, y;  // model units
         float amplitude;
+        float rebound;
         int step;
     };
 
@@ -103,12 +110,18 @@ private:
     void makeMesh(int vertices);
     void fillMesh();
     void raiseTouchRipples(TouchAction action, Place place, float amplitude);
-    void raise(Place place, float amplitude);
+    void raise(Place place, float amplitude, float rebound);
     void stepWater();
     void growDrops();
     void addRipple(const Drop& drop, float share);
     void dropRain();
-    bool isStill() const { return !changed_ && !raining_ && drops_.empty() && calmSteps_ >= look_.stepsToRest; }
+    bool isBreezy() const { return isSetUp_ && look_.breeze > 0.0f && (gust_ > 0.0 || isStirred()); }
+    bool isStirred() const { return blowsAlways_ || time_ < calmAt_; }
+    void breathe(double seconds);
+    double inkStep() const { return 1.0 / look_.inkStepsPerSecond; }
+    bool isStill() const {
+        return !changed_ && !raining_ && drops_.empty() && !isBreezy() && calmSteps_ >= look_.stepsToRest;
+    }
     void startInk();
     void gatherHeights();
     void drawOnce(bool isSeen);
@@ -130,12 +143,17 @@ private:
     bool fingerDown_ = false;
     Place trail_ = {};  // where the finger raised its last ripple
 
+    Breeze breeze_;
+    bool blowsAlways_ = false;
+    double calmAt_ = 0.0;  // when the breeze begins to sink
+    double gust_ = 0.0;    // its share of its full strength, before it is smoothed
+
     StrokeClock strokes_;
     double inkStart_ = -1.0;  // when the ink that rested is to begin, or below 0
     double inkTime_ = 0.0;    // of the ink's last step
     int inkSteps_ = 0;        // until the ink has faded: the library does not tell whether any is left
 
-    bool isGathered_ = false;  // the mesh has the heights of the lattice
+    bool isGathered_ = false;  // the mesh has the heights of the lattice, and no others
     bool isMeshFilled_ = false;
 
     // The part of the square mesh that the view shows, in model units, and the whole numbers that the library takes for

@@ -24,6 +24,7 @@ WaveLattice latticeFor(const Look& look, int width, int height) {
 
     // Shorter steps where the waves would outrun the lattice.
     const double cell = spanned / (lattice.points - 1);
+    lattice.cell = cell;
     const double cellsPerStep = look.ringSpeed / (cell * look.stepsPerSecond);
     const double steps = std::clamp(std::ceil(cellsPerStep / std::sqrt(kMostWaveSpeed)), 1.0, 8.0);
     lattice.stepsPerSecond = look.stepsPerSecond * static_cast<int>(steps);

@@ -7,6 +7,7 @@
 struct WaveLattice {
     int points;          // along each side of a square around the view
     int extent;          // of that side, model units
+    double cell;         // between two points, view heights
     int stepsPerSecond;  // that keep the waves stable
     float damping;       // a step
     float waveSpeed;     // a step

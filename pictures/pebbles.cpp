@@ -26,6 +26,9 @@ constexpr Mineral kMinerals[] = {
     {{0.045f, 0.050f, 0.055f}, {0.018f, 0.022f, 0.026f}, 0.3f},   // basalt
 };
 
+// All stones take on some of it.
+constexpr Rgb kBank = {0.150f, 0.140f, 0.120f};
+
 // Light from the upper left, halfway up.
 constexpr std::array<float, 3> kLight = {-0.50f, -0.58f, 0.643f};
 
@@ -58,7 +61,7 @@ Pebble makePebble(float x, float y, float radius, Random& random) {
     pebble.lobe3 = random.in(-0.07f, 0.07f);
     pebble.lobeSkew = random.in(-0.07f, 0.07f);
     pebble.flatness = random.in(0.2f, 0.8f);
-    pebble.shade = random.in(0.75f, 1.3f);
+    pebble.shade = random.in(0.8f, 1.15f);
     pebble.mineral = mineral;
     pebble.veined = random.in(0.0f, 1.0f) < mineral.veins;
     pebble.veinX = std::cos(veinAngle);
@@ -91,12 +94,12 @@ Rgb stoneColour(const Pebble& pebble, const CloudTile& clouds, float u, float v,
     const float grain = grainAt(column, row);
     Rgb colour = mix(pebble.mineral.mottle, pebble.mineral.base, std::clamp(cloud * 2.2f - 0.6f, 0.0f, 1.0f));
     const float shade = pebble.shade * (0.86f + 0.28f * grain);
-    colour = colour * shade;
+    colour = mix(colour * shade, kBank, 0.45f);
     if (pebble.veined) {
         const float wander = (cloud - 0.5f) * 0.35f;
         const float away = std::abs(u * pebble.veinX + v * pebble.veinY + wander - pebble.veinOffset);
         const float vein = std::clamp(1.5f - away / pebble.veinWidth, 0.0f, 1.0f);
-        colour = mix(colour, {0.46f, 0.43f, 0.38f}, vein * 0.75f);
+        colour = mix(colour, {0.34f, 0.32f, 0.29f}, vein * 0.5f);
     }
     return colour;
 }
@@ -168,6 +171,6 @@ void scatterPebbles(Canvas& canvas, float unit, Random& random, const CloudTile&
     scatter(canvas, 0.15f * unit, 0.45f * unit, 0.7f, random, clouds);
     scatter(canvas, 0.40f * unit, 1.40f * unit, 1.25f, random, clouds);
     scatter(canvas, 0.15f * unit, 0.50f * unit, 0.14f, random, clouds);
-    scatter(canvas, 1.50f * unit, 2.50f * unit, 0.14f, random, clouds);
+    scatter(canvas, 1.50f * unit, 2.20f * unit, 0.05f, random, clouds);
     scatter(canvas, 0.14f * unit, 0.32f * unit, 0.03f, random, clouds);
 }

@@ -41,7 +41,7 @@ float sampleHalf(const std::vector<float>& net, int netWidth, int netHeight, int
 
 // What the eye sees of a stone under `depth` of water: 0 is shallow and warm, 1 deep and blue-green.
 Rgb underWater(Rgb stone, float depth, float caustic) {
-    const float sun = (0.75f + 0.95f * std::min(caustic, 4.5f)) * (1.30f - 0.50f * depth);
+    const float sun = (1.30f + 0.28f * std::min(caustic, 3.0f)) * (1.30f - 0.50f * depth);
     return {
         expose(stone.r * sun * (1.20f - 0.80f * depth) + 0.002f),
         expose(stone.g * sun * (1.10f - 0.28f * depth) + 0.003f + 0.016f * depth),
@@ -75,12 +75,12 @@ Picture riverBed(int width, int height) {
         Random random(5);
         scatterPebbles(bed, unit, random, CloudTile(11));
     };
-    return flood(width, height, 0.85f, pebbles, [](float x, float y) { return 0.40f * x + 0.80f * y - 0.10f; });
+    return flood(width, height, 0.6f, pebbles, [](float x, float y) { return 0.40f * x + 0.80f * y - 0.10f; });
 }
 
 Picture tiledPool(int width, int height) {
     const auto tiles = [](Canvas& bed, float unit) { layTiles(bed, unit, CloudTile(41)); };
-    return flood(width, height, 1.5f, tiles, [](float, float y) { return 0.15f + 0.35f * y; });
+    return flood(width, height, 0.8f, tiles, [](float, float y) { return 0.15f + 0.35f * y; });
 }
 
 Picture sandyShore(int width, int height) {
@@ -88,7 +88,7 @@ Picture sandyShore(int width, int height) {
         Random random(8);
         rakeSand(bed, unit, random, CloudTile(31));
     };
-    return flood(width, height, 1.2f, sand, [](float x, float y) { return 0.75f - 0.25f * x - 0.70f * y; });
+    return flood(width, height, 0.7f, sand, [](float x, float y) { return 0.75f - 0.25f * x - 0.70f * y; });
 }
 
 // A flat surface shows the very middle, slopes lead outwards from there: sky, with the sun's glitter on it.

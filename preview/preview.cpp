@@ -109,7 +109,7 @@ bool runPreview(const PreviewOptions& options, std::string& error) {
     srand48(static_cast<long>(options.seed));
     WaterHost host(*look, width, height, options.seed);
     host.setUp(options.withInk);
-    host.loadPictures(sourceOf(*pictures));
+    host.loadPictures(sourceOf(*pictures, *look));
     host.rain(options.rain);
     const int frames = countFrames(options, events);
     TouchPlayer touches(std::move(events), width, height);

@@ -128,7 +128,7 @@ bool runWindow(const PreviewOptions& options, std::string& error) {
 
     // The ink draws from this generator as well.
     srand48(static_cast<long>(options.seed));
-    Stage stage{LiveWater(sourceOf(*pictures), options.seed), options.withInk, options.rain};
+    Stage stage{LiveWater(sourceOf(*pictures, *look), options.seed), options.withInk, options.rain};
     stage.water.setQuality(Quality::high);
     stage.water.setLook(*look);
     stage.water.picturesChanged(kAllPictures);

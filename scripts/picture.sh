@@ -9,10 +9,9 @@ configure_program
 cmake --build --preset release --target tidemark-preview
 preview=build/release/preview/tidemark-preview
 
-# Drawn larger than it is shown, which keeps it crisp.
-"$preview" --script scenes/welcome.touch --size 840x504 --seconds 4.8 --video out/welcome.mp4
-ffmpeg -v error -y -i out/welcome.mp4 -vf fps=20,scale=480:-1:flags=lanczos \
-    -c:v libwebp_anim -quality 55 -compression_level 6 -loop 0 docs/tidemark.webp
+"$preview" --script scenes/welcome.touch --rain --size 1260x708 --seconds 3.8 --video out/welcome.mp4
+ffmpeg -v error -y -i out/welcome.mp4 -vf fps=15,scale=840:-1:flags=lanczos \
+    -c:v libwebp_anim -quality 40 -compression_level 6 -loop 0 docs/tidemark.webp
 
 "$preview" --script scenes/curl.touch --size 540x540 --seconds 0.7 --inside out/inside
 mkdir -p docs/inside
@@ -32,24 +31,33 @@ ffmpeg -v error -y "${parts[@]}" -filter_complex "hstack=inputs=3,crop=1620:640:
 # The same stroke on a phone at each quality.
 parts=()
 for quality in low medium high; do
-    "$preview" --script scenes/welcome.touch --size 1080x2340 --density 3 --quality "$quality" --seconds 1.6 \
-        --every 95 --out "out/quality-$quality"
+    "$preview" --script scenes/fast.touch --size 1080x2340 --density 3 --quality "$quality" --seconds 0.85 \
+        --every 50 --out "out/quality-$quality"
     parts+=(-i "out/quality-$quality/frame-0001.png")
 done
 ffmpeg -v error -y "${parts[@]}" -filter_complex \
     "[0]scale=540:-1[a];[1]scale=540:-1[b];[2]scale=540:-1[c];[a][b][c]hstack=inputs=3,crop=1620:700:0:300,scale=1200:-1" \
     -frames:v 1 -c:v libwebp -quality 80 docs/density.webp
 
-for vertices in 96 128 192 256; do
-    echo "meshVertices = $vertices" >"out/$vertices.look"
-    "$preview" --look "out/$vertices.look" --script scenes/quality.touch --size 1440x900 --seconds 0.45 --no-ink \
-        --every 26 --out "out/quality-$vertices"
-done
 parts=()
-for vertices in 96 128 192 256; do
-    parts+=(-i "out/quality-$vertices/frame-0001.png")
+for preset in clear-lake summer-rain heavy-glass quicksilver honey red-ink deep-swell; do
+    "$preview" --preset "$preset" --script scenes/strip.touch --size 360x560 --seconds 1.2 --every 71 --out "out/preset-$preset"
+    parts+=(-i "out/preset-$preset/frame-0001.png")
 done
-crop=crop=360:360:540:300
-ffmpeg -v error -y "${parts[@]}" \
-    -filter_complex "[0]${crop}[a];[1]${crop}[b];[2]${crop}[c];[3]${crop}[d];[a][b][c][d]hstack=inputs=4" \
-    -frames:v 1 -c:v libwebp -quality 88 docs/quality.webp
+ffmpeg -v error -y "${parts[@]}" -filter_complex "hstack=inputs=7,scale=1660:-1" \
+    -frames:v 1 -c:v libwebp -quality 80 docs/presets.webp
+
+# Grounds of three brightnesses, each as it is and wet.
+"$preview" --ground shore --no-ink --size 400x400 --seconds 0.02 --script scenes/tap.touch --out out/ground
+parts=()
+for brightness in 0.3 -0.1 -0.4; do
+    ffmpeg -v error -y -i out/ground/frame-0000.png -vf "eq=brightness=$brightness:saturation=0.4" "out/ground$brightness.png"
+    for wet in 0.0 0.6; do
+        echo "wet = $wet" >out/wet.look
+        "$preview" --portrait "out/ground$brightness.png" --look out/wet.look --no-ink --script scenes/strip.touch \
+            --size 400x400 --seconds 0.5 --every 29 --out "out/wet$brightness$wet"
+        parts+=(-i "out/wet$brightness$wet/frame-0001.png")
+    done
+done
+ffmpeg -v error -y "${parts[@]}" -filter_complex "hstack=inputs=6,scale=1660:-1" \
+    -frames:v 1 -c:v libwebp -quality 80 docs/wet.webp

@@ -179,6 +179,49 @@ TEST_F(Live, drawsAsManyPixelsAsTheQualityAllows) {
     }
 }
 
+// Nothing moves but the breeze.
+TEST_F(Live, aBreezeRisesWithATouchAndSinksToRestWithoutAJump) {
+    begin({.meshVertices = 24, .touchAmplitude = 0.0f, .breeze = 2.0f});
+    next();
+    EXPECT_EQ(next(), Frame::resting);
+    const auto flat = seen();
+    const auto farthestFrom = [this](const std::vector<Rgba>& before) {
+        int most = 0;
+        const auto now = seen();
+        for (std::size_t i = 0; i < now.size(); ++i) most = std::max(most, std::abs(now[i][0] - before[i][0]));
+        return most;
+    };
+    touch();
+    auto last = flat;
+    int most = 0, jump = 0, frames = 0;
+    for (; next() == Frame::drawn && frames < 1000; ++frames, last = seen()) {
+        most = std::max(most, farthestFrom(flat));
+        jump = std::max(jump, farthestFrom(last));
+    }
+    EXPECT_GT(most, 10);
+    EXPECT_LT(jump, most / 2);
+    EXPECT_LT(frames, 600);
+    EXPECT_EQ(seen(), flat);
+
+    water.setBreezeAlways(true);
+    touch();
+    for (int i = 0; i < 900; ++i) next();
+    EXPECT_EQ(next(), Frame::drawn);
+    water.setBreezeAlways(false);
+    EXPECT_LT(framesToRest(), 600);
+}
+
+TEST(Shade, darkensAndCoolsABrightGroundOnly) {
+    const Look look = {.wet = 1.0f};
+    const Shade none = {1.0f, 1.0f, 1.0f};
+    EXPECT_EQ(shadeOf(look, PictureSlot::portrait, 0.3f), none);
+    EXPECT_EQ(shadeOf(look, PictureSlot::light, 1.0f), none);
+    const Shade white = shadeOf(look, PictureSlot::portrait, 1.0f);
+    EXPECT_LT(white.red, white.green);
+    EXPECT_LT(white.green, white.blue);
+    EXPECT_LT(white.blue, 0.7f);
+}
+
 TEST_F(Live, aPauseIsNotMadeUpFor) {
     enum Pause { kAfterTheLastFrame, kAfterRainWithoutADrop, kInTheWaves };
     const auto ringAfter = [this](Pause pause, double seconds) {

@@ -55,7 +55,7 @@ protected:
         resetGestures();
         srand48(1);
         LiveWater water(sourceOf(pictures), 1);
-        water.setLook({.meshVertices = 16, .touchAmplitude = 0.0f});
+        water.setLook({.meshVertices = 16, .touchAmplitude = 0.0f, .breeze = 0.0f});
         water.setView(kWidth, kHeight, 1.0, 0.0);
         water.setInk(true);
         water.picturesChanged(kAllPictures);

@@ -95,7 +95,7 @@ TEST_F(Host, ringsAreRoundOnTheScreen) {
 
 TEST_F(Host, ringsRunAtTheirSpeed) {
     for (const float speed : {0.1f, 0.2713f, 1.0f, 2.0f}) {
-        WaterHost host = start(kShort, kLong, false, {.ringSpeed = speed, .calmingTime = 100.0f});
+        WaterHost host = start(kShort, kLong, false, {.ringSpeed = speed, .calmingTime = 100.0f, .rebound = 0.0f});
         host.splash(kShort / 2, kLong / 2, 1.0f);
         // From the middle of the steps that raise the drop.
         const double time = 0.4 / speed + 4.0 / host.lattice().stepsPerSecond;
@@ -126,6 +126,10 @@ TEST_F(Host, inkBloomsInItsColorFadesAndIsClearedAtOnce) {
     constexpr int height = 200;
     Look look;
     look.touchAmplitude = 0.0f;
+    look.breeze = 0.0f;
+    look.inkRed = 0.05f;
+    look.inkGreen = 0.15f;
+    look.inkBlue = 0.45f;
     look.stepsToRest = 1;
     look.meshVertices = 16;
     WaterHost host = start(width, height, true, look);
@@ -171,7 +175,7 @@ TEST_F(Host, inkBloomsInItsColorFadesAndIsClearedAtOnce) {
 }
 
 TEST_F(Host, aMoveFollowsAFingerAndRaisesAShortTrailAtMost) {
-    WaterHost host = start(kShort, kLong, true, {.longestTrail = 3.0f, .trailShare = 0.5f});
+    WaterHost host = start(kShort, kLong, true, {.longestTrail = 3.0f, .trailShare = 0.5f, .rebound = 0.0f});
     const auto raised = [&host] { return std::accumulate(host.heights().begin(), host.heights().end(), 0.0); };
     host.draw();
     const auto clear = readPixels(kShort, kLong);

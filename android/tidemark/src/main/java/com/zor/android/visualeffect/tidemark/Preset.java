@@ -9,9 +9,9 @@ import org.jetbrains.annotations.NotNull;
  */
 public enum Preset {
     /** Clear lake. */
-    CLEAR_LAKE("Clear lake", Ground.POOL, false, false),
+    CLEAR_LAKE("Clear lake", Ground.SHORE, false, false),
     /** Summer rain. */
-    SUMMER_RAIN("Summer rain", Ground.SHORE, false, true),
+    SUMMER_RAIN("Summer rain", Ground.POOL, false, true),
     /** Heavy glass. */
     HEAVY_GLASS("Heavy glass", Ground.POOL, false, false),
     /** Quicksilver. */
@@ -62,50 +62,87 @@ public enum Preset {
         Look look = new Look();
         switch (this) {
             case CLEAR_LAKE:
+                look.breeze = 0.3f;
+                look.groundRed = 0.6f;
+                look.groundGreen = 0.92f;
                 break;
             case SUMMER_RAIN:
                 look.calmingTime = 3.6f;
-                look.rainDropsPerSecond = 16;
-                look.rainAmplitude = 0.72f;
+                look.rainDropsPerSecond = 24;
+                look.rainAmplitude = 0.9f;
+                look.groundRed = 0.7f;
+                look.groundGreen = 0.78f;
+                look.groundBlue = 0.85f;
                 break;
             case HEAVY_GLASS:
                 look.refractiveIndex = 2.4f;
-                look.calmingTime = 2.5f;
-                look.ringSpeed = 0.2f;
+                look.calmingTime = 4;
+                look.ringSpeed = 0.16f;
                 look.exponent = 120;
                 look.specularRatio = 8;
+                look.alphaMix = 0.6f;
+                look.rebound = 0;
+                look.breeze = 0.1f;
+                look.touchAmplitude = 4;
+                look.groundRed = 0.75f;
+                look.groundGreen = 0.95f;
+                look.groundBlue = 0.85f;
                 break;
             case QUICKSILVER:
-                look.alphaMix = 0.8f;
-                look.alphaScale1 = 0.8f;
-                look.fresnelRatio = 1.2f;
+                look.alphaMix = 0.9f;
+                look.alphaScale1 = 0.9f;
+                look.fresnelRatio = 2;
                 look.specularRatio = 6;
-                look.exponent = 60;
+                look.exponent = 25;
                 look.touchAmplitude = 3;
                 look.calmingTime = 10;
+                look.ringSpeed = 0.22f;
+                look.rebound = 0.8f;
+                look.breeze = 0.4f;
+                look.groundRed = 0.25f;
+                look.groundGreen = 0.29f;
+                look.groundBlue = 0.42f;
+                look.lightGreen = 0.8f;
+                look.lightBlue = 0.65f;
                 break;
             case HONEY:
-                look.calmingTime = 1.6f;
-                look.ringSpeed = 0.17f;
+                look.calmingTime = 1.2f;
+                look.ringSpeed = 0.12f;
+                look.dropRadius = 0.034f;
                 look.touchAmplitude = 3.4f;
+                look.trailShare = 0.2f;
                 look.alphaMix = 0.8f;
-                look.inkRed = 0.6f;
-                look.inkGreen = 0.302f;
-                look.inkBlue = 0.02f;
+                look.exponent = 80;
+                look.rebound = 0;
+                look.breeze = 0;
+                look.inkStepsPerSecond = 30;
+                look.groundGreen = 0.66f;
+                look.groundBlue = 0.2f;
+                look.lightGreen = 0.8f;
+                look.lightBlue = 0.4f;
+                look.inkRed = 0.45f;
+                look.inkGreen = 0.18f;
+                look.inkBlue = 0.01f;
                 break;
             case RED_INK:
                 look.touchAmplitude = 1.2f;
                 look.trailShare = 0.06f;
+                look.inkStepsPerSecond = 30;
                 look.inkRed = 0.6f;
-                look.inkGreen = 0.031f;
-                look.inkBlue = 0.051f;
+                look.inkGreen = 0.03f;
+                look.inkBlue = 0.05f;
                 break;
             case DEEP_SWELL:
-                look.dropRadius = 0.032f;
+                look.dropRadius = 0.045f;
                 look.meshExtent = 20;
                 look.calmingTime = 12.5f;
                 look.ringSpeed = 0.43f;
                 look.touchAmplitude = 3;
+                look.rebound = 0.5f;
+                look.breeze = 0.5f;
+                look.groundRed = 0.3f;
+                look.groundGreen = 0.48f;
+                look.groundBlue = 0.7f;
                 break;
         }
         return look;

@@ -11,7 +11,7 @@ preview=build/release/preview/tidemark-preview
 
 "$preview" --script scenes/welcome.touch --rain --size 1260x708 --seconds 3.8 --video out/welcome.mp4
 ffmpeg -v error -y -i out/welcome.mp4 -vf fps=15,scale=840:-1:flags=lanczos \
-    -c:v libwebp_anim -quality 40 -compression_level 6 -loop 0 docs/tidemark.webp
+    -c:v libwebp_anim -quality 55 -compression_level 4 -loop 0 docs/tidemark.webp
 
 "$preview" --script scenes/curl.touch --size 540x540 --seconds 0.7 --inside out/inside
 mkdir -p docs/inside

@@ -187,8 +187,8 @@ TEST_F(Live, aBreezeRisesWithATouchAndSinksToRestWithoutAJump) {
     const auto flat = seen();
     const auto farthestFrom = [this](const std::vector<Rgba>& before) {
         int most = 0;
-        const auto now = seen();
-        for (std::size_t i = 0; i < now.size(); ++i) most = std::max(most, std::abs(now[i][0] - before[i][0]));
+        const auto current = seen();
+        for (std::size_t i = 0; i < current.size(); ++i) most = std::max(most, std::abs(current[i][0] - before[i][0]));
         return most;
     };
     touch();

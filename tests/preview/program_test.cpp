@@ -35,9 +35,10 @@ TEST_F(Program, StillWaterShowsThePictureOfItsOrientation) {
 
 TEST_F(Program, TouchesMoveTheWaterInTheFrameThatTheyFallInto) {
     std::ofstream("../tap.touch") << "100 down 50% 90% 1\n110 up 50% 90% 1\n";
-    std::ofstream("../numb.look") << "touchAmplitude = 0\n";
+    std::ofstream("../numb.look") << "touchAmplitude = 0\nbreeze = 0\n";
+    std::ofstream("../still.look") << "breeze = 0\n";
     const std::string scene = "--size 48x80 --fps 20 --script ../tap.touch ";
-    EXPECT_EQ(preview(scene + "--out o"), "0\n");
+    EXPECT_EQ(preview(scene + "--look ../still.look --out o"), "0\n");
     EXPECT_EQ(load("o/frame-0000.png").rgba, load("o/frame-0001.png").rgba);
     const std::vector<std::uint8_t> before = load("o/frame-0001.png").rgba, after = load("o/frame-0002.png").rgba;
     const auto half = static_cast<std::ptrdiff_t>(before.size() / 2);
@@ -69,7 +70,8 @@ TEST_F(Program, SameInputsGiveTheSameBytesInVideosOfEachKind) {
 }
 
 TEST_F(Program, ShowsTheInsideOfAStroke) {
-    const std::string scene = "--size 100x96 --fps 60 --seconds 0.5 --script '" TIDEMARK_SCENES_PATH "/curl.touch' ";
+    const std::string scene =
+        "--ground shore --size 100x96 --fps 60 --seconds 0.5 --script '" TIDEMARK_SCENES_PATH "/curl.touch' ";
     EXPECT_EQ(preview(scene + "--inside i"), "0\n");
     for (const std::string name : {"height", "velocity", "density", "result"}) {
         const Picture picture = load("i/" + name + ".png");

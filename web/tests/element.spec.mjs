@@ -417,8 +417,10 @@ test('pictures: lazy ones far below wait, others come as asked, failed ones are 
     expect(await first.evaluate(({ water: { picture: { drawable } } }) => [drawable.crossOrigin, drawable.fetchPriority])).toEqual(['anonymous', 'high']);
     await page.evaluate(() => document.querySelector('#far').scrollIntoView());
     await expect.poll(names).toContain('lazy.png');
-    await page.evaluate(() => { document.querySelector('#far').src = 'lazy.png'; });
-    await expect.poll(() => names().filter((name) => name === 'lazy.png').length).toBeGreaterThan(2);  // one to find out why
+    await expect.poll(async () => {
+        await page.evaluate(() => { document.querySelector('#far').src = 'lazy.png'; });
+        return names().filter((name) => name === 'lazy.png').length;
+    }).toBeGreaterThan(2);  // one to find out why
     expect(await first.evaluate(async (water) => {
         const source = document.createElement('canvas').getContext('2d');
         const video = Object.assign(document.createElement('video'), { srcObject: source.canvas.captureStream(), muted: true });

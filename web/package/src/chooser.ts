@@ -7,8 +7,8 @@ import { greyPicture, loadPicture, plainPicture, shippedLight, upload, uploadCov
 interface Told {
     pictureChanged(): void;
     lightChanged(): void;
-    /** Of the light, it is not `needed` for water to show. */
-    failed(error: WaterError, needed: boolean): void;
+    /** `isNeeded` is false for the light: the water shows without it. */
+    failed(error: WaterError, isNeeded: boolean): void;
     /** A video goes on. */
     moved(): void;
 }

@@ -12,8 +12,8 @@ import { presets } from './presets.js';
 import { Sight } from './sight.js';
 import { Still } from './still.js';
 
-// Of its context. A `live` water draws; a `parked` one has given the context back and shows its last frame; from a
-// `lost` one the browser has taken it, and its picture shows without water.
+// A `live` water draws. A `parked` one has given its WebGL context back and shows its last frame. A `lost` one shows its
+// picture, because the browser has taken the context.
 //
 //   none    -> opening       once it can be seen
 //   opening -> live, lost
@@ -38,7 +38,7 @@ export interface WaterEvents extends Record<'ready' | 'calm' | 'wake' | 'context
 export interface Stage {
     /** Has the size of the canvas, and hears the pointers. */
     box: HTMLElement;
-    /** Lies below the canvas, and shows where that has no context. */
+    /** A canvas below that of the water, which shows a picture while the water has no context. */
     still: HTMLCanvasElement;
 }
 
@@ -297,7 +297,7 @@ export class Water extends EventTarget {
     private update(): void {
         if (!this.running()) this.loop.stop();
         else if (this.state === 'lost') void this.open();
-        // A still serves until something moves.
+        // The picture of a parked water serves until something moves.
         else if (this.state !== 'parked' || !this.calm || this.stale) this.wake();
     }
 
@@ -413,7 +413,7 @@ export class Water extends EventTarget {
         if (still.isKept) return true;
         if (!native || !this.isComplete()) return false;
         native._redraw();
-        if (drawFrame(native, this.canvas, this.loop.last) !== Frame.drawn || this.gl!.isContextLost()) return false;
+        if (this.frame(native, this.loop.last) !== Frame.drawn || this.gl!.isContextLost()) return false;
         still.copy(this.canvas);
         return true;
     }
@@ -472,6 +472,10 @@ export class Water extends EventTarget {
         this.wake();
     }
 
+    private frame(native: Native, now: number): Frame {
+        return drawFrame(native, this.canvas, now);
+    }
+
     private draw(now: number): Frame | null {
         const { native, picture, options: { paused } } = this;
         if (!native || !picture || !this.isComplete()) return null;
@@ -481,7 +485,7 @@ export class Water extends EventTarget {
         if (picture.changed()) native._picturesChanged(1 << this.slot());
         let frame: Frame;
         try {
-            frame = drawFrame(native, this.canvas, paused ? this.loop.last : now);
+            frame = this.frame(native, paused ? this.loop.last : now);
         } catch (error) {
             this.fail(error);
             return null;

@@ -15,6 +15,9 @@ constexpr double kSettleSeconds = 0.1;
 // Pictures are handed over again where the view has grown by more than this since.
 constexpr double kGrowth = 1.25;
 
+// More than these nobody asks for before a frame.
+constexpr std::size_t kMostSplashes = 64;
+
 }  // namespace
 
 float penWeight(float pressure) {
@@ -79,7 +82,7 @@ void LiveWater::touch(TouchAction action, float x, float y, float weight, double
 }
 
 void LiveWater::splash(float x, float y, float weight) {
-    host_.splash(double{x} * surface_.width, double{y} * surface_.height, weight);
+    if (splashes_.size() < kMostSplashes) splashes_.push_back({TouchAction::down, x, y, weight, 0.0});
 }
 
 void LiveWater::picturesChanged(unsigned which) {
@@ -108,7 +111,8 @@ void LiveWater::prepare() {
 bool LiveWater::isResting() const {
     if (known_ != kAllPictures || view_.width == 0.0) return true;
     if (isSurfaceDue()) return false;
-    return surface_.width == 0 || (!setUpDue_ && !pictureDue_ && touches_.empty() && host_.isResting());
+    return surface_.width == 0 ||
+           (!setUpDue_ && !pictureDue_ && touches_.empty() && splashes_.empty() && host_.isResting());
 }
 
 bool LiveWater::isSurfaceDue() const {
@@ -135,6 +139,10 @@ LiveWater::Frame LiveWater::frame(double now) {
     }
     if (surface_.width == 0) return Frame::waiting;
     prepare();
+    for (const Touch& splash : splashes_) {
+        host_.splash(double{splash.x} * surface_.width, double{splash.y} * surface_.height, splash.weight);
+    }
+    splashes_.clear();
     const double seconds = std::min(secondsUntil(now), longestFrame_);
     for (const Touch& touch : touches_) {
         // On the host's clock, which stands still while the water rests.
@@ -164,7 +172,7 @@ double LiveWater::due() const {
     if (isResting()) return kNever;
     const double surface = isSurfaceDue() ? settledAt_ : kNever;
     if (surface_.width == 0) return surface;
-    const bool isDue = setUpDue_ || pictureDue_ || !touches_.empty();
+    const bool isDue = setUpDue_ || pictureDue_ || !touches_.empty() || !splashes_.empty();
     const bool isStill = host_.isResting() && !isDue;
     return std::min(surface, isStill ? kNever : now_ + (isDue ? 0.0 : host_.due() - host_.time()));
 }

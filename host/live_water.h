@@ -65,7 +65,7 @@ public:
     // left corner. A cancel ends a stroke as lifting the finger does.
     void touch(TouchAction action, float x, float y, float weight, double time);
 
-    // A ripple without a finger and without ink.
+    // A ripple without a finger and without ink, with the next frame: also the first, however early it was asked for.
     void splash(float x, float y, float weight);
 
     // Nothing is drawn before all three pictures were there once. `which` is a sum of k...Picture.
@@ -111,6 +111,7 @@ private:
 
     // Reported since the last frame; places are shares of the view, times those of the face.
     std::vector<Touch> touches_;
+    std::vector<Touch> splashes_;
 
     double longestFrame_ = Look{}.longestFrame;
     double shortestFrame_ = 0.0;

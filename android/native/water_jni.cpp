@@ -35,9 +35,8 @@ LiveWater& liveOf(JNIEnv* env, jobject self) {
 }
 
 void Water::handOver(PictureSlot slot, int width, int height) {
-    if (env->ExceptionCheck()) return;  // Java had no memory for the one before
     const jobject bitmap = env->CallObjectMethod(self, pictureMethod, static_cast<jint>(slot), width, height);
-    if (env->ExceptionCheck()) return;
+    if (env->ExceptionCheck() || !bitmap) return;  // the library keeps the picture that it has
     constexpr void (*kTransfers[])(JNIEnv*, jobject, jobject) = {
         native::transferPortraitBGBitmap, native::transferLandscapeBGBitmap, native::transferWaterBitmap};
     kTransfers[static_cast<int>(slot)](env, nullptr, bitmap);
@@ -98,6 +97,11 @@ NATIVE(void, clearInk)(JNIEnv* env, jobject self) {
 NATIVE(void, touch)
 (JNIEnv* env, jobject self, jint action, jfloat x, jfloat y, jboolean isStylus, jfloat pressure, jdouble time) {
     liveOf(env, self).touch(static_cast<TouchAction>(action), x, y, isStylus ? penWeight(pressure) : 1.0f, time);
+}
+// A finger that comes down and is lifted at once.
+NATIVE(void, drop)(JNIEnv* env, jobject self, jfloat x, jfloat y, jfloat weight, jdouble time) {
+    for (const TouchAction action : {TouchAction::down, TouchAction::up})
+        liveOf(env, self).touch(action, x, y, weight, time);
 }
 NATIVE(void, splash)(JNIEnv* env, jobject self, jfloat x, jfloat y, jfloat weight) {
     liveOf(env, self).splash(x, y, weight);

@@ -6,16 +6,16 @@
     build_packages=(cmake g++ make ninja-build openjdk-17-jdk-headless libgles-dev libegl-dev libegl-mesa0 libgl1-mesa-dri
         libstb-dev libcli11-dev libglfw3-dev ffmpeg)
     lint_packages=(clang clang-format clang-tidy git python3 shellcheck)
-    test_packages=(clang libgtest-dev junit4 libjetbrains-annotations-java aapt android-framework-res python3 xz-utils
+    test_packages=(clang libgtest-dev junit4 aapt android-framework-res python3 xz-utils
         glslang-tools binutils llvm valgrind xvfb xauth xdotool)
     fuzz_packages=(clang libclang-rt-dev llvm)
     arm64_packages=(g++-aarch64-linux-gnu qemu-user)
     android_packages=(clang lld llvm libc++-14-dev libc6-dev-arm64-cross libc6-dev-armel-cross android-liblog-dev
         android-platform-frameworks-native-headers android-libnativehelper-dev android-framework-res
-        libjetbrains-annotations-java python3 xz-utils proguard-cli aapt zip zipalign apksigner)
+        python3 xz-utils proguard-cli aapt zip zipalign apksigner)
     android_test_packages=(enjarify unzip)
     web_packages=(cmake ninja-build openjdk-17-jdk-headless emscripten)
-    web_test_packages=(chromium firefox-esr webkit2gtk-driver xvfb xauth libjetbrains-annotations-java)
+    web_test_packages=(chromium firefox-esr webkit2gtk-driver xvfb xauth)
     bench_packages=(clang libbenchmark-dev libeigen3-dev python3)
 }
 

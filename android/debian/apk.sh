@@ -10,7 +10,7 @@ rm -rf apk && mkdir apk
 # The classes for apps are whole, as tests run the APK's code; those with native methods have only the module's rules.
 python3 "$here/java_api.py" "$JDK" java_api.jar
 proguard -include "$source/android/tidemark/consumer-rules.pro" -include resources/rules.pro \
-    -injars classes/shipped -outjars apk/classes.jar -libraryjars "java_api.jar:classes/platform:$ANNOTATIONS" \
+    -injars classes/shipped -outjars apk/classes.jar -libraryjars "java_api.jar:classes/platform:classes/annotations" \
     -keep 'class !**.JniTidemarkRender,!**.NativeWater,com.zor.android.visualeffect.tidemark.* { *; }' \
     -keepclassmembers 'class **.JniTidemarkRender { <init>(); }' \
     -target 1.7 -dontnote -forceprocessing

@@ -6,21 +6,19 @@ here=$(dirname "$0")
 # shellcheck source=android/debian/values.sh
 source "$here/values.sh"
 cd "$2"
-rm -rf classes framework generated headers resources
-mkdir -p classes framework generated resources
+rm -rf classes generated headers resources
+mkdir -p classes/annotations generated resources
 java() {
     find "$@" -name '*.java'
 }
 
-# The framework's own view, without what it keeps from apps: tracing and names of errors. Its surface comes by a test.
-sed '/UnsupportedAppUsage/d; /Trace\.trace/d; /android\.os\.Trace/d; /holder.addCallback/d
-    s/EGLLogWrapper.getErrorString(error)/error/' \
-    platform/opengl/java/android/opengl/GLSurfaceView.java >framework/GLSurfaceView.java
-
-mapfile -t users < <(java "$source"/android/{tidemark,sample}/src "$source"/{examples,tests/jvm/fakes} framework)
+mapfile -t users < <(java "$source"/android/{tidemark,sample}/src "$source"/{examples,tests/jvm/fakes})
 python3 "$here/classes_of_api.py" platform/api/current.txt generated "${users[@]}"
 mapfile -t api < <(java generated)
 "$JDK/bin/javac" -nowarn -Xlint:none --release 8 -d classes/platform "${api[@]}"
+# Only compilers and editors read annotations.
+mapfile -t annotations < <(java "$here/annotations")
+"$JDK/bin/javac" -Xlint:-options --release 8 -d classes/annotations "${annotations[@]}"
 
 # As Gradle does, which knows the package and the versions from its own files.
 module=$source/android/tidemark
@@ -38,5 +36,5 @@ aapt2 link -I "$framework" --manifest resources/manifest.xml \
     --proguard resources/rules.pro -o resources/linked.apk resources/{tidemark,sample}.zip
 
 mapfile -t sources < <(java "$module/src" "$sample/src" resources)
-"$JDK/bin/javac" -Xlint:all,-options -Werror --release 8 -h headers -cp "classes/platform:$ANNOTATIONS" \
+"$JDK/bin/javac" -Xlint:all,-options -Werror --release 8 -h headers -cp "classes/platform:classes/annotations" \
     -d classes/shipped "${sources[@]}"

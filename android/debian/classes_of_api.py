@@ -69,6 +69,10 @@ due = {name for name in classes if re.search(r"import (static )?" + re.escape(na
 while due - wanted:
     name = (due - wanted).pop()
     wanted.add(name)
+    if " interface " in " " + classes[name][0]:
+        # What implements it has its methods.
+        words |= {found[1] for member in classes[name][1] if (found := re.search(r"(\w+)\(", member))}
+        due |= {other for seen in wanted for member in taken(seen) for other in named(member)}
     outer = name.rpartition(".")[0]
     due |= {outer} & classes.keys()
     due |= {inner for inner in classes if inner.startswith(name + ".") and ".".join(inner.split(".")[-2:]) in text}

@@ -12,10 +12,10 @@ compile() {
     "$JDK/bin/javac" -Xlint:all,-options -Werror "$@"
 }
 mapfile -t example < <(java "$source/examples")
-mapfile -t fakes < <(java "$source/tests/jvm/fakes" "$shipped/framework")
+mapfile -t fakes < <(java "$source/tests/jvm/fakes")
 mapfile -t tests < <(java "$source/tests/jvm/java")
 platform=$shipped/classes/platform
 compile --release 8 -cp "$platform:$shipped/classes/shipped" -d classes/tests "${example[@]}"
 compile --release 8 -cp "$platform" -d classes/fakes "${fakes[@]}"
-compile --release 17 -h headers -cp "classes/tests:classes/fakes:$platform:$shipped/classes/shipped:$JUNIT" \
+compile --release 17 -h headers -cp "classes/tests:classes/fakes:$platform:$shipped/classes/shipped:$shipped/classes/annotations:$JUNIT" \
     -d classes/tests "${tests[@]}"

@@ -63,3 +63,11 @@ JNIEXPORT jstring JNICALL Java_com_zor_android_visualeffect_tidemark_GlContext_t
     for (const std::string& line : recorder.take()) text += line + '\n';
     return env->NewStringUTF(text.c_str());
 }
+
+JNIEXPORT jint JNICALL Java_com_zor_android_visualeffect_tidemark_GlContext_countObjects(JNIEnv*, jclass) {
+    jint count = 0;
+    for (GLuint name = 1; name < 1000; ++name) {
+        for (const auto is : {glIsBuffer, glIsFramebuffer, glIsProgram, glIsShader, glIsTexture}) count += is(name);
+    }
+    return count;
+}

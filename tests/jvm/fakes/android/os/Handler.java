@@ -1,11 +1,17 @@
 package android.os;
 
-/** Of a main thread that has nothing else to do. */
 public class Handler {
-    public Handler(Looper looper) {}
+    private final Looper looper;
+
+    public Handler(Looper looper) {
+        this.looper = looper;
+    }
 
     public final boolean post(Runnable call) {
-        call.run();
-        return true;
+        return looper.calls.add(call);
+    }
+
+    public final boolean postDelayed(Runnable call, long milliseconds) {
+        return post(call);
     }
 }

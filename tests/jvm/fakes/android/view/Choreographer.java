@@ -1,6 +1,10 @@
 package android.view;
 
-import java.util.Set;
+import android.os.Handler;
+import android.os.Looper;
+
+import java.util.HashMap;
+import java.util.Map;
 import java.util.concurrent.ConcurrentHashMap;
 
 /** Of a display that refreshes when a test says so. */
@@ -10,27 +14,23 @@ public final class Choreographer {
     }
 
     private static final Choreographer DISPLAY = new Choreographer();
-    private final Set<FrameCallback> awaiting = ConcurrentHashMap.newKeySet();
+    private final Map<FrameCallback, Looper> awaiting = new ConcurrentHashMap<>();
 
     public static Choreographer getInstance() {
         return DISPLAY;
     }
 
     public void postFrameCallback(FrameCallback callback) {
-        awaiting.add(callback);
-    }
-
-    public void removeFrameCallback(FrameCallback callback) {
-        awaiting.remove(callback);
+        awaiting.put(callback, Looper.myLooper());
     }
 
     /** Whether somebody awaited it. */
-    public boolean refresh(long nanos) {
-        FrameCallback[] called = awaiting.toArray(new FrameCallback[0]);
-        for (FrameCallback callback : called) {
-            awaiting.remove(callback);
-            callback.doFrame(nanos);
-        }
-        return called.length > 0;
+    public static boolean refresh(long nanos) {
+        Map<FrameCallback, Looper> called = new HashMap<>(DISPLAY.awaiting);
+        called.forEach((callback, looper) -> {
+            DISPLAY.awaiting.remove(callback);
+            new Handler(looper).post(() -> callback.doFrame(nanos));
+        });
+        return !called.isEmpty();
     }
 }

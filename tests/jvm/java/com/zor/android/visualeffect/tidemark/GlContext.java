@@ -37,6 +37,9 @@ final class GlContext {
     /** What the library has logged since the last call, a line each. */
     static native String takeLog();
 
+    /** Of the current context. */
+    static native int countObjects();
+
     static native long create(int width, int height);
 
     static native void destroy(long context);

@@ -1,83 +1,54 @@
 package com.zor.android.visualeffect.tidemark;
 
 import static org.junit.Assert.assertEquals;
+import static org.junit.Assert.assertNull;
 import static org.junit.Assert.assertThrows;
 import static org.junit.Assert.assertTrue;
 
-import android.app.Activity;
-import android.content.res.Resources;
+import android.content.ComponentCallbacks2;
 import android.content.res.TypedArray;
 import android.graphics.Bitmap;
-import android.opengl.GLES20;
+import android.os.Parcelable;
 import android.os.SystemClock;
-import android.util.DisplayMetrics;
+import android.provider.Settings;
 import android.view.MotionEvent;
-import android.view.SurfaceHolder;
+import android.graphics.SurfaceTexture;
+import android.view.Surface;
+import android.view.SurfaceView;
 
 import org.junit.After;
-import org.junit.Before;
 import org.junit.Test;
 
-import java.lang.reflect.Proxy;
+import java.util.ArrayList;
 import java.util.Arrays;
 import java.util.List;
-import java.util.Vector;
 
-/** The view and its renderer, from the touch to the screen: when they draw, when they rest, and what they show. */
-public final class RendererTest {
+/** The view, from the call and the touch to the screen: when it draws, when it rests, what it shows and what it tells. */
+public final class ViewTest {
     private static final int LONG = 160;
     private static final int SHORT = 90;
     private static final int RED = 0xffc04030;
     private static final int GREEN = 0xff40a050;
 
-    private final Activity activity = new Activity() {
-        @Override
-        public Resources getResources() {
-            return new Resources(null, null, null) {
-                @Override
-                public DisplayMetrics getDisplayMetrics() {
-                    DisplayMetrics display = new DisplayMetrics();
-                    display.density = 2;
-                    return display;
-                }
-            };
-        }
-    };
-    private final ViewOfAWindow view = new ViewOfAWindow(activity);
-    private final ActivityFollower follower = new ActivityFollower(activity, view);
+    private final List<String> heard = new ArrayList<>();
+    private final TestView view = new TestView();
     private final Bitmap red = plain(Bitmap.Config.ARGB_8888, RED);
     private final Bitmap green = plain(Bitmap.Config.ARGB_8888, GREEN);
-    private final Bitmap white = plain(Bitmap.Config.ARGB_8888, 0xffffffff);
-    private final List<String> heard = new Vector<>();
     private int framesSeen = Screen.frames;
     private int handedOver = Bitmap.locksMade;
 
-    @Before
-    public void listen() {
-        view.setListener(new TidemarkListener() {
-            @Override
-            public void onCalm() {
-                heard.add("calm");
-            }
-
-            @Override
-            public void onFailure(Failure failure, String message) {
-                heard.add(failure.name());
-            }
-        });
-    }
-
     @After
     public void release() {
-        Screen.during(view, view::onDetachedFromWindow);
+        view.onDetachedFromWindow();
+        Screen.settle();
     }
 
     @Test
     public void drawsWhileSomethingMoves() {
-        int cleared = GLES20.clears;
-        surface(SHORT, LONG);
-        assertEquals("frames without water", 1, drawUntilRest());
-        view.setPictures(red, green, white);
+        view.setListener(new Heard());
+        show(view, SHORT, LONG);
+        assertEquals("frames without a picture", 0, drawUntilRest());
+        view.setPicture(RED);
         assertEquals("frames of still water", 1, drawUntilRest());
         assertEquals("frames of drawn water", 0, drawUntilRest());
         expectColor(RED);
@@ -92,15 +63,16 @@ public final class RendererTest {
         view.clearInk();
         Screen.isLost = true;
         assertEquals("frames where the first is lost with its context", 2, drawUntilRest());
-        Screen.during(view, view::onStop);
-        view.ripple(40, 40, 1);
-        Screen.during(view, view::onStart);  // a wallpaper's surface lives on
-        assertTrue("a splash of a pause is forgotten", drawUntilRest() < 3);
-        assertEquals("frames without water", cleared + 1, GLES20.clears);
+        expectColor(RED);
+        hide(view);
+        view.drop(40, 40);
+        show(view, SHORT, LONG);
+        assertTrue("a drop of a pause is forgotten", drawUntilRest() < 3);
+        assertEquals(List.of("ready", "calm", "wake", "calm"), heard);
     }
 
     @Test
-    public void inkShowsAndFadesAndComesBackAfterALostContext() {
+    public void inkShowsAndFadesAndSurvivesAPause() {
         start();
         view.setInk(true);
         drawUntilRest();
@@ -110,40 +82,21 @@ public final class RendererTest {
         Screen.refreshRate = 60;
         assertTrue("ink along a stroke", inked() > 100);
         assertTrue("20 frames take the time of 20 steps of the ink", SystemClock.nanos - before > 250000000);
-
-        view.setPreserveEGLContextOnPause(false);
-        stop();
-        drawUntilRest();
-        view.clearInk();
-        follower.onActivityStarted(new Activity());
-        assertEquals("frames of a stopped activity", 0, drawUntilRest());
-        restart();
-        touch(MotionEvent.ACTION_MOVE, 60, 100);
+        hide(view);
+        assertEquals("frames of a view that is not seen", 0, drawUntilRest());
+        show(view, SHORT, LONG);
+        drawFrame();
+        assertTrue("ink goes on after a pause", inked() > 100);
         assertTrue("ink that never rests", drawUntilRest() < 600);
         expectColor(RED);
 
         drawStroke();
-        assertTrue("ink after a pause", inked() > 100);
         view.clearInk();
         drawFrame();
         assertEquals("ink after it was cleared", 0, inked());
-        view.setInk(false);
         drawStroke();
-        assertEquals("ink when it is off", 0, inked());
-    }
-
-    @Test
-    public void inkSurvivesAPauseThatKeepsTheContext() {
-        start();
-        view.setInk(true);
-        drawUntilRest();
-        drawStroke();
-        stop();
-        int cleared = GLES20.clears;
-        restart();
-        assertTrue("ink goes on after a pause that kept the context", inked() > 100);
-        assertEquals("blank frames, as no step of the ink is due", cleared, GLES20.clears);
         view.setInk(false);
+        drawFrame();
         view.setInk(true);
         drawFrame();
         assertEquals("a switch clears the ink", 0, inked());
@@ -151,22 +104,20 @@ public final class RendererTest {
 
     @Test
     public void onlyWhatIsNewIsHandedOver() {
-        surface(LONG, LONG);
-        resize(SHORT, LONG);
+        show(view, LONG, LONG);
         expectHandOvers(0, "before there are pictures");
-        view.setPictures(red, green, white);
+        view.setPictures(red, green, null);
         expectHandOvers(3, "the first pictures");
-        view.setPictures(red, green, white);
+        view.setPictures(red, green, null);
         view.setInk(true);
         expectHandOvers(0, "ink");
-        resize(LONG, SHORT);
-        expectHandOvers(0, "a view turned");
-        resize(SHORT, SHORT);
+        show(view, LONG, SHORT);
         expectHandOvers(2, "a view of other proportions");
-        surface(SHORT, SHORT);
-        expectHandOvers(0, "a lost context");
-        view.setPictures(red, red, white);
-        expectHandOvers(1, "another picture");
+        show(view, SHORT, LONG);
+        Screen.isLost = true;
+        expectHandOvers(0, "a view turned, and a lost context");
+        view.setPictures(red, red, null);
+        expectHandOvers(2, "another picture, and the light decoded again");
     }
 
     private void expectHandOvers(int expected, String after) {
@@ -176,16 +127,14 @@ public final class RendererTest {
     }
 
     @Test
-    public void aPictureOfTwoBytesAPixelIsConverted() {
-        start();
-        Bitmap narrow = plain(Bitmap.Config.RGB_565, 0xff102030);
-        view.setPictures(narrow, narrow, narrow);
-        drawUntilRest();
-        expectColor(0xff102030);
-    }
-
-    @Test
-    public void aLargePictureIsCroppedAndEveryPixelCounts() {
+    public void anyPictureWillDo() {
+        show(view, SHORT, LONG);
+        for (Bitmap.Config config : Bitmap.Config.values()) {
+            int color = 0xff102030 + 0x400000 * config.ordinal();
+            view.setPicture(plain(config, color));
+            drawUntilRest();
+            expectColor(color);
+        }
         int[] colors = new int[500 * 640];
         for (int i = 0; i < colors.length; ++i) {  // a chessboard between red margins
             int x = i % 500;
@@ -195,59 +144,103 @@ public final class RendererTest {
         Bitmap fitted = new Pictures(board, board, board).fitted(0, SHORT, LONG);
         assertEquals(SHORT + " x " + LONG, fitted.getWidth() + " x " + fitted.getHeight());
         for (int i = 0; i < fitted.pixels.capacity(); i += 4) assertEquals(127, fitted.pixels.get(i) & 255, 1);
+        Bitmap panorama = Bitmap.createBitmap(5000, 20, Bitmap.Config.ARGB_8888);
+        assertEquals("of a light", 1024, new Pictures(red, red, panorama).fitted(2, 0, 0).getWidth());
+        assertEquals("a panorama keeps the pixels of its height", 1, PictureLoader.samples(6000, 1500, 1000));
+        assertEquals(4, PictureLoader.samples(8000, 6000, 1000));
     }
 
     @Test
-    public void whatIsSetWhileTheViewIsAwayIsKept() {
+    public void whatCannotBeUsedLeavesThePictureThatIsThere() {
         start();
         drawUntilRest();
-        Screen.during(view, view::onDetachedFromWindow);
-        view.setPictures(green, red, white);
-        surface(LONG, SHORT);
+        view.setPicture(green);
+        view.setPicture(TestActivity.NO_PICTURE);
         drawUntilRest();
         expectColor(RED);
+        view.setListener(new Heard());
+        assertEquals("a listener that comes late", List.of("PICTURE", "ready", "calm"), heard);
+        view.setPicture(green);
+        drawUntilRest();
+        green.recycle();
+        show(view, LONG, LONG);
+        drawUntilRest();
+        expectColor(GREEN);
+        assertEquals(List.of("PICTURE", "PICTURE"), heard.subList(3, 5));
+        assertThrows(IllegalArgumentException.class, () -> view.setPicture(green));
+        assertThrows(IllegalArgumentException.class, () -> view.setPictures(0, 0, 0));
     }
 
     @Test
-    public void theNewestViewDraws() {
+    public void theNewestViewWithAPictureDraws() {
         start();
         view.setInk(true);
+        view.setListener(new Heard());
         drawUntilRest();
-        TidemarkView newer = new TidemarkView(new Activity());
-        newer.onStart();  // as a wallpaper does, which has no window
-        newer.setPictures(green, green, white);
-        newer.setInk(true);
-        Screen.during(newer, () -> showSurface(newer, SHORT, LONG));
+        TestView newer = new TestView();
+        show(newer, SHORT, LONG);
+        drawUntilRest();
+        expectColor(RED);
+        newer.setPictures(green, green, null);
+        drawUntilRest();
         expectColor(GREEN);
-        while (Screen.goOn(newer)) continue;
-        framesSeen = Screen.frames;
         touch(MotionEvent.ACTION_DOWN, 20, 40);
         assertEquals("frames of an older view", 0, drawUntilRest());
-
+        assertNull(view.toBitmap());
+        newer.setInk(true);
         drawStroke(newer);
-        Screen.during(view, () -> showSurface(view, SHORT, LONG));
+        show(view, SHORT, LONG);
         for (int i = 1; i <= 20; ++i) {
             touch(MotionEvent.ACTION_MOVE, 50 + i, 80 + 2 * i);
             drawFrame();
         }
         assertEquals("ink of the other view's stroke", 0, inked());
-        Screen.during(view, view::onStop);
-        assertTrue("the other view goes on by itself", Screen.goOn(newer));
-        assertEquals("its red", 0x40, Screen.pixels[0] & 255, 8);
-        Screen.during(newer, newer::onDetachedFromWindow);
+        drawUntilRest();
+        expectColor(RED);
+        assertEquals(List.of("ready", "calm", "rest", "calm"), heard.subList(0, 4));
+        hide(view);
+        drawUntilRest();
+        assertEquals("the red of the other view, which goes on by itself", 0x40, Screen.pixels[0] & 255, 8);
+
+        newer.setInk(false);
+        int[] objects = new int[8];
+        for (int turn = 0; turn < 8; ++turn) {
+            show(turn % 2 == 0 ? view : newer, SHORT, LONG);
+            drawUntilRest();
+            int at = turn;
+            GlThread.await(() -> objects[at] = GlContext.countObjects());
+        }
+        assertEquals("objects on the GPU after more turns", objects[1], objects[7]);
+        newer.onDetachedFromWindow();
+    }
+
+    @Test
+    public void memoryIsGivenBackWhileNothingDraws() {
+        start();
+        drawUntilRest();
+        Screen.process.onTrimMemory(ComponentCallbacks2.TRIM_MEMORY_BACKGROUND);
+        expectHandOvers(3, "a trim while a view draws");
+        hide(view);
+        Screen.process.onTrimMemory(ComponentCallbacks2.TRIM_MEMORY_BACKGROUND - 20);
+        expectHandOvers(0, "a trim that is none");
+        Screen.process.onTrimMemory(ComponentCallbacks2.TRIM_MEMORY_BACKGROUND);
+        expectHandOvers(3, "a trim, of single pixels");
+        show(view, SHORT, LONG);
+        expectHandOvers(3, "the way back");
+        expectColor(RED);
     }
 
     @Test
     public void theSurfaceHasTheSizeOfTheQuality() {
         start();
         drawUntilRest();
-        int cleared = GLES20.clears;
         view.setQuality(Quality.LOW);
-        view.onSizeChanged(LONG, LONG, 0, 0);  // on a display of two pixels each
+        view.onSizeChanged(LONG, LONG, 0, 0);
         drawUntilRest();
-        assertEquals("80 x 80", view.sizeSet);
-        assertEquals("blank frames until the surface is another", cleared, GLES20.clears);
-        resize(80, 80);
+        assertEquals("80 x 80", SurfaceView.sizeSet);
+        Screen.width = Screen.height = 80;
+        view.drawOn(view.surface, 80, 80);
+        view.onSizeChanged(LONG, LONG, 0, 0);
         drawUntilRest();
         expectColor(RED);
         byte[] still = Screen.pixels;
@@ -257,18 +250,80 @@ public final class RendererTest {
     }
 
     @Test
-    public void aListenerHearsOfCalmAndFailures() {
+    public void codeMovesTheWaterAsAFingerDoes() {
         start();
+        view.drop(40, 40);
+        assertTrue("a drop before the first frame falls in it", drawUntilRest() > 60);
+        view.setInk(true);
+        show(view, LONG, LONG);
         drawUntilRest();
-        view.ripple(40, 40, 1);
-        assertTrue("a splash moves", drawUntilRest() > 60);
-        GLES20.largestTexture = 39;
-        view.setPictures(green, green, white);
+        view.drop(LONG / 2, LONG / 2, 1, true);
+        for (int i = 0; i < 20; ++i) drawFrame();
+        assertTrue("ink of a drop", inked() > 20);
+        view.clearInk();
+        show(view, SHORT, LONG);
         drawUntilRest();
-        GLES20.largestTexture = 2048;
-        expectColor(RED);
-        assertEquals(List.of("calm", "calm", "PICTURE_TOO_LARGE", "calm"), heard);
-        assertThrows(IllegalArgumentException.class, () -> view.setPictures(red, null, white));
+        view.stroke(new float[] {30, 40, 50, 80, 60, 120}, 400);
+        for (int i = 0; i < 40; ++i) drawFrame();
+        assertTrue("ink of a stroke", inked() > 100);
+        byte[] seen = Screen.pixels;
+        Bitmap picture = view.toBitmap();
+        assertEquals("of the last frame, upright", seen[4 * SHORT * 20] & 255, picture.pixels.get(4 * SHORT * (LONG - 21)) & 255, 8);
+
+        drawFrame();
+        view.pause();
+        drawUntilRest();
+        assertEquals("frames of a pause", 0, drawUntilRest());
+        view.play();
+        drawFrame();
+        assertTrue("it goes on", drawUntilRest() > 60);
+        assertThrows(IllegalArgumentException.class, () -> view.stroke(new float[] {1}, 400));
+    }
+
+    @Test
+    public void reducedMotionLeavesTheWaterToTouches() {
+        Settings.Global.animations = 0;
+        view.setFirstDrop(true);
+        view.setRain(20);
+        start();
+        assertTrue("frames without rain and first drop", drawUntilRest() <= 2);
+        view.setMotion(Motion.FULL);
+        for (int i = 0; i < 600; ++i) drawFrame();
+        assertTrue("it rains", Screen.goOn());
+        Settings.Global.animations = 1;
+        view.setRain(false);
+        assertTrue(drawUntilRest() > 60);
+        release();
+        framesSeen = Screen.frames;
+        TestView other = new TestView();
+        other.setFirstDrop(true);
+        other.setPicture(RED);
+        show(other, SHORT, LONG);
+        assertTrue("the first drop", drawUntilRest() > 60);
+        other.onDetachedFromWindow();
+    }
+
+    @Test
+    public void touchesAreTakenWhereThereIsWater() {
+        show(view, SHORT, LONG);
+        touch(MotionEvent.ACTION_DOWN, 20, 40);
+        view.setPicture(RED);
+        drawUntilRest();
+        assertEquals("without a picture", 0, view.claims);
+        view.setInteraction(Interaction.PRESS_OR_SCROLL);
+        touch(MotionEvent.ACTION_DOWN, 20, 40);
+        touch(MotionEvent.ACTION_CANCEL, 20, 40);
+        assertEquals("where a list may scroll", 0, view.claims);
+        assertTrue("it ripples all the same", drawUntilRest() > 60);
+        view.setInteraction(Interaction.NONE);
+        touch(MotionEvent.ACTION_DOWN, 20, 40);
+        view.setInteraction(Interaction.PRESS);
+        view.isEnabled = false;
+        touch(MotionEvent.ACTION_DOWN, 20, 40);
+        assertEquals("frames of touches that are not taken", 0, drawUntilRest());
+        view.isEnabled = true;
+        touch(MotionEvent.ACTION_DOWN, 20, 40);
+        assertEquals("of a finger that draws", 1, view.claims);
     }
 
     @Test
@@ -279,86 +334,113 @@ public final class RendererTest {
         look.meshVertices = 64;
         look.stepsToRest = 5;
         view.setLook(look);
-        look.dropRadius = Float.NaN;  // the view has its own copy
         assertEquals("frames of another mesh", 1, drawUntilRest());
+        view.setLook(look);
+        assertEquals("frames of an equal look", 0, drawUntilRest());
+        assertEquals(look, view.getLook());
+        look.dropRadius = Float.NaN;  // the view has its own copy
         String message = assertThrows(IllegalArgumentException.class, () -> view.setLook(look)).getMessage();
         assertTrue(message, message.contains("dropRadius"));
         assertEquals("frames of a look that is refused", 0, drawUntilRest());
+        view.setInkColor(0x99080d);
+        view.setRain(12);
+        assertEquals(List.of(0xff99080d, 12f, 12f),
+                List.of(view.getInkColor(), view.getRain(), view.getLook().rainDropsPerSecond));
         expectColor(RED);
     }
 
     @Test
-    public void aLayoutSaysWhatTheViewShows() {
-        start();
+    public void aLayoutAndASavedStateSayWhatTheViewShows() {
         ViewAttributes.apply(new TypedArray() {
             @Override
             public boolean getBoolean(int index, boolean usual) {
-                return index == R.styleable.TidemarkView_ink;
+                return index == R.styleable.TidemarkView_tidemarkInk;
+            }
+
+            @Override
+            public int getResourceId(int index, int usual) {
+                return index == R.styleable.TidemarkView_tidemarkPicture ? GREEN : usual;
             }
         }, view);
+        show(view, SHORT, LONG);
         drawUntilRest();
+        expectColor(GREEN);
         drawStroke();
-        assertTrue("ink of a layout", inked() > 100);
+        assertTrue("ink of a layout", inked() > 0);
+        view.setRain(5);
+        Parcelable state = view.onSaveInstanceState();
+        release();
+        TestView next = new TestView();
+        next.onRestoreInstanceState(state);
+        assertEquals(List.of(true, 5f), List.of(next.getInk(), next.getRain()));
+        next.setRain(false);
+        show(next, SHORT, LONG);
+        drawUntilRest();
+        expectColor(GREEN);
+        next.onDetachedFromWindow();
     }
 
-    private static final class ViewOfAWindow extends TidemarkView {
-        String sizeSet;
-
-        ViewOfAWindow(Activity activity) {
-            super(activity);
+    private final class Heard implements TidemarkListener {
+        @Override
+        public void onReady() {
+            heard.add("ready");
         }
 
         @Override
-        public SurfaceHolder getHolder() {
-            return (SurfaceHolder) Proxy.newProxyInstance(getClass().getClassLoader(),
-                    new Class<?>[] {SurfaceHolder.class}, (self, method, values) -> {
-                        if (method.getName().equals("setFixedSize")) sizeSet = values[0] + " x " + values[1];
-                        return null;
-                    });
+        public void onCalm() {
+            heard.add("calm");
         }
 
-        void reattach() {
-            onDetachedFromWindow();
-            onAttachedToWindow();
+        @Override
+        public void onWake() {
+            heard.add("wake");
+        }
+
+        @Override
+        public void onRest() {
+            heard.add("rest");
+        }
+
+        @Override
+        public void onFailure(Failure failure, String message) {
+            heard.add(failure.name());
+        }
+    }
+
+    private static final class TestView extends TidemarkView {
+        final Surface surface = new Surface((SurfaceTexture) null);
+        int claims;  // of a finger that no list may take
+        boolean isEnabled = true;
+
+        TestView() {
+            super(new TestActivity());
+        }
+
+        @Override
+        public boolean isEnabled() {
+            return isEnabled;
+        }
+
+        @Override
+        void claimFinger() {
+            ++claims;
         }
     }
 
     private void start() {
-        surface(SHORT, LONG);
-        view.setPictures(red, green, white);
+        view.setPictures(red, green, null);
+        show(view, SHORT, LONG);
     }
 
-    // A first surface, or one after the view was out of its window, where its thread and its context end.
-    private void surface(int width, int height) {
-        Screen.during(view, () -> {
-            view.reattach();
-            showSurface(view, width, height);
-        });
-    }
-
-    private static void showSurface(TidemarkView view, int width, int height) {
+    private static void show(TestView view, int width, int height) {
         Screen.width = width;
         Screen.height = height;
-        view.surfaceCreated(null);
-        view.surfaceChanged(null, 0, width, height);
+        view.drawOn(view.surface, width, height);
+        Screen.settle();
     }
 
-    private void resize(int width, int height) {
-        Screen.during(view, () -> showSurface(view, width, height));
-    }
-
-    private void stop() {
-        Screen.during(view, () -> {
-            follower.onActivityStopped(activity);
-            view.surfaceDestroyed(null);
-        });
-    }
-
-    private void restart() {
-        Screen.during(view, () -> {
-            follower.onActivityStarted(activity);
-            showSurface(view, Screen.width, Screen.height);
-        });
+    private static void hide(TidemarkView view) {
+        view.drawOn(null, 0, 0);
     }
 
     private void touch(int action, float x, float y) {
@@ -372,14 +454,13 @@ public final class RendererTest {
     // Slow, and the finger stays down.
     private void drawStroke() {
         drawStroke(view);
-        framesSeen = Screen.frames;
     }
 
-    private static void drawStroke(TidemarkView view) {
+    private void drawStroke(TidemarkView view) {
         touch(view, MotionEvent.ACTION_DOWN, 30, 40);
         for (int i = 1; i <= 20; ++i) {
             touch(view, MotionEvent.ACTION_MOVE, 30 + i, 40 + 2 * i);
-            Screen.goOn(view);
+            drawFrame();
         }
     }
 
@@ -394,12 +475,12 @@ public final class RendererTest {
     }
 
     private void drawFrame() {
-        Screen.goOn(view);
+        Screen.goOn();
         framesSeen = Screen.frames;
     }
 
     private int drawUntilRest() {
-        for (int i = 0; Screen.goOn(view) && i < 3000; ++i) continue;
+        for (int i = 0; Screen.goOn() && i < 3000; ++i) continue;
         int frames = Screen.frames - framesSeen;
         framesSeen += frames;
         return frames;

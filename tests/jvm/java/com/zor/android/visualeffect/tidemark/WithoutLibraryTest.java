@@ -1,8 +1,11 @@
 package com.zor.android.visualeffect.tidemark;
 
 import static org.junit.Assert.assertEquals;
+import static org.junit.Assert.assertFalse;
+import static org.junit.Assert.assertNull;
 
-import android.app.Activity;
+import android.graphics.SurfaceTexture;
+import android.view.Surface;
 
 import org.junit.Test;
 
@@ -14,20 +17,20 @@ public final class WithoutLibraryTest {
     @Test
     public void onlyTheFirstSurfaceMissesTheLibrary() {
         List<String> heard = new ArrayList<>();
-        TidemarkView view = new TidemarkView(new Activity());
+        TidemarkView view = new TidemarkView(new TestActivity());
+        view.setInk(true);
+        view.drop(1, 2);
+        assertNull(view.toBitmap());
+        Screen.settle();
+        view.drawOn(new Surface((SurfaceTexture) null), 90, 160);
+        view.setPicture(1);
+        assertFalse("frames", Screen.goOn());
         view.setListener(new TidemarkListener() {
             @Override
             public void onFailure(Failure failure, String message) {
                 heard.add(failure.name());
             }
         });
-        view.setInk(true);
-        view.ripple(1, 2, 1);
-        view.onStart();
-        assertEquals(List.of(), heard);
-        view.renderer.onSurfaceCreated(null, null);
-        view.renderer.onSurfaceChanged(null, 90, 160);
-        view.renderer.onDrawFrame(null);
         assertEquals(List.of("NO_LIBRARY"), heard);
     }
 }

@@ -4,9 +4,14 @@ import android.graphics.Bitmap;
 
 /**
  * Water on a screen that is looked at: {@code host/live_water.h} method by method, where each is documented. Call
- * everything on the GL thread, and of all waters one at a time.
+ * everything on {@link GlThread}, {@link #frame} with the context current.
  */
 final class NativeWater {
+    /** What becomes of a picture that cannot be handed over. */
+    interface Complaints {
+        void hear(String message);
+    }
+
     /** Of what {@link #frame} answers: the framebuffer holds another picture. */
     static final int DRAWN = 2;
     /** The surface must first have {@link #width} x {@link #height} pixels. */
@@ -18,10 +23,17 @@ final class NativeWater {
     }
 
     private final long handle;
+    private final Complaints complaints;
     private Pictures pictures;
+    private int handedOver;  // pictures that the library has from this water, as a sum
 
-    NativeWater(int seed) {
+    NativeWater(int seed, Complaints complaints) {
+        this.complaints = complaints;
         handle = create(seed);
+    }
+
+    boolean hasPictures() {
+        return pictures != null;
     }
 
     void setPictures(Pictures pictures) {
@@ -30,8 +42,9 @@ final class NativeWater {
         picturesChanged(changed);
     }
 
-    /** The library has lost them. */
+    /** The library has another water's, or none. */
     void renewPictures() {
+        handedOver = 0;
         if (pictures != null) picturesChanged(Pictures.ALL);
     }
 
@@ -43,9 +56,16 @@ final class NativeWater {
         applyLook();
     }
 
-    // Called in the middle of a frame.
+    // Called in the middle of a frame. Null leaves the library the picture that it has.
     private Bitmap picture(int slot, int width, int height) {
-        return pictures.fitted(slot, width, height);
+        try {
+            Bitmap fitted = pictures.fitted(slot, width, height);
+            handedOver |= 1 << slot;
+            return fitted;
+        } catch (RuntimeException | OutOfMemoryError e) {  // recycled meanwhile, or too large
+            complaints.hear("a picture cannot be used: " + e);
+            return (handedOver & 1 << slot) != 0 ? null : Pictures.pixel();
+        }
     }
 
     // Its memory is not the virtual machine's, and a view does not hear that nobody wants it any more.
@@ -79,6 +99,8 @@ final class NativeWater {
     native void clearInk();
 
     native void touch(int action, float x, float y, boolean isStylus, float pressure, double time);
+
+    native void drop(float x, float y, float weight, double time);
 
     native void splash(float x, float y, float weight);
 

@@ -1,28 +1,26 @@
 package com.zor.android.visualeffect.tidemark;
 
 import android.graphics.Bitmap;
+import android.graphics.Canvas;
+import android.graphics.Paint;
+import android.graphics.Rect;
 
-import org.jetbrains.annotations.NotNull;
+import java.nio.ByteBuffer;
 
-/** The three pictures of the effect. The backgrounds may be larger or of other proportions than the view. */
-public final class Pictures {
+/** The three pictures of the effect, decoded. The backgrounds may be larger or of other proportions than the view. */
+final class Pictures {
     /** All three, as a sum of 1, 2 and 4. */
     static final int ALL = 7;
 
     private static final int LIGHT = 2;
+    private static final int LONGEST_SIDE_OF_LIGHT = 1024;
+    private static final int DEEP_WATER = 0xff0d3b4f;
 
     private final Bitmap[] slots;
 
-    /**
-     * Keeps the bitmaps themselves.
-     *
-     * @param portrait what the water lies over in an upright view
-     * @param landscape and in a wide one
-     * @param light on the waves, of any proportions
-     * @throws IllegalArgumentException for a bitmap that is null or recycled
-     */
-    public Pictures(@NotNull Bitmap portrait, @NotNull Bitmap landscape, @NotNull Bitmap light) {
-        slots = new Bitmap[] {usable(portrait, "portrait"), usable(landscape, "landscape"), usable(light, "light")};
+    /** By slot: portrait, landscape, light. */
+    Pictures(Bitmap... slots) {
+        this.slots = slots;
     }
 
     /** Those that are other bitmaps than in {@code before}, which may be null. */
@@ -34,44 +32,66 @@ public final class Pictures {
         return which;
     }
 
-    /** In pixels. */
-    int longestSideOfLight() {
-        return Math.max(slots[LIGHT].getWidth(), slots[LIGHT].getHeight());
-    }
-
     /**
-     * Of a background the middle part that has the proportions width : height, with at most so many pixels; of the light
-     * all. Four bytes a pixel.
+     * A bitmap as the library takes it: four bytes a pixel, in the colours of the display that it knows, without padding
+     * between rows. Of a background the middle part that has the proportions width : height, with at most so many pixels;
+     * of the light all.
      */
     Bitmap fitted(int slot, int width, int height) {
-        Bitmap picture = slot == LIGHT ? slots[LIGHT] : scaled(cropped(slots[slot], width, height), width, height);
-        Bitmap.Config rgba = Bitmap.Config.ARGB_8888;
-        return picture.getConfig() == rgba ? picture : picture.copy(rgba, false);
+        Bitmap picture = slots[slot];
+        if (slot != LIGHT) return scaled(picture, middle(picture, width, height), width, height);
+        Rect whole = new Rect(0, 0, picture.getWidth(), picture.getHeight());
+        return scaled(picture, whole, LONGEST_SIDE_OF_LIGHT, LONGEST_SIDE_OF_LIGHT);
     }
 
-    private static Bitmap scaled(Bitmap picture, int width, int height) {
-        // The filter takes the mean of four pixels, so that none is left out where a side shrinks by half at most.
-        while (picture.getWidth() > width || picture.getHeight() > height) {
-            picture = Bitmap.createScaledBitmap(picture, Math.max(width, (picture.getWidth() + 1) / 2),
-                    Math.max(height, (picture.getHeight() + 1) / 2), true);
-        }
-        return picture;
-    }
-
-    private static Bitmap cropped(Bitmap picture, int width, int height) {
+    private static Rect middle(Bitmap picture, int width, int height) {
         double aspect = (double) width / height;
         int columns = within((int) Math.round(picture.getHeight() * aspect), picture.getWidth());
         int rows = within((int) Math.round(picture.getWidth() / aspect), picture.getHeight());
         int left = (picture.getWidth() - columns) / 2;
         int top = (picture.getHeight() - rows) / 2;
-        return Bitmap.createBitmap(picture, left, top, columns, rows);
+        return new Rect(left, top, left + columns, top + rows);
     }
 
-    private static Bitmap usable(Bitmap bitmap, String name) {
-        if (bitmap == null || bitmap.isRecycled()) {
-            throw new IllegalArgumentException("the picture for " + name + (bitmap == null ? " is null" : " is recycled"));
+    private static Bitmap scaled(Bitmap picture, Rect part, int width, int height) {
+        // A canvas does not draw what only the GPU has.
+        Bitmap from = isHardware(picture) ? picture.copy(Bitmap.Config.ARGB_8888, false) : picture;
+        // The filter takes the mean of four pixels, so that none is left out where a side shrinks by half at most.
+        while (true) {
+            int columns = Math.min(part.width(), Math.max(width, (part.width() + 1) / 2));
+            int rows = Math.min(part.height(), Math.max(height, (part.height() + 1) / 2));
+            Bitmap drawn = Bitmap.createBitmap(columns, rows, Bitmap.Config.ARGB_8888);
+            Rect whole = new Rect(0, 0, columns, rows);
+            new Canvas(drawn).drawBitmap(from, part, whole, new Paint(Paint.FILTER_BITMAP_FLAG));
+            if (from != picture) from.recycle();
+            if (columns <= width && rows <= height) return drawn;
+            from = drawn;
+            part = whole;
         }
-        return bitmap;
+    }
+
+    private static boolean isHardware(Bitmap picture) {
+        return picture.getConfig() != null && picture.getConfig().name().equals("HARDWARE");  // of API 26
+    }
+
+    /** What takes the place of a picture that is not there. */
+    static Bitmap pixel() {
+        return Bitmap.createBitmap(new int[] {DEEP_WATER}, 1, 1, Bitmap.Config.ARGB_8888);
+    }
+
+    /** A frame, whose bytes are R, G, B, A and whose rows are from the bottom. */
+    static Bitmap upright(ByteBuffer pixels, int width, int height) {
+        byte[] row = new byte[4 * width];
+        ByteBuffer turned = ByteBuffer.allocateDirect(4 * width * height);
+        for (int y = height - 1; y >= 0; --y) {
+            pixels.position(y * row.length);
+            pixels.get(row);
+            turned.put(row);
+        }
+        turned.position(0);
+        Bitmap picture = Bitmap.createBitmap(width, height, Bitmap.Config.ARGB_8888);
+        picture.copyPixelsFromBuffer(turned);
+        return picture;
     }
 
     private static int within(int side, int most) {

@@ -1,258 +1,264 @@
 package com.zor.android.visualeffect.tidemark;
 
+import android.graphics.Bitmap;
+import android.opengl.EGLSurface;
 import android.opengl.GLES20;
-import android.opengl.GLSurfaceView;
 import android.os.Handler;
 import android.os.Looper;
+import android.os.SystemClock;
 import android.util.Log;
+import android.view.Choreographer;
 import android.view.MotionEvent;
 
-import org.jetbrains.annotations.NotNull;
-import org.jetbrains.annotations.Nullable;
-
-import java.util.ArrayList;
-import java.util.List;
-import java.util.Queue;
-import java.util.concurrent.ConcurrentLinkedQueue;
-import java.util.concurrent.atomic.AtomicReference;
-
-import javax.microedition.khronos.egl.EGLConfig;
-import javax.microedition.khronos.opengles.GL10;
+import java.nio.ByteBuffer;
 
 /**
- * Draws water into a {@code GLSurfaceView} of {@code RENDERMODE_WHEN_DIRTY}, and asks for frames only while something
- * moves. {@link TidemarkView} is built on it; a surface view of your own calls {@link #show} and {@link #hide} too.
- *
- * <p>All methods but those of {@code GLSurfaceView.Renderer} may be called on any thread, whether there is a surface or
- * not: the next frame takes over what has changed.
+ * The part of a view that is on {@link GlThread}: draws its water into its window with the display's refresh, and asks for
+ * no frames while nothing moves. Times are seconds of {@code System.nanoTime}, which is the clock of touches as well.
  */
-public final class TidemarkRenderer implements GLSurfaceView.Renderer {
-    /** Gives the surface another size, on the main thread. */
-    interface Surface {
-        void setSize(int width, int height);
+final class TidemarkRenderer implements Choreographer.FrameCallback {
+    /** What becomes of the water. */
+    enum State { NOT_READY, MOVING, CALM, RESTING }
+
+    /** The view; called on the main thread. */
+    interface View {
+        void becomes(State state);
+
+        void fails(TidemarkListener.Failure failure, String message);
+
+        /** Asks for a surface of so many pixels, of which the renderer then hears by {@link #setWindow}. */
+        void setSurfaceSize(int width, int height);
     }
 
-    private interface Change {
+    interface Change {
         void apply(NativeWater water);
     }
 
-    private interface News {
-        void reach(TidemarkListener listener);
-    }
-
+    static final double MILLISECOND = 1e-3;
+    private static final double NEVER = Double.POSITIVE_INFINITY;
     private static final String TAG = "Tidemark";
 
-    // The library serves one effect. The lock is held for every call of it, since each view has its own GL thread.
-    private static final List<TidemarkRenderer> SHOWN = new ArrayList<>();  // the newest last
-    private static volatile TidemarkRenderer newest;  // of these
-    private static Object owner;  // the mark of whose pictures and objects the library has
+    private final Handler main = new Handler(Looper.getMainLooper());
+    private final View view;
+    private boolean isStarted;  // of the main thread
 
-    // The renderer itself would keep its view and its activity in memory.
-    private final Object mark = new Object();
-    private final FrameTimer timer;
-    private final Surface surface;
-    private final Queue<Change> changes = new ConcurrentLinkedQueue<>();
-    private final AtomicReference<Pictures> newPictures = new AtomicReference<>();
-    private volatile TidemarkListener listener;
-    private volatile boolean hasView;  // or all that is known is the surface
-
-    // Of the GL thread.
     private NativeWater water;  // null where the library does not load
     private boolean isBroken;
+    private Object window;  // a Surface or a SurfaceTexture; null while the view is not shown
+    private EGLSurface surface;  // of the window
     private int width;  // of the surface, pixels
     private int height;
-    private Quality quality = Quality.AUTO;
+    private State state = State.NOT_READY;
+    private boolean isPaused;
+    private boolean isStale;  // a frame is due in spite of the pause
+    private double lastFrame;
+    private boolean isAwaited;  // the next refresh
+    private CodeStroke stroke;
 
-    /**
-     * With no pictures yet, without ink and rain.
-     *
-     * @param requestRender asks for one frame, as the method of that name of {@code GLSurfaceView} does
-     */
-    public TidemarkRenderer(@NotNull Runnable requestRender) {
-        this(requestRender, (width, height) -> {});
+    TidemarkRenderer(View view) {
+        this.view = view;
     }
 
-    TidemarkRenderer(Runnable requestRender, Surface surface) {
-        timer = new FrameTimer(requestRender);
-        this.surface = surface;
-    }
+    // Called on the main thread.
 
-    /**
-     * Hears on the main thread when the water is calm and what fails.
-     *
-     * @param listener null for nobody
-     */
-    public void setListener(@Nullable TidemarkListener listener) {
-        this.listener = listener;
-    }
-
-    /**
-     * Shows other pictures with the next frame.
-     *
-     * @param pictures whose bitmaps must stay unchanged while they are shown
-     */
-    public void setPictures(@NotNull Pictures pictures) {
-        newPictures.set(pictures);
-        askForFrame();
+    /** What changes before the view is shown for the first time is in the {@link Choices} that it then hands over. */
+    void change(Change change) {
+        if (isStarted) {
+            GlThread.post(() -> {
+                if (water == null) return;
+                change.apply(water);
+                isStale = true;
+                GlThread.choose();
+                schedule();
+            });
+        }
     }
 
     /**
-     * Takes over all values; the water and the ink stay.
+     * Shows the water in this window from now on, or nowhere. When it returns, the former window is no longer used.
      *
-     * @param look is copied
-     * @throws IllegalArgumentException naming a value that is beyond its limits; nothing changes
+     * @param choices are taken over with the first window
      */
-    public void setLook(@NotNull Look look) {
-        Look copy = look.clone();
-        copy.forEach(Look::checked);
-        change(water -> water.setLook(copy));
+    void setWindow(Object window, int width, int height, Choices choices) {
+        if (window == null && !isStarted) return;
+        isStarted = true;
+        Choices now = choices.clone();
+        if (window == null) {
+            GlThread.await(() -> open(null, 0, 0, now));
+        } else {
+            GlThread.post(() -> open(window, width, height, now));
+        }
     }
 
-    /**
-     * Switches the ink; it is off at first.
-     *
-     * @param withInk whether touches drop ink
-     */
-    public void setInk(boolean withInk) {
-        change(water -> water.setInk(withInk));
+    /** The view is out of its window: what was made for it is freed, unless another view draws. */
+    void end() {
+        if (isStarted) GlThread.await(() -> GlThread.end(this));
     }
 
-    /** Lets all ink vanish. */
-    public void clearInk() {
-        change(NativeWater::clearInk);
-    }
-
-    /**
-     * Switches the rain; it is off at first.
-     *
-     * @param falling whether it rains
-     */
-    public void setRain(boolean falling) {
-        change(water -> water.setRain(falling));
-    }
-
-    void setQuality(Quality quality) {
-        change(water -> {
-            this.quality = quality;
-            if (hasView) water.setQuality(quality.ordinal());
-        });
-    }
-
-    /** Sides in density-independent pixels; from now on the surface has the size that the quality asks for. */
-    void setView(double width, double height, double density) {
-        hasView = true;
-        double now = FrameTimer.now();
-        change(water -> {
-            water.setQuality(quality.ordinal());
-            water.setView(width, height, density, now);
-        });
-    }
-
-    /**
-     * One position of a touch. While another renderer draws, or none, it only ends what began before.
-     *
-     * @param action as in {@code MotionEvent}: 0 down, 1 up, 2 move, 3 cancel
-     * @param x share of the view's width from its left edge
-     * @param y share of its height from its top edge
-     * @param isStylus whether the pressure counts
-     * @param pressure as {@code MotionEvent} has it
-     * @param time of the event, likewise
-     */
-    public void touch(int action, float x, float y, boolean isStylus, float pressure, long time) {
+    /** One position of a touch, as shares of the view's sides. While another view draws, it only ends what began before. */
+    void touch(int action, float x, float y, boolean isStylus, float pressure, long time) {
         boolean isEnd = action == MotionEvent.ACTION_UP || action == MotionEvent.ACTION_CANCEL;
-        if (!isEnd && newest != this) return;
-        change(water -> water.touch(action, x, y, isStylus, pressure, time * FrameTimer.MILLISECOND));
+        change(water -> {
+            if (isEnd || GlThread.draws(this)) water.touch(action, x, y, isStylus, pressure, time * MILLISECOND);
+        });
     }
 
-    /**
-     * A splash without a finger; it drops no ink. Nothing while another renderer draws, or none.
-     *
-     * @param x share of the view's width from its left edge
-     * @param y share of its height from its top edge
-     * @param strength 1 for that of a finger that comes down
-     */
-    public void ripple(float x, float y, float strength) {
-        if (newest == this) change(water -> water.splash(x, y, strength));
+    /** A drop that falls before the first frame is seen in it. One that falls while the view is away is forgotten. */
+    void drop(float x, float y, float strength, boolean withInk) {
+        change(water -> {
+            if (state != State.NOT_READY && !GlThread.draws(this)) return;
+            if (withInk) {
+                water.drop(x, y, strength, now());
+            } else {
+                water.splash(x, y, strength);
+            }
+        });
     }
 
-    /** From now on this renderer draws, and others rest until it hides. */
-    public void show() {
-        synchronized (SHOWN) {
-            SHOWN.remove(this);
-            if (!SHOWN.isEmpty()) Log.w(TAG, "one view at a time: the older one rests while a newer one is shown");
-            SHOWN.add(this);
-            newest = this;
-        }
-        timer.askForFrame();
+    void stroke(float[] shares, double seconds) {
+        change(water -> {
+            if (GlThread.draws(this)) stroke = new CodeStroke(shares, now(), seconds);
+        });
     }
 
-    /** Asks for no more frames, and lets the one that was shown before go on. */
-    public void hide() {
-        synchronized (SHOWN) {
-            SHOWN.remove(this);
-            timer.stop();
-            if (newest != this) return;
-            newest = SHOWN.isEmpty() ? null : SHOWN.get(SHOWN.size() - 1);
-            if (newest != null) newest.timer.askForFrame();
-        }
+    void setPaused(boolean paused) {
+        change(water -> isPaused = paused);
     }
 
-    /** Also after the context was lost. */
+    /** Waits for a frame. Null where the view does not draw. */
+    Bitmap toBitmap() {
+        Bitmap[] result = new Bitmap[1];
+        if (isStarted) GlThread.await(() -> result[0] = read());
+        return result[0];
+    }
+
+    static double now() {
+        return SystemClock.uptimeMillis() * MILLISECOND;
+    }
+
+    // Called on the GL thread.
+
+    boolean hasPictures() {
+        return water != null && water.hasPictures();
+    }
+
+    /** The library has none of what it had for this water: in the context nothing, and perhaps other pictures. */
+    void renew(boolean withPictures) {
+        water.renewContext();
+        if (withPictures) water.renewPictures();
+    }
+
+    /** Another view draws. */
+    void rest() {
+        stroke = null;
+        become(State.RESTING);
+    }
+
+    /** Awaits a refresh of the display where one will bring something new. */
+    void schedule() {
+        if (isAwaited || !canDraw()) return;
+        if (isPaused ? !isStale : water.due() == NEVER && stroke == null) return;
+        isAwaited = true;
+        Choreographer.getInstance().postFrameCallback(this);
+    }
+
     @Override
-    public void onSurfaceCreated(GL10 gl, EGLConfig config) {
-        if (isReady()) water.renewContext();
+    public void doFrame(long nanoTime) {
+        isAwaited = false;
+        if (!canDraw()) return;
+        double now = isPaused && lastFrame > 0 ? lastFrame : nanoTime * 1e-9;
+        if (stroke != null && !isPaused && !stroke.follow(water, now)) stroke = null;
+        if (isPaused ? isStale : now >= water.due()) draw(now, null);
+        schedule();
     }
 
-    @Override
-    public void onSurfaceChanged(GL10 gl, int width, int height) {
+    private boolean canDraw() {
+        return window != null && GlThread.draws(this);
+    }
+
+    private void open(Object newWindow, int width, int height, Choices choices) {
+        if (newWindow != window || width != this.width || height != this.height) closeSurface();
+        window = newWindow;
         this.width = width;
         this.height = height;
-        if (!isReady()) return;
-        if (!hasView) {
-            water.setQuality(Quality.HIGH.ordinal());  // which stays the same
-            water.setView(width, height, 1, FrameTimer.now());
+        if (window == null || !isReady(choices)) {
+            GlThread.hide(this);
+            return;
         }
-        if (!hasView || water.width() == width && water.height() == height) water.resized();
-    }
-
-    @Override
-    public void onDrawFrame(GL10 gl) {
-        synchronized (SHOWN) {
-            if (!draw(timer.takeTime())) GLES20.glClear(GLES20.GL_COLOR_BUFFER_BIT);  // nothing to show
+        boolean isFixed = !choices.hasView();
+        if (isFixed) {
+            water.setQuality(Quality.HIGH.ordinal());  // which leaves the size as it is
+            water.setView(width, height, 1, now());
         }
-    }
-
-    void report(TidemarkListener.Failure failure, String message) {
-        Log.e(TAG, message);
-        tell(heard -> heard.onFailure(failure, message));
-    }
-
-    private void change(Change change) {
-        changes.add(change);
-        askForFrame();
-    }
-
-    // One that rests would have to clear its surface, and shows its last picture as long as nobody asks.
-    private void askForFrame() {
-        if (newest == this) timer.askForFrame();
-    }
-
-    private boolean draw(double now) {
-        // What was asked for before a newer one came can still be drawn until that one does.
-        if (newest != this && owner != mark || !isReady()) return false;
-        if (owner != mark) takeOver();
-        takeChanges();
-        // The surface shows its buffer after every call, so every call has to fill it.
+        if (isFixed || water.width() == width && water.height() == height) water.resized();
         water.redraw();
+        isStale = true;
+        GlThread.show(this);
+        schedule();
+    }
+
+    // Loads the library, which the layout editor and an app's tests on a desktop do not have.
+    private boolean isReady(Choices choices) {
+        if (water != null || isBroken) return water != null;
+        try {
+            water = new NativeWater((int) System.nanoTime(), message -> fail(TidemarkListener.Failure.PICTURE, message));
+            choices.applyTo(water);
+            isPaused = choices.isPaused;
+        } catch (LinkageError e) {
+            isBroken = true;
+            fail(TidemarkListener.Failure.NO_LIBRARY, e.toString());
+        }
+        return water != null;
+    }
+
+    private boolean draw(double now, ByteBuffer pixels) {
+        isStale = false;
+        if (!makeCurrent()) return false;
+        GlThread.takeOver(this);
         int frame = water.frame(now);
         if (frame == NativeWater.RESIZE) {
             resize();
             frame = water.frame(now);
         }
-        double due = water.due();
-        if (newest == this) timer.setDue(due);
-        if (frame == NativeWater.DRAWN && due == FrameTimer.NEVER) tell(TidemarkListener::onCalm);
-        return frame == NativeWater.DRAWN;
+        if (frame != NativeWater.DRAWN) return false;
+        if (pixels != null) GLES20.glReadPixels(0, 0, width, height, GLES20.GL_RGBA, GLES20.GL_UNSIGNED_BYTE, pixels);
+        GlThread.hasDrawn(this);
+        lastFrame = now;
+        boolean isShown = GlThread.EGL.show(surface);
+        if (isShown) {
+            become(water.due() == NEVER ? State.CALM : State.MOVING);
+        } else {
+            surfaceLost();
+        }
+        return isShown;
+    }
+
+    private boolean makeCurrent() {
+        if (!GlThread.EGL.open()) {
+            isBroken = true;
+            window = null;
+            fail(TidemarkListener.Failure.NO_OPENGL, "this device has no OpenGL ES 2.0");
+            return false;
+        }
+        if (surface == null) surface = GlThread.EGL.surfaceOf(window);
+        if (surface != null && GlThread.EGL.makeCurrent(surface)) return true;
+        surfaceLost();
+        return false;
+    }
+
+    private void surfaceLost() {
+        if (GlThread.EGL.isContextLost()) {
+            GlThread.contextLost();
+            isStale = true;
+        } else {
+            window = null;  // the system is about to take it away, or to give another
+        }
+        closeSurface();
+    }
+
+    private void closeSurface() {
+        if (surface != null) GlThread.EGL.destroy(surface);
+        surface = null;
     }
 
     private void resize() {
@@ -261,55 +267,25 @@ public final class TidemarkRenderer implements GLSurfaceView.Renderer {
         if (wantedWidth == width && wantedHeight == height) {
             water.resized();
         } else {
-            new Handler(Looper.getMainLooper()).post(() -> surface.setSize(wantedWidth, wantedHeight));
+            main.post(() -> view.setSurfaceSize(wantedWidth, wantedHeight));
         }
     }
 
-    // Loads the library, which the layout editor and an app's tests on a desktop do not have.
-    private boolean isReady() {
-        if (water != null || isBroken) return water != null;
-        try {
-            water = new NativeWater((int) System.nanoTime());
-        } catch (LinkageError e) {
-            isBroken = true;
-            report(TidemarkListener.Failure.NO_LIBRARY, e.toString());
-        }
-        return water != null;
+    private Bitmap read() {
+        if (!canDraw() || state == State.NOT_READY) return null;
+        ByteBuffer pixels = ByteBuffer.allocateDirect(4 * width * height);
+        water.redraw();
+        return draw(lastFrame, pixels) ? Pictures.upright(pixels, width, height) : null;
     }
 
-    // The library may have another renderer's pictures, a stroke of its finger, and objects of its context.
-    private void takeOver() {
-        if (owner != null) {
-            new JniTidemarkRender().clearInkValue();
-            water.renewContext();
-            water.renewPictures();
-        }
-        owner = mark;
+    private void become(State next) {
+        if (next == state) return;
+        state = next;
+        main.post(() -> view.becomes(next));
     }
 
-    private void takeChanges() {
-        Pictures handedIn = newPictures.getAndSet(null);
-        if (handedIn != null) takePictures(handedIn);
-        for (Change change; (change = changes.poll()) != null;) change.apply(water);
-    }
-
-    private void takePictures(Pictures handedIn) {
-        int[] most = new int[1];
-        GLES20.glGetIntegerv(GLES20.GL_MAX_TEXTURE_SIZE, most, 0);
-        if (handedIn.longestSideOfLight() <= most[0]) {
-            water.setPictures(handedIn);
-        } else {
-            report(TidemarkListener.Failure.PICTURE_TOO_LARGE, "the light has a side of " + handedIn.longestSideOfLight()
-                    + " pixels, and the largest texture of the device one of " + most[0]);
-        }
-    }
-
-    // A listener that was taken away meanwhile hears nothing.
-    private void tell(News news) {
-        if (listener == null) return;
-        new Handler(Looper.getMainLooper()).post(() -> {
-            TidemarkListener heard = listener;
-            if (heard != null) news.reach(heard);
-        });
+    private void fail(TidemarkListener.Failure failure, String message) {
+        Log.e(TAG, message);
+        main.post(() -> view.fails(failure, message));
     }
 }

@@ -2,8 +2,7 @@ package com.zor.android.visualeffect.tidemark;
 
 import android.content.res.Resources;
 import android.content.res.TypedArray;
-import android.graphics.Bitmap;
-import android.graphics.BitmapFactory;
+import android.widget.ImageView;
 
 import java.io.IOException;
 import java.io.InputStream;
@@ -13,34 +12,41 @@ final class ViewAttributes {
     private ViewAttributes() {}
 
     static void apply(TypedArray given, TidemarkView view) {
-        Resources resources = given.getResources();
-        int look = given.getResourceId(R.styleable.TidemarkView_look, 0);
-        if (look != 0) view.setLook(read(resources, look));
-        int portrait = given.getResourceId(R.styleable.TidemarkView_portrait, 0);
-        int landscape = given.getResourceId(R.styleable.TidemarkView_landscape, portrait);
-        if (landscape != 0) {
-            Bitmap upright = decode(resources, portrait);
-            Bitmap wide = landscape == portrait ? upright : decode(resources, landscape);
-            int light = given.getResourceId(R.styleable.TidemarkView_light, 0);
-            view.setPictures(upright, wide, decode(resources, light));
+        int look = given.getResourceId(R.styleable.TidemarkView_tidemarkLook, 0);
+        if (look != 0) view.setLook(read(given.getResources(), look));
+        if (given.hasValue(R.styleable.TidemarkView_tidemarkInkColor)) {
+            view.setInkColor(given.getColor(R.styleable.TidemarkView_tidemarkInkColor, 0));
         }
-        view.setInk(given.getBoolean(R.styleable.TidemarkView_ink, false));
-        view.setQuality(Quality.values()[given.getInt(R.styleable.TidemarkView_quality, 0)]);
-        view.setRain(given.getBoolean(R.styleable.TidemarkView_rain, false));
+        view.setInk(given.getBoolean(R.styleable.TidemarkView_tidemarkInk, false));
+        view.setRain(given.getFloat(R.styleable.TidemarkView_tidemarkRain, 0));
+        view.setFirstDrop(given.getBoolean(R.styleable.TidemarkView_tidemarkFirstDrop, false));
+        view.setQuality(Quality.values()[given.getInt(R.styleable.TidemarkView_tidemarkQuality, 0)]);
+        view.setInteraction(Interaction.values()[given.getInt(R.styleable.TidemarkView_tidemarkInteraction, 0)]);
+        view.setMotion(Motion.values()[given.getInt(R.styleable.TidemarkView_tidemarkMotion, 0)]);
+        int picture = given.getResourceId(R.styleable.TidemarkView_tidemarkPicture, 0);
+        int portrait = given.getResourceId(R.styleable.TidemarkView_tidemarkPortrait, picture);
+        int landscape = given.getResourceId(R.styleable.TidemarkView_tidemarkLandscape, picture);
+        if (portrait == 0 && landscape == 0) return;
+        if (view.isInEditMode()) {
+            show(portrait != 0 ? portrait : landscape, view);
+        } else {
+            view.setPictures(portrait, landscape, given.getResourceId(R.styleable.TidemarkView_tidemarkLight, 0));
+        }
+    }
+
+    // A layout editor has no water.
+    private static void show(int picture, TidemarkView view) {
+        ImageView still = new ImageView(view.getContext());
+        still.setScaleType(ImageView.ScaleType.CENTER_CROP);
+        still.setImageResource(picture);
+        view.addView(still, 0);
     }
 
     private static Look read(Resources resources, int look) {
         try (InputStream text = resources.openRawResource(look)) {
             return Look.load(text);
         } catch (IOException e) {
-            throw new IllegalArgumentException("app:look cannot be read", e);
+            throw new IllegalArgumentException("app:tidemarkLook cannot be read", e);
         }
-    }
-
-    // Pixel by pixel, whatever the density; null for what is no bitmap.
-    private static Bitmap decode(Resources resources, int picture) {
-        BitmapFactory.Options options = new BitmapFactory.Options();
-        options.inScaled = false;
-        return picture == 0 ? null : BitmapFactory.decodeResource(resources, picture, options);
     }
 }

@@ -6,20 +6,22 @@ import android.content.Intent;
 import android.content.SharedPreferences;
 import android.net.Uri;
 import android.os.Bundle;
-import android.widget.Button;
 import android.widget.CompoundButton;
 
 /** Picture, ink and rain of the wallpaper, which follows at once. */
 public final class WallpaperSettings extends Activity {
-    /** The address of the user's picture; none for the sand. */
-    static final String PICTURE = "picture";
-
     static final String INK = "ink";
     static final String RAIN = "rain";
-    private static final int PICK_PICTURE = 1;
+    private static final String PICTURE = "picture";
 
     static SharedPreferences of(Context context) {
         return context.getSharedPreferences("wallpaper", MODE_PRIVATE);
+    }
+
+    /** The user's picture; null for the pebbles. */
+    static Uri picture(Context context) {
+        String address = of(context).getString(PICTURE, null);
+        return address == null ? null : Uri.parse(address);
     }
 
     @Override
@@ -28,8 +30,7 @@ public final class WallpaperSettings extends Activity {
         setContentView(R.layout.settings);
         bind(R.id.ink, INK);
         bind(R.id.rain, RAIN);
-        Button picture = findViewById(R.id.picture);
-        picture.setOnClickListener(button -> PictureLoader.choose(this, PICK_PICTURE));
+        findViewById(R.id.picture).setOnClickListener(button -> PicturePicker.open(this));
     }
 
     private void bind(int id, String key) {
@@ -41,10 +42,7 @@ public final class WallpaperSettings extends Activity {
     @Override
     protected void onActivityResult(int request, int result, Intent data) {
         super.onActivityResult(request, result, data);
-        if (request != PICK_PICTURE || result != RESULT_OK || data == null) return;
-        Uri uri = data.getData();
-        // The wallpaper reads it long after this activity.
-        getContentResolver().takePersistableUriPermission(uri, Intent.FLAG_GRANT_READ_URI_PERMISSION);
-        of(this).edit().putString(PICTURE, uri.toString()).apply();
+        Uri picture = PicturePicker.chosen(this, request, result, data);
+        if (picture != null) of(this).edit().putString(PICTURE, picture.toString()).apply();
     }
 }

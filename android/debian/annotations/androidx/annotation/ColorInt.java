@@ -1,0 +1,3 @@
+package androidx.annotation;
+
+public @interface ColorInt {}

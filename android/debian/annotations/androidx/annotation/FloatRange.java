@@ -1,0 +1,7 @@
+package androidx.annotation;
+
+public @interface FloatRange {
+    double from();
+
+    double to();
+}

@@ -242,7 +242,7 @@ int main() { Water water; ${await copied('C++')} }`);
         void setInk(boolean withInk) { System.out.print(" " + withInk); }
         void setRain(boolean falling) { System.out.print(" " + falling); }
         public static void main(String[] arguments) { Copied water = new Copied(); ${await copied('Java')} } }`);
-    const path = `${root}android/tidemark/src/main/java:${root}tests/jvm/annotations`;
+    const path = `${root}android/tidemark/src/main/java:${root}android/debian/annotations`;
     run('javac', '-d', '.', '-cp', path, 'Copied.java');
     expect(run('java', '-cp', '.', 'com.zor.android.visualeffect.tidemark.Copied')).toBe(output);
 });

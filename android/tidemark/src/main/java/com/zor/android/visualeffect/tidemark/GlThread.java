@@ -23,7 +23,7 @@ final class GlThread {
     static final Egl EGL = new Egl();
     private static final List<TidemarkRenderer> SHOWN = new ArrayList<>();  // the newest last
     private static TidemarkRenderer drawing;  // of these
-    private static TidemarkRenderer owner;  // whose pictures and ink the library has
+    private static Object owner;  // the mark of whose pictures and ink the library has
     private static boolean isLibraryInUse;
 
     private GlThread() {}
@@ -98,26 +98,30 @@ final class GlThread {
 
     /** Before a renderer draws. What another one has left in the library is replaced. */
     static void takeOver(TidemarkRenderer renderer) {
-        if (owner == renderer) return;
+        if (owner == renderer.mark) return;
         if (isLibraryInUse) new JniTidemarkRender().clearInkValue();  // or a stroke would go on
         renderer.renew(true);
     }
 
     static void hasDrawn(TidemarkRenderer renderer) {
-        owner = renderer;
+        owner = renderer.mark;
         isLibraryInUse = true;
     }
 
-    /** The system has taken the context and all that was made in it. */
-    static void contextLost() {
+    /** The system has taken the context from this renderer, and all that was made in it. */
+    static void contextLost(TidemarkRenderer renderer) {
         EGL.close();
-        if (owner != null) owner.renew(false);
+        if (owner == renderer.mark) {
+            renderer.renew(false);
+        } else {
+            owner = null;
+        }
     }
 
     /** The renderer's view is out of its window. */
     static void end(TidemarkRenderer renderer) {
         hide(renderer);
-        if (owner != renderer) return;
+        if (owner != renderer.mark) return;
         owner = null;
         releaseUnused();
     }

@@ -1,6 +1,7 @@
 package com.zor.android.visualeffect.tidemark;
 
 import android.graphics.Bitmap;
+import android.graphics.SurfaceTexture;
 import android.opengl.EGLSurface;
 import android.opengl.GLES20;
 import android.os.Handler;
@@ -37,6 +38,9 @@ final class TidemarkRenderer implements Choreographer.FrameCallback {
     static final double MILLISECOND = 1e-3;
     private static final double NEVER = Double.POSITIVE_INFINITY;
     private static final String TAG = "Tidemark";
+
+    /** Stands for this renderer where it must not be kept in memory, and its view with it. */
+    final Object mark = new Object();
 
     private final Handler main = new Handler(Looper.getMainLooper());
     private final View view;
@@ -240,15 +244,20 @@ final class TidemarkRenderer implements Choreographer.FrameCallback {
             fail(TidemarkListener.Failure.NO_OPENGL, "this device has no OpenGL ES 2.0");
             return false;
         }
-        if (surface == null) surface = GlThread.EGL.surfaceOf(window);
-        if (surface != null && GlThread.EGL.makeCurrent(surface)) return true;
-        surfaceLost();
-        return false;
+        boolean isNew = surface == null;
+        if (isNew) surface = GlThread.EGL.surfaceOf(window);
+        if (surface == null || !GlThread.EGL.makeCurrent(surface)) {
+            surfaceLost();
+            return false;
+        }
+        // The main thread consumes the frames of a texture, and may be waiting for this thread.
+        if (isNew && window instanceof SurfaceTexture) GlThread.EGL.waitForNobody();
+        return true;
     }
 
     private void surfaceLost() {
         if (GlThread.EGL.isContextLost()) {
-            GlThread.contextLost();
+            GlThread.contextLost(this);
             isStale = true;
         } else {
             window = null;  // the system is about to take it away, or to give another

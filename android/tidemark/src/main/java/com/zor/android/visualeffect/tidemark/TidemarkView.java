@@ -10,6 +10,7 @@ import android.os.Looper;
 import android.os.Parcelable;
 import android.provider.Settings;
 import android.util.AttributeSet;
+import android.util.DisplayMetrics;
 import android.view.GestureDetector;
 import android.view.MotionEvent;
 import android.view.Surface;
@@ -447,6 +448,7 @@ public class TidemarkView extends FrameLayout {
         setWindow(surface, width, height);
     }
 
+    /** Draws where the first finger is. A short tap is a click, and a finger that rests a long click. */
     @Override
     public boolean onTouchEvent(@NonNull MotionEvent event) {
         if (!takesTouches()) {
@@ -462,12 +464,6 @@ public class TidemarkView extends FrameLayout {
     // A list around the view would take the finger's way for scrolling.
     void claimFinger() {
         if (getParent() != null) getParent().requestDisallowInterceptTouchEvent(true);
-    }
-
-    /** For a tap, and for services that tap without a finger. */
-    @Override
-    public boolean performClick() {
-        return super.performClick();
     }
 
     @Override
@@ -567,7 +563,7 @@ public class TidemarkView extends FrameLayout {
     }
 
     private int longestSideOfDisplay() {
-        android.util.DisplayMetrics display = context.getResources().getDisplayMetrics();
+        DisplayMetrics display = context.getResources().getDisplayMetrics();
         return Math.max(display.widthPixels, display.heightPixels);
     }
 
@@ -596,7 +592,7 @@ public class TidemarkView extends FrameLayout {
     }
 
     private boolean hasAnimationsOff() {
-        return Settings.Global.getFloat(
+        return !isInEditMode() && Settings.Global.getFloat(
                 context.getContentResolver(), Settings.Global.ANIMATOR_DURATION_SCALE, 1) == 0;
     }
 

@@ -14,6 +14,18 @@ final class WaterSurface implements SurfaceHolder.Callback, TextureView.SurfaceT
         void setWindow(Object window, int width, int height);
     }
 
+    // One of a fixed size would measure as many pixels as that has.
+    private static final class FillingSurface extends SurfaceView {
+        FillingSurface(Context context) {
+            super(context);
+        }
+
+        @Override
+        protected void onMeasure(int widthSpec, int heightSpec) {
+            setMeasuredDimension(getDefaultSize(0, widthSpec), getDefaultSize(0, heightSpec));
+        }
+    }
+
     private final Listener listener;
     private final SurfaceView own;  // or
     private final TextureView shared;
@@ -24,7 +36,7 @@ final class WaterSurface implements SurfaceHolder.Callback, TextureView.SurfaceT
 
     WaterSurface(Context context, boolean onTexture, Listener listener) {
         this.listener = listener;
-        own = onTexture ? null : new SurfaceView(context);
+        own = onTexture ? null : new FillingSurface(context);
         shared = onTexture ? new TextureView(context) : null;
         if (onTexture) {
             shared.setSurfaceTextureListener(this);

@@ -81,8 +81,8 @@ void LiveWater::touch(TouchAction action, float x, float y, float weight, double
     touches_.push_back({action, x, y, weight, time});
 }
 
-void LiveWater::splash(float x, float y, float weight) {
-    if (splashes_.size() < kMostSplashes) splashes_.push_back({TouchAction::down, x, y, weight, 0.0});
+void LiveWater::splash(float x, float y, float weight, bool withInk) {
+    if (splashes_.size() < kMostSplashes) splashes_.push_back({x, y, weight, withInk});
 }
 
 void LiveWater::picturesChanged(unsigned which) {
@@ -139,11 +139,16 @@ LiveWater::Frame LiveWater::frame(double now) {
     }
     if (surface_.width == 0) return Frame::waiting;
     prepare();
-    for (const Touch& splash : splashes_) {
-        host_.splash(double{splash.x} * surface_.width, double{splash.y} * surface_.height, splash.weight);
+    const double seconds = std::min(secondsUntil(now), longestFrame_);
+    for (const Splash& splash : splashes_) {
+        const double x = double{splash.x} * surface_.width;
+        const double y = double{splash.y} * surface_.height;
+        if (!splash.withInk) host_.splash(x, y, splash.weight);
+        for (const TouchAction action : {TouchAction::down, TouchAction::up}) {
+            if (splash.withInk) host_.touch(action, x, y, splash.weight, host_.time() + seconds);
+        }
     }
     splashes_.clear();
-    const double seconds = std::min(secondsUntil(now), longestFrame_);
     for (const Touch& touch : touches_) {
         // On the host's clock, which stands still while the water rests.
         const double ago = std::clamp(now - touch.time, -0.1, 1.0);

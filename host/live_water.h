@@ -65,8 +65,9 @@ public:
     // left corner. A cancel ends a stroke as lifting the finger does.
     void touch(TouchAction action, float x, float y, float weight, double time);
 
-    // A ripple without a finger and without ink, with the next frame: also the first, however early it was asked for.
-    void splash(float x, float y, float weight);
+    // A ripple without a finger, with the next frame: also the first, however early it was asked for. With ink it is
+    // what a finger does that comes down and is lifted at once.
+    void splash(float x, float y, float weight, bool withInk = false);
 
     // Nothing is drawn before all three pictures were there once. `which` is a sum of k...Picture.
     void picturesChanged(unsigned which);
@@ -92,6 +93,11 @@ public:
     double due() const;
 
 private:
+    struct Splash {
+        float x, y, weight;
+        bool withInk;
+    };
+
     void prepare();
     void fitSurface();
     bool isSurfaceDue() const;
@@ -111,7 +117,7 @@ private:
 
     // Reported since the last frame; places are shares of the view, times those of the face.
     std::vector<Touch> touches_;
-    std::vector<Touch> splashes_;
+    std::vector<Splash> splashes_;
 
     double longestFrame_ = Look{}.longestFrame;
     double shortestFrame_ = 0.0;

@@ -98,13 +98,8 @@ NATIVE(void, touch)
 (JNIEnv* env, jobject self, jint action, jfloat x, jfloat y, jboolean isStylus, jfloat pressure, jdouble time) {
     liveOf(env, self).touch(static_cast<TouchAction>(action), x, y, isStylus ? penWeight(pressure) : 1.0f, time);
 }
-// A finger that comes down and is lifted at once.
-NATIVE(void, drop)(JNIEnv* env, jobject self, jfloat x, jfloat y, jfloat weight, jdouble time) {
-    for (const TouchAction action : {TouchAction::down, TouchAction::up})
-        liveOf(env, self).touch(action, x, y, weight, time);
-}
-NATIVE(void, splash)(JNIEnv* env, jobject self, jfloat x, jfloat y, jfloat weight) {
-    liveOf(env, self).splash(x, y, weight);
+NATIVE(void, splash)(JNIEnv* env, jobject self, jfloat x, jfloat y, jfloat weight, jboolean withInk) {
+    liveOf(env, self).splash(x, y, weight, withInk);
 }
 NATIVE(void, picturesChanged)(JNIEnv* env, jobject self, jint which) {
     liveOf(env, self).picturesChanged(static_cast<unsigned>(which));

@@ -198,11 +198,11 @@ public final class ViewTest {
         drawUntilRest();
         expectColor(RED);
         assertEquals(List.of("ready", "calm", "wake", "calm", "rest", "calm"), heard.subList(0, 6));
+        newer.setInk(false);
         hide(view);
         drawUntilRest();
         assertEquals("the red of the other view, which goes on by itself", 0x40, Screen.pixels[0] & 255, 8);
 
-        newer.setInk(false);
         int[] objects = new int[8];
         for (int turn = 0; turn < 8; ++turn) {
             show(turn % 2 == 0 ? view : newer, SHORT, LONG);
@@ -211,6 +211,9 @@ public final class ViewTest {
             GlThread.await(() -> objects[at] = GlContext.countObjects());
         }
         assertEquals("objects on the GPU after more turns", objects[1], objects[7]);
+        hide(newer);
+        drawUntilRest();
+        expectColor(RED);
         newer.onDetachedFromWindow();
     }
 
@@ -267,15 +270,12 @@ public final class ViewTest {
 
     @Test
     public void codeMovesTheWaterAsAFingerDoes() {
-        start();
-        view.drop(40, 40);
-        assertTrue("a drop before the first frame falls in it", drawUntilRest() > 60);
-        view.setInk(true);
         show(view, LONG, LONG);
-        drawUntilRest();
+        view.setInk(true);
+        view.setPictures(red, green, null);
         view.drop(LONG / 2, LONG / 2, 1, true);
         for (int i = 0; i < 20; ++i) drawFrame();
-        assertTrue("ink of a drop", inked() > 20);
+        assertTrue("ink of a drop before the first frame", inked() > 20);
         view.clearInk();
         show(view, SHORT, LONG);
         drawUntilRest();

@@ -93,7 +93,7 @@ final class GlThread {
         }
         if (drawing == before) return;
         if (before != null && SHOWN.contains(before)) before.rest();
-        if (drawing != null) drawing.schedule();
+        if (drawing != null) drawing.goOn();
     }
 
     /** Before a renderer draws. What another one has left in the library is replaced. */

@@ -100,9 +100,7 @@ final class NativeWater {
 
     native void touch(int action, float x, float y, boolean isStylus, float pressure, double time);
 
-    native void drop(float x, float y, float weight, double time);
-
-    native void splash(float x, float y, float weight);
+    native void splash(float x, float y, float weight, boolean withInk);
 
     private native void picturesChanged(int which);
 

@@ -110,12 +110,7 @@ final class TidemarkRenderer implements Choreographer.FrameCallback {
     /** A drop that falls before the first frame is seen in it. One that falls while the view is away is forgotten. */
     void drop(float x, float y, float strength, boolean withInk) {
         change(water -> {
-            if (state != State.NOT_READY && !GlThread.draws(this)) return;
-            if (withInk) {
-                water.drop(x, y, strength, now());
-            } else {
-                water.splash(x, y, strength);
-            }
+            if (state == State.NOT_READY || GlThread.draws(this)) water.splash(x, y, strength, withInk);
         });
     }
 
@@ -156,6 +151,13 @@ final class TidemarkRenderer implements Choreographer.FrameCallback {
     void rest() {
         stroke = null;
         become(State.RESTING);
+    }
+
+    /** No other view draws any more. */
+    void goOn() {
+        water.redraw();
+        isStale = true;
+        schedule();
     }
 
     /** Awaits a refresh of the display where one will bring something new. */

@@ -55,13 +55,11 @@ if [ ! "$kotlin/node_modules/.package-lock.json" -nt "$kotlin/package-lock.json"
 fi
 [ "$(snippets kotlin)" ] || fail "the README has no Kotlin"
 cat >Snippet.kt <<END
-import android.app.Activity
-import android.graphics.Bitmap
 import androidx.compose.ui.viewinterop.AndroidView
 import $name.*
 $(snippets kotlin | grep '^import ')
 
-fun snippet(activity: Activity, portrait: Bitmap, landscape: Bitmap, light: Bitmap, withInk: Boolean) {
+fun snippet(picture: Int, withInk: Boolean) {
 $(snippets kotlin | grep -v '^import ')
 }
 END

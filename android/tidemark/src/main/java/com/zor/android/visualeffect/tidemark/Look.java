@@ -7,8 +7,8 @@ import java.io.InputStream;
 import java.util.Properties;
 
 /**
- * How the water looks and moves. Each value has a range in which it looks well, and limits that a look must keep to.
- * Change the fields before you hand them on, or load them from a file that your app ships.
+ * Parameters of the water's appearance and motion. Each field has a recommended range and hard limits. Set the fields
+ * before you pass the object, or load them from a file in your app.
  *
  * <p>Generated from {@code host/look.properties}.
  */
@@ -135,10 +135,55 @@ public final class Look implements Cloneable {
      */
     public float rainAmplitude = 0.9f;
     /**
+     * Crest and crater that follow a drop, as a share of what came before: fine rings instead of one broad one.
+     * Range 0 to 0.9, limits 0 to 1.
+     */
+    public float rebound = 0.7f;
+    /**
+     * Height of the waves of a breeze, which rises with a touch and sinks some seconds later. 0 for none.
+     * Range 0 to 0.5, limits 0 to 10.
+     */
+    public float breeze = 0.2f;
+    /**
      * Drops of rain a second.
      * Range 0 to 60, limits 0 to 1000.
      */
     public float rainDropsPerSecond = 3.0f;
+    /**
+     * How much darker and cooler a bright picture is handed over, so that highlights show on it; a dark one stays as it is.
+     * Range 0 to 1, limits 0 to 1.
+     */
+    public float wet = 0.6f;
+    /**
+     * Share of the ground's red that the water lets through.
+     * Range 0 to 1, limits 0 to 1.
+     */
+    public float groundRed = 1.0f;
+    /**
+     * Share of its green.
+     * Range 0 to 1, limits 0 to 1.
+     */
+    public float groundGreen = 1.0f;
+    /**
+     * Share of its blue.
+     * Range 0 to 1, limits 0 to 1.
+     */
+    public float groundBlue = 1.0f;
+    /**
+     * Red of the light on the waves, as a share of its picture's.
+     * Range 0 to 1, limits 0 to 1.
+     */
+    public float lightRed = 1.0f;
+    /**
+     * Green of that light.
+     * Range 0 to 1, limits 0 to 1.
+     */
+    public float lightGreen = 1.0f;
+    /**
+     * Blue of that light.
+     * Range 0 to 1, limits 0 to 1.
+     */
+    public float lightBlue = 1.0f;
     /**
      * Red of the ink. Ink of more than 0.75 would light the picture up.
      * Range 0 to 0.75, limits 0 to 1.
@@ -148,33 +193,39 @@ public final class Look implements Cloneable {
      * Green of the ink.
      * Range 0 to 0.75, limits 0 to 1.
      */
-    public float inkGreen = 0.15f;
+    public float inkGreen = 0.09f;
     /**
      * Blue of the ink.
      * Range 0 to 0.75, limits 0 to 1.
      */
-    public float inkBlue = 0.45f;
+    public float inkBlue = 0.24f;
     /**
-     * Steps of the ink, of which there are 60 a second, after the last touch until it has faded below the smallest
+     * Steps of the ink a second. Each needs a frame, and while ink lives there are no others: fewer steps make the ink slower
+     * and the water less smooth. A tap takes as many steps whatever their number.
+     * Range 24 to 60, limits 10 to 120.
+     */
+    public int inkStepsPerSecond = 60;
+    /**
+     * Steps of the ink after the last touch until it has faded below the smallest
      * step of its texture: the slowest preset keeps 0.94 of it a step, and 127 * 0.94^n &lt; 1 / 255 for n = 168.
      * Range 168 to 300, limits 0 to 10000.
      */
     public int framesToFade = 180;
 
-    /** Takes each value with its name and its limits, and gives back the one to go on with. */
+    /** Called for each field; returns its new value. */
     interface Values {
         double next(String name, double value, double least, double most, boolean isWhole);
     }
 
     /**
-     * Reads {@code key = number} lines, in the form of {@code java.util.Properties}. What they do not name keeps its
-     * default.
+     * Reads {@code key = number} lines in the format of {@code java.util.Properties}. Fields without a line keep their
+     * defaults.
      *
-     * @param text stays open
-     * @return a look of its own
-     * @throws IOException where the text cannot be read
-     * @throws IllegalArgumentException naming the key, when it is none of the fields above or when its value is not a
-     *     number of the field's type or beyond its limits
+     * @param text the lines; not closed
+     * @return a new look
+     * @throws IOException if the text cannot be read
+     * @throws IllegalArgumentException if a key is not a field, or its value is not a number of the field's type within
+     *     the limits; the message names the key
      */
     @NonNull
     public static Look load(@NonNull InputStream text) throws IOException {
@@ -186,9 +237,9 @@ public final class Look implements Cloneable {
     }
 
     /**
-     * The way back of {@link #load}.
+     * Converts the look to properties that {@link #load} can read.
      *
-     * @return all values, for {@code Properties.store} to write
+     * @return all fields
      */
     @NonNull
     public Properties toProperties() {
@@ -224,14 +275,24 @@ public final class Look implements Cloneable {
         longestTrail = (float) values.next("longestTrail", longestTrail, 0f, 1000f, false);
         trailShare = (float) values.next("trailShare", trailShare, 0f, 10f, false);
         rainAmplitude = (float) values.next("rainAmplitude", rainAmplitude, 0f, 100f, false);
+        rebound = (float) values.next("rebound", rebound, 0f, 1f, false);
+        breeze = (float) values.next("breeze", breeze, 0f, 10f, false);
         rainDropsPerSecond = (float) values.next("rainDropsPerSecond", rainDropsPerSecond, 0f, 1000f, false);
+        wet = (float) values.next("wet", wet, 0f, 1f, false);
+        groundRed = (float) values.next("groundRed", groundRed, 0f, 1f, false);
+        groundGreen = (float) values.next("groundGreen", groundGreen, 0f, 1f, false);
+        groundBlue = (float) values.next("groundBlue", groundBlue, 0f, 1f, false);
+        lightRed = (float) values.next("lightRed", lightRed, 0f, 1f, false);
+        lightGreen = (float) values.next("lightGreen", lightGreen, 0f, 1f, false);
+        lightBlue = (float) values.next("lightBlue", lightBlue, 0f, 1f, false);
         inkRed = (float) values.next("inkRed", inkRed, 0f, 1f, false);
         inkGreen = (float) values.next("inkGreen", inkGreen, 0f, 1f, false);
         inkBlue = (float) values.next("inkBlue", inkBlue, 0f, 1f, false);
+        inkStepsPerSecond = (int) values.next("inkStepsPerSecond", inkStepsPerSecond, 10, 120, true);
         framesToFade = (int) values.next("framesToFade", framesToFade, 0, 10000, true);
     }
 
-    /** The value itself, or an {@code IllegalArgumentException} where it is beyond its limits or no number. */
+    /** Returns the value; throws {@code IllegalArgumentException} if it is NaN or outside its limits. */
     static double checked(String name, double value, double least, double most, boolean isWhole) {
         if (value >= least && value <= most) return value;
         throw new IllegalArgumentException(
@@ -249,7 +310,7 @@ public final class Look implements Cloneable {
         return toProperties().hashCode();
     }
 
-    /** A look of its own, so that later changes do not reach the other. */
+    /** Returns an independent copy. */
     @NonNull
     @Override
     public Look clone() {

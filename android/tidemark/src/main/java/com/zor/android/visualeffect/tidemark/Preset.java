@@ -1,6 +1,6 @@
 package com.zor.android.visualeffect.tidemark;
 
-import org.jetbrains.annotations.NotNull;
+import androidx.annotation.NonNull;
 
 /**
  * Looks with names.
@@ -34,10 +34,10 @@ public enum Preset {
     }
 
     /** For people, in English. */
-    @NotNull public final String title;
+    @NonNull public final String title;
 
     /** The picture that suits the look. */
-    @NotNull public final Ground ground;
+    @NonNull public final Ground ground;
 
     /** Whether touches drop ink. */
     public final boolean ink;
@@ -57,7 +57,7 @@ public enum Preset {
      *
      * @return a look of its own
      */
-    @NotNull
+    @NonNull
     public Look look() {
         Look look = new Look();
         switch (this) {

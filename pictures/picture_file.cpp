@@ -1,71 +1,94 @@
 #include "pictures/picture_file.h"
 
-#include <stb/stb_image.h>
-#include <stb/stb_image_resize.h>
+#include <fcntl.h>
+#include <sys/stat.h>
 
-#include <algorithm>
-#include <cmath>
+#include <cerrno>
+#include <cstring>
 #include <memory>
+#include <utility>
 
-#include "host/read_file.h"
-#include "pictures/jpeg_file.h"
+#include "pictures/ffmpeg.h"
 
 namespace {
 
-// Four channels of two bytes, which a file holds in fewer bytes, and no more than an int counts.
-constexpr std::size_t kMostBytes = 8 * std::size_t{kMostPixels};
+// Ten times as long as the largest picture takes: a small file can ask for hours.
+constexpr int kMostSeconds = 60;
 
-std::size_t byteCount(int width, int height) {
-    return 4 * static_cast<std::size_t>(width) * static_cast<std::size_t>(height);
+void coverWhite(Picture& picture) {
+    for (std::size_t i = 0; i < picture.rgba.size(); i += 4) {
+        std::uint8_t* const pixel = &picture.rgba[i];
+        const int alpha = std::exchange(pixel[3], std::uint8_t{255});
+        for (int k = 0; alpha < 255 && k < 3; ++k) {
+            pixel[k] = static_cast<std::uint8_t>((pixel[k] * alpha + 255 * (255 - alpha) + 127) / 255);
+        }
+    }
 }
 
-// The reader's reason quotes bytes of the file, which may be anything.
-std::string failureReason() {
-    std::string reason = stbi_failure_reason();
-    std::replace_if(
-        reason.begin(), reason.end(), [](char c) { return c < ' ' || c > '~'; }, '?');
-    return reason;
+// The one picture in a stream of PAM, a header of text and the pixels.
+std::optional<Picture> readPam(std::FILE* stream) {
+    Picture picture;
+    char end = 0;
+    // NOLINTNEXTLINE(cert-err34-c): ffmpeg's numbers fit
+    const int count = std::fscanf(
+        stream, "P7 WIDTH %d HEIGHT %d DEPTH 4 MAXVAL 255 TUPLTYPE RGB_ALPHA ENDHDR%c", &picture.width, &picture.height,
+        &end);
+    if (count != 3 || end != '\n') return std::nullopt;
+    picture.rgba.resize(4 * static_cast<std::size_t>(picture.width) * static_cast<std::size_t>(picture.height));
+    if (std::fread(picture.rgba.data(), 1, picture.rgba.size(), stream) != picture.rgba.size()) return std::nullopt;
+    return picture;
 }
 
 }  // namespace
 
 std::optional<Picture> loadPicture(const std::string& path, std::string& error, int mostPixels) {
-    const std::optional<std::string> content = readFile(path, "the picture", kMostBytes, error);
-    if (!content) return std::nullopt;
-    const auto* const bytes = reinterpret_cast<const stbi_uc*>(content->data());
-    const int size = static_cast<int>(content->size());
+    const auto fail = [&](const std::string& reason) {
+        error = "cannot read the picture " + path + ": " + reason;
+        return std::nullopt;
+    };
+    // A pipe might never begin.
+    const int input = open(path.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC);
+    if (input < 0) return fail(std::strerror(errno));
+    const std::unique_ptr<std::FILE, int (*)(std::FILE*)> file(fdopen(input, "r"), std::fclose);
+    struct stat status;
+    if (fstat(input, &status) != 0) return fail(std::strerror(errno));
+    if (!S_ISREG(status.st_mode)) return fail("it is not a regular file");
 
-    if (const char* const harm = harmIn({bytes, content->size()})) {
-        error = path + " is not a JPEG picture that can be read: " + harm;
-        return std::nullopt;
+    // Through a pipe ffmpeg tells by the content what it is, and a play list cannot have it open other files.
+    const std::vector<std::string> arguments = {
+        "-max_pixels",
+        std::to_string(mostPixels),
+        "-protocol_whitelist",
+        "pipe",
+        "-i",
+        "pipe:0",
+        "-frames:v",
+        "1",
+        "-sws_flags",
+        "bicubic+accurate_rnd+full_chroma_int",
+        "-f",
+        "image2pipe",
+        "-c:v",
+        "pam",
+        "-pix_fmt",
+        "rgba",
+        "pipe:1"};
+    Ffmpeg ffmpeg;
+    if (!ffmpeg.startReading(arguments, input, kMostSeconds, error)) return fail(error);
+    std::optional<Picture> picture = readPam(ffmpeg.pipe());
+    if (!ffmpeg.finish(error)) return fail(error);
+    if (!picture) return fail("ffmpeg finds no picture in it");
+    if (const std::string damage = ffmpeg.complaint(); !damage.empty()) {
+        std::fprintf(stderr, "%s is damaged: %s\n", path.c_str(), damage.c_str());
     }
-    Picture picture;
-    // Before anything is decoded: a few bytes can claim a picture that no memory holds.
-    if (stbi_info_from_memory(bytes, size, &picture.width, &picture.height, nullptr) &&
-        picture.height > mostPixels / std::max(picture.width, 1)) {
-        error = path + " has " + std::to_string(picture.width) + "x" + std::to_string(picture.height) +
-                " pixels, more than the " + std::to_string(mostPixels) + " that can be read";
-        return std::nullopt;
-    }
-    const std::unique_ptr<stbi_uc, void (*)(void*)> pixels(
-        stbi_load_from_memory(bytes, size, &picture.width, &picture.height, nullptr, STBI_rgb_alpha), stbi_image_free);
-    if (!pixels) {
-        error = path + " is not a PNG or JPEG picture that can be read: " + failureReason();
-        return std::nullopt;
-    }
-    picture.rgba.assign(pixels.get(), pixels.get() + byteCount(picture.width, picture.height));
+    coverWhite(*picture);
     return picture;
 }
 
-Picture fitPicture(Picture picture, int longestSide) {
-    const int longer = std::max(picture.width, picture.height);
-    if (longer <= longestSide) return picture;
-    const auto shrink = [&](int side) {
-        return std::max(1, static_cast<int>(std::lround(static_cast<double>(side) * longestSide / longer)));
-    };
-    Picture fitted{shrink(picture.width), shrink(picture.height), {}};
-    fitted.rgba.resize(byteCount(fitted.width, fitted.height));
-    stbir_resize_uint8(
-        picture.rgba.data(), picture.width, picture.height, 0, fitted.rgba.data(), fitted.width, fitted.height, 0, 4);
-    return fitted;
+bool savePicture(const Picture& picture, const std::string& path, std::string& error) {
+    Ffmpeg ffmpeg;
+    const std::vector<std::string> output = {"-c:v",     "png",       "-pred", "mixed",      "-pix_fmt",    "rgb24",
+                                             "-flags:v", "+bitexact", "-f",    "image2pipe", "file:" + path};
+    return ffmpeg.startWriting(picture.width, picture.height, 1, output, error) && ffmpeg.write(picture, error) &&
+           ffmpeg.finish(error);
 }

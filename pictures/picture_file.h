@@ -1,4 +1,4 @@
-// Pictures from PNG and JPEG files.
+// Pictures in files.
 #pragma once
 
 #include <optional>
@@ -9,8 +9,10 @@
 // What the largest phone cameras take. Reading one needs a few times four bytes for each pixel.
 constexpr int kMostPixels = 200'000'000;
 
-// On failure, or for a picture of more than `mostPixels` pixels, says why in `error`.
+// A picture of any kind that ffmpeg reads, turned as the camera was held where a JPEG tells, over white where it is
+// transparent. Of one that moves, the first frame. On failure, or for a picture of more than `mostPixels` pixels, says
+// why in `error`. Says on standard error what is wrong with a damaged picture.
 std::optional<Picture> loadPicture(const std::string& path, std::string& error, int mostPixels = kMostPixels);
 
-// The picture, made smaller in its own proportions where a side is longer than `longestSide` pixels.
-Picture fitPicture(Picture picture, int longestSide);
+// Writes a PNG. On failure says why in `error`.
+bool savePicture(const Picture& picture, const std::string& path, std::string& error);

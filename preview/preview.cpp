@@ -4,48 +4,25 @@
 
 #include <algorithm>
 #include <cmath>
+#include <cstdint>
 #include <cstdio>
 #include <cstdlib>
+#include <filesystem>
 #include <memory>
 #include <vector>
 
 #include "desktop/headless_context.h"
 #include "host/picture.h"
 #include "host/water_host.h"
-#include "preview/frame_sink.h"
 #include "preview/inside.h"
+#include "preview/interrupt.h"
+#include "preview/output.h"
 #include "preview/progress.h"
 #include "preview/scene.h"
+#include "preview/seam.h"
 #include "preview/touch_script.h"
 
 namespace {
-
-std::string frameName(int frame) {
-    char name[32];
-    std::snprintf(name, sizeof name, "frame-%04d.png", frame);
-    return name;
-}
-
-// In the order of opening: what comes later may lie in a directory that was made for one before, and goes first.
-struct Outputs {
-    std::unique_ptr<FrameSink> pictures, inside, video;
-
-    bool open(const PreviewOptions& options, std::string& error) {
-        const auto [width, height] = options.size;
-        if (!options.out.empty() && !(pictures = openPngSink(options.out, frameName, error))) return false;
-        if (!options.inside.empty() && !(inside = openPngSink(options.inside, insideName, error))) return false;
-        if (options.video.empty()) return true;
-        video = openVideoSink(options.video, width, height, options.framesPerSecond, error);
-        return video != nullptr;
-    }
-    bool write(const Picture& frame, bool asPicture, std::string& error) {
-        return (!pictures || !asPicture || pictures->write(frame, error)) && (!video || video->write(frame, error));
-    }
-    bool finish(std::string& error) {
-        return (!video || video->finish(error)) && (!inside || inside->finish(error)) &&
-               (!pictures || pictures->finish(error));
-    }
-};
 
 // GL's rows come from the bottom.
 void readFrame(Picture& frame) {
@@ -57,38 +34,97 @@ void readFrame(Picture& frame) {
     }
 }
 
-int countFrames(const PreviewOptions& options, const std::vector<TouchEvent>& events) {
-    const double ownLength = events.empty() ? 4.0 : static_cast<double>(events.back().timeMs) / 1000.0 + 1.5;
-    return std::max(1, static_cast<int>(std::lround(options.seconds.value_or(ownLength) * options.framesPerSecond)));
+// Counted in frames.
+struct Plan {
+    int warmUp = 0;  // rounds of the scene that nobody sees, so that a clip that goes round begins as it ends
+    int round;
+    int fade = 0;  // from the end of the clip to its beginning
+
+    int total() const { return warmUp + round + fade; }
+};
+
+Plan makePlan(const PreviewOptions& options, const Look& look, const std::vector<TouchEvent>& events) {
+    double seconds = events.empty() ? 4.0 : static_cast<double>(events.back().timeMs) / 1000.0 + 1.5;
+    // One picture needs no more than what leads to it.
+    if (options.at)
+        seconds = options.out.empty() && options.video.empty() ? *options.at : std::max(seconds, *options.at);
+    const auto frames = [&](double time) { return static_cast<int>(std::lround(time * options.framesPerSecond)); };
+    Plan plan = {.round = std::max(1, frames(options.seconds.value_or(seconds)))};
+    if (!options.loop) return plan;
+    const int calming = frames(std::min(double{look.calmingTime}, 30.0));
+    plan.warmUp = (calming + plan.round - 1) / plan.round * plan.round;
+    // The frames that fade in are kept in memory, of which they take at most a gibibyte.
+    const auto affordable = (std::int64_t{1} << 28) / (std::int64_t{options.size.width} * options.size.height);
+    plan.fade = static_cast<int>(std::min({std::int64_t{frames(0.5)}, std::int64_t{plan.round / 2}, affordable}));
+    return plan;
+}
+
+// The events of each round, one after the other.
+std::vector<TouchEvent> repeated(const std::vector<TouchEvent>& events, const Plan& plan, int framesPerSecond) {
+    std::vector<TouchEvent> all;
+    for (int start = 0; start < plan.total(); start += plan.round) {
+        for (TouchEvent event : events) {
+            event.timeMs += std::int64_t{1000} * start / framesPerSecond;
+            all.push_back(event);
+        }
+    }
+    return all;
 }
 
 bool drawFrames(
-    const PreviewOptions& options, const Look& look, int frames, WaterHost& host, TouchPlayer& touches,
-    Outputs& outputs, std::string& error) {
+    const PreviewOptions& options, const Look& look, const Plan& plan, WaterHost& host, TouchPlayer& touches,
+    Output& output, Progress& progress, std::string& error) {
     const auto [width, height] = options.size;
     Picture frame{width, height, std::vector<std::uint8_t>(4 * static_cast<std::size_t>(width * height))};
-    Progress progress(frames);
-    for (int i = 0; i < frames; ++i) {
+    const double length = static_cast<double>(plan.round) / options.framesPerSecond;
+    const auto still = std::lround(options.at.value_or(length) * options.framesPerSecond) - 1;
+    Seam seam(plan.round, plan.fade);
+    for (int i = 0; i < plan.total() && !interrupted(); ++i) {
         touches.deliverBefore((i + 1) * 1000.0 / options.framesPerSecond, host);
         if (host.advance(1.0 / options.framesPerSecond)) {
             host.draw();
             readFrame(frame);
         }
-        if (!outputs.write(frame, i % options.every == 0, error)) return false;
-        progress.show(i + 1);
+        progress.show(i + 1, plan.total());
+        const int number = i - plan.warmUp;
+        if (number < 0) continue;
+        if (!options.still.empty() && number == std::max(still, 0L) &&
+            !output.writePicture(options.still, frame, error)) {
+            return false;
+        }
+        const Picture* const shown = seam.shown(number, frame);
+        if (shown && !output.write(*shown, error)) return false;
     }
-    if (outputs.inside) {
+    if (output.frames() == 0) {
+        error = "interrupted before the first frame";
+        return false;
+    }
+    if (!options.inside.empty()) {
+        int i = 0;
         for (const Picture& picture : drawInside(host, look, frame)) {
-            if (!outputs.inside->write(picture, error)) return false;
+            const std::filesystem::path path = std::filesystem::path(options.inside) / insideName(i++);
+            if (!output.writePicture(path, picture, error)) return false;
         }
     }
-    return outputs.finish(error);
+    return output.finish(error);
+}
+
+std::string describe(const PreviewOptions& options, int frames, int planned, const std::string& files) {
+    const std::string size = std::to_string(options.size.width) + "x" + std::to_string(options.size.height);
+    char seconds[32];
+    std::snprintf(seconds, sizeof seconds, "%.2f", static_cast<double>(frames) / options.framesPerSecond);
+    return (frames < planned ? "Interrupted: drew " + std::to_string(frames) + " of " + std::to_string(planned)
+                             : "Drew " + std::to_string(frames)) +
+           (planned == 1 ? " frame, " : " frames, ") + seconds + " s of " + size + " pixels" +
+           (files.empty() ? "" : ": ") + files;
 }
 
 }  // namespace
 
-bool runPreview(const PreviewOptions& options, std::string& error) {
+bool runPreview(const PreviewOptions& options, std::string& summary, std::string& error) {
     const auto [width, height] = options.size;
+    Output output(options);
+    if (!output.check(error)) return false;
     std::vector<TouchEvent> events;
     if (!options.script.empty()) {
         std::optional<std::vector<TouchEvent>> loaded = loadTouchScript(options.script, error);
@@ -97,13 +133,18 @@ bool runPreview(const PreviewOptions& options, std::string& error) {
     }
     const std::optional<Look> look = chooseLook(options, error);
     if (!look) return false;
+    const Plan plan = makePlan(options, *look, events);
+    if (options.loop && !events.empty() && events.back().timeMs * options.framesPerSecond > plan.round * 1000LL) {
+        error = "--loop: the script is longer than --seconds";
+        return false;
+    }
+    Progress progress(
+        "Getting the pictures ready, and " + std::to_string(width) + "x" + std::to_string(height) + " pixels of water");
     std::optional<Pictures> pictures = choosePictures(options, error);
     if (!pictures) return false;
     const std::unique_ptr<HeadlessContext> context = HeadlessContext::create(width, height, error);
     if (!context) return false;
-    fitToDriver(options, *pictures);
-    Outputs outputs;
-    if (!outputs.open(options, error)) return false;
+    fitToDriver(options.light, pictures->light);
 
     // The ink draws from this generator as well.
     srand48(static_cast<long>(options.seed));
@@ -111,7 +152,9 @@ bool runPreview(const PreviewOptions& options, std::string& error) {
     host.setUp(options.withInk);
     host.loadPictures(sourceOf(*pictures, *look));
     host.rain(options.rain);
-    const int frames = countFrames(options, events);
-    TouchPlayer touches(std::move(events), width, height);
-    return drawFrames(options, *look, frames, host, touches, outputs, error);
+    TouchPlayer touches(repeated(events, plan, options.framesPerSecond), width, height);
+    noteInterrupts();
+    if (!output.open(error) || !drawFrames(options, *look, plan, host, touches, output, progress, error)) return false;
+    summary = describe(options, output.frames(), plan.round, output.summary());
+    return true;
 }

@@ -1,18 +1,20 @@
-// A progress bar on standard error for runs that take longer than a second; nothing where nobody watches.
+// What a run is at, on standard error; nothing where nobody watches.
 #pragma once
 
 #include <chrono>
+#include <string>
 
 class Progress {
 public:
-    explicit Progress(int frames);
+    // Says what comes before the first frame, which takes a while in a large view.
+    explicit Progress(const std::string& beginning);
     ~Progress();
 
-    void show(int framesDone);
+    // A bar, ten times a second.
+    void show(int framesDone, int frames);
 
 private:
-    int frames_;
     bool watched_;
     bool shown_ = false;
-    std::chrono::steady_clock::time_point start_ = std::chrono::steady_clock::now();
+    std::chrono::steady_clock::time_point next_ = {};
 };

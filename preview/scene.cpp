@@ -3,8 +3,10 @@
 #include <GLES2/gl2.h>
 
 #include <algorithm>
+#include <cmath>
+#include <cstdint>
 #include <cstdio>
-#include <functional>
+#include <utility>
 
 #include "host/look_file.h"
 #include "pictures/picture_file.h"
@@ -24,33 +26,34 @@ Picture paintGround(Ground ground, int width, int height) {
     return sandyShore(width, height);
 }
 
-// The picture of `file`, or the built-in one where there is no file.
-std::optional<Picture> choosePicture(
-    const std::string& file, const std::function<Picture()>& builtIn, std::string& error) {
-    return file.empty() ? builtIn() : loadPicture(file, error);
-}
+// Ink of this brightness leaves a channel as it is; brighter ink would light the picture up.
+constexpr std::uint32_t kBrightestChannel = 0xbf;
 
 }  // namespace
 
 std::optional<Pictures> choosePictures(const PreviewOptions& options, std::string& error) {
-    // The built-in pictures stay as sharp as the view up to a size where they take too long to make.
+    // The painted pictures stay as sharp as the view up to a size where they take too long to make.
     const auto [width, height] = options.size;
     const double shrink = std::min(1.0, 2048.0 / std::max(width, height));
     const int shorter = std::max(1, static_cast<int>(std::min(width, height) * shrink));
     const int longer = std::max(1, static_cast<int>(std::max(width, height) * shrink));
-    std::optional<Picture> portrait = choosePicture(
-        options.portrait, [&] { return paintGround(options.ground, shorter, longer); }, error);
+    const auto background = [&](const std::string& own, bool isWide) -> std::optional<Picture> {
+        // A view that keeps its size shows one of the two.
+        if (!options.inWindow && isWide != (options.size.width > options.size.height)) {
+            return Picture{1, 1, {0, 0, 0, 255}};
+        }
+        const std::string& file = own.empty() ? options.picture : own;
+        if (!file.empty()) return loadPicture(file, error);
+        return paintGround(options.ground, isWide ? longer : shorter, isWide ? shorter : longer);
+    };
+    std::optional<Picture> portrait = background(options.portrait, false);
     if (!portrait) return std::nullopt;
-    std::optional<Picture> landscape = choosePicture(
-        options.landscape, [&] { return paintGround(options.ground, longer, shorter); }, error);
+    std::optional<Picture> landscape = background(options.landscape, true);
     if (!landscape) return std::nullopt;
-    std::optional<Picture> water = choosePicture(
-        options.light, [] { return waterLight(512); }, error);
-    if (!water) return std::nullopt;
-    return Pictures{std::move(*portrait), std::move(*landscape), std::move(*water)};
+    std::optional<Picture> light = options.light.empty() ? waterLight(512) : loadPicture(options.light, error);
+    if (!light) return std::nullopt;
+    return Pictures{std::move(*portrait), std::move(*landscape), std::move(*light)};
 }
-
-namespace {
 
 void fitToDriver(const std::string& file, Picture& picture) {
     GLint limit = 0;
@@ -58,26 +61,27 @@ void fitToDriver(const std::string& file, Picture& picture) {
     const int width = picture.width;
     const int height = picture.height;
     if (std::max(width, height) <= limit) return;
-    picture = fitPicture(std::move(picture), limit);
+    const double scale = static_cast<double>(limit) / std::max(width, height);
+    const auto shrunk = [=](int side) { return std::max(1, static_cast<int>(std::lround(side * scale))); };
+    picture = fitted(picture, shrunk(width), shrunk(height));
     std::fprintf(
         stderr, "tidemark-preview: %s: scaled from %dx%d to %dx%d pixels, the most that the driver takes\n",
         file.c_str(), width, height, picture.width, picture.height);
 }
 
-}  // namespace
-
-void fitToDriver(const PreviewOptions& options, Pictures& pictures) {
-    fitToDriver(options.portrait, pictures.portrait);
-    fitToDriver(options.landscape, pictures.landscape);
-    fitToDriver(options.light, pictures.light);
-}
-
 std::optional<Look> chooseLook(const PreviewOptions& options, std::string& error) {
     std::optional<Look> look = options.look.empty() ? options.base : loadLook(options.look, error, options.base);
-    if (look && options.inkColor) {
-        look->inkRed = options.inkColor->red;
-        look->inkGreen = options.inkColor->green;
-        look->inkBlue = options.inkColor->blue;
+    if (!look || !options.inkColor) return look;
+    std::uint32_t shown = 0;
+    for (const auto& [channel, shift] : {std::pair{&look->inkRed, 16}, {&look->inkGreen, 8}, {&look->inkBlue, 0}}) {
+        const std::uint32_t value = std::min(*options.inkColor >> shift & 0xff, kBrightestChannel);
+        *channel = static_cast<float>(value) / 255.0f;
+        shown |= value << shift;
+    }
+    if (shown != *options.inkColor) {
+        std::fprintf(
+            stderr, "tidemark-preview: the ink #%06x is too bright to darken the picture; #%06x is drawn\n",
+            *options.inkColor, shown);
     }
     return look;
 }

@@ -11,8 +11,8 @@
 // On failure says why in `error`.
 std::optional<Pictures> choosePictures(const PreviewOptions& options, std::string& error);
 
-// Makes what is larger than the current context's driver takes smaller, and says so on standard error.
-void fitToDriver(const PreviewOptions& options, Pictures& pictures);
+// Makes a picture that is larger than the current context's driver takes smaller, and says so on standard error.
+void fitToDriver(const std::string& file, Picture& picture);
 
-// On failure says why in `error`.
+// Says on standard error what it has to change. On failure says why in `error`.
 std::optional<Look> chooseLook(const PreviewOptions& options, std::string& error);

@@ -1,10 +1,13 @@
 #include "preview/touch_script.h"
 
+#include <algorithm>
 #include <charconv>
 #include <cmath>
 #include <cstddef>
+#include <cstdio>
 #include <sstream>
 #include <string_view>
+#include <utility>
 
 #include "host/quoted.h"
 #include "host/read_file.h"
@@ -26,11 +29,13 @@ std::optional<Number> parseNumber(std::string_view text) {
     return value;
 }
 
+constexpr std::pair<std::string_view, TouchAction> kActions[] = {
+    {"down", TouchAction::down}, {"move", TouchAction::move}, {"up", TouchAction::up}, {"cancel", TouchAction::cancel}};
+
 std::optional<TouchAction> parseAction(std::string_view text) {
-    if (text == "down") return TouchAction::down;
-    if (text == "move") return TouchAction::move;
-    if (text == "up") return TouchAction::up;
-    if (text == "cancel") return TouchAction::cancel;
+    for (const auto& [name, action] : kActions) {
+        if (name == text) return action;
+    }
     return std::nullopt;
 }
 
@@ -103,6 +108,20 @@ std::optional<std::vector<TouchEvent>> loadTouchScript(const std::string& path, 
     if (!content) return std::nullopt;
     std::istringstream text(*content);
     return parseTouchScript(text, path, error);
+}
+
+std::string writeTouchScript(const std::vector<TouchEvent>& events) {
+    std::string text = "# time_ms action x y pressure\n";
+    for (const auto& [timeMs, action, x, y, pressure] : events) {
+        const auto* const named = std::find_if(
+            std::begin(kActions), std::end(kActions), [&](const auto& known) { return known.second == action; });
+        char line[160];
+        std::snprintf(
+            line, sizeof line, "%lld %s %.3f%s %.3f%s %.2f\n", static_cast<long long>(timeMs), named->first.data(),
+            x.value, x.percent ? "%" : "", y.value, y.percent ? "%" : "", static_cast<double>(pressure));
+        text += line;
+    }
+    return text;
 }
 
 void TouchPlayer::deliverBefore(double timeMs, WaterHost& host) {

@@ -35,6 +35,9 @@ std::optional<std::vector<TouchEvent>> parseTouchScript(
     std::istream& text, const std::string& name, std::string& error);
 std::optional<std::vector<TouchEvent>> loadTouchScript(const std::string& path, std::string& error);
 
+// The lines of a script, whose parts of a pixel and of a per cent are rounded to thousandths.
+std::string writeTouchScript(const std::vector<TouchEvent>& events);
+
 // Plays a script to a host.
 class TouchPlayer {
 public:

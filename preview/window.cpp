@@ -4,14 +4,22 @@
 #include <GLFW/glfw3.h>
 
 #include <algorithm>
+#include <cerrno>
 #include <cmath>
 #include <cstdlib>
+#include <cstring>
+#include <fstream>
 #include <utility>
+#include <vector>
 
 #include "desktop/keep_driver.h"
 #include "host/live_water.h"
 #include "host/picture.h"
+#include "preview/interrupt.h"
+#include "preview/new_file.h"
+#include "preview/output.h"
 #include "preview/scene.h"
+#include "preview/touch_script.h"
 
 namespace {
 
@@ -19,6 +27,7 @@ struct Stage {
     LiveWater water;
     bool withInk, raining;
     bool pressed = false;
+    std::vector<TouchEvent> touches = {};
 };
 
 Stage& stageOf(GLFWwindow* window) {
@@ -30,8 +39,11 @@ void touch(GLFWwindow* window, TouchAction action) {
     int width = 0, height = 0;
     glfwGetCursorPos(window, &x, &y);
     glfwGetWindowSize(window, &width, &height);
-    const auto share = [](double position, int extent) { return static_cast<float>(position / std::max(extent, 1)); };
-    stageOf(window).water.touch(action, share(x, width), share(y, height), 1.0f, glfwGetTime());
+    x /= std::max(width, 1);
+    y /= std::max(height, 1);
+    Stage& stage = stageOf(window);
+    stage.water.touch(action, static_cast<float>(x), static_cast<float>(y), 1.0f, glfwGetTime());
+    stage.touches.push_back({std::llround(1000.0 * glfwGetTime()), action, {100 * x, true}, {100 * y, true}, 1.0f});
 }
 
 void onButton(GLFWwindow* window, int button, int action, int) {
@@ -73,7 +85,7 @@ void run(GLFWwindow* window, Stage& stage) {
     int width = 0, height = 0;
     glfwGetFramebufferSize(window, &width, &height);
     onResize(window, width, height);
-    while (!glfwWindowShouldClose(window)) {
+    while (!glfwWindowShouldClose(window) && !interrupted()) {
         switch (stage.water.frame(glfwGetTime())) {
             case LiveWater::Frame::drawn:
                 glfwSwapBuffers(window);
@@ -83,13 +95,32 @@ void run(GLFWwindow* window, Stage& stage) {
                 glfwWaitEventsTimeout(std::clamp(stage.water.due() - glfwGetTime(), 0.0005, 1.0));
                 break;
             case LiveWater::Frame::resting:
-                glfwWaitEvents();
+                glfwWaitEventsTimeout(0.5);  // and sees an interrupt
                 break;
             case LiveWater::Frame::resize:
                 stage.water.resized();
                 break;
         }
     }
+    if (stage.pressed) touch(window, TouchAction::up);
+}
+
+// A script that begins a little before its first touch.
+bool saveTouches(
+    const PreviewOptions& options, std::vector<TouchEvent> touches, std::string& summary, std::string& error) {
+    constexpr std::int64_t kBefore = 200;
+    const std::int64_t first = touches.empty() ? 0 : touches.front().timeMs;
+    for (TouchEvent& touch : touches) touch.timeMs += kBefore - first;
+    const std::string text = writeTouchScript(touches);
+    NewFile file;
+    if (!file.make(options.record, options.force, error)) return false;
+    if (std::ofstream script(file.part()); !(script << text).flush()) {
+        error = "cannot write " + options.record + ": " + std::strerror(errno);
+        return false;
+    }
+    summary = "Wrote " + std::to_string(touches.size()) + " events of touches: " + options.record + " (" +
+              sizeInWords(text.size()) + ")";
+    return file.keep(error);
 }
 
 bool fail(const std::string& what, std::string& error) {
@@ -101,15 +132,21 @@ bool fail(const std::string& what, std::string& error) {
 
 }  // namespace
 
-bool runWindow(const PreviewOptions& options, std::string& error) {
+bool runWindow(PreviewOptions options, std::string& summary, std::string& error) {
+    if (!options.record.empty() && !mayWrite(options.record, options.force, error)) return false;
     const std::optional<Look> look = chooseLook(options, error);
     if (!look) return false;
-    std::optional<Pictures> pictures = choosePictures(options, error);
-    if (!pictures) return false;
     if (!glfwInit()) return fail("no screen for a window", error);
     struct Ended {
         ~Ended() { glfwTerminate(); }
     } ended;
+    GLFWmonitor* const screen = options.fullscreen ? glfwGetPrimaryMonitor() : nullptr;
+    if (screen) {
+        const GLFWvidmode* const mode = glfwGetVideoMode(screen);
+        options.size = {mode->width, mode->height};
+    }
+    std::optional<Pictures> pictures = choosePictures(options, error);
+    if (!pictures) return false;
     const std::pair<int, int> hints[] = {
         {GLFW_CLIENT_API, GLFW_OPENGL_ES_API},
         {GLFW_CONTEXT_CREATION_API, GLFW_EGL_CONTEXT_API},
@@ -119,12 +156,12 @@ bool runWindow(const PreviewOptions& options, std::string& error) {
         {GLFW_DEPTH_BITS, 0},
         {GLFW_STENCIL_BITS, 0}};
     for (const auto& [hint, value] : hints) glfwWindowHint(hint, value);
-    GLFWwindow* const window = glfwCreateWindow(options.size.width, options.size.height, "Tidemark", nullptr, nullptr);
+    GLFWwindow* const window = glfwCreateWindow(options.size.width, options.size.height, "Tidemark", screen, nullptr);
     if (!window) return fail("cannot open a window", error);
     glfwMakeContextCurrent(window);
     glfwSwapInterval(1);
     keepDriverLoaded();
-    fitToDriver(options, *pictures);
+    fitToDriver(options.light, pictures->light);
 
     // The ink draws from this generator as well.
     srand48(static_cast<long>(options.seed));
@@ -134,6 +171,7 @@ bool runWindow(const PreviewOptions& options, std::string& error) {
     stage.water.picturesChanged(kAllPictures);
     stage.water.setInk(stage.withInk);
     stage.water.setRain(stage.raining);
+    noteInterrupts();
     run(window, stage);
-    return true;
+    return options.record.empty() || saveTouches(options, std::move(stage.touches), summary, error);
 }

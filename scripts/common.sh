@@ -4,7 +4,7 @@
 # shellcheck disable=SC2034  # the scripts use them
 {
     build_packages=(cmake g++ make ninja-build openjdk-17-jdk-headless libgles-dev libegl-dev libegl-mesa0 libgl1-mesa-dri
-        libstb-dev libcli11-dev libglfw3-dev ffmpeg)
+        libcli11-dev libglfw3-dev ffmpeg)
     lint_packages=(clang clang-format clang-tidy git python3 shellcheck)
     test_packages=(clang libgtest-dev junit4 aapt android-framework-res python3 xz-utils
         glslang-tools binutils llvm valgrind xvfb xauth xdotool)

@@ -1,13 +1,24 @@
 #!/usr/bin/env bash
-# Renders the shipped scene into out/: pictures and a short video of moving water. Options go to tidemark-preview, which
-# refuses what it does not know: scripts/demo.sh --portrait my-photo.jpg
+# Renders the shipped scene into out/: pictures and a short video of moving water. Options go to tidemark-preview, and
+# come before the script's own; those that say what to write, or open a window, replace out/:
+# scripts/demo.sh --picture my-photo.jpg --video my.gif
 set -euo pipefail
-cd "$(dirname "$0")/.."
-source scripts/common.sh
-[ "${1-}" != --help ] || no_more_arguments "scripts/demo.sh [OPTION OF build/release/preview/tidemark-preview]..." "$@"
+root=$(cd "$(dirname "$0")/.." && pwd)
+source "$root/scripts/common.sh"
 install_missing "${build_packages[@]}"
-configure_program
-cmake --build --preset release --target tidemark-preview
-build/release/preview/tidemark-preview --script scenes/demo.touch --size 720x1280 \
-    --out out --every 30 --video out/demo.mp4 "$@"
-echo "Pictures and a video: $PWD/out"
+(
+    cd "$root"
+    configure_program
+    cmake --build --preset release --target tidemark-preview
+) >&2
+scene=(--script demo)
+size=(--size 720x1280)
+output=(--video "$root/out/demo.mp4" --out "$root/out" --every 30 --force)
+for option in "$@"; do
+    case $option in
+        --window | --fullscreen) scene=() size=() output=() ;;
+        --size*) size=() ;;
+        --video* | --out* | --still* | --inside*) output=() ;;
+    esac
+done
+exec "$root/build/release/preview/tidemark-preview" "${scene[@]}" "${size[@]}" "${output[@]}" "$@"

@@ -8,6 +8,7 @@ install_missing "${build_packages[@]}"
 configure_program
 cmake --build --preset release --target tidemark-preview
 preview=build/release/preview/tidemark-preview
+rm -rf out/welcome.mp4 out/inside out/strokes-* out/quality-*
 
 "$preview" --script scenes/welcome.touch --rain --size 1260x708 --seconds 3.8 --video out/welcome.mp4
 ffmpeg -v error -y -i out/welcome.mp4 -vf fps=15,scale=840:-1:flags=lanczos \

@@ -1,10 +1,10 @@
 #include "pictures/picture_file.h"
 
 #include <gtest/gtest.h>
-#include <stb/stb_image_write.h>
+#include <sys/stat.h>
+#include <unistd.h>
 
-#include <algorithm>
-#include <cstdio>
+#include <cstdlib>
 #include <filesystem>
 #include <fstream>
 
@@ -12,93 +12,105 @@
 
 using namespace std::string_literals;
 
-// A file without a name of its own, which nobody else can have.
-static const std::string kPath = "/proc/self/fd/" + std::to_string(fileno(std::tmpfile()));
+class PictureFile : public testing::Test {
+protected:
+    void SetUp() override {
+        std::filesystem::create_directories(folder_);
+        std::filesystem::current_path(folder_);
+    }
+    void TearDown() override {
+        std::filesystem::current_path("/");
+        std::filesystem::remove_all(folder_);
+    }
 
-static std::string reasonAgainst(const std::string& content) {
-    std::ofstream(kPath, std::ios::binary) << content;
-    std::string error;
-    EXPECT_FALSE(loadPicture(kPath, error));
-    return error;
-}
-
-TEST(PictureFile, ReadsPngAndJpegOfAnyKindAsOpaqueRgba) {
-    std::string error;
-    const unsigned char rgb[] = {255, 0, 10, 40, 50, 60};
-    ASSERT_TRUE(stbi_write_png(kPath.c_str(), 1, 2, 3, rgb, 0));
-    const std::optional<Picture> png = loadPicture(kPath, error);
-    ASSERT_TRUE(png) << error;
-    EXPECT_EQ(std::pair(png->width, png->height), std::pair(1, 2));
-    EXPECT_EQ(png->rgba, (std::vector<std::uint8_t>{255, 0, 10, 255, 40, 50, 60, 255}));
-    std::filesystem::resize_file(kPath, std::filesystem::file_size(kPath) / 2);
-    EXPECT_FALSE(loadPicture(kPath, error));
-    EXPECT_NE(error.find(kPath), std::string::npos) << error;
-
-    const std::vector<unsigned char> grey(16 * 16, 100);
-    ASSERT_TRUE(stbi_write_jpg(kPath.c_str(), 16, 16, 1, grey.data(), 95));
-    const std::optional<Picture> jpeg = loadPicture(kPath, error);
-    ASSERT_TRUE(jpeg) << error;
-    ASSERT_EQ(jpeg->rgba.size(), 16U * 16 * 4);
-    EXPECT_NEAR(jpeg->rgba[2], 100, 2);
-    EXPECT_EQ(jpeg->rgba[3], 255);
-}
-
-TEST(PictureFile, RefusesWhatWouldHarmTheProcess) {
-    const auto png = "\x89PNG\r\n\x1a\n\0\0\0\rIHDR"s;
-    EXPECT_NE(reasonAgainst(png + "\0\0\x3e\x80\0\0\x3e\x80\x08\6\0\0\0crc?"s).find("16000x16000"), std::string::npos);
-    const std::string reason = reasonAgainst(png + "\0\0\0\1\0\0\0\1\x08\6\0\0\0crc?\0\0\0\0\x1b[7mcrc?"s);
-    EXPECT_EQ(reason.find('\x1b'), std::string::npos) << "bytes of the file that a terminal would obey";
-
-    // A pixel in a block of fixed codes: 24 bits of them, then 13 bytes for each 8 runs of 258 zeros, to over a
-    // gibibyte.
-    std::string zeros = "\x78\1\x63\x18\5"s;
-    for (int i = 0; i < 525'000; ++i) zeros += "\xa3\x60\x14\x8c\x82\x51\x30\x0a\x46\xc1\x28\x18\5";
-    zeros += "\0\0"s;
-    std::string length(4, '\0');
-    for (std::size_t i = 0; i < 4; ++i) length[i] = static_cast<char>(zeros.size() >> (24 - 8 * i));
-    EXPECT_NE(
-        reasonAgainst(png + "\0\0\0\1\0\0\0\1\x08\0\0\0\0crc?"s + length + "IDAT" + zeros + "crc?\0\0\0\0IENDcrc?"s)
-            .find("outofmem"),
-        std::string::npos);
-
-    // Tables of one code too many, where the file's parts are still told apart, after that, and in a comment.
-    const std::string table = "\xff\xc4\1\x14\0\0\0\0\0\0\0\0\1\xff\1\0\0\0\0\0\0"s + std::string(257, 'c');
-    EXPECT_NE(reasonAgainst("\xff\xd8\xff\xe0\0\4ab"s + table).find("Huffman"), std::string::npos);
-    EXPECT_NE(reasonAgainst("\xff\xd8\xff\xda\0\4abscan"s + table).find("Huffman"), std::string::npos);
-    EXPECT_EQ(reasonAgainst("\xff\xd8\xff\xfe\1\x20"s + table + "........").find("Huffman"), std::string::npos);
-}
-
-TEST(PictureFile, RefusesMoreScansThanAPictureNeeds) {
-    const std::vector<unsigned char> grey(8 * 8, 100);
-    ASSERT_TRUE(stbi_write_jpg(kPath.c_str(), 8, 8, 1, grey.data(), 95));
-    std::string error;
-    const std::string jpeg = readFile(kPath, "", 10000, error).value_or("");
-    const std::size_t start = jpeg.find("\xff\xda");
-    const std::string scan = jpeg.substr(start, jpeg.size() - 2 - start);
-    std::string content = jpeg.substr(0, start);
-    for (int i = 0; i < 100; ++i) content += scan;
-    std::ofstream(kPath, std::ios::binary) << content + "\xff\xd9";
-    EXPECT_TRUE(loadPicture(kPath, error)) << error;
-    EXPECT_NE(reasonAgainst(content + scan + "\xff\xd9").find("too many scans"), std::string::npos);
-}
-
-TEST(PictureFile, NamesInOneLineEachFileThatOnceDidHarm) {
-    for (const auto& file : std::filesystem::directory_iterator(TIDEMARK_REGRESSIONS_PATH)) {
+    static void make(const std::string& name, const std::string& filter) {
+        const std::string source = "color=red:size=16x8:duration=1,format=yuv444p," + filter;
+        const std::string made = "made" + std::string(std::filesystem::path(name).extension());
+        ASSERT_EQ(std::system(("ffmpeg -v error -f lavfi -i '" + source + "' -frames:v 1 " + made).c_str()), 0);
+        std::filesystem::rename(made, name);
+    }
+    static void write(const std::string& name, const std::string& content) {
+        std::ofstream(name, std::ios::binary) << content;
+    }
+    static Picture load(const std::string& name) {
         std::string error;
-        EXPECT_FALSE(loadPicture(file.path(), error));
-        EXPECT_NE(error.find(file.path()), std::string::npos) << error;
-        EXPECT_EQ(error.find('\n'), std::string::npos) << error;
+        const std::optional<Picture> picture = loadPicture(name, error);
+        EXPECT_TRUE(picture) << error;
+        return picture.value_or(Picture{1, 1, {0, 0, 0, 0}});
+    }
+    static void expectColor(const Picture& picture, int x, int y, std::array<int, 4> color) {
+        for (std::size_t i = 0; i < 4; ++i) {
+            const std::size_t place = 4 * static_cast<std::size_t>(y * picture.width + x) + i;
+            EXPECT_NEAR(picture.rgba.at(place), color.at(i), 6) << x << "," << y << " channel " << i;
+        }
+    }
+
+private:
+    const std::filesystem::path folder_ = testing::TempDir() + "pictures-" + std::to_string(getpid());
+};
+
+constexpr std::array<int, 4> kRed = {253, 0, 0, 255}, kBlue = {0, 0, 253, 255};
+
+TEST_F(PictureFile, ReadsPicturesOfManyKinds) {
+    for (const std::string name : {"%d.png", "[a]*?.jpg", "a:b.webp", "a.gif", "a.avif"}) {
+        make(name, "drawbox=x=8:w=8:h=8:color=blue:t=fill");
+        const Picture picture = load(name);
+        ASSERT_EQ(std::pair(picture.width, picture.height), std::pair(16, 8)) << name;
+        expectColor(picture, 2, 4, kRed);
+        expectColor(picture, 13, 4, kBlue);
     }
 }
 
-TEST(PictureFile, FitsLargePicturesInTheirOwnProportions) {
-    Picture wide{40, 10, std::vector<std::uint8_t>(40 * 10 * 4, 7)};
-    for (int row = 0; row < 10; ++row) std::fill_n(wide.rgba.begin() + 160 * row, 80, std::uint8_t{200});
-    EXPECT_EQ(fitPicture(wide, 40).rgba, wide.rgba);
-    const Picture fitted = fitPicture(wide, 20);
-    ASSERT_EQ(std::pair(fitted.width, fitted.height), std::pair(20, 5));
-    EXPECT_NEAR(fitted.rgba.at(2 * 80 + 2 * 4), 200, 2);
-    EXPECT_NEAR(fitted.rgba.at(2 * 80 + 18 * 4), 7, 2);
-    const Picture line = fitPicture({1000, 1, std::vector<std::uint8_t>(4000)}, 100);
-    EXPECT_EQ(std::pair(line.width, line.height), std::pair(100, 1));
+TEST_F(PictureFile, TurnsAPhotoAsTheCameraWasHeld) {
+    make("a.jpg", "drawbox=x=8:w=8:h=8:color=blue:t=fill");
+    std::string error, photo = readFile("a.jpg", "", 10000, error).value_or("");
+    // The right side of the scene is at the top of the picture: turn it clockwise.
+    photo.insert(2, "\xff\xe1\0\x22"s + "Exif\0\0MM\0*\0\0\0\x08\0\1\1\x12\0\3\0\0\0\1\0\6\0\0\0\0\0\0"s);
+    write("turned.jpg", photo);
+    const Picture picture = load("turned.jpg");
+    ASSERT_EQ(std::pair(picture.width, picture.height), std::pair(8, 16));
+    expectColor(picture, 4, 2, kRed);
+    expectColor(picture, 4, 13, kBlue);
+}
+
+TEST_F(PictureFile, ShowsWhiteWhereAPictureIsTransparent) {
+    make("a.png", "format=rgba,colorchannelmixer=aa=0.5");
+    expectColor(load("a.png"), 3, 3, {254, 127, 127, 255});
+}
+
+TEST_F(PictureFile, WritesWhatItReads) {
+    Picture picture{3, 2, {}};
+    for (int i = 0; i < 24; ++i) picture.rgba.push_back(static_cast<std::uint8_t>(i % 4 == 3 ? 255 : 37 * i));
+    std::string error;
+    ASSERT_TRUE(savePicture(picture, "a:b.png", error)) << error;
+    EXPECT_EQ(load("a:b.png").rgba, picture.rgba);
+    EXPECT_FALSE(savePicture(picture, "no/a.png", error));
+    EXPECT_NE(error.find("No such file"), error.npos) << error;
+}
+
+TEST_F(PictureFile, RefusesInOneLineWhatIsNoPictureOrTooLarge) {
+    make("a.png", "null");
+    std::string ignored;
+    write("half.png", readFile("a.png", "", 10000, ignored).value_or("").substr(0, 60));
+    write("list.png", "ffconcat version 1.0\nfile a.png\n");
+    write("escape.png", "\x89PNG\r\n\x1a\n\0\0\0\1\x1b[7mcrc?"s);
+    write("empty.png", "");
+    ASSERT_EQ(mkfifo("pipe.png", 0600), 0);
+    for (const auto& [name, reason] :
+         {std::pair{"none.png", "No such file"},
+          {"half.png", "ffmpeg"},
+          {"list.png", "ffmpeg"},
+          {"escape.png", "ffmpeg"},
+          {"empty.png", "ffmpeg"},
+          {"pipe.png", "it is not a regular file"},
+          {"/dev/zero", "it is not a regular file"}}) {
+        std::string error;
+        EXPECT_FALSE(loadPicture(name, error)) << name;
+        EXPECT_EQ(error.find("cannot read the picture "s + name + ": "), 0U) << error;
+        EXPECT_NE(error.find(reason), error.npos) << error;
+        EXPECT_EQ(error.find_first_of("\n\x1b"), error.npos) << error;
+    }
+    std::string error;
+    EXPECT_FALSE(loadPicture("a.png", error, 127));
+    EXPECT_TRUE(error.ends_with(": Picture size 16x8 exceeds specified max pixel count 127")) << error;
 }

@@ -30,6 +30,13 @@ protected:
     static std::string preview(const std::string& arguments, const std::string& environment = "") {
         return run("env " + environment + " '" TIDEMARK_PREVIEW_PATH "' " + arguments);
     }
+    // Whether the program draws what it is asked for, and says so in one line.
+    static testing::AssertionResult draws(const std::string& arguments) {
+        const std::string output = preview(arguments);
+        const bool isLine = output.starts_with("Drew ") && output.find('\n') == output.size() - 3;
+        return isLine && output.ends_with("\n0\n") ? testing::AssertionSuccess()
+                                                   : testing::AssertionFailure() << output;
+    }
 
 private:
     const std::filesystem::path directory_ = testing::TempDir() + "preview-" + std::to_string(getpid());

@@ -14,6 +14,10 @@ TEST(TouchScript, ReadsEventsBetweenCommentsAndBlankLines) {
     const auto events =
         parse("# a\n\n0 down -3 20 1\r\n  16\tmove 100% 12.5% 0.5 # b\n16 up 0 7 0\n17 cancel 0 0 1", error);
     ASSERT_TRUE(events) << error;
+    EXPECT_EQ(
+        writeTouchScript(*events),
+        "# time_ms action x y pressure\n0 down -3.000 20.000 1.00\n16 move 100.000% 12.500% 0.50\n"
+        "16 up 0.000 7.000 0.00\n17 cancel 0.000 0.000 1.00\n");
     std::ostringstream read;
     for (const auto& [timeMs, action, x, y, pressure] : *events) {
         read << timeMs << " " << static_cast<int>(action) << " " << x.pixels(1080) << "," << y.pixels(1920) << " "

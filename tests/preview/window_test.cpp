@@ -58,7 +58,8 @@ TEST_F(Window, ObeysMouseAndKeysAndFillsAnotherSize) {
     // Water that calms at once, and rain without a pause.
     std::ofstream("../look") << "damping = 0.8\nrainDropsPerSecond = 60\nframesToFade = 30\n";
     run("ffmpeg -v error -f lavfi -i color=red:size=20x10 -frames:v 1 ../red.png");
-    program = std::async([] { return preview("--window --size 120x160 --look ../look --landscape ../red.png"); });
+    program = std::async(
+        [] { return preview("--window --size 120x160 --look ../look --landscape ../red.png --record a.touch"); });
     ASSERT_TRUE(waitUntil([] { return redAtEndOfStroke() > 20 && still(); })) << "no picture";
     const int red = redAtEndOfStroke();
     stroke();
@@ -78,5 +79,8 @@ TEST_F(Window, ObeysMouseAndKeysAndFillsAnotherSize) {
     send("search --name Tidemark windowsize 200 100");
     ASSERT_TRUE(waitUntil([] { return averageRed("10x90", "185,5") > 200; })) << "the new part has no picture";
     send("key Escape");
-    EXPECT_EQ(program.get(), "0\n");
+    const std::string output = program.get();
+    EXPECT_TRUE(output.starts_with("Wrote ") && output.ends_with("\n0\n")) << output;
+    EXPECT_EQ(run("grep -c -e down -e up a.touch"), "4\n0\n");
+    EXPECT_EQ(run("sed -n 2p a.touch"), "200 down 25.000% 50.000% 1.00\n0\n");
 }

@@ -1,0 +1,43 @@
+// The program ffmpeg as a child process, which reads pictures of all kinds and writes pictures and videos.
+#pragma once
+
+#include <sys/types.h>
+
+#include <cstdio>
+#include <string>
+#include <vector>
+
+#include "host/picture.h"
+
+class Ffmpeg {
+public:
+    Ffmpeg() = default;
+    ~Ffmpeg();  // ends the program if it still runs
+    Ffmpeg(const Ffmpeg&) = delete;
+    Ffmpeg& operator=(const Ffmpeg&) = delete;
+
+    // Starts the program with the open file `input` as its standard input and its standard output at pipe(). It may
+    // use the processor for so many seconds. On failure says why in `error`, as the next three do.
+    bool startReading(const std::vector<std::string>& arguments, int input, int mostSeconds, std::string& error);
+
+    // Starts the program with what write() gives it as its input: RGBA frames of this size.
+    bool startWriting(
+        int width, int height, int framesPerSecond, const std::vector<std::string>& output, std::string& error);
+    bool write(const Picture& frame, std::string& error);
+
+    // Closes the pipe and waits until the program has ended well.
+    bool finish(std::string& error);
+
+    std::FILE* pipe() const { return pipe_; }
+
+    // The first thing that the program complained about, in one line of printable characters; empty for none.
+    std::string complaint() const;
+
+private:
+    bool start(std::vector<std::string> arguments, int input, std::string& error);
+    int wait();
+
+    pid_t pid_ = -1;
+    std::FILE* pipe_ = nullptr;
+    std::FILE* messages_ = nullptr;  // its standard error
+};

@@ -1,0 +1,5 @@
+#pragma once
+
+// From now on Ctrl-C, or a request to end, is only noted. A second one ends the program.
+void noteInterrupts();
+bool interrupted();

@@ -10,6 +10,10 @@
 #include <cerrno>
 #include <csignal>
 #include <cstring>
+#include <iterator>
+#include <sstream>
+#include <utility>
+#include <vector>
 
 Ffmpeg::~Ffmpeg() {
     if (pid_ > 0) kill(pid_, SIGKILL);
@@ -18,7 +22,7 @@ Ffmpeg::~Ffmpeg() {
 }
 
 // Without an input the pipe is that, otherwise it is the output.
-bool Ffmpeg::start(std::vector<std::string> arguments, int input, std::string& error) {
+bool Ffmpeg::start(const std::string& options, const std::string& output, int input, std::string& error) {
     const bool reads = input >= 0;
     int ends[2];
     messages_ = std::tmpfile();
@@ -31,7 +35,9 @@ bool Ffmpeg::start(std::vector<std::string> arguments, int input, std::string& e
     // A program that ends early is reported by write, not by a signal.
     std::signal(SIGPIPE, SIG_IGN);
 
-    arguments.insert(arguments.begin(), {"ffmpeg", "-nostdin", "-hide_banner", "-loglevel", "error"});
+    std::istringstream words("ffmpeg -nostdin -hide_banner -loglevel error " + options);
+    std::vector<std::string> arguments{std::istream_iterator<std::string>(words), {}};
+    arguments.push_back(output);
     std::vector<char*> pointers;
     pointers.reserve(arguments.size() + 1);
     for (std::string& argument : arguments) pointers.push_back(argument.data());
@@ -60,29 +66,21 @@ bool Ffmpeg::start(std::vector<std::string> arguments, int input, std::string& e
     return false;
 }
 
-bool Ffmpeg::startReading(const std::vector<std::string>& arguments, int input, int mostSeconds, std::string& error) {
-    if (!start(arguments, input, error)) return false;
+bool Ffmpeg::startReading(const std::string& options, int input, int mostSeconds, std::string& error) {
+    if (!start(options, "pipe:1", input, error)) return false;
     const rlimit limit = {static_cast<rlim_t>(mostSeconds), static_cast<rlim_t>(mostSeconds)};
     prlimit(pid_, RLIMIT_CPU, &limit, nullptr);
     return true;
 }
 
 bool Ffmpeg::startWriting(
-    int width, int height, int framesPerSecond, const std::vector<std::string>& output, std::string& error) {
-    std::vector<std::string> arguments = {
-        "-y",
-        "-f",
-        "rawvideo",
-        "-pix_fmt",
-        "rgba",
-        "-video_size",
-        std::to_string(width) + "x" + std::to_string(height),
-        "-framerate",
-        std::to_string(framesPerSecond),
-        "-i",
-        "pipe:0"};
-    arguments.insert(arguments.end(), output.begin(), output.end());
-    return start(arguments, -1, error);
+    int width, int height, int framesPerSecond, const std::string& options, const std::string& file,
+    std::string& error) {
+    const std::string frames = "-y -f rawvideo -pix_fmt rgba -video_size " + std::to_string(width) + "x" +
+                               std::to_string(height) + " -framerate " + std::to_string(framesPerSecond) +
+                               " -i pipe:0 ";
+    // The time of day and the encoder's version stay out of the file.
+    return start(frames + options + " -fflags +bitexact -flags:v +bitexact", "file:" + file, -1, error);
 }
 
 bool Ffmpeg::write(const Picture& frame, std::string& error) {

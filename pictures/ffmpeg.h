@@ -5,7 +5,6 @@
 
 #include <cstdio>
 #include <string>
-#include <vector>
 
 #include "host/picture.h"
 
@@ -16,13 +15,16 @@ public:
     Ffmpeg(const Ffmpeg&) = delete;
     Ffmpeg& operator=(const Ffmpeg&) = delete;
 
-    // Starts the program with the open file `input` as its standard input and its standard output at pipe(). It may
-    // use the processor for so many seconds. On failure says why in `error`, as the next three do.
-    bool startReading(const std::vector<std::string>& arguments, int input, int mostSeconds, std::string& error);
+    // The options of both are separated by blanks. On failure these and the next two say why in `error`.
 
-    // Starts the program with what write() gives it as its input: RGBA frames of this size.
+    // Starts the program with the open file `input` as its standard input and its standard output at pipe(). It may
+    // use the processor for so many seconds.
+    bool startReading(const std::string& options, int input, int mostSeconds, std::string& error);
+
+    // Starts the program with what write() gives it as its input, RGBA frames of this size, to write a file.
     bool startWriting(
-        int width, int height, int framesPerSecond, const std::vector<std::string>& output, std::string& error);
+        int width, int height, int framesPerSecond, const std::string& options, const std::string& file,
+        std::string& error);
     bool write(const Picture& frame, std::string& error);
 
     // Closes the pipe and waits until the program has ended well.
@@ -34,7 +36,7 @@ public:
     std::string complaint() const;
 
 private:
-    bool start(std::vector<std::string> arguments, int input, std::string& error);
+    bool start(const std::string& options, const std::string& output, int input, std::string& error);
     int wait();
 
     pid_t pid_ = -1;

@@ -55,26 +55,11 @@ std::optional<Picture> loadPicture(const std::string& path, std::string& error, 
     if (!S_ISREG(status.st_mode)) return fail("it is not a regular file");
 
     // Through a pipe ffmpeg tells by the content what it is, and a play list cannot have it open other files.
-    const std::vector<std::string> arguments = {
-        "-max_pixels",
-        std::to_string(mostPixels),
-        "-protocol_whitelist",
-        "pipe",
-        "-i",
-        "pipe:0",
-        "-frames:v",
-        "1",
-        "-sws_flags",
-        "bicubic+accurate_rnd+full_chroma_int",
-        "-f",
-        "image2pipe",
-        "-c:v",
-        "pam",
-        "-pix_fmt",
-        "rgba",
-        "pipe:1"};
+    const std::string options = "-max_pixels " + std::to_string(mostPixels) +
+                                " -protocol_whitelist pipe -i pipe:0 -frames:v 1"
+                                " -sws_flags bicubic+accurate_rnd+full_chroma_int -f image2pipe -c:v pam -pix_fmt rgba";
     Ffmpeg ffmpeg;
-    if (!ffmpeg.startReading(arguments, input, kMostSeconds, error)) return fail(error);
+    if (!ffmpeg.startReading(options, input, kMostSeconds, error)) return fail(error);
     std::optional<Picture> picture = readPam(ffmpeg.pipe());
     if (!ffmpeg.finish(error)) return fail(error);
     if (!picture) return fail("ffmpeg finds no picture in it");
@@ -87,8 +72,6 @@ std::optional<Picture> loadPicture(const std::string& path, std::string& error, 
 
 bool savePicture(const Picture& picture, const std::string& path, std::string& error) {
     Ffmpeg ffmpeg;
-    const std::vector<std::string> output = {"-c:v",     "png",       "-pred", "mixed",      "-pix_fmt",    "rgb24",
-                                             "-flags:v", "+bitexact", "-f",    "image2pipe", "file:" + path};
-    return ffmpeg.startWriting(picture.width, picture.height, 1, output, error) && ffmpeg.write(picture, error) &&
-           ffmpeg.finish(error);
+    return ffmpeg.startWriting(picture.width, picture.height, 1, std::string(kPng) + " -f image2pipe", path, error) &&
+           ffmpeg.write(picture, error) && ffmpeg.finish(error);
 }

@@ -14,5 +14,8 @@ constexpr int kMostPixels = 200'000'000;
 // why in `error`. Says on standard error what is wrong with a damaged picture.
 std::optional<Picture> loadPicture(const std::string& path, std::string& error, int mostPixels = kMostPixels);
 
+// How ffmpeg writes PNGs.
+constexpr char kPng[] = "-c:v png -pred mixed -pix_fmt rgb24";
+
 // Writes a PNG. On failure says why in `error`.
 bool savePicture(const Picture& picture, const std::string& path, std::string& error);

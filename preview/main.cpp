@@ -23,6 +23,8 @@ enum Exit { done = 0, failed = 1, wrongUse = 2, endedEarly = 130 };
 
 const std::map<std::string, Ground> kGrounds = {
     {"pool", Ground::pool}, {"river", Ground::river}, {"shore", Ground::shore}};
+const std::map<std::string, Quality> kQualities = {
+    {"low", Quality::low}, {"medium", Quality::medium}, {"high", Quality::high}};
 
 int fail(Exit code, const std::string& reason) {
     std::fprintf(stderr, "tidemark-preview: %s%s\n", reason.c_str(), code == wrongUse ? "; see --help" : "");
@@ -89,8 +91,9 @@ std::string contradiction(const PreviewOptions& options) {
     if (!writesClip && options.still.empty() && options.inside.empty()) {
         return "nothing to do: name a --video, --out, --still or --inside to write, or open a --window";
     }
-    if (isWide && !options.portrait.empty()) return "--portrait is for a view that is taller than this one is wide";
-    if (!isWide && !options.landscape.empty()) return "--landscape is for a view that is wider than this one is tall";
+    // Who names both need not mind the view.
+    if (isWide && options.landscape.empty() && !options.portrait.empty()) return "--portrait is not for a wide view";
+    if (!isWide && options.portrait.empty() && !options.landscape.empty()) return "--landscape is for a wide view";
     if (!options.inside.empty() && !options.withInk) return "--inside needs ink";
     if (options.loop && !writesClip) return "--loop is for a --video or --out";
     if (options.at && options.seconds && *options.at > *options.seconds) return "--at is after the end of --seconds";
@@ -114,7 +117,8 @@ int main(int argc, char** argv) {
     CLI::App app("Draws rippling water over a picture into a video, PNG files or a window.");
     app.get_formatter()->column_width(28);
     app.footer(
-        std::string("Keys in the window: ") + kWindowKeys +
+        std::string("Pictures are all that ffmpeg reads; transparent parts are white.\nKeys in the window: ") +
+        kWindowKeys +
         ".\n"
         "Ctrl-C ends a run early, with the frames that it has drawn.\n"
         "Ends with 0 when all is done, 1 when that fails, 2 for a wrong option, 130 after Ctrl-C.");
@@ -123,112 +127,74 @@ int main(int argc, char** argv) {
         "--list", [] { throw CLI::CallForVersion(listNames(), 0); }, "List the scenes, looks and pictures with names");
     // So that a script's own options may come first.
     app.option_defaults()->multi_option_policy(CLI::MultiOptionPolicy::TakeLast);
+    const auto add = [&](const char* name, auto& value, const char* type, const char* help) {
+        return app.add_option(name, value, help)->type_name(type);
+    };
 
     app.option_defaults()->group("Scene");
     std::vector<std::string> presets;
     for (const Preset& named : kPresets) presets.emplace_back(named.name);
-    app.add_option("--preset", preset, "Look, picture, ink and rain with a name")
-        ->check(CLI::IsMember(presets))
-        ->type_name("NAME");
+    add("--preset", preset, "NAME", "Look, picture, ink and rain with a name")->check(CLI::IsMember(presets));
     CLI::Option* const both =
-        app.add_option("--picture", picture, "Picture under the water, painted or a file; default: pool")
-            ->type_name("pool|river|shore|FILE");
-    app.add_option("--portrait", options.portrait, "Picture for a view that is taller than wide")
-        ->excludes(both)
-        ->type_name("FILE");
-    app.add_option("--landscape", options.landscape, "Picture for a view that is wider than tall")
-        ->excludes(both)
-        ->type_name("FILE");
-    app.add_option("--light", options.light, "Picture of the light on the waves")->type_name("FILE");
-    app.add_option(
-           "--look", options.look,
-           "Values of the look, above those of the preset: lines of \"key = number\", as in host/look.properties")
-        ->type_name("FILE");
-    CLI::Option* const script =
-        app.add_option(
-               "--script", options.script, "Touches to play: a scene, or lines of \"time_ms action x y pressure\"")
-            ->type_name("NAME|FILE");
+        add("--picture", picture, "pool|river|shore|FILE", "Picture under the water, painted or a file; default: pool");
+    add("--portrait", options.portrait, "FILE", "Picture for a view that is taller than wide")->excludes(both);
+    add("--landscape", options.landscape, "FILE", "Picture for a view that is wider than tall")->excludes(both);
+    add("--light", options.light, "FILE", "Picture of the light on the waves");
+    add("--look", options.look, "FILE",
+        "Values of the look, above those of the preset: lines of \"key = number\", as in host/look.properties");
     app.add_flag("--rain", options.rain, "Let it rain; without --script it always does");
-    CLI::Option* const ink =
-        app.add_option("--ink", options.inkColor, "Colour of the ink that touches drop, each channel at most bf")
-            ->transform(CLI::Validator(readColor, "", "color"))
-            ->type_name("#rrggbb");
+    CLI::Option* const ink = add("--ink", options.inkColor, "#rrggbb", "Colour of the ink, each channel at most bf")
+                                 ->transform(CLI::Validator(readColor, ""));
     CLI::Option* const withoutInk = app.add_flag("--no-ink", noInk, "Water without ink")->excludes(ink);
-    app.add_option("--seed", options.seed, "Seed of the random numbers")->capture_default_str();
-
-    app.option_defaults()->group("View");
-    CLI::Option* const view = app.add_option("--size", size, "Size of the view in pixels; default: 540x960")
+    add("--seed", options.seed, "N", "Seed of the random numbers")->capture_default_str();
+    CLI::Option* const view = add("--size", size, "WxH", "Size of the view in pixels; default: 540x960")
                                   ->delimiter('x')
                                   ->multi_option_policy(CLI::MultiOptionPolicy::Throw)
-                                  ->check(CLI::Range(1, kLongestSide))
-                                  ->type_name("WxH");
-    std::vector<CLI::Option*> recorded = {script};
-    recorded.push_back(app.add_option("--density", density, "Pixels of the display for each density-independent pixel")
-                           ->check(CLI::Range(0.5, 8.0))
-                           ->check(CLI::Validator(readNumber, ""))
-                           ->capture_default_str());
-    recorded.push_back(
-        app.add_option("--quality", quality, "Draw at most 1, 2 or 3 pixels for each density-independent pixel")
-            ->transform(CLI::CheckedTransformer(
-                            std::map<std::string, Quality>{
-                                {"low", Quality::low}, {"medium", Quality::medium}, {"high", Quality::high}})
-                            .description(""))
-            ->type_name("low|medium|high"));
-    const auto seconds = [&](const char* name, std::optional<double>& time, const char* help) {
-        recorded.push_back(app.add_option(name, time, help)
-                               ->check(CLI::Range(0.001, 3600.0))
-                               ->check(CLI::Validator(readNumber, ""))
-                               ->type_name("SECONDS"));
-        return recorded.back();
-    };
-    seconds("--seconds", options.seconds, "Length of the scene; default: a little more than the script");
-    // The host takes longer frames for a pause.
-    CLI::Option* const fps = app.add_option(
-                                    "--fps", options.framesPerSecond,
-                                    "Frames per second; default: 60, and 50 for a GIF, which shows no more")
-                                 ->check(CLI::Range(4, 240));
-    recorded.push_back(fps);
+                                  ->check(CLI::Range(1, kLongestSide));
 
-    app.option_defaults()->group("Output");
-    const auto output = [&](const char* name, std::string& path, const char* help) {
-        recorded.push_back(app.add_option(name, path, help));
-        return recorded.back();
-    };
-    CLI::Option* const video = output("--video", options.video, "Video to write")
-                                   ->check(endingIn({".mp4", ".webp", ".gif"}))
-                                   ->type_name("FILE.mp4|.webp|.gif");
-    CLI::Option* const crf = app.add_option("--crf", options.crf, "Quality of an MP4: less is better and larger")
+    const std::string clip = "What a run without a window draws and writes";
+    app.option_defaults()->group(clip);
+    const CLI::Validator isNumber(readNumber, "");
+    const CLI::Range time(0.001, 3600.0);
+    add("--script", options.script, "NAME|FILE",
+        "Touches to play: a scene, or lines of \"time_ms action x y pressure\"");
+    add("--density", density, "N", "Pixels of the display for each density-independent pixel; default: 1")
+        ->check(CLI::Range(0.5, 8.0))
+        ->check(isNumber);
+    add("--quality", quality, "low|medium|high", "Draw at most 1, 2 or 3 pixels for each density-independent pixel")
+        ->transform(CLI::CheckedTransformer(kQualities).description(""));
+    add("--seconds", options.seconds, "N", "Length of the scene; default: a little more than the script")
+        ->check(time)
+        ->check(isNumber);
+    // The host takes longer frames for a pause.
+    CLI::Option* const fps =
+        add("--fps", options.framesPerSecond, "N", "Frames per second; default: 60, and 50 for a GIF")
+            ->check(CLI::Range(4, 240));
+    CLI::Option* const video = add("--video", options.video, "FILE.mp4|.webp|.gif", "Video to write")
+                                   ->check(endingIn({".mp4", ".webp", ".gif"}));
+    CLI::Option* const crf = add("--crf", options.crf, "N", "Quality of an MP4: less is better and larger; default: 18")
                                  ->check(CLI::Range(0, 51))
-                                 ->needs(video)
-                                 ->capture_default_str();
-    CLI::Option* const out =
-        output("--out", options.out, "Folder for all frames: frame-0000.png and so on")->type_name("FOLDER");
-    recorded.push_back(app.add_option("--every", options.every, "Write every Nth frame as a picture")
-                           ->check(CLI::Range(1, 1'000'000))
-                           ->needs(out)
-                           ->type_name("N"));
-    CLI::Option* const still = output("--still", options.still, "One frame to write, the last one or that of --at")
-                                   ->check(endingIn({".png"}))
-                                   ->type_name("FILE.png");
-    seconds("--at", options.at, "Time of that frame")->needs(still);
-    CLI::Option* const inside = output(
-                                    "--inside", options.inside,
-                                    "Folder for pictures of the heights, the flow and the ink behind the last frame")
-                                    ->excludes(withoutInk)
-                                    ->type_name("FOLDER");
-    recorded.push_back(crf);
-    recorded.push_back(inside);
-    recorded.push_back(app.add_flag("--loop", options.loop, "A clip whose end leads over to its beginning"));
-    app.add_flag("--force", options.force, "Overwrite what is there");
+                                 ->needs(video);
+    app.add_flag("--loop", options.loop, "A clip whose end leads over to its beginning");
+    CLI::Option* const out = add("--out", options.out, "FOLDER", "Folder for all frames: frame-0000.png and so on");
+    add("--every", options.every, "N", "Write every Nth frame as a picture")
+        ->check(CLI::Range(1, 1'000'000))
+        ->needs(out);
+    CLI::Option* const still = add("--still", options.still, "FILE.png", "One frame to write, the last or that of --at")
+                                   ->check(endingIn({".png"}));
+    add("--at", options.at, "N", "Seconds to that frame")->check(time)->check(isNumber)->needs(still);
+    add("--inside", options.inside, "FOLDER",
+        "Folder for pictures of the heights, the flow and the ink behind the last frame")
+        ->excludes(withoutInk);
 
     app.option_defaults()->group("Window");
     app.add_flag("--window", options.inWindow, "Open a window and touch the water with the mouse");
     app.add_flag("--fullscreen", options.fullscreen, "The same on the whole screen")->excludes(view);
-    app.add_option("--record", options.record, "Touch script to write with the touches in the window")
-        ->check(endingIn({".touch"}))
-        ->type_name("FILE.touch");
+    add("--record", options.record, "FILE.touch", "Touch script to write with the touches in the window")
+        ->check(endingIn({".touch"}));
 
     app.option_defaults()->group("Other");
+    app.add_flag("--force", options.force, "Overwrite what is there");
     app.add_flag("--verbose", verbose, "Show the library's log");
     try {
         app.parse(argc, argv);
@@ -239,8 +205,9 @@ int main(int argc, char** argv) {
     }
 
     options.inWindow |= options.fullscreen;
-    for (const CLI::Option* const option : recorded) {
-        if (*option && options.inWindow) return fail(wrongUse, option->get_name() + " is not for a window");
+    for (const CLI::Option* const option : app.get_options()) {
+        if (!options.inWindow || !*option || option->get_group() != clip) continue;
+        return fail(wrongUse, option->get_name() + " is not for a window");
     }
     options.size = {size.first, size.second};
     if (quality) options.size = drawnSize({size.first / density, size.second / density, density}, *quality, 1.0);
@@ -252,11 +219,11 @@ int main(int argc, char** argv) {
         options.rain |= named.rain;
         options.withInk = (named.ink || *ink) && !noInk;
     }
-    const auto ground = kGrounds.find(picture);
-    if (ground != kGrounds.end())
+    if (const auto ground = kGrounds.find(picture); ground != kGrounds.end()) {
         options.ground = ground->second;
-    else
+    } else {
         options.picture = picture;
+    }
     if (!*fps && options.video.ends_with(".gif")) options.framesPerSecond = 50;
     if (*crf && !options.video.ends_with(".mp4")) return fail(wrongUse, "--crf is for an MP4");
     if (const std::string reason = contradiction(options); !reason.empty()) return fail(wrongUse, reason);

@@ -23,36 +23,15 @@ int countFrames(const fs::path& folder) {
     return count;
 }
 
-std::vector<std::string> videoFormat(const std::string& ending, int crf) {
+std::string videoFormat(const std::string& ending, int crf) {
     if (ending == ".gif") {
-        return {"-filter_complex",
-                "split[seen][kept];[seen]palettegen[palette];[kept][palette]paletteuse",
-                "-loop",
-                "0",
-                "-f",
-                "gif"};
+        return "-filter_complex split[seen][kept];[seen]palettegen[palette];[kept][palette]paletteuse -loop 0 -f gif";
     }
-    if (ending == ".webp") return {"-c:v", "libwebp_anim", "-quality", "80", "-loop", "0", "-f", "webp"};
+    if (ending == ".webp") return "-c:v libwebp_anim -quality 80 -loop 0 -f webp";
     // H.264 halves the resolution of the colours, so it wants even sides.
-    return {
-        "-vf",
-        "pad=ceil(iw/2)*2:ceil(ih/2)*2,scale=out_color_matrix=bt709:out_range=tv",
-        "-c:v",
-        "libx264",
-        "-crf",
-        std::to_string(crf),
-        "-pix_fmt",
-        "yuv420p",
-        "-colorspace",
-        "bt709",
-        "-color_primaries",
-        "bt709",
-        "-color_trc",
-        "bt709",
-        "-movflags",
-        "+faststart",
-        "-f",
-        "mp4"};
+    return "-vf pad=ceil(iw/2)*2:ceil(ih/2)*2,scale=out_color_matrix=bt709:out_range=tv -c:v libx264 -pix_fmt yuv420p"
+           " -colorspace bt709 -color_primaries bt709 -color_trc bt709 -movflags +faststart -f mp4 -crf " +
+           std::to_string(crf);
 }
 
 bool cannotWrite(const std::string& what, std::string& error) {
@@ -99,17 +78,14 @@ bool Output::openFrames(std::string& error) {
     for (const char c : part.string()) folder += c == '%' ? "%%" : std::string(1, c);
     return pictures_.startWriting(
         options_.size.width, options_.size.height, options_.framesPerSecond,
-        {"-c:v", "png", "-pred", "mixed", "-pix_fmt", "rgb24", "-flags:v", "+bitexact", "-start_number", "0", "-f",
-         "image2", "file:" + folder + "/frame-%04d.png"},
-        error);
+        std::string(kPng) + " -start_number 0 -f image2", folder + "/frame-%04d.png", error);
 }
 
 bool Output::openVideo(std::string& error) {
-    if (!videoFile_.make(options_.video, options_.force, error)) return false;
-    std::vector<std::string> output = videoFormat(fs::path(options_.video).extension(), options_.crf);
-    // The time of day and the encoder's version stay out of the file.
-    output.insert(output.end(), {"-fflags", "+bitexact", "-flags:v", "+bitexact", "file:" + videoFile_.part()});
-    return video_.startWriting(options_.size.width, options_.size.height, options_.framesPerSecond, output, error);
+    const std::string format = videoFormat(fs::path(options_.video).extension(), options_.crf);
+    return videoFile_.make(options_.video, options_.force, error) &&
+           video_.startWriting(
+               options_.size.width, options_.size.height, options_.framesPerSecond, format, videoFile_.part(), error);
 }
 
 bool Output::write(const Picture& frame, std::string& error) {

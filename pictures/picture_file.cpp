@@ -56,7 +56,7 @@ std::optional<Picture> loadPicture(const std::string& path, std::string& error, 
 
     // Through a pipe ffmpeg tells by the content what it is, and a play list cannot have it open other files.
     const std::string options = "-max_pixels " + std::to_string(mostPixels) +
-                                " -protocol_whitelist pipe -i pipe:0 -frames:v 1"
+                                " -i pipe:0 -frames:v 1"
                                 " -sws_flags bicubic+accurate_rnd+full_chroma_int -f image2pipe -c:v pam -pix_fmt rgba";
     Ffmpeg ffmpeg;
     if (!ffmpeg.startReading(options, input, kMostSeconds, error)) return fail(error);

@@ -112,13 +112,14 @@ std::optional<std::vector<TouchEvent>> loadTouchScript(const std::string& path, 
 
 std::string writeTouchScript(const std::vector<TouchEvent>& events) {
     std::string text = "# time_ms action x y pressure\n";
-    for (const auto& [timeMs, action, x, y, pressure] : events) {
-        const auto* const named = std::find_if(
-            std::begin(kActions), std::end(kActions), [&](const auto& known) { return known.second == action; });
+    for (const TouchEvent& event : events) {
+        const auto* const action = std::find_if(
+            std::begin(kActions), std::end(kActions), [&](const auto& known) { return known.second == event.action; });
         char line[160];
         std::snprintf(
-            line, sizeof line, "%lld %s %.3f%s %.3f%s %.2f\n", static_cast<long long>(timeMs), named->first.data(),
-            x.value, x.percent ? "%" : "", y.value, y.percent ? "%" : "", static_cast<double>(pressure));
+            line, sizeof line, "%lld %s %.3f%s %.3f%s %.2f\n", static_cast<long long>(event.timeMs),
+            action->first.data(), event.x.value, event.x.percent ? "%" : "", event.y.value, event.y.percent ? "%" : "",
+            static_cast<double>(event.pressure));
         text += line;
     }
     return text;

@@ -48,7 +48,7 @@ function(embed_presets ini folder)
 
 #include \"host/look.h\"
 
-// What the water lies over: tiles, pebbles or sand.
+// The picture under the water: tiles, pebbles or sand.
 enum class Ground { pool, river, shore };
 
 // A look with a name.

@@ -23,7 +23,7 @@ public enum Preset {
     /** Deep swell. */
     DEEP_SWELL("Deep swell", Ground.POOL, false, false);
 
-    /** What the water lies over. */
+    /** The picture under the water. */
     public enum Ground {
         /** Glazed tiles. */
         POOL,

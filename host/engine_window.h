@@ -13,9 +13,9 @@ struct EngineView {
     std::vector<float> density;
     int inkWidth, inkHeight;
 
-    // What a unit of density adds to the divisor of red, green and blue.
+    // One unit of density adds this to the divisor of red, green and blue.
     float tint[3];
 };
 
-// What the last frame has left. Needs the context current and a set-up with ink; leaves framebuffer 0 bound.
+// The engine's state after the last frame. Needs the context current and a set-up with ink; leaves framebuffer 0 bound.
 EngineView lookIntoEngine();

@@ -18,7 +18,8 @@
 
 struct LookField;
 
-// What a pen's pressure, 0 to 1, counts: 0.3 to 1.5. A finger or a mouse, whose pressure is not worth much, counts 1.
+// The weight of a pen's pressure of 0 to 1: 0.3 to 1.5. A finger or a mouse weighs 1, as few screens measure its
+// pressure.
 float penWeight(float pressure);
 
 class LiveWater {
@@ -72,8 +73,8 @@ public:
     // Nothing is drawn before all three pictures were there once. `which` is a sum of k...Picture.
     void picturesChanged(unsigned which);
 
-    // What a face multiplies a picture's colours by before it hands it over, see shade.h. A look that changes it has
-    // the pictures handed over again.
+    // The factors that a face multiplies a picture's colours by before it hands it over, see shade.h. A look that
+    // changes it has the pictures handed over again.
     Shade shade(PictureSlot slot, float brightness) const { return shadeOf(host_.look(), slot, brightness); }
 
     // Where the framebuffer has lost the last frame.
@@ -124,7 +125,7 @@ private:
     bool isRunning_ = false;  // or the last frame was before a rest
     double now_ = 0.0;        // of the last frame
 
-    // What the library has not been told yet; the next frame does, where the context is current.
+    // Changes that the next frame passes to the library, because the context is current only there.
     bool setUpDue_ = false;
     unsigned pictureDue_ = 0;   // to be handed over
     unsigned texturesDue_ = 0;  // besides those

@@ -17,7 +17,7 @@ struct Picture {
     bool operator==(const Picture&) const = default;
 };
 
-// What the water lies over in portrait and in landscape, and the light that its waves throw back.
+// The pictures under the water in portrait and in landscape, and the light that its waves reflect.
 struct Pictures {
     Picture portrait, landscape, light;
 };

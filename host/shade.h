@@ -1,4 +1,4 @@
-// What the colours of a picture are multiplied by when it is handed over.
+// Factors for the colours of a picture, which apply when it is handed over.
 #pragma once
 
 #include "host/look.h"

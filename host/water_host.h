@@ -1,6 +1,6 @@
-// What an app does around the library, in the order that the library asks for: owns the mesh arrays, the view, the
-// transform and the lighting values, turns touches and rain into ripples, steps water and ink in time and tells when
-// there is nothing new to draw. LiveWater puts it on a screen; what only renders pictures may drive it directly.
+// Does the work of an app around the library, in the order that the library requires: owns the mesh arrays, the view,
+// the transform and the lighting values, turns touches and rain into ripples, steps water and ink in time and tells
+// when there is nothing new to draw. LiveWater puts it on a screen; what only renders pictures may drive it directly.
 //
 // Call everything on the one thread that owns the OpenGL ES 2.0 context.
 #pragma once

@@ -1,4 +1,4 @@
-// What pictures are painted on.
+// The surface that painters draw on.
 #pragma once
 
 #include <algorithm>

@@ -109,7 +109,7 @@ std::string Ffmpeg::complaint() const {
     while (text.starts_with('[') && text.find("] ") != text.npos) text.erase(0, text.find("] ") + 2);
     if (text.starts_with("pipe:0: ")) text.erase(0, 8);
     text.resize(std::min(text.size(), text.find(", see the documentation")));
-    // What it quotes from a file may be anything, and a terminal might obey it.
+    // ffmpeg may quote any bytes of the file, which a terminal could take for commands.
     std::replace_if(
         text.begin(), text.end(), [](char c) { return c < ' ' || c > '~'; }, '?');
     return text;

@@ -136,7 +136,7 @@ void drawPebble(Canvas& canvas, const Pebble& pebble, const CloudTile& clouds) {
         const float light = 0.20f + 1.35f * diffuse * (0.6f + 0.4f * diffuse);
         const float glint = 0.05f * gloss * gloss * gloss * gloss;
         const Rgb stone = stoneColour(pebble, clouds, u, v, column, row);
-        // What does not face the sun is lit by the blue of the sky.
+        // The blue sky lights the sides that do not face the sun.
         const Rgb lit = {stone.r * light + glint, stone.g * (light + 0.03f) + glint, stone.b * (light + 0.08f) + glint};
         pixel = mix(pixel, lit, coverage);
     });

@@ -6,7 +6,7 @@
 
 #include "host/picture.h"
 
-// What the largest phone cameras take. Reading one needs a few times four bytes for each pixel.
+// The size of the largest phone cameras' photos. Reading one needs a few times four bytes for each pixel.
 constexpr int kMostPixels = 200'000'000;
 
 // A picture of any kind that ffmpeg reads, turned as the camera was held where a JPEG tells, over white where it is

@@ -39,7 +39,7 @@ float sampleHalf(const std::vector<float>& net, int netWidth, int netHeight, int
     return 0.5625f * at(x, y) + 0.1875f * (at(besideX, y) + at(x, besideY)) + 0.0625f * at(besideX, besideY);
 }
 
-// What the eye sees of a stone under `depth` of water: 0 is shallow and warm, 1 deep and blue-green.
+// The colour of a stone under `depth` of water: 0 is shallow and warm, 1 deep and blue-green.
 Rgb underWater(Rgb stone, float depth, float caustic) {
     const float sun = (1.30f + 0.28f * std::min(caustic, 3.0f)) * (1.30f - 0.50f * depth);
     return {

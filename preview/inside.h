@@ -1,4 +1,4 @@
-// What lies behind a frame with ink, drawn to be looked at.
+// Draws the heights, the flow and the density behind a frame with ink.
 #pragma once
 
 #include <array>

@@ -82,7 +82,7 @@ std::string readNumber(std::string& text) {
     return text.find_first_not_of("0123456789.") == text.npos ? "" : text + " is not a number above 0";
 }
 
-// What options say together that none of them says alone; empty when all is well.
+// Returns why the options contradict each other, or an empty text.
 std::string contradiction(const PreviewOptions& options) {
     const bool isWide = options.size.width > options.size.height;
     const bool writesClip = !options.video.empty() || !options.out.empty();

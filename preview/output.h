@@ -1,4 +1,4 @@
-// What a run writes.
+// The files that a run writes.
 #pragma once
 
 #include <filesystem>

@@ -8,7 +8,7 @@
 #include "host/presets.h"
 #include "host/view_size.h"
 
-// What is left empty is the painted picture or the look of the base, no script, or no such output.
+// An empty picture means the painted one, an empty look that of the preset, an empty script none, an empty output none.
 struct PreviewOptions {
     std::string picture, portrait, landscape, light;  // files; the first where the next two are empty
     Ground ground = Ground::pool;                     // the painted picture

@@ -1,4 +1,4 @@
-// What a run is at, on standard error; nothing where nobody watches.
+// Shows the progress of a run on standard error, if that is a terminal.
 #pragma once
 
 #include <chrono>

@@ -1,4 +1,4 @@
-// What the options of a run ask for, made ready.
+// Prepares the pictures, the look and the script that the options of a run name.
 #pragma once
 
 #include <optional>

@@ -12,8 +12,8 @@ public:
     // Both counted in frames; without a fade every frame is as it is.
     Seam(int round, int fade) : round_(round), fade_(fade) {}
 
-    // What the clip shows for a frame of the scene, counted from 0 to round + fade: null for nothing. Stays as it is
-    // until the next call.
+    // Returns the clip's frame for a frame of the scene, counted from 0 to round + fade: null for nothing. Stays as it
+    // is until the next call.
     const Picture* shown(int number, const Picture& frame);
 
 private:

@@ -53,7 +53,7 @@ protected:
 
     std::vector<Rgba> seen() const { return readPixels(kWidth, kHeight); }
 
-    // What the next frame tells the library: P, L and W for hand-overs, | for a set-up, p, l and w for texture loads.
+    // The calls that the next frame makes: P, L and W for hand-overs, | for a set-up, p, l and w for texture loads.
     std::string told(double seconds = 1.0 / 60) {
         constexpr std::uint32_t kMark = 4711;
         AndroidBitmapInfo* const slots[] = {&bmp_portrait_bg_info, &bmp_landscape_bg_info, &bmp_water_Info};

@@ -27,7 +27,7 @@ Point finger(double time) {
     return {110 + 320 * along, 480 + 250 * std::sin(5 * along)};
 }
 
-// What the ink does at each of its steps: -2 for no drag, else the class of its speed.
+// One entry for each step of the ink: -2 without a drag, else the class of its speed.
 std::vector<int> classes;
 
 class Strokes : public GlTest {

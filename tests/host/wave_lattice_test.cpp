@@ -18,7 +18,7 @@ struct Ring {
     float height;
 };
 
-// What a mesh of `vertices` a side shows of a drop in the middle, half a second later.
+// Measures the ring of a drop in the middle, half a second later, on a mesh of `vertices` a side.
 Ring ringAfterHalfASecond(const Look& look, int width, int height, int vertices) {
     const WaveLattice lattice = latticeFor(look, width, height);
     const int n = lattice.points;

@@ -19,7 +19,7 @@ protected:
         std::filesystem::remove_all(directory_);
     }
 
-    // What a command line of the shell writes to its outputs, and its exit code, as a line, behind that.
+    // Returns the output of a shell command and, as a last line, its exit code.
     static std::string run(const std::string& command) {
         std::FILE* const shell = popen(("exec 2>&1; timeout 60 " + command + "; echo $?").c_str(), "r");
         std::string output;

@@ -18,7 +18,7 @@ protected:
         send(events);
     }
 
-    // What the server shows of a rectangle; the window stands in the upper left corner.
+    // Reads a rectangle of the screen; the window is in the upper left corner.
     static std::string grab(const std::string& size, const std::string& place, const std::string& filter) {
         return run(
             "ffmpeg -v error -fpsprobesize 0 -f x11grab -draw_mouse 0 -video_size " + size + " -i $DISPLAY+" + place +

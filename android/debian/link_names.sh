@@ -13,6 +13,6 @@ mapfile -t gl < <(sed -nE 's/^GL_APICALL .* GL_APIENTRY (gl\w+).*/\1/p' /usr/inc
 library libGLESv2.so "${gl[@]}"
 library liblog.so __android_log_print
 library libjnigraphics.so AndroidBitmap_{getInfo,lockPixels,unlockPixels}
-library libm.so ceil ceilf exp floor floorf lround lroundf sin
+library libm.so ceil ceilf cos exp floor floorf lround lroundf pow sin sincos
 library libc.so __cxa_atexit abort free lrand48 malloc memcmp memcpy memmove memset realloc strlen \
     __aeabi_{idiv,memclr,memclr4,memclr8,memcpy,memcpy4,memcpy8,memmove,memmove4,memmove8}

@@ -91,6 +91,17 @@ NATIVE(void, setInk)(JNIEnv* env, jobject self, jboolean withInk) {
 NATIVE(void, setRain)(JNIEnv* env, jobject self, jboolean falling) {
     liveOf(env, self).setRain(falling);
 }
+NATIVE(void, setBreezeAlways)(JNIEnv* env, jobject self, jboolean always) {
+    liveOf(env, self).setBreezeAlways(always);
+}
+
+// As a colour of Android's, opaque.
+NATIVE(jint, shade)(JNIEnv* env, jobject self, jint slot, jfloat brightness) {
+    const Shade shade = liveOf(env, self).shade(static_cast<PictureSlot>(slot), brightness);
+    const auto channel = [](float share) { return static_cast<std::uint32_t>(share * 255.0f + 0.5f); };
+    const std::uint32_t rgb = channel(shade.red) << 16 | channel(shade.green) << 8 | channel(shade.blue);
+    return static_cast<jint>(0xff000000u | rgb);
+}
 NATIVE(void, clearInk)(JNIEnv* env, jobject self) {
     liveOf(env, self).clearInk();
 }

@@ -43,6 +43,10 @@ public final class Bitmap {
         return colors[y * width + x];
     }
 
+    public int getPixel(int x, int y) {
+        return color(x, y);
+    }
+
     public static Bitmap createBitmap(int[] colors, int width, int height, Config config) {
         return new Bitmap(colors.clone(), width, height, config);
     }

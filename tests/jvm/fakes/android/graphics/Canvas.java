@@ -1,11 +1,24 @@
 package android.graphics;
 
-/** Draws whole pictures. */
+/** Draws whole pictures, and multiplies them by an opaque colour. */
 public class Canvas {
     private final Bitmap target;
 
     public Canvas(Bitmap target) {
         this.target = target;
+    }
+
+    public void drawColor(int color, PorterDuff.Mode mode) {
+        if (mode != PorterDuff.Mode.MULTIPLY) throw new IllegalArgumentException(mode.name());
+        int[] colors = new int[target.getWidth() * target.getHeight()];
+        for (int i = 0; i < colors.length; ++i) {
+            int before = target.color(i % target.getWidth(), i / target.getWidth());
+            for (int shift = 0; shift < 32; shift += 8) {
+                int product = (before >>> shift & 255) * (color >>> shift & 255);
+                colors[i] |= (product + 127) / 255 << shift;
+            }
+        }
+        target.fill(colors);
     }
 
     /** As the platform's filter, which takes four pixels for one, however many there are. */

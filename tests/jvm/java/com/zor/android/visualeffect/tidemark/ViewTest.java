@@ -346,7 +346,7 @@ public final class ViewTest {
     public void aLookIsTakenAtAnyTime() {
         start();
         drawUntilRest();
-        Look look = new Look();
+        Look look = plainLook();
         look.meshVertices = 64;
         look.stepsToRest = 5;
         view.setLook(look);
@@ -363,6 +363,47 @@ public final class ViewTest {
         assertEquals(List.of(0xff99080d, 12f, 12f),
                 List.of(view.getInkColor(), view.getRain(), view.getLook().rainDropsPerSecond));
         expectColor(RED);
+    }
+
+    @Test
+    public void aLookColoursBrightPicturesAndDarkOnes() {
+        start();
+        view.setPicture(0xffffffff);
+        drawUntilRest();
+        Look look = plainLook();
+        look.wet = 0.6f;
+        view.setLook(look);
+        drawUntilRest();
+        expectColor(0xffa0acb9);  // 1 - 0.6 times what water takes at most
+        look.groundRed = 0.5f;
+        view.setLook(look);
+        view.setPicture(GREEN & 0xff3f3f3f);
+        drawUntilRest();
+        expectColor(0xff002010);
+        view.setPicture(RED);
+        drawUntilRest();
+        expectColor(0xff5c3e2e);  // of this brightness, a tenth of it
+    }
+
+    @Test
+    public void aBreezeFollowsATouchOrBlowsAlwaysButNotInReducedMotion() {
+        start();
+        drawUntilRest();
+        view.setLook(new Look());
+        touch(MotionEvent.ACTION_DOWN, 20, 40);
+        int frames = drawUntilRest();
+        assertTrue(frames + " frames of a breeze after a touch", frames > 480 && frames < 1200);
+        view.setBreezeAlways(true);
+        for (int i = 0; i < 1200; ++i) assertTrue("frames of a breeze", Screen.goOn());
+        view.setMotion(Motion.REDUCED);
+        framesSeen = Screen.frames;
+        assertTrue("the breeze ends", drawUntilRest() < 480);
+        view.setLook(plainLook());
+        Look breezy = new Look();
+        view.setLook(breezy);
+        touch(MotionEvent.ACTION_DOWN, 20, 40);
+        assertTrue("ripples alone", drawUntilRest() < 480);
+        assertEquals("what is set stays", breezy, view.getLook());
     }
 
     @Test
@@ -430,6 +471,7 @@ public final class ViewTest {
 
         TestView() {
             super(new TestActivity());
+            setLook(plainLook());
         }
 
         @Override
@@ -521,6 +563,14 @@ public final class ViewTest {
         int most = 0;
         for (int i = 0; i < one.length; ++i) most = Math.max(most, Math.abs((one[i] & 255) - (other[i] & 255)));
         return most;
+    }
+
+    // Rests as soon as the waves are gone, and leaves pictures their colours.
+    private static Look plainLook() {
+        Look look = new Look();
+        look.breeze = 0;
+        look.wet = 0;
+        return look;
     }
 
     private static Bitmap plain(Bitmap.Config config, int argb) {

@@ -5,6 +5,7 @@ final class Choices implements Cloneable {
     Look look = new Look();
     boolean withInk;
     boolean rains;
+    boolean breezeAlways;
     boolean isReduced;  // only touches move the water
     boolean isPaused;
     Quality quality = Quality.AUTO;
@@ -23,12 +24,19 @@ final class Choices implements Cloneable {
         return rains && !isReduced;
     }
 
+    Look lookInMotion() {
+        Look result = look.clone();
+        if (isReduced) result.breeze = 0;
+        return result;
+    }
+
     void applyTo(NativeWater water) {
         water.setQuality(quality.ordinal());
         if (hasView()) water.setView(width, height, density, TidemarkRenderer.now());
-        water.setLook(look);
+        water.setLook(lookInMotion());
         water.setInk(withInk);
         water.setRain(rainFalls());
+        water.setBreezeAlways(breezeAlways);
         if (pictures != null) water.setPictures(pictures);
     }
 

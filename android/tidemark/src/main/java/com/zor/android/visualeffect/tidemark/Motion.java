@@ -4,7 +4,7 @@ package com.zor.android.visualeffect.tidemark;
 public enum Motion {
     /** {@link #REDUCED} where the user has switched the system's animations off, otherwise {@link #FULL}. */
     AUTO,
-    /** It rains, and the first drop falls, where they are switched on. */
+    /** It rains, the first drop falls, and a breeze follows a touch, where the view and its look say so. */
     FULL,
     /** Only touches and calls move the water. */
     REDUCED

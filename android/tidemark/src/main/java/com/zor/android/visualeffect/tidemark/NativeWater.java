@@ -60,6 +60,7 @@ final class NativeWater {
     private Bitmap picture(int slot, int width, int height) {
         try {
             Bitmap fitted = pictures.fitted(slot, width, height);
+            Pictures.multiply(fitted, shade(slot, Pictures.brightness(fitted)));
             handedOver |= 1 << slot;
             return fitted;
         } catch (RuntimeException | OutOfMemoryError e) {  // recycled meanwhile, or too large
@@ -95,6 +96,10 @@ final class NativeWater {
     native void setInk(boolean withInk);
 
     native void setRain(boolean falling);
+
+    native void setBreezeAlways(boolean always);
+
+    private native int shade(int slot, float brightness);
 
     native void clearInk();
 

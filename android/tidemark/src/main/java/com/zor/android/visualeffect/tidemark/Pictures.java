@@ -3,6 +3,7 @@ package com.zor.android.visualeffect.tidemark;
 import android.graphics.Bitmap;
 import android.graphics.Canvas;
 import android.graphics.Paint;
+import android.graphics.PorterDuff;
 import android.graphics.Rect;
 
 import java.nio.ByteBuffer;
@@ -14,6 +15,7 @@ final class Pictures {
 
     private static final int LIGHT = 2;
     private static final int LONGEST_SIDE_OF_LIGHT = 1024;
+    private static final int WHITE = 0xffffffff;
     private static final int DEEP_WATER = 0xff0d3b4f;
 
     private final Bitmap[] slots;
@@ -42,6 +44,17 @@ final class Pictures {
         if (slot != LIGHT) return scaled(picture, middle(picture, width, height), width, height);
         Rect whole = new Rect(0, 0, picture.getWidth(), picture.getHeight());
         return scaled(picture, whole, LONGEST_SIDE_OF_LIGHT, LONGEST_SIDE_OF_LIGHT);
+    }
+
+    /** The mean of all channels, 0 to 1. */
+    static float brightness(Bitmap picture) {
+        int mean = scaled(picture, new Rect(0, 0, picture.getWidth(), picture.getHeight()), 1, 1).getPixel(0, 0);
+        return ((mean >> 16 & 255) + (mean >> 8 & 255) + (mean & 255)) / (3 * 255f);
+    }
+
+    /** Multiplies a bitmap of {@link #fitted} by an opaque colour. */
+    static void multiply(Bitmap fitted, int color) {
+        if (color != WHITE) new Canvas(fitted).drawColor(color, PorterDuff.Mode.MULTIPLY);
     }
 
     private static Rect middle(Bitmap picture, int width, int height) {

@@ -123,7 +123,7 @@ public class TidemarkView extends FrameLayout {
      * Shows a picture. It may have any size: it is cropped to the view and scaled down to it.
      *
      * @param picture is not copied: keep it unchanged while the view shows it. Recycling it is harmless; the view then
-     *     keeps what it shows until it gets another size, and the listener hears of it.
+     *     keeps what it shows, in the size and the colours that it had, and the listener hears of it.
      * @throws IllegalArgumentException for a bitmap that is recycled
      */
     public void setPicture(@NonNull Bitmap picture) {
@@ -187,7 +187,7 @@ public class TidemarkView extends FrameLayout {
         copy.forEach(Look::checked);
         if (copy.equals(choices.look)) return;
         choices.look = copy;
-        renderer.change(water -> water.setLook(copy));
+        applyLook();
     }
 
     /**
@@ -285,6 +285,26 @@ public class TidemarkView extends FrameLayout {
     }
 
     /**
+     * Lets the breeze of the look blow for good, so that the view never stops drawing. It otherwise sinks some seconds
+     * after a touch. {@link Motion#REDUCED} has no breeze.
+     *
+     * @param always false at first
+     */
+    public void setBreezeAlways(boolean always) {
+        choices.breezeAlways = always;
+        renderer.change(water -> water.setBreezeAlways(always));
+    }
+
+    /**
+     * Whether the breeze blows for good.
+     *
+     * @return as set last
+     */
+    public boolean getBreezeAlways() {
+        return choices.breezeAlways;
+    }
+
+    /**
      * Chooses how many pixels are drawn; {@link Quality#AUTO} at first.
      *
      * @param quality at the cost of time and of battery
@@ -327,11 +347,11 @@ public class TidemarkView extends FrameLayout {
     /**
      * Chooses whether the water moves by itself; {@link Motion#AUTO} at first.
      *
-     * @param motion for the rain and the first drop
+     * @param motion for the rain, the breeze and the first drop
      */
     public void setMotion(@NonNull Motion motion) {
         this.motion = motion;
-        applyRain();
+        applyMotion();
     }
 
     /**
@@ -487,7 +507,6 @@ public class TidemarkView extends FrameLayout {
     @Override
     protected void onWindowVisibilityChanged(int visibility) {
         super.onWindowVisibilityChanged(visibility);
-        applyRain();  // the user may come from the system's settings
         if (surface != null) surface.setSeen(visibility == VISIBLE);
     }
 
@@ -572,6 +591,7 @@ public class TidemarkView extends FrameLayout {
             finger.lift();
         } else {
             GlThread.start(context);
+            applyMotion();  // the user may come from the system's settings
         }
         renderer.setWindow(window, width, height, choices);
     }
@@ -585,8 +605,20 @@ public class TidemarkView extends FrameLayout {
         renderer.touch(action, x / width, y / height, isStylus, pressure, time);
     }
 
-    private void applyRain() {
+    private void applyMotion() {
+        boolean wasReduced = choices.isReduced;
         choices.isReduced = motion == Motion.REDUCED || motion == Motion.AUTO && hasAnimationsOff();
+        if (choices.isReduced == wasReduced) return;
+        applyLook();
+        applyRain();
+    }
+
+    private void applyLook() {
+        Look look = choices.lookInMotion();
+        renderer.change(water -> water.setLook(look));
+    }
+
+    private void applyRain() {
         boolean falls = choices.rainFalls();
         renderer.change(water -> water.setRain(falls));
     }

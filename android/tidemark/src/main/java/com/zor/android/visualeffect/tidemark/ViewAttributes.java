@@ -19,6 +19,7 @@ final class ViewAttributes {
         }
         view.setInk(given.getBoolean(R.styleable.TidemarkView_tidemarkInk, false));
         view.setRain(given.getFloat(R.styleable.TidemarkView_tidemarkRain, 0));
+        view.setBreezeAlways(given.getInt(R.styleable.TidemarkView_tidemarkBreeze, 0) != 0);
         view.setFirstDrop(given.getBoolean(R.styleable.TidemarkView_tidemarkFirstDrop, false));
         view.setQuality(Quality.values()[given.getInt(R.styleable.TidemarkView_tidemarkQuality, 0)]);
         view.setInteraction(Interaction.values()[given.getInt(R.styleable.TidemarkView_tidemarkInteraction, 0)]);

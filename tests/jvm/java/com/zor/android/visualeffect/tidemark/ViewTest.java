@@ -411,7 +411,17 @@ public final class ViewTest {
         ViewAttributes.apply(new TypedArray() {
             @Override
             public boolean getBoolean(int index, boolean usual) {
-                return index == R.styleable.TidemarkView_tidemarkInk;
+                return usual;
+            }
+
+            @Override
+            public float getFloat(int index, float usual) {
+                return usual;
+            }
+
+            @Override
+            public int getInt(int index, int usual) {
+                return index == R.styleable.TidemarkView_tidemarkPreset ? Preset.RED_INK.ordinal() : usual;
             }
 
             @Override
@@ -422,8 +432,8 @@ public final class ViewTest {
         show(view, SHORT, LONG);
         drawUntilRest();
         expectColor(GREEN);
-        drawStroke();
-        assertTrue("ink of a layout", inked() > 0);
+        assertEquals("of a preset", Preset.RED_INK.look(), view.getLook());
+        assertTrue("ink of a preset", view.getInk());
         view.setRain(5);
         Parcelable state = view.onSaveInstanceState();
         release();

@@ -177,6 +177,18 @@ public class TidemarkView extends FrameLayout {
     }
 
     /**
+     * Sets the look, the ink and the rain. The picture stays: the module has none of the {@link Preset#ground grounds},
+     * which an app may bring.
+     *
+     * @param preset a look by name
+     */
+    public void setPreset(@NonNull Preset preset) {
+        setLook(preset.look());
+        setInk(preset.ink);
+        setRain(preset.rain);
+    }
+
+    /**
      * Changes how the water looks and moves; the water and the ink stay.
      *
      * @param look is copied

@@ -12,13 +12,15 @@ final class ViewAttributes {
     private ViewAttributes() {}
 
     static void apply(TypedArray given, TidemarkView view) {
+        int preset = given.getInt(R.styleable.TidemarkView_tidemarkPreset, -1);
+        if (preset >= 0) view.setPreset(Preset.values()[preset]);
         int look = given.getResourceId(R.styleable.TidemarkView_tidemarkLook, 0);
         if (look != 0) view.setLook(read(given.getResources(), look));
         if (given.hasValue(R.styleable.TidemarkView_tidemarkInkColor)) {
             view.setInkColor(given.getColor(R.styleable.TidemarkView_tidemarkInkColor, 0));
         }
-        view.setInk(given.getBoolean(R.styleable.TidemarkView_tidemarkInk, false));
-        view.setRain(given.getFloat(R.styleable.TidemarkView_tidemarkRain, 0));
+        view.setInk(given.getBoolean(R.styleable.TidemarkView_tidemarkInk, view.getInk()));
+        view.setRain(given.getFloat(R.styleable.TidemarkView_tidemarkRain, view.getRain()));
         view.setBreezeAlways(given.getInt(R.styleable.TidemarkView_tidemarkBreeze, 0) != 0);
         view.setFirstDrop(given.getBoolean(R.styleable.TidemarkView_tidemarkFirstDrop, false));
         view.setQuality(Quality.values()[given.getInt(R.styleable.TidemarkView_tidemarkQuality, 0)]);

@@ -3,7 +3,8 @@ import { readdirSync, readFileSync, statSync, writeFileSync } from 'node:fs';
 import { join, posix } from 'node:path';
 import { Marked } from 'marked';
 import { defineConfig } from 'vite';
-import { groundOf, grounds, usualPreset } from './src/grounds';
+import { presets } from 'tidemark-water/core';
+import { usualPreset } from './src/grounds';
 
 const out = new URL('dist', import.meta.url).pathname;
 const largestSite = 1_000_000;  // bytes before compression
@@ -90,7 +91,7 @@ function hurry() {
         generateBundle(_, bundle) {
             const painter = Object.keys(bundle).find((file) => file.includes('/painter-'));
             const source = readFileSync(new URL('src/early_painter.js', import.meta.url), 'utf8')
-                .replace('PAINTER', `./${painter}`).replace('GROUND', JSON.stringify(grounds[groundOf(usualPreset)]));
+                .replace('PAINTER', `./${painter}`).replace('GROUND', JSON.stringify(presets[usualPreset].ground));
             this.emitFile({ type: 'asset', name: 'early_painter.js', source });
         },
         transformIndexHtml: {

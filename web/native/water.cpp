@@ -5,6 +5,7 @@
 // is handed over is a placeholder of one pixel.
 #include <emscripten.h>
 
+#include <cmath>
 #include <cstdlib>
 #include <optional>
 
@@ -111,6 +112,9 @@ EMSCRIPTEN_KEEPALIVE void setInk(bool withInk) {
 EMSCRIPTEN_KEEPALIVE void setRain(bool falling) {
     water->setRain(falling);
 }
+EMSCRIPTEN_KEEPALIVE void setBreezeAlways(bool always) {
+    water->setBreezeAlways(always);
+}
 EMSCRIPTEN_KEEPALIVE void clearInk() {
     water->clearInk();
 }
@@ -130,6 +134,15 @@ EMSCRIPTEN_KEEPALIVE void splash(float x, float y, float weight) {
 // A sum of 1 for the portrait, 2 for the landscape and 4 for the light.
 EMSCRIPTEN_KEEPALIVE void picturesChanged(unsigned which) {
     water->picturesChanged(which);
+}
+// What load() multiplies the colours of a picture by, 0xRRGGBB.
+EMSCRIPTEN_KEEPALIVE int shade(int slot, float brightness) {
+    const Shade shade = water->shade(static_cast<PictureSlot>(slot), brightness);
+    int color = 0;
+    for (const float factor : {shade.red, shade.green, shade.blue}) {
+        color = 256 * color + static_cast<int>(std::lround(255.0f * factor));
+    }
+    return color;
 }
 EMSCRIPTEN_KEEPALIVE void redraw() {
     water->redraw();

@@ -1,16 +1,16 @@
 // The chosen values for a page of one's own and for the hosts.
-import { defaultLook, lookKeys, lookOf } from 'tidemark-water';
-import { usualPreset } from './grounds';
+import { defaultLook, lookKeys, lookOf, type Choices } from 'tidemark-water';
 import { addressOf, withPreset, type Settings } from './settings';
 
 const pictureOf = ({ picture }: Settings) => addressOf(picture) ?? 'picture.jpg';
 
-// What an element or a canvas is told.
-function choices({ preset, ink, inkColor, rain, look }: Settings): Record<string, unknown> {
+// What an element or a canvas is told: the preset, and what differs from it.
+function choices({ preset, ink, inkColor, rain, look }: Settings): Choices & { ink?: boolean } {
     const usual = withPreset(preset);
     return {
-        ...(preset !== usualPreset && { preset }),
-        ...(ink && { ink, ...(inkColor !== usual.inkColor && { inkColor }) }),
+        preset,
+        ...(ink !== usual.ink && { ink }),
+        ...(ink && inkColor !== usual.inkColor && { inkColor }),
         ...(rain !== usual.rain && { rain }),
         ...(Object.keys(look).length > 0 && { look }),
     };
@@ -20,21 +20,21 @@ export function toHtml(settings: Settings): string {
     const words = Object.entries(choices(settings)).map(([name, value]) => {
         const attribute = name.replace('C', '-c');
         if (value === true) return ` ${attribute}`;
+        if (value === false) return ` ${attribute}="off"`;
         return typeof value === 'object' ? ` ${attribute}='${JSON.stringify(value)}'` : ` ${attribute}="${value}"`;
     });
-    const off = !settings.ink ? ' ink="off"' : '';
-    return `<script type="module" src="tidemark-water.js"></script>\n<tidemark-water src="${pictureOf(settings)}"${words.join('')}${off}></tidemark-water>\n`;
+    return `<script type="module" src="tidemark-water.js"></script>\n<tidemark-water src="${pictureOf(settings)}"${words.join('')}></tidemark-water>\n`;
 }
 
 function toJavaScript(settings: Settings): string {
-    const options = { src: pictureOf(settings), ...choices(settings), ink: settings.ink };
+    const options = { src: pictureOf(settings), ...choices(settings) };
     return `import { createWater } from 'tidemark-water';\ncreateWater(document.querySelector('canvas'), ${JSON.stringify(options, null, 4)});\n`;
 }
 
 // For a `water` that is an Android view or a host in C++.
 function statements(settings: Settings): string {
     const usual = defaultLook();
-    const look = lookOf(settings);
+    const look = lookOf(choices(settings));
     const assignments = lookKeys.filter(({ name }) => look[name] !== usual[name]).map(({ name, whole }) => {
         const text = String(Number(look[name]!.toFixed(4)));
         return `look.${name} = ${whole ? text : `${text.includes('.') ? text : `${text}.0`}f`};\n`;

@@ -1,7 +1,7 @@
 // A worker that paints the built-in pictures, so that the water does not wait for them.
 import createPainter, { type Painter } from '../../build/web/tidemark-painter.js';
 import url from '../../build/web/tidemark-painter.wasm?url';
-import { tone, type Ground } from './grounds';
+import type { Ground } from './grounds';
 
 export interface Painted {
     id: number;
@@ -20,10 +20,9 @@ loaded.catch(() => {});  // told with the first task
 
 async function paint({ ground, width, height }: Task): Promise<ImageBitmap> {
     const module = await loaded;
-    const fill = { pool: module._paintTiledPool, river: module._paintRiverBed, shore: module._paintSandyShore }[ground.painting];
+    const fill = { pool: module._paintTiledPool, river: module._paintRiverBed, shore: module._paintSandyShore }[ground];
     const place = fill(width, height);
     const pixels = new Uint8ClampedArray(module.HEAPU8.slice(place, place + 4 * width * height).buffer);
-    tone(pixels, ground);
     return createImageBitmap(new ImageData(pixels, width, height));
 }
 

@@ -1,9 +1,9 @@
 // The panel: what a visitor chooses in plain words, every value of the look under "Expert", and the choice as code.
-import { lookKeys, lookOf, presets, type Water } from 'tidemark-water';
+import { lookKeys, lookOf, presets, type PresetName, type Water } from 'tidemark-water';
 import { codes, toHtml } from './code';
 import { make, makeControls, wordOf } from './controls';
 import { expertSliders } from './expert';
-import { groundOf, grounds } from './grounds';
+import { grounds, isGround, type Ground } from './grounds';
 import { inks } from './inks';
 import { isChanged, withPreset, type Settings } from './settings';
 import { drawGround, drawThumbnails } from './thumbnails';
@@ -28,8 +28,9 @@ export function makePanel(root: HTMLElement, settings: Settings, actions: PanelA
     const row = (className: string, ...children: Node[]) => make('div', { className }, ...children);
     const button = (title: string, onclick: () => void) => make('button', { type: 'button', onclick }, title);
 
-    const choosePreset = (preset: string) => Object.assign(settings, withPreset(preset, settings.picture));
-    const tiles = Object.entries(presets).map(([name, { title }]) => {
+    const choosePreset = (preset: PresetName) => Object.assign(settings, withPreset(preset, settings.picture));
+    const tiles = (Object.keys(presets) as PresetName[]).map((name) => {
+        const { title } = presets[name];
         const picture = make('i');
         const mark = make('small', {}, 'changed');
         follow(() => (mark.hidden = settings.preset !== name || !isChanged(settings)));
@@ -39,16 +40,16 @@ export function makePanel(root: HTMLElement, settings: Settings, actions: PanelA
     const back = button('', () => (choosePreset(settings.preset), actions.changed()));
     const undo = button('Undo', actions.undo);
     follow(() => {
-        back.textContent = `Back to ${presets[settings.preset]!.title}`;
+        back.textContent = `Back to ${presets[settings.preset].title}`;
         back.hidden = !isChanged(settings);
         undo.disabled = !actions.canUndo();
     });
 
-    const pictures = Object.entries(grounds).map(([name, { title }]) => {
-        return { name, swatch: controls.choice(title, () => settings.picture === name, () => (settings.picture = name)) };
+    const pictures = (Object.keys(grounds) as Ground[]).map((name) => {
+        return { name, swatch: controls.choice(grounds[name], () => settings.picture === name, () => (settings.picture = name)) };
     });
     const own = make('button', { type: 'button', ariaLabel: 'Your own picture', onclick: actions.chooseOwnPicture }, '+');
-    follow(() => (own.ariaPressed = String(!Object.hasOwn(grounds, settings.picture))));
+    follow(() => (own.ariaPressed = String(!isGround(settings.picture))));
 
     const swatches = Object.entries(inks).map(([title, color]) => {
         const swatch = controls.choice(title, () => settings.inkColor === color, () => Object.assign(settings, { inkColor: color, ink: true }));
@@ -100,7 +101,7 @@ export function makePanel(root: HTMLElement, settings: Settings, actions: PanelA
     const status = make('p', { className: 'status' }, make('i'), make('span'));
     root.append(
         section('Preset', row('tiles', ...tiles.map(({ tile }) => tile), surprise), row('actions', undo, back)),
-        controls.choices('Picture', () => grounds[settings.picture]?.title ?? 'your own', row('pictures', ...pictures.map(({ swatch }) => swatch), own)),
+        controls.choices('Picture', () => (isGround(settings.picture) ? grounds[settings.picture] : 'your own'), row('pictures', ...pictures.map(({ swatch }) => swatch), own)),
         controls.choices('Ink colour', () => nameOf(inks, settings.inkColor, settings.inkColor).toLowerCase(), row('swatches', ...swatches, color)),
         water,
         section('On your page', ...code(() => 'HTML', () => toHtml(settings))),
@@ -121,7 +122,7 @@ export function makePanel(root: HTMLElement, settings: Settings, actions: PanelA
             for (const { name, swatch } of pictures) {
                 const url = await drawGround(name);
                 show(swatch, url);
-                for (const { name: preset, picture } of tiles) if (groundOf(preset) === name) show(picture, url);
+                for (const { name: preset, picture } of tiles) if (presets[preset].ground === name) show(picture, url);
             }
             await drawThumbnails((preset, url) => show(tiles.find(({ name }) => name === preset)!.picture, url));
         },

@@ -1,7 +1,7 @@
 // What lies under the water: a painting, an address, or the visitor's own photos, of which the portrait one shows in
 // portrait and the landscape one in landscape.
 import { WaterError, type WaterElement } from 'tidemark-water';
-import { grounds } from './grounds';
+import { isGround } from './grounds';
 import { paint } from './paintings';
 import { addressOf } from './settings';
 
@@ -35,11 +35,10 @@ export function makePictures(water: WaterElement, failed: (shown: string | null,
     let painted = '';    // the size of the last painting
 
     async function load(picture: string, isLast: () => boolean): Promise<void> {
-        const ground = grounds[picture];
-        if (ground) {
+        if (isGround(picture)) {
             const size = sizeOf(water);
             painted = String(size);
-            const bitmap = await paint(ground, ...size);
+            const bitmap = await paint(picture, ...size);
             if (isLast()) await water.setPicture(bitmap);
         } else if (picture === 'photo') {
             const [first, second] = photos;
@@ -72,7 +71,7 @@ export function makePictures(water: WaterElement, failed: (shown: string | null,
     addEventListener('resize', () => {
         clearTimeout(repaintDue);
         repaintDue = window.setTimeout(() => {
-            if (asked && grounds[asked] && String(sizeOf(water)) !== painted) void replace(asked);
+            if (asked && isGround(asked) && String(sizeOf(water)) !== painted) void replace(asked);
         }, 250);
     });
 

@@ -1,17 +1,15 @@
 // All that the visitor chooses, and its form in the address bar: what differs from the preset.
-import { lookKeys, presets, type Look } from 'tidemark-water';
-import { groundOf, grounds, usualPreset } from './grounds';
+import { lookKeys, lookOf, presets, type Look, type PresetName } from 'tidemark-water';
+import { isGround, usualPreset } from './grounds';
 
 export interface Settings {
     picture: string;  // a name of `grounds`, an address, or "photo"
-    preset: string;
+    preset: PresetName;
     ink: boolean;
     inkColor: string;
     rain: number;  // drops a second
     look: Look;    // what differs from the preset
 }
-
-const usualInk = '#0d2673';
 
 // The address of a picture, absolute, which no name of a painting is; null for anything else.
 export function addressOf(text: string, base?: string): string | null {
@@ -26,12 +24,19 @@ export function addressOf(text: string, base?: string): string | null {
 // A picture that the page's address brings, as for a frame in another page.
 const src = new URLSearchParams(location.search).get('src');
 const brought = src && addressOf(src, location.href);
-const isOwn = (picture: string) => !Object.hasOwn(grounds, picture);
+const isOwn = (picture: string) => !isGround(picture);
+
+const colorOf = (...shares: number[]) =>
+    `#${shares.map((share) => Math.round(255 * share).toString(16).padStart(2, '0')).join('')}`;
 
 // A preset is a whole look with a picture, which gives way to one of the visitor's own.
-export function withPreset(preset: string, picture = brought ?? ''): Settings {
-    const { ink = true, inkColor = usualInk, rain = 0 } = presets[preset]!;
-    return { picture: picture && isOwn(picture) ? picture : groundOf(preset), preset, ink, inkColor, rain, look: {} };
+export function withPreset(preset: PresetName, picture = brought ?? ''): Settings {
+    const { ground, ink, rain } = presets[preset];
+    const { inkRed, inkGreen, inkBlue, rainDropsPerSecond } = lookOf({ preset });
+    return {
+        picture: picture && isOwn(picture) ? picture : ground, preset, ink,
+        inkColor: colorOf(inkRed!, inkGreen!, inkBlue!), rain: rain ? rainDropsPerSecond! : 0, look: {},
+    };
 }
 
 function differences(settings: Settings): [string, string][] {
@@ -57,7 +62,7 @@ export function toHash(settings: Settings): string {
 // Of a link that was cut or made up, takes what can be used.
 export function fromHash(hash: string): Settings {
     const words = new URLSearchParams(hash.replace(/^#/, ''));
-    const preset = words.get('preset') ?? '';
+    const preset = words.get('preset') as PresetName;
     const settings = withPreset(Object.hasOwn(presets, preset) ? preset : usualPreset);
     const picture = words.get('picture') ?? '';
     settings.picture = (isOwn(picture) ? addressOf(picture) : picture) ?? settings.picture;

@@ -40,7 +40,7 @@ export const attributes = {
     fetchPriority: { kind: 'choice', values: ['auto', 'high', 'low'] },
     /**
      * `clear-lake`, `summer-rain`, `heavy-glass`, `quicksilver`, `honey`, `red-ink` or `deep-swell`
-     * @default `clear-lake`
+     * @default the look's own values
      */
     preset: { kind: 'choice', values: Object.keys(presets) as PresetName[] },
     /**
@@ -50,7 +50,7 @@ export const attributes = {
     ink: { kind: 'flag' },
     /**
      * `#rrggbb`; dark ones look best, and red or violet on warm pictures
-     * @default dark blue
+     * @default as the preset says, or blue-black
      */
     inkColor: { kind: 'color' },
     /**
@@ -58,6 +58,11 @@ export const attributes = {
      * @default as the preset says, or none
      */
     rain: { kind: 'number', usual: 6 },
+    /**
+     * `always` keeps a breeze on the water, which then never rests
+     * @default it follows a touch, and sinks some seconds later
+     */
+    breeze: { kind: 'choice', values: ['always'] },
     /**
      * `hover`, `press`, both, or `none`
      * @default `press`

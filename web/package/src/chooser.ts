@@ -2,7 +2,7 @@
 import type { Options } from './attributes.js';
 import type { WaterError } from './errors.js';
 import { Slot } from './native.js';
-import { greyPicture, loadPicture, plainPicture, shippedLight, upload, uploadCover, type Picture, type Place, type Source } from './pictures.js';
+import { greyPicture, loadPicture, plainPicture, shippedLight, uploadCover, type Picture, type Place, type Shade, type Source } from './pictures.js';
 
 interface Told {
     pictureChanged(): void;
@@ -20,7 +20,7 @@ type Chosen = Source | symbol | null;
 
 export class Chooser {
     picture: Picture | undefined;
-    light: Picture | ImageBitmap | undefined;
+    light: Picture | undefined;
 
     private source: Chosen = nothingYet;
     private lightSource: Chosen = nothingYet;
@@ -72,19 +72,16 @@ export class Chooser {
     }
 
     /** Fills the texture that is bound, in the middle of a frame. */
-    fill(gl: WebGLRenderingContext, slot: Slot, width: number, height: number, place: Place): void {
-        if (slot !== Slot.light) this.cover(gl, 'picture', width, height, place);
-        else if (this.light instanceof ImageBitmap) upload(gl, this.light);
-        else this.cover(gl, 'light', lightSide, lightSide, place);
-    }
-
-    private cover(gl: WebGLRenderingContext, part: 'picture' | 'light', ...size: [number, number, Place]): void {
+    fill(gl: WebGLRenderingContext, slot: Slot, width: number, height: number, place: Place, shade: Shade): void {
+        const isLight = slot === Slot.light;
+        const part = isLight ? 'light' : 'picture';
+        const size = isLight ? [lightSide, lightSide] as const : [width, height] as const;
         try {
-            uploadCover(gl, this[part] as Picture, ...size);
+            uploadCover(gl, this[part]!, ...size, place, shade);
         } catch (error) {
-            uploadCover(gl, (this[part] = plainPicture()), ...size);
+            uploadCover(gl, (this[part] = plainPicture()), ...size, place, shade);
             // Who hears of it may call in, which is not for the middle of a frame.
-            queueMicrotask(() => this.told.failed(error as WaterError, part === 'picture'));
+            queueMicrotask(() => this.told.failed(error as WaterError, !isLight));
         }
     }
 

@@ -1,6 +1,6 @@
 // The numbers of host/look.properties, and the whole look that a visitor's choices give.
 import keys from '../../../build/web/generated/host/look.json';
-import { presets } from './presets.js';
+import { presets, type PresetName } from './presets.js';
 
 export type Look = Record<string, number>;
 
@@ -23,8 +23,7 @@ export type Quality = 'auto' | 'low' | 'medium' | 'high';
 export interface Choices {
     /** At most as many pixels for a CSS pixel as the display has, and as 1, 2 or 3; "auto" as frames keep the pace. */
     quality?: Quality | null;
-    /** A key of `presets`. */
-    preset?: string | null;
+    preset?: PresetName | null;
     /** "#rrggbb" */
     inkColor?: string | null;
     /** Drops a second, up to 60. */
@@ -62,13 +61,13 @@ export function withinRange(look: Look): Look {
 
 /** The whole look that these choices give, by the names of host/look.properties. */
 export function lookOf({ preset, inkColor, rain, look }: Choices): Look {
-    const named = presets[preset ?? ''];
-    const drops = Math.min(rain ?? named?.rain ?? 0, mostDrops);
+    const drops = Math.min(rain ?? 0, mostDrops);
     return {
         ...defaultLook(),
-        ...(drops > 0 && { rainDropsPerSecond: drops, rainAmplitude: dropHeight(drops) }),
-        ...named?.look,
-        ...inkOf(inkColor ?? named?.inkColor ?? ''),
+        ...(drops > 0 && { rainAmplitude: dropHeight(drops) }),
+        ...(preset && presets[preset]?.look),
+        ...(drops > 0 && { rainDropsPerSecond: drops }),
+        ...inkOf(inkColor ?? ''),
         ...withinRange(look ?? {}),
     };
 }

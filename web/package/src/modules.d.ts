@@ -3,6 +3,10 @@ declare module '*/look.json' {
     const keys: { name: string; value: number; min: number; max: number; whole: boolean }[];
     export default keys;
 }
+declare module '*/presets.json' {
+    const presets: Record<import('./presets.js').PresetName, import('./presets.js').Preset>;
+    export default presets;
+}
 declare module '*.css' {
     const text: string;
     export default text;

@@ -92,17 +92,21 @@ interface Instance {
     _resized(): void;
     _setInk(withInk: boolean): void;
     _setRain(falling: boolean): void;
+    _setBreezeAlways(always: boolean): void;
     _clearInk(): void;
     _touch(action: number, x: number, y: number, pressure: number, seconds: number): void;
     _drop(x: number, y: number, weight: number, seconds: number): void;
     _splash(x: number, y: number, weight: number): void;
     _picturesChanged(which: number): void;
+    _shade(slot: Slot, brightness: number): number;
     _redraw(): void;
     _renewContext(): void;
     _frame(seconds: number): number;
 }
 export interface Native extends Instance {
     setLook(look: Look): void;
+    /** The colour by which a picture of this brightness, 0 to 1, is multiplied, for style sheets. */
+    shade(slot: Slot, brightness: number): string;
     /** After a lost context: the same, restored, or another one. */
     renew(context: WebGLRenderingContext): void;
 }
@@ -134,6 +138,7 @@ export async function instantiate(
             }
             instance._applyLook();
         },
+        shade: (slot: Slot, brightness: number) => `#${instance._shade(slot, brightness).toString(16).padStart(6, '0')}`,
         renew(context: WebGLRenderingContext) {
             instance.context = context;
             instance._renewContext();

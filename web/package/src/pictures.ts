@@ -13,7 +13,12 @@ export interface Picture {
     moving(): boolean;
     /** Whether it has changed since the last call. */
     changed(): boolean;
+    /** Whether the look darkens and tints it. Not what moves, which would be measured with every frame. */
+    shaded: boolean;
 }
+
+/** The colour by which a picture is multiplied whose channels have this mean, 0 to 1. */
+export type Shade = (brightness: number) => string;
 
 function canvasOf(width: number, height: number): HTMLCanvasElement {
     const canvas = document.createElement('canvas');
@@ -54,7 +59,7 @@ async function loadImage(url: string, priority: 'high' | 'low' | 'auto', blob?: 
 }
 
 const still = (drawable: CanvasImageSource, size: () => [number, number]): Picture =>
-    ({ drawable, size, moving: () => false, changed: () => false });
+    ({ drawable, size, moving: () => false, changed: () => false, shaded: true });
 
 /** Throws for what a texture would refuse in the middle of a frame. */
 function probe(picture: Picture): Picture {
@@ -97,10 +102,11 @@ async function load(source: Source, priority: 'high' | 'low' | 'auto'): Promise<
             size: () => [source.videoWidth, source.videoHeight],
             moving: () => !source.paused && !source.ended,
             changed: () => source.readyState > 1 && time !== (time = source.currentTime),
+            shaded: false,
         };
     }
     if (source instanceof HTMLCanvasElement || (typeof OffscreenCanvas === 'function' && source instanceof OffscreenCanvas)) {
-        return { drawable: source, size: () => [source.width, source.height], moving: () => true, changed: () => true };
+        return { drawable: source, size: () => [source.width, source.height], moving: () => true, changed: () => true, shaded: false };
     }
     if (source instanceof ImageBitmap) return still(source, () => [source.width, source.height]);
     let image: HTMLImageElement;
@@ -139,16 +145,36 @@ export function drawCover(canvas: HTMLCanvasElement, picture: Picture, [x, y]: P
         width * scale, height * scale, 0, 0, width, height);
 }
 
+function brightnessOf(canvas: HTMLCanvasElement): number {
+    const side = 32;
+    const context = canvasOf(side, side).getContext('2d', { willReadFrequently: true })!;
+    context.imageSmoothingQuality = 'high';
+    context.drawImage(canvas, 0, 0, side, side);
+    const { data } = context.getImageData(0, 0, side, side);
+    return data.reduce((sum, value, i) => (i % 4 < 3 ? sum + value : sum), 0) / (255 * 3 * side * side);
+}
+
+/** Multiplies the colours of a canvas. */
+export function multiply(canvas: HTMLCanvasElement, shade: Shade): void {
+    if (shade(1) === '#ffffff') return;  // and then for a darker one as well
+    const context = canvas.getContext('2d')!;
+    context.fillStyle = shade(brightnessOf(canvas));
+    context.globalCompositeOperation = 'multiply';
+    context.fillRect(0, 0, canvas.width, canvas.height);
+    context.globalCompositeOperation = 'source-over';
+}
+
 let scratch: HTMLCanvasElement | undefined;
 
 /** Fills the texture that is bound with a part of the picture, scaled to width x height. Rows go from the top. */
-export function uploadCover(gl: WebGLRenderingContext, picture: Picture, width: number, height: number, place: Place): void {
+export function uploadCover(gl: WebGLRenderingContext, picture: Picture, width: number, height: number, place: Place, shade: Shade): void {
     scratch ??= canvasOf(width, height);
     if (scratch.width !== width) scratch.width = width;
     if (scratch.height !== height) scratch.height = height;
     drawCover(scratch, picture, place);
     try {
-        upload(gl, scratch);
+        if (picture.shaded) multiply(scratch, shade);
+        gl.texImage2D(gl.TEXTURE_2D, 0, gl.RGBA, gl.RGBA, gl.UNSIGNED_BYTE, scratch);
     } catch {  // a canvas that was drawn on since
         scratch = undefined;
         throw new WaterError('cross-origin', 'The picture holds what this page may not use.');
@@ -156,15 +182,12 @@ export function uploadCover(gl: WebGLRenderingContext, picture: Picture, width: 
     if (!picture.moving()) scratch.width = scratch.height = 1;
 }
 
-export function upload(gl: WebGLRenderingContext, source: TexImageSource): void {
-    gl.texImage2D(gl.TEXTURE_2D, 0, gl.RGBA, gl.RGBA, gl.UNSIGNED_BYTE, source);
-}
-
-let shipped: Promise<ImageBitmap> | undefined;
+let shipped: Promise<Picture> | undefined;
 
 /** What the waves throw back: sky with the sun's glitter. */
-export const shippedLight = (): Promise<ImageBitmap> =>
-    (shipped ??= createImageBitmap(new Blob([light], { type: 'image/webp' })));
+export const shippedLight = (): Promise<Picture> =>
+    (shipped ??= createImageBitmap(new Blob([light], { type: 'image/webp' }))
+        .then((bitmap) => still(bitmap, () => [bitmap.width, bitmap.height])));
 
 /** Without a picture: deep water. */
 export function plainPicture(): Picture {
@@ -184,5 +207,5 @@ export function greyPicture(): Picture {
     const context = canvas.getContext('2d')!;
     context.fillStyle = '#808080';
     context.fillRect(0, 0, 1, 1);
-    return still(canvas, () => [1, 1]);
+    return { ...still(canvas, () => [1, 1]), shaded: false };
 }

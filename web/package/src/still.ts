@@ -1,5 +1,5 @@
 // A picture of the water, for where it cannot be drawn. A canvas with WebGL can be read only in the task that has drawn.
-import { drawCover, placeOf, type Picture } from './pictures.js';
+import { drawCover, multiply, placeOf, type Picture, type Shade } from './pictures.js';
 
 export class Still {
     /** Whether it has what the water shows. */
@@ -14,9 +14,10 @@ export class Still {
     }
 
     /** Water at rest looks like its picture. */
-    show(picture: Picture, { width, height }: HTMLCanvasElement): void {
+    show(picture: Picture, { width, height }: HTMLCanvasElement, shade: Shade): void {
         this.resize(width, height);
         drawCover(this.canvas, picture, placeOf(getComputedStyle(this.canvas).objectPosition));
+        if (picture.shaded) multiply(this.canvas, shade);
         this.isKept = true;
     }
 

@@ -345,9 +345,10 @@ export class Water extends EventTarget {
         // What is not shown keeps its one pixel.
         const load = (slot: Slot, width: number, height: number) => {
             if (slot !== Slot.light && slot !== this.slot()) return;
-            this.chooser.fill(this.gl!, slot, width, height, placeOf(getComputedStyle(this.canvas).objectPosition));
+            const shade = (brightness: number) => native.shade(slot, brightness);
+            this.chooser.fill(this.gl!, slot, width, height, placeOf(getComputedStyle(this.canvas).objectPosition), shade);
         };
-        const native = await instantiate(module, gl, load, 1 + Math.floor(Math.random() * 1e6));
+        const native: Native = await instantiate(module, gl, load, 1 + Math.floor(Math.random() * 1e6));
         this.longestSide = Math.min(gl.getParameter(gl.MAX_TEXTURE_SIZE), ...gl.getParameter(gl.MAX_VIEWPORT_DIMS));
         if (this.picture) native._picturesChanged(backgrounds);
         if (this.chooser.light) native._picturesChanged(1 << Slot.light);
@@ -419,7 +420,8 @@ export class Water extends EventTarget {
     }
 
     private keepPicture(): void {
-        if (this.picture && this.shown) this.still.show(this.picture, this.canvas);
+        if (!this.picture || !this.shown) return;
+        this.still.show(this.picture, this.canvas, (brightness) => this.native!.shade(this.slot(), brightness));
     }
 
     private isComplete(): boolean {
@@ -455,8 +457,9 @@ export class Water extends EventTarget {
         this.loop.most = options.fps || Infinity;
         if (!native) return;
         this.fit();
-        const preset = presets[options.preset ?? ''];
-        const look = lookOf(options);
+        const preset = options.preset ? presets[options.preset] : undefined;
+        const isReduced = this.reduced();
+        const look = { ...lookOf(options), ...(isReduced && { breeze: 0 }) };
         const quality = Math.max(0, qualities.indexOf(options.quality ?? 'auto'));
         const ink = options.ink ?? preset?.ink ?? false;
         const given = JSON.stringify([look, quality, ink]);
@@ -468,7 +471,8 @@ export class Water extends EventTarget {
         }
         this.given = given;
         native._setShortestFrame(1 / this.loop.most);
-        native._setRain(!options.paused && !this.reduced() && (options.rain ?? preset?.rain ?? 0) > 0);
+        native._setRain(!options.paused && !isReduced && (options.rain ?? Number(preset?.rain)) > 0);
+        native._setBreezeAlways(options.breeze === 'always');
         this.wake();
     }
 

@@ -150,7 +150,7 @@ test('what fails is told once, and a paused water shows another picture at anoth
 });
 
 test('a paused water stands still while something is chosen, through another place, and takes no drops', async ({ page }) => {
-    await show(page, `${script}<tidemark-water src="pond.png" ink></tidemark-water><p></p>`);
+    await show(page, `${script}<tidemark-water src="pond.png" ink look='{"breeze": 0}'></tidemark-water><p></p>`);
     await element(page).and(page.locator('[shown]')).waitFor();
     expect(await element(page).evaluate(async (water) => {
         const pictures = [];
@@ -188,10 +188,10 @@ test('a paused water stands still while something is chosen, through another pla
 test('in a shadow root content is clicked and rippled, keys drop, and motion keeps to the wish', async ({ page }) => {
     await page.emulateMedia({ reducedMotion: 'reduce' });
     await show(page, `${script}<div><template shadowrootmode="open">
-        <tidemark-water src="pond.png" rain="20" first-drop><button onclick="this.textContent += '!'">Buy</button></tidemark-water></template>`);
+        <tidemark-water src="pond.png" rain="20" breeze="always" first-drop><button onclick="this.textContent += '!'">Buy</button></tidemark-water></template>`);
     await element(page).and(page.locator('[shown]')).waitFor();
     const calm = (yes) => expect.poll(() => element(page).evaluate(({ water }) => water.calm)).toBe(yes);
-    await calm(true);  // neither rain nor a drop
+    await calm(true);  // neither rain nor a drop, nor a breeze below
     await page.getByText('Buy').click();
     await calm(false);
     await expect(page.getByText('Buy!')).toBeVisible();
@@ -248,6 +248,41 @@ test('canvases of the page show a canvas and a video that move, and give picture
     });
     expect(reds).toEqual([true, true, false, false]);
     expect(codes).toEqual(['cross-origin', 'cross-origin']);
+});
+
+test('a bright still is handed over wet, in the look\'s colours, and shows them without a context too; a breeze stays', async ({ page, problems }) => {
+    const white = PNG.sync.write(Object.assign(new PNG({ width: 2, height: 2 }), { data: Buffer.alloc(16, 255) }));
+    await show(page, `${script}<tidemark-water src="white.png"></tidemark-water>`, { files: { 'white.png': white } });
+    await element(page).and(page.locator('[shown]')).waitFor();
+    const seen = await element(page).evaluate(async (water) => {
+        const { water: { still, lose } } = water;
+        const frames = async (count) => { while (count-- > 0) await new Promise(requestAnimationFrame); };
+        const scratch = new OffscreenCanvas(1, 1).getContext('2d', { willReadFrequently: true });
+        const colorOf = (drawable) => {
+            scratch.drawImage(drawable, 0, 0);
+            return String(scratch.getImageData(0, 0, 1, 1).data.slice(0, 3));
+        };
+        const drawn = async () => (await frames(9), colorOf(await createImageBitmap(await water.toBlob())));
+        const seen = { wet: await drawn() };
+        water.look = { wet: 0, groundRed: 0.2 };
+        seen.red = await drawn();
+        const moving = document.createElement('canvas').getContext('2d');
+        moving.fillStyle = '#fff';
+        moving.fillRect(0, 0, 999, 999);
+        await water.setPicture(moving.canvas);
+        seen.moving = await drawn();
+        await water.setPicture('white.png');
+        await frames(60);
+        seen.calm = water.water.calm;
+        water.breeze = 'always';
+        await frames(9);
+        seen.breezy = !water.water.calm;
+        lose.loseContext();
+        while (water.water.state !== 'lost') await frames(1);
+        return { ...seen, lost: colorOf(still.canvas) };
+    });
+    expect(seen).toEqual({ wet: '160,172,185', red: '51,255,255', moving: '255,255,255', calm: true, breezy: true, lost: '51,255,255' });
+    expect(problems.splice(0).filter((text) => !/loseContext/.test(text))).toEqual([]);
 });
 
 test('a high element shows the portrait, and off screen a still picture until it is touched again', async ({ page }) => {
@@ -505,13 +540,13 @@ test('transparent water leaves the page as it is, lights it, and takes the point
 
 test('both spellings of an attribute count, what is unknown is named once, and states can be styled', async ({ page, problems }) => {
     await show(page, `${script}<tidemark-water inkcolor="#ff0000" srcportrait="pond.png" firstdrop fetchpriority="high" look='{"exponent": 9}'></tidemark-water>
-        <tidemark-water preset="lake" quality="best" rain="much"></tidemark-water><tidemark-water preset="lake" ink-color="red" paused></tidemark-water>`);
+        <tidemark-water preset="lake" quality="best" rain="much" breeze="storm"></tidemark-water><tidemark-water preset="lake" ink-color="red" paused></tidemark-water>`);
     await expect(page.locator('tidemark-water[shown]')).toHaveCount(3);
     expect(await element(page).first().evaluate(({ inkColor, srcPortrait, firstDrop, fetchPriority, look }) =>
         [inkColor, srcPortrait, firstDrop, fetchPriority, look])).toEqual(['#ff0000', 'pond.png', true, 'high', { exponent: 9 }]);
     expect(await element(page).evaluateAll((all) => all.map((water) => [water.matches(':state(ready)'), water.matches(':state(paused)')])))
         .toEqual([[true, false], [true, false], [true, true]]);
-    expect(problems.splice(0).map((text) => /: (\w+)/.exec(text)[1])).toEqual(['preset', 'rain', 'quality', 'inkColor']);
+    expect(problems.splice(0).map((text) => /: (\w+)/.exec(text)[1])).toEqual(['preset', 'rain', 'breeze', 'quality', 'inkColor']);
 });
 
 test.describe('dense', () => {

@@ -33,7 +33,7 @@ test('the value of every slider reaches the water under its own name', async ({ 
     await page.emulateMedia({ reducedMotion: 'reduce' });  // no drop falls by itself
     const pixelsWith = async (value) => {
         await page.goto('about:blank');
-        await open(page, `?src=favicon.svg#ink=0&${value}`);
+        await open(page, `?src=favicon.svg#${value}`);
         await takeOver(page);
         return pixelsAfter(page, touchAndRun);
     };
@@ -80,12 +80,12 @@ test('a link brings the same look, and a bad one the nearest', async ({ page, ba
 
     await page.evaluate(() => { location.hash = 'ringSpeed=9&meshExtent=1e9&calmingTime=x&exponent=&picture=toString&preset=valueOf&inkColor=red&rain=-1'; });
     await expect.poll(() => settings(page)).toMatchObject(
-        { picture: 'pool', preset: 'clear-lake', inkColor: '#0d2673', rain: 0, look: { ringSpeed: 1, meshExtent: 64 } });
+        { picture: 'shore', preset: 'clear-lake', inkColor: '#0d173d', rain: 0, look: { ringSpeed: 1, meshExtent: 64 } });
     const address = `${baseURL}favicon.svg`;
     await page.evaluate((address) => { location.hash = `picture=${encodeURIComponent(address)}`; }, address);
     await expect.poll(() => settings(page)).toMatchObject({ picture: address, look: {} });
     await press(page, 'Honey');
-    expect(await settings(page)).toMatchObject({ picture: address, preset: 'honey', inkColor: '#994d05' });
+    expect(await settings(page)).toMatchObject({ picture: address, preset: 'honey', inkColor: '#732e03' });
 });
 
 test('a preset brings its picture and is marked where it was changed; each change can be taken back', async ({ page }) => {
@@ -93,7 +93,7 @@ test('a preset brings its picture and is marked where it was changed; each chang
     const back = page.getByRole('button', { name: /^Back to/ });
     await press(page, 'Honey');
     const honey = await settings(page);
-    expect(honey).toMatchObject({ preset: 'honey', picture: 'amber', look: {} });
+    expect(honey).toMatchObject({ preset: 'honey', picture: 'shore', look: {} });
     await expect(back).toBeHidden();
     await page.getByLabel('Calming time').evaluate((slider) => {
         for (const value of [5, 6, 7]) Object.assign(slider, { value }).dispatchEvent(new Event('input'));
@@ -112,7 +112,7 @@ test('a preset brings its picture and is marked where it was changed; each chang
     await press(page, 'Undo');
     expect(await settings(page)).toEqual(honey);
     await press(page, 'Undo');
-    expect(await settings(page)).toMatchObject({ preset: 'clear-lake', picture: 'pool' });
+    expect(await settings(page)).toMatchObject({ preset: 'clear-lake', picture: 'shore' });
     await expect(page.getByRole('button', { name: 'Undo' })).toBeDisabled();
 });
 
@@ -145,7 +145,7 @@ test('the keys work with Caps Lock and while a slider has the focus', async ({ p
     await page.keyboard.press('R');
     expect(await settings(page)).toMatchObject({ rain: 14 });
     await page.keyboard.press('I');
-    expect(await settings(page)).toMatchObject({ ink: false });
+    expect(await settings(page)).toMatchObject({ ink: true });
 });
 
 test('pictures and addresses are taken where they are dropped or pasted', async ({ page, baseURL }) => {
@@ -207,7 +207,7 @@ test('a link, a picture and a clip leave the page', async ({ page, context }) =>
 test('the copied code compiles in both languages and holds the values', async ({ page, context }, { outputDir }) => {
     test.slow();
     await context.grantPermissions(['clipboard-read', 'clipboard-write']);
-    await openPanel(page, '#calmingTime=9.51&meshExtent=33&exponent=77&inkRed=0.125&rain=9');
+    await openPanel(page, '#preset=red-ink&calmingTime=9.51&meshExtent=33&exponent=77&inkRed=0.125&rain=9');
     await page.getByText('For developers').click();
     const copied = async (language) => {
         if (language !== 'HTML') await press(page, language);

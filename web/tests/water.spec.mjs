@@ -15,7 +15,7 @@ function expectMiddleOf(pixels, view, [width, height]) {
 
 test('shows the photo, and each of two in its turn; a file that is none leaves it', async ({ page }) => {
     test.slow();
-    await open(page);
+    await open(page, '#wet=0&groundRed=1&groundGreen=1');
     await takeOver(page);
     const size = () => page.evaluate(() => window.tidemark.water.water.picture.size());
     await page.setInputFiles('#files', [slope(400, 200), slope(200, 500)]);
@@ -35,7 +35,7 @@ test('shows the photo, and each of two in its turn; a file that is none leaves i
 });
 
 test('a tap raises rings that come to rest, and then no frames are asked for', async ({ page }) => {
-    await open(page, '#ink=0');
+    await open(page, '#breeze=0');
     const rests = () => page.evaluate(() => window.tidemark.water.water.calm);
     await expect.poll(rests).toBe(true);
     await page.mouse.click(100, 150);
@@ -49,7 +49,7 @@ test('a tap raises rings that come to rest, and then no frames are asked for', a
 });
 
 test('pointers become touches: one draws with every report, at its place and time, and the others only ripple', async ({ page }) => {
-    await open(page, '#ink=0');
+    await open(page);
     const seen = await page.evaluate(() => {
         const { native } = document.querySelector('tidemark-water').water;
         const seen = [];
@@ -80,7 +80,7 @@ test('pointers become touches: one draws with every report, at its place and tim
 });
 
 test('a canvas whose size keeps changing is stretched, and gets its pixels and the picture once', async ({ page }) => {
-    await open(page, '?src=favicon.svg#ink=0');
+    await open(page, '?src=favicon.svg');
     await takeOver(page);
     const flat = await flatPixels(page);
     expect(await page.evaluate(async () => {
@@ -106,7 +106,7 @@ test('a canvas whose size keeps changing is stretched, and gets its pixels and t
 
 test('keys and buttons switch the ink, and clear it', async ({ page }) => {
     test.slow();
-    await open(page);
+    await open(page, '#ink=1');
     await takeOver(page);
     const flat = await flatPixels(page);
     const drawn = () => {

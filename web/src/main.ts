@@ -62,7 +62,8 @@ function apply(): void {
     pictures.show(picture);
     panel.refresh();
     clearTimeout(addressDue);
-    addressDue = window.setTimeout(writeAddress, 300);
+    const { hash } = location;  // a link that is followed meanwhile brings its own
+    addressDue = window.setTimeout(() => location.hash === hash && writeAddress(), 300);
 }
 
 function replace(chosen: Settings): void {

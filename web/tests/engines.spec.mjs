@@ -71,7 +71,7 @@ for (const [name, start] of Object.entries({ firefox, webkit })) {
             };
             for (const [size, ...extent] of [['desktop', 1200, 900], ['small-phone', 320, 568], ['phone', 390, 844]]) {
                 await engine.resize(...extent);
-                await engine.show(baseURL);
+                await engine.show(`${baseURL}#wet=0&groundRed=1&groundGreen=1&breeze=0`);  // a photo in its own colours, soon calm
                 await expect.poll(() => run(() => document.querySelector('#water[shown]') !== null)).toBe(true);
                 await new Promise((resolve) => setTimeout(resolve, 1500));
                 writeFileSync(screenshotPath(`${name}-${size}`), await look());
@@ -94,7 +94,7 @@ for (const [name, start] of Object.entries({ firefox, webkit })) {
                 const slider = [...document.querySelectorAll('#panel label')].find(({ textContent }) => textContent === 'Rain').control;
                 for (let i = 0; i < 180; ++i) Object.assign(slider, { value: i % 60 }).dispatchEvent(new Event('input'));
             });
-            await expect.poll(() => run(() => location.hash)).toBe('#rain=59');
+            await expect.poll(() => run(() => location.hash)).toMatch(/rain=59/);
 
             await run(() => Object.assign(window.tidemark.water, { rain: 0 }).clearInk());
             await run(() => window.tidemark.water.water.lose.loseContext());

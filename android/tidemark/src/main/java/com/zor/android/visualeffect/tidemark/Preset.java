@@ -9,7 +9,7 @@ import androidx.annotation.NonNull;
  */
 public enum Preset {
     /** Clear lake. */
-    CLEAR_LAKE("Clear lake", Ground.SHORE, false, false),
+    CLEAR_LAKE("Clear lake", Ground.SHORE, true, false),
     /** Summer rain. */
     SUMMER_RAIN("Summer rain", Ground.POOL, false, true),
     /** Heavy glass. */

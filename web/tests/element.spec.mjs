@@ -386,8 +386,11 @@ test('after a click the keys scroll; from the keyboard they drop, and focus() wo
         expect(await top()).toBeGreaterThan(50);
     }).toPass();
     expect(await fallen()).toBe(0);
-    await page.evaluate(() => scrollTo(0, 0));
-    await expect.poll(top).toBe(0);
+    await expect(async () => {  // once the browser's smooth scrolling has ended
+        await page.evaluate(() => scrollTo(0, 0));
+        await page.waitForTimeout(300);
+        expect(await top()).toBe(0);
+    }).toPass();
     await element(page).evaluate((water) => { document.activeElement.blur(); water.focus(); });
     await page.keyboard.press('Space');
     expect(await fallen()).toBe(1);

@@ -71,7 +71,8 @@ for (const [name, start] of Object.entries({ firefox, webkit })) {
             };
             for (const [size, ...extent] of [['desktop', 1200, 900], ['small-phone', 320, 568], ['phone', 390, 844]]) {
                 await engine.resize(...extent);
-                await engine.show(`${baseURL}#wet=0&groundRed=1&groundGreen=1&breeze=0`);  // a photo in its own colours, soon calm
+                // A photo in its own colours, soon calm. Another address loads the page anew.
+                await engine.show(`${baseURL}?${size}#wet=0&groundRed=1&groundGreen=1&breeze=0`);
                 await expect.poll(() => run(() => document.querySelector('#water[shown]') !== null)).toBe(true);
                 await new Promise((resolve) => setTimeout(resolve, 1500));
                 writeFileSync(screenshotPath(`${name}-${size}`), await look());

@@ -16,6 +16,7 @@ declare -A below=(
     [desktop]=""
     [pictures]="host"
     [host]="platform jni/natives.h"
+    [examples]="host"
     [preview]="$faces"
     [web]="$faces"
     [android]="$faces"

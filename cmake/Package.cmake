@@ -25,6 +25,7 @@ install(FILES platform/desktop_bitmap.h DESTINATION ${headers}/platform)
 
 install(EXPORT Tidemark NAMESPACE Tidemark:: FILE TidemarkConfig.cmake DESTINATION ${config})
 write_basic_package_version_file(${PROJECT_BINARY_DIR}/TidemarkConfigVersion.cmake COMPATIBILITY SameMajorVersion)
+file(RELATIVE_PATH up /prefix/${CMAKE_INSTALL_LIBDIR}/pkgconfig /prefix)
 configure_file(cmake/tidemark.pc.in ${PROJECT_BINARY_DIR}/tidemark.pc @ONLY)
 install(FILES ${PROJECT_BINARY_DIR}/TidemarkConfigVersion.cmake DESTINATION ${config})
 install(FILES ${PROJECT_BINARY_DIR}/tidemark.pc DESTINATION ${CMAKE_INSTALL_LIBDIR}/pkgconfig)

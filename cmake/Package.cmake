@@ -1,4 +1,4 @@
-# What an application links, in this build and from an installed package: Tidemark::effect, the library, and
+# Defines the targets that an application links, in this build and from an installed package: Tidemark::effect, the library, and
 # Tidemark::host, the host in C++ above it.
 include(GNUInstallDirs)
 include(CMakePackageConfigHelpers)

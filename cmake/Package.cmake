@@ -1,5 +1,5 @@
-# Defines the targets that an application links, in this build and from an installed package: Tidemark::effect, the library, and
-# Tidemark::host, the host in C++ above it.
+# Defines the targets that an application links, in this build and from an installed package: Tidemark::effect, the
+# library, and Tidemark::host, the host in C++ above it.
 include(GNUInstallDirs)
 include(CMakePackageConfigHelpers)
 

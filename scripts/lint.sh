@@ -47,5 +47,5 @@ diff <(git grep -il 'by contract' -- '*.cpp' '*.h' '*.vert' '*.frag' | sort) \
     <(grep -oE '[a-z]+/[A-Za-z_]+\.(cpp|h|vert|frag)' docs/contract.md | sort -u)
 
 [ -f build/clang/compile_commands.json ] || cmake --preset clang -DTIDEMARK_TESTS=OFF -DTIDEMARK_BENCH=OFF >/dev/null
-git ls-files '*.cpp' ':!'{tests,bench,reference,probes,web,fuzz} |
+git ls-files '*.cpp' ':!'{tests,bench,examples,reference,probes,web,fuzz} |
     xargs -P "$(nproc)" -n 4 clang-tidy -p build/clang --quiet 2> >(grep -v "warnings generated" >&2)

@@ -143,9 +143,10 @@ LiveWater::Frame LiveWater::frame(double now) {
     for (const Splash& splash : splashes_) {
         const double x = double{splash.x} * surface_.width;
         const double y = double{splash.y} * surface_.height;
-        if (!splash.withInk) host_.splash(x, y, splash.weight);
+        const bool withInk = splash.withInk && !host_.isTouched();
+        if (!withInk) host_.splash(x, y, splash.weight);
         for (const TouchAction action : {TouchAction::down, TouchAction::up}) {
-            if (splash.withInk) host_.touch(action, x, y, splash.weight, host_.time() + seconds);
+            if (withInk) host_.touch(action, x, y, splash.weight, host_.time() + seconds);
         }
     }
     splashes_.clear();

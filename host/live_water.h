@@ -66,8 +66,8 @@ public:
     // left corner. A cancel ends a stroke as lifting the finger does.
     void touch(TouchAction action, float x, float y, float weight, double time);
 
-    // A ripple without a finger, with the next frame: also the first, however early it was asked for. With ink it is
-    // what a finger does that comes down and is lifted at once.
+    // Raises a ripple with the next frame, even if that is the first one. With ink it acts as a finger that comes down
+    // and is lifted at once, unless a finger is down: the ink follows one stroke at a time.
     void splash(float x, float y, float weight, bool withInk = false);
 
     // Nothing is drawn before all three pictures were there once. `which` is a sum of k...Picture.

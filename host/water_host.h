@@ -56,6 +56,9 @@ public:
     void touch(TouchAction action, double x, double y, float weight, double time);
     void touch(TouchAction action, double x, double y, float weight) { touch(action, x, y, weight, time_); }
 
+    // Whether a finger is down.
+    bool isTouched() const { return fingerDown_; }
+
     // Raises the ripple of a finger of this weight that comes down, without a finger and without ink.
     void splash(double x, double y, float weight);
 

@@ -150,6 +150,18 @@ TEST_F(Live, drawsASurfaceOfAnotherSizeAtOnceUnderAFinger) {
     EXPECT_EQ(size.width, kWidth + 164);
 }
 
+TEST_F(Live, aDropWithInkDoesNotEndTheStrokeOfAFinger) {
+    water.setInk(true);
+    next();
+    touch();
+    for (int i = 0; i < 9; ++i) {
+        if (i == 3) water.splash(0.7f, 0.7f, 1.0f, true);
+        touch(TouchAction::move);
+        next();
+        EXPECT_NEAR(POSITION_X, 0.4 * kWidth, 1) << i;
+    }
+}
+
 TEST_F(Live, drawsAsManyPixelsAsTheQualityAllows) {
     for (const auto& [quality, density, pixels] :
          {std::tuple(Quality::low, 2.6, 1.0),

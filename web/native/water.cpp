@@ -123,9 +123,9 @@ EMSCRIPTEN_KEEPALIVE void clearInk() {
 EMSCRIPTEN_KEEPALIVE void touch(int action, float x, float y, float pressure, double seconds) {
     water->touch(static_cast<TouchAction>(action), x, y, pressure < 0.0f ? 1.0f : penWeight(pressure), seconds);
 }
-// A finger that comes down and is lifted at once.
-EMSCRIPTEN_KEEPALIVE void drop(float x, float y, float weight, double seconds) {
-    for (const TouchAction action : {TouchAction::down, TouchAction::up}) water->touch(action, x, y, weight, seconds);
+// A ripple with ink.
+EMSCRIPTEN_KEEPALIVE void drop(float x, float y, float weight) {
+    water->splash(x, y, weight, true);
 }
 EMSCRIPTEN_KEEPALIVE void splash(float x, float y, float weight) {
     water->splash(x, y, weight);
@@ -135,7 +135,7 @@ EMSCRIPTEN_KEEPALIVE void splash(float x, float y, float weight) {
 EMSCRIPTEN_KEEPALIVE void picturesChanged(unsigned which) {
     water->picturesChanged(which);
 }
-// What load() multiplies the colours of a picture by, 0xRRGGBB.
+// The colour that load() multiplies a picture by, 0xRRGGBB.
 EMSCRIPTEN_KEEPALIVE int shade(int slot, float brightness) {
     const Shade shade = water->shade(static_cast<PictureSlot>(slot), brightness);
     int color = 0;

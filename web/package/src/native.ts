@@ -95,7 +95,7 @@ interface Instance {
     _setBreezeAlways(always: boolean): void;
     _clearInk(): void;
     _touch(action: number, x: number, y: number, pressure: number, seconds: number): void;
-    _drop(x: number, y: number, weight: number, seconds: number): void;
+    _drop(x: number, y: number, weight: number): void;
     _splash(x: number, y: number, weight: number): void;
     _picturesChanged(which: number): void;
     _shade(slot: Slot, brightness: number): number;

@@ -152,7 +152,7 @@ export class Water extends EventTarget {
         const column = x / (this.box.clientWidth || 1);
         const row = y / (this.box.clientHeight || 1);
         this.let((native) => {
-            if (ink) native._drop(column, row, strength, performance.now() / 1000);
+            if (ink) native._drop(column, row, strength);
             else native._splash(column, row, strength);
         });
     }
@@ -236,7 +236,7 @@ export class Water extends EventTarget {
                 const touch = () => this.native!._touch(action, x, y, pressure, event.timeStamp / 1000);
                 if (action === TouchAction.down) {
                     const isLive = this.shown && this.state === 'live';
-                    this.let(isLive ? () => (touch(), (this.drawing = true)) : (native) => native._drop(x, y, 1, performance.now() / 1000));
+                    this.let(isLive ? () => (touch(), (this.drawing = true)) : (native) => native._drop(x, y, 1));
                 } else if (this.drawing && action === TouchAction.move) {
                     if (this.state === 'live') this.let(touch);
                 } else if (this.drawing) {

@@ -207,7 +207,7 @@ TEST_F(Program, RefusesBadInputInOneLine) {
         {2, "--still a.png --landscape a.jpg", "--landscape"},
         {2, "--still a.png --every 2", "--out"},
         {2, "--still a.png --seconds 1 --at 2", "--at"},
-        {2, "--preset clear-lake --inside i", "ink"},
+        {2, "--preset quicksilver --inside i", "ink"},
         {2, "--ink blue", "blue is not #rrggbb"},
         {2, "--ink '#112233' --no-ink", "--no-ink"},
         {2, "--out o --every 0", "not in range 1 to"},

@@ -1,5 +1,6 @@
-// Clips of a canvas, in the first of these forms that the browser writes.
-const types = ['video/mp4;codecs=avc1', 'video/webm;codecs=vp9', 'video/webm'];
+// Clips of a canvas, in the first of these forms that the browser writes. The canvas may change its size while it is
+// recorded: avc3 allows that, avc1 does not.
+const types = ['video/mp4;codecs=avc3', 'video/webm;codecs=vp9', 'video/webm', 'video/mp4'];
 const longest = 60_000;  // milliseconds
 
 export const canRecord = typeof MediaRecorder === 'function' && 'captureStream' in HTMLCanvasElement.prototype;

@@ -324,7 +324,7 @@ test('contexts that the page\'s other graphics take come back, and until then th
     });
     await expect.poll(states).toEqual(['lost', 'lost']);
     expect(await red(first)).toBeGreaterThan(180);  // 255 to the right, and white is told by its green
-    await expect.poll(states, { timeout: 30_000 }).toEqual(['live', 'live']);  // by itself
+    await expect.poll(states, { timeout: 60_000 }).toEqual(['live', 'live']);  // by itself, the second after half a minute
     await first.evaluate(({ water }) => water.lose.loseContext());
     await expect.poll(async () => (await states())[0]).toBe('lost');
     await first.click();

@@ -33,7 +33,7 @@ test('the value of every slider reaches the water under its own name', async ({ 
     await page.emulateMedia({ reducedMotion: 'reduce' });  // no drop falls by itself
     const pixelsWith = async (value) => {
         await page.goto('about:blank');
-        await open(page, `?src=favicon.svg#${value}`);
+        await open(page, `?src=favicon.svg#ink=0&${value}`);
         await takeOver(page);
         return pixelsAfter(page, touchAndRun);
     };
@@ -145,7 +145,7 @@ test('the keys work with Caps Lock and while a slider has the focus', async ({ p
     await page.keyboard.press('R');
     expect(await settings(page)).toMatchObject({ rain: 14 });
     await page.keyboard.press('I');
-    expect(await settings(page)).toMatchObject({ ink: true });
+    expect(await settings(page)).toMatchObject({ ink: false });
 });
 
 test('pictures and addresses are taken where they are dropped or pasted', async ({ page, baseURL }) => {

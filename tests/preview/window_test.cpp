@@ -55,11 +55,11 @@ protected:
 };
 
 TEST_F(Window, ObeysMouseAndKeysAndFillsAnotherSize) {
-    // Water that calms at once, and rain without a pause.
-    std::ofstream("../look") << "damping = 0.8\nrainDropsPerSecond = 60\nframesToFade = 30\n";
+    // Water that calms at once over a picture in its own colour, and rain without a pause.
+    std::ofstream("../look") << "damping = 0.8\nbreeze = 0\nwet = 0\nrainDropsPerSecond = 60\nframesToFade = 30\n";
     run("ffmpeg -v error -f lavfi -i color=red:size=20x10 -frames:v 1 ../red.png");
     program = std::async(
-        [] { return preview("--window --size 120x160 --look ../look --landscape ../red.png --record a.touch"); });
+        [] { return preview("--window --size 120x160 --look ../look --picture ../red.png --record a.touch"); });
     ASSERT_TRUE(waitUntil([] { return redAtEndOfStroke() > 20 && still(); })) << "no picture";
     const int red = redAtEndOfStroke();
     stroke();

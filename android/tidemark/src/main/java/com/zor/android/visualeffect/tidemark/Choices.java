@@ -1,6 +1,6 @@
 package com.zor.android.visualeffect.tidemark;
 
-/** What is chosen of a view, kept for its getters and for the water that is made when the view is first shown. */
+/** The settings of a view, kept for its getters and for the water that is made when the view is first shown. */
 final class Choices implements Cloneable {
     Look look = new Look();
     boolean withInk;

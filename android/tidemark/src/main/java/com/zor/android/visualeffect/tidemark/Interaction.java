@@ -1,6 +1,6 @@
 package com.zor.android.visualeffect.tidemark;
 
-/** What touches do. */
+/** The effect of touches. */
 public enum Interaction {
     /** A finger draws, and no view around the water can take it away for scrolling. */
     PRESS,

@@ -94,8 +94,8 @@ public final class JniTidemarkRender {
 
     /**
      * Takes one wave step over a rectangle of the two fields, N * N floats each with element {@code y * stride + x}.
-     * What lies around it is read and stays: at least one element on every side. On the mesh x and {@code stride} count
-     * down a column, y across the columns.
+     * The elements around it are read and not changed: at least one on every side. On the mesh x and {@code stride}
+     * count down a column, y across the columns.
      *
      * @param velocity speeds in model units a step
      * @param height heights in model units; kept within -100 to 100

@@ -7,7 +7,7 @@ import android.graphics.Bitmap;
  * everything on {@link GlThread}, {@link #frame} with the context current.
  */
 final class NativeWater {
-    /** What becomes of a picture that cannot be handed over. */
+    /** Hears of a picture that cannot be handed over. */
     interface Complaints {
         void hear(String message);
     }

@@ -87,7 +87,7 @@ final class Pictures {
         return picture.getConfig() != null && picture.getConfig().name().equals("HARDWARE");  // of API 26
     }
 
-    /** What takes the place of a picture that is not there. */
+    /** Stands in for a missing picture. */
     static Bitmap pixel() {
         return Bitmap.createBitmap(new int[] {DEEP_WATER}, 1, 1, Bitmap.Config.ARGB_8888);
     }

@@ -18,7 +18,7 @@ import java.nio.ByteBuffer;
  * no frames while nothing moves. Times are seconds of {@code System.nanoTime}, which is the clock of touches as well.
  */
 final class TidemarkRenderer implements Choreographer.FrameCallback {
-    /** What becomes of the water. */
+    /** The state of the water. */
     enum State { NOT_READY, MOVING, CALM, RESTING }
 
     /** The view; called on the main thread. */
@@ -65,7 +65,7 @@ final class TidemarkRenderer implements Choreographer.FrameCallback {
 
     // Called on the main thread.
 
-    /** What changes before the view is shown for the first time is in the {@link Choices} that it then hands over. */
+    /** Changes from before the view is first shown are in the {@link Choices} that it then hands over. */
     void change(Change change) {
         if (isStarted) {
             GlThread.post(() -> {

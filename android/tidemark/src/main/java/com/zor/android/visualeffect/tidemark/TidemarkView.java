@@ -347,7 +347,7 @@ public class TidemarkView extends FrameLayout {
     }
 
     /**
-     * What touches do.
+     * Returns the effect of touches.
      *
      * @return as set last
      */

@@ -8,6 +8,8 @@
 #include "bench/frame_scene.h"
 #include "desktop/headless_context.h"
 
+using namespace tidemark;
+
 namespace {
 
 void frames(benchmark::State& run, Scene kind, int width, int height) {

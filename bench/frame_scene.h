@@ -9,6 +9,8 @@
 #include "probes/gesture_state.h"
 #include "probes/smooth_picture.h"
 
+namespace tidemark {
+
 enum class Scene { water, idleInk, drag };
 
 class FrameScene {
@@ -60,3 +62,5 @@ private:
 inline const char* nameOf(Scene scene) {
     return scene == Scene::water ? "water" : scene == Scene::idleInk ? "idle ink" : "fast drag";
 }
+
+}  // namespace tidemark

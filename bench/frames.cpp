@@ -18,6 +18,8 @@
 #include "probes/library_blocks.h"
 #include "reference/surface.h"
 
+using namespace tidemark;
+
 namespace {
 
 void frames(benchmark::State& run, Scene kind, int vertices, int width, int height) {

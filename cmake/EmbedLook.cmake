@@ -52,7 +52,14 @@ function(embed_look properties folder)
             message(FATAL_ERROR "${properties}: cannot read \"${line}\"")
         endif()
     endforeach()
-    file(CONFIGURE OUTPUT ${folder}/look.h CONTENT "#pragma once\n\nstruct Look {\n${members}};\n" @ONLY)
+    file(CONFIGURE OUTPUT ${folder}/look.h CONTENT "\
+#pragma once
+
+namespace tidemark {
+struct Look {
+${members}};
+}  // namespace tidemark
+" @ONLY)
     file(CONFIGURE OUTPUT ${folder}/look_fields.h CONTENT "\
 #pragma once
 
@@ -60,6 +67,8 @@ function(embed_look properties folder)
 #include <variant>
 
 #include \"host/look.h\"
+
+namespace tidemark {
 
 // A field of Look and its limits.
 struct LookField {
@@ -70,6 +79,8 @@ struct LookField {
 
 inline constexpr LookField kLookFields[] = {
 ${fields}};
+
+}  // namespace tidemark
 " @ONLY)
     file(CONFIGURE OUTPUT ${folder}/look.json CONTENT "[${json}\n]\n" @ONLY)
     configure_file(${CMAKE_CURRENT_FUNCTION_LIST_DIR}/look.md.in ${folder}/look.md @ONLY)

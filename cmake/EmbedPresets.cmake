@@ -48,6 +48,8 @@ function(embed_presets ini folder)
 
 #include \"host/look.h\"
 
+namespace tidemark {
+
 // The picture under the water: tiles, pebbles or sand.
 enum class Ground { pool, river, shore };
 
@@ -61,6 +63,8 @@ struct Preset {
 
 inline constexpr Preset kPresets[] = {
 ${rows}};
+
+}  // namespace tidemark
 " @ONLY)
     file(CONFIGURE OUTPUT ${folder}/presets.json CONTENT "{${json}\n}\n" @ONLY)
     configure_file(${CMAKE_CURRENT_FUNCTION_LIST_DIR}/Preset.java.in ${folder}/Preset.java @ONLY)

@@ -15,6 +15,8 @@
 #include "platform/desktop_bitmap.h"
 #include "probes/copying_environment.h"
 
+using namespace tidemark;
+
 namespace {
 
 using Wide = std::int64_t;

@@ -3,6 +3,8 @@
 #include <cmath>
 #include <utility>
 
+namespace tidemark {
+
 namespace {
 
 struct Course {
@@ -57,3 +59,5 @@ void Breeze::add(int column, int row, int count, float* heights) const {
         for (int i = 0; i < count; ++i) heights[i] += c * cosines[i] - s * sines[i];
     }
 }
+
+}  // namespace tidemark

@@ -6,6 +6,8 @@
 
 #include "host/wave_lattice.h"
 
+namespace tidemark {
+
 class Breeze {
 public:
     explicit Breeze(const WaveLattice& lattice);
@@ -26,3 +28,5 @@ private:
     float height_ = 0.0f;
     double time_ = 0.0;
 };
+
+}  // namespace tidemark

@@ -7,6 +7,8 @@
 
 #include "jni/globals.h"
 
+namespace tidemark {
+
 EngineView lookIntoEngine() {
     EngineView view = {};
     const Texture<vec2>& flow = fluid.VelocityTex;
@@ -33,3 +35,5 @@ EngineView lookIntoEngine() {
     view.tint[2] = tint(fluid.InkColor.b);
     return view;
 }
+
+}  // namespace tidemark

@@ -4,6 +4,8 @@
 
 #include <vector>
 
+namespace tidemark {
+
 struct EngineView {
     // The flow, rows from the bottom: x and y of each cell, y upwards.
     std::vector<float> velocity;
@@ -19,3 +21,5 @@ struct EngineView {
 
 // The engine's state after the last frame. Needs the context current and a set-up with ink; leaves framebuffer 0 bound.
 EngineView lookIntoEngine();
+
+}  // namespace tidemark

@@ -2,6 +2,8 @@
 
 #include <type_traits>
 
+namespace tidemark {
+
 namespace {
 
 template <class Array, class Element, class Reference>
@@ -29,3 +31,5 @@ JNIEnv* hostEnvironment() {
     static JNIEnv environment = {&functions};
     return &environment;
 }
+
+}  // namespace tidemark

@@ -6,6 +6,8 @@
 #include <cstddef>
 #include <vector>
 
+namespace tidemark {
+
 template <class Reference, class Element>
 struct HostArray : Reference {
     explicit HostArray(std::size_t length) : values(length) {}
@@ -17,3 +19,5 @@ using ShortArray = HostArray<_jshortArray, jshort>;
 
 // An environment whose array calls take the arrays above. It hands out their own elements, as nothing moves them.
 JNIEnv* hostEnvironment();
+
+}  // namespace tidemark

@@ -7,6 +7,8 @@
 
 #include "host/look_values.h"
 
+namespace tidemark {
+
 namespace {
 
 // A view that keeps its size for so long, in seconds, has it for good.
@@ -182,3 +184,5 @@ double LiveWater::due() const {
     const bool isStill = host_.isResting() && !isDue;
     return std::min(surface, isStill ? kNever : now_ + (isDue ? 0.0 : host_.due() - host_.time()));
 }
+
+}  // namespace tidemark

@@ -16,6 +16,8 @@
 #include "host/view_size.h"
 #include "host/water_host.h"
 
+namespace tidemark {
+
 struct LookField;
 
 // The weight of a pen's pressure of 0 to 1: 0.3 to 1.5. A finger or a mouse weighs 1, as few screens measure its
@@ -133,3 +135,5 @@ private:
     double proportions_ = 0.0;  // to which the backgrounds were last cropped
     int longest_ = 0;           // and the view's longer side then
 };
+
+}  // namespace tidemark

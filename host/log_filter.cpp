@@ -4,6 +4,8 @@
 
 #include <string_view>
 
+namespace tidemark {
+
 namespace {
 
 // The library notes these two steps of every set-up at error priority, though nothing is wrong.
@@ -20,3 +22,5 @@ void passFailures(const __android_log_message* message) {
 void quietenLog() {
     __android_log_set_logger(passFailures);
 }
+
+}  // namespace tidemark

@@ -8,6 +8,8 @@
 #include "host/quoted.h"
 #include "host/read_file.h"
 
+namespace tidemark {
+
 namespace {
 
 std::string trimmed(const std::string& text) {
@@ -58,3 +60,5 @@ std::optional<Look> loadLook(const std::string& path, std::string& error, const 
     std::istringstream text(*content);
     return parseLook(text, path, error, base);
 }
+
+}  // namespace tidemark

@@ -8,6 +8,10 @@
 
 #include "host/look.h"
 
+namespace tidemark {
+
 // On failure says why in `error`, in one line that starts with "name:line: ".
 std::optional<Look> parseLook(std::istream& text, const std::string& name, std::string& error, const Look& base = {});
 std::optional<Look> loadLook(const std::string& path, std::string& error, const Look& base = {});
+
+}  // namespace tidemark

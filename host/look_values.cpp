@@ -4,6 +4,8 @@
 #include <cmath>
 #include <type_traits>
 
+namespace tidemark {
+
 const LookField* fieldNamed(std::string_view name) {
     const auto* const field = std::find_if(
         std::begin(kLookFields), std::end(kLookFields), [=](const LookField& f) { return f.name == name; });
@@ -32,3 +34,5 @@ const LookField* firstInvalid(const Look& look) {
     });
     return field == std::end(kLookFields) ? nullptr : field;
 }
+
+}  // namespace tidemark

@@ -5,6 +5,8 @@
 
 #include "host/look_fields.h"
 
+namespace tidemark {
+
 // Null if there is none.
 const LookField* fieldNamed(std::string_view name);
 
@@ -14,3 +16,5 @@ bool setValue(Look& look, const LookField& field, double value);
 
 // Null if all values are within their limits.
 const LookField* firstInvalid(const Look& look);
+
+}  // namespace tidemark

@@ -3,6 +3,8 @@
 
 #include "jni/natives.h"
 
+namespace tidemark {
+
 #define TIDEMARK_NATIVE(method) \
     inline constexpr auto& method = Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_##method
 
@@ -25,3 +27,5 @@ TIDEMARK_NATIVE(clearInkValue);
 }  // namespace native
 
 #undef TIDEMARK_NATIVE
+
+}  // namespace tidemark

@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+namespace tidemark {
+
 namespace {
 
 constexpr Pace::Level kLevels[] = {{1.0, 1.0}, {0.7, 1.0}, {0.5, 1.0}, {0.5, 0.8}, {0.5, 0.65}, {0.5, 0.5}};
@@ -72,3 +74,5 @@ bool Pace::judge(double now, double shortest) {
     }
     return false;
 }
+
+}  // namespace tidemark

@@ -4,6 +4,8 @@
 
 #include <array>
 
+namespace tidemark {
+
 class Pace {
 public:
     // Shares of the mesh's vertices and of the pixels along each side, 1 being the best.
@@ -39,3 +41,5 @@ private:
     double retryAt_ = 0.0;   // when a better level is tried
     double patience_ = 8.0;  // seconds until then; doubled by each attempt that fails
 };
+
+}  // namespace tidemark

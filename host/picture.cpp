@@ -9,6 +9,8 @@
 #include "host/shade.h"
 #include "platform/desktop_bitmap.h"
 
+namespace tidemark {
+
 namespace {
 
 // The pixels along one axis that one pixel of a smaller picture covers, and the share that each of them has in it.
@@ -120,3 +122,5 @@ PictureSource sourceOf(const Pictures& pictures) {
     plain.wet = 0.0f;
     return sourceOf(pictures, plain);
 }
+
+}  // namespace tidemark

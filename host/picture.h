@@ -6,6 +6,8 @@
 
 #include "host/picture_source.h"
 
+namespace tidemark {
+
 struct Look;
 
 // Rows from the top, four bytes a pixel in R, G, B, A order, no padding.
@@ -32,3 +34,5 @@ void handOver(PictureSlot slot, const Picture& picture);
 // Hands over pictures that stay where they are, in the colours that the look gives them, or in their own.
 PictureSource sourceOf(const Pictures& pictures, const Look& look);
 PictureSource sourceOf(const Pictures& pictures);
+
+}  // namespace tidemark

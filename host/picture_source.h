@@ -3,6 +3,8 @@
 
 #include <functional>
 
+namespace tidemark {
+
 enum class PictureSlot { portrait = 0, landscape = 1, light = 2 };
 
 // Some of the three slots, as a sum.
@@ -17,3 +19,5 @@ struct PictureSource {
     // Called with the slot's new texture bound to the active unit, which the face may fill instead. May be empty.
     std::function<void(PictureSlot slot)> loaded;
 };
+
+}  // namespace tidemark

@@ -2,6 +2,8 @@
 
 #include <cstddef>
 
+namespace tidemark {
+
 std::string quoted(std::string_view text) {
     constexpr std::size_t kLongest = 60;
     constexpr char kDigits[] = "0123456789abcdef";
@@ -16,3 +18,5 @@ std::string quoted(std::string_view text) {
     }
     return result + (text.size() > kLongest ? "...\"" : "\"");
 }
+
+}  // namespace tidemark

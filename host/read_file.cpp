@@ -7,6 +7,8 @@
 #include <cstring>
 #include <fstream>
 
+namespace tidemark {
+
 std::optional<std::string> readFile(
     const std::string& path, const std::string& what, std::size_t mostBytes, std::string& error) {
     const auto fail = [&](const std::string& reason) {
@@ -27,3 +29,5 @@ std::optional<std::string> readFile(
     content.resize(static_cast<std::size_t>(file.gcount()));
     return content;
 }
+
+}  // namespace tidemark

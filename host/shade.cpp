@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+namespace tidemark {
+
 namespace {
 
 // Grounds up to this brightness keep their colours; that of white paper takes all of `wet`.
@@ -20,3 +22,5 @@ Shade shadeOf(const Look& look, PictureSlot slot, float brightness) {
         look.groundRed * (1.0f - share * kMostTaken.red), look.groundGreen * (1.0f - share * kMostTaken.green),
         look.groundBlue * (1.0f - share * kMostTaken.blue)};
 }
+
+}  // namespace tidemark

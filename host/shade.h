@@ -4,6 +4,8 @@
 #include "host/look.h"
 #include "host/picture_source.h"
 
+namespace tidemark {
+
 struct Shade {
     float red, green, blue;  // 0 to 1
 
@@ -12,3 +14,5 @@ struct Shade {
 
 // `brightness`: the mean of all channels of the picture, 0 to 1.
 Shade shadeOf(const Look& look, PictureSlot slot, float brightness);
+
+}  // namespace tidemark

@@ -2,6 +2,8 @@
 
 #include <algorithm>
 
+namespace tidemark {
+
 namespace {
 
 // Reports that lie farther apart than this, in seconds, do not belong to one movement: the finger has rested between
@@ -52,3 +54,5 @@ void StrokeClock::reset() {
     due_.clear();
     isDown_ = false;
 }
+
+}  // namespace tidemark

@@ -4,6 +4,8 @@
 
 #include <vector>
 
+namespace tidemark {
+
 enum class TouchAction { down = 0, up = 1, move = 2, cancel = 3 };
 
 struct Touch {
@@ -36,3 +38,5 @@ private:
     Touch given_ = {};            // what the ink got last
     bool isDown_ = false;
 };
+
+}  // namespace tidemark

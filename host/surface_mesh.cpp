@@ -4,6 +4,8 @@
 #include <cmath>
 #include <cstddef>
 
+namespace tidemark {
+
 namespace {
 
 std::ptrdiff_t at(int line, int length) {
@@ -161,3 +163,5 @@ void SurfaceMesh::gather(
         turnDiagonals(c, indices);
     }
 }
+
+}  // namespace tidemark

@@ -7,6 +7,8 @@
 
 #include "host/breeze.h"
 
+namespace tidemark {
+
 class SurfaceMesh {
 public:
     // A square of `vertices` a side over a lattice of `points` a side, each at least 2, of which only a middle part is
@@ -64,3 +66,5 @@ private:
     std::vector<float> slopes_, slopesBefore_;      // the products of both slopes in this column and in the one before
     std::vector<int> turned_;                       // which of the cells between them
 };
+
+}  // namespace tidemark

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <cmath>
 
+namespace tidemark {
+
 namespace {
 
 // Smaller views than this are drawn as large, and shown smaller.
@@ -23,3 +25,5 @@ Size drawnSize(const ViewSize& view, Quality quality, double resolution) {
     };
     return {side(view.width), side(view.height)};
 }
+
+}  // namespace tidemark

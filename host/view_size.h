@@ -1,6 +1,8 @@
 // How many pixels a view is drawn with.
 #pragma once
 
+namespace tidemark {
+
 enum class Quality { automatic = 0, low = 1, medium = 2, high = 3 };
 
 struct Size {
@@ -21,3 +23,5 @@ struct ViewSize {
 // density-independent one: at most 1, 2 and 3 for low, medium and high; automatic begins with that of medium, of which
 // `resolution` is a share.
 Size drawnSize(const ViewSize& view, Quality quality, double resolution);
+
+}  // namespace tidemark

@@ -6,6 +6,8 @@
 
 #include "host/native_names.h"
 
+namespace tidemark {
+
 namespace {
 
 constexpr int kMostInkSteps = 4;
@@ -396,3 +398,5 @@ void WaterHost::drawOnce(bool isSeen) {
         look_.alphaMix, look_.alphaScale1, look_.alphaScale2, look_.inkRed, look_.inkGreen, look_.inkBlue,
         look_.fresnelRatio, look_.specularRatio, look_.exponent, width_ > height_);
 }
+
+}  // namespace tidemark

@@ -17,6 +17,8 @@
 #include "host/surface_mesh.h"
 #include "host/wave_lattice.h"
 
+namespace tidemark {
+
 class WaterHost {
 public:
     // `seed` fixes where the rain falls. The view is width x height pixels, each at least 1. Every value of the look is
@@ -178,3 +180,5 @@ private:
     FloatArray heightAttribs_{0};
     FloatArray mvp_{16};
 };
+
+}  // namespace tidemark

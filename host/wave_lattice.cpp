@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <cmath>
 
+namespace tidemark {
+
 namespace {
 
 // Beyond this factor on the curvature a wave of the shortest length grows from rounding errors.
@@ -37,3 +39,5 @@ WaveLattice latticeFor(const Look& look, int width, int height) {
     lattice.damping = look.damping > 0.0f ? look.damping : static_cast<float>(damping);
     return lattice;
 }
+
+}  // namespace tidemark

@@ -4,6 +4,8 @@
 
 #include "host/look.h"
 
+namespace tidemark {
+
 struct WaveLattice {
     int points;          // along each side of a square around the view
     int extent;          // of that side, model units
@@ -15,3 +17,5 @@ struct WaveLattice {
 
 // Lengths of the look are shares of the view's height: that of an upright view of 9 : 16 with as many pixels.
 WaveLattice latticeFor(const Look& look, int width, int height);
+
+}  // namespace tidemark

@@ -2,6 +2,8 @@
 
 #include <cmath>
 
+namespace tidemark {
+
 namespace {
 
 std::uint8_t toByte(float linear) {
@@ -34,3 +36,5 @@ Canvas toCanvas(const Picture& picture) {
     }
     return canvas;
 }
+
+}  // namespace tidemark

@@ -7,6 +7,8 @@
 
 #include "host/picture.h"
 
+namespace tidemark {
+
 struct Rgb {
     float r, g, b;  // linear light, 1 is white
 };
@@ -48,3 +50,5 @@ template <class Paint>
 void forAllPixels(Canvas& canvas, Paint paint) {
     forPixelsAround(canvas, 0.0f, 0.0f, static_cast<float>(canvas.width + canvas.height), paint);
 }
+
+}  // namespace tidemark

@@ -7,6 +7,8 @@
 
 #include "pictures/noise.h"
 
+namespace tidemark {
+
 namespace {
 
 constexpr int kWaves = 14;
@@ -78,3 +80,5 @@ std::vector<float> causticNet(int width, int height, float cell, unsigned seed) 
     }
     return map;
 }
+
+}  // namespace tidemark

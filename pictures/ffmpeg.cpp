@@ -15,6 +15,8 @@
 #include <utility>
 #include <vector>
 
+namespace tidemark {
+
 Ffmpeg::~Ffmpeg() {
     if (pid_ > 0) kill(pid_, SIGKILL);
     wait();
@@ -126,3 +128,5 @@ int Ffmpeg::wait() {
     pid_ = -1;
     return status;
 }
+
+}  // namespace tidemark

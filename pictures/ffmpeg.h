@@ -8,6 +8,8 @@
 
 #include "host/picture.h"
 
+namespace tidemark {
+
 class Ffmpeg {
 public:
     Ffmpeg() = default;
@@ -43,3 +45,5 @@ private:
     std::FILE* pipe_ = nullptr;
     std::FILE* messages_ = nullptr;  // its standard error
 };
+
+}  // namespace tidemark

@@ -2,6 +2,8 @@
 
 #include <cstdint>
 
+namespace tidemark {
+
 namespace {
 
 float smooth(float t) {
@@ -46,3 +48,5 @@ CloudTile::CloudTile(unsigned seed) : values_(std::size_t{kSide} * kSide, 0.5f) 
         amplitude *= 0.55f;
     }
 }
+
+}  // namespace tidemark

@@ -5,6 +5,8 @@
 #include <random>
 #include <vector>
 
+namespace tidemark {
+
 class Random {
 public:
     explicit Random(unsigned seed) : engine_(seed) {}
@@ -34,3 +36,5 @@ public:
 private:
     std::vector<float> values_;
 };
+
+}  // namespace tidemark

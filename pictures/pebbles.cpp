@@ -7,6 +7,8 @@
 #include <iterator>
 #include <numbers>
 
+namespace tidemark {
+
 namespace {
 
 struct Mineral {
@@ -174,3 +176,5 @@ void scatterPebbles(Canvas& canvas, float unit, Random& random, const CloudTile&
     scatter(canvas, 1.50f * unit, 2.20f * unit, 0.05f, random, clouds);
     scatter(canvas, 0.14f * unit, 0.32f * unit, 0.03f, random, clouds);
 }
+
+}  // namespace tidemark

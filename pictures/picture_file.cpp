@@ -10,6 +10,8 @@
 
 #include "pictures/ffmpeg.h"
 
+namespace tidemark {
+
 namespace {
 
 // Ten times as long as the largest picture takes: a small file can ask for hours.
@@ -75,3 +77,5 @@ bool savePicture(const Picture& picture, const std::string& path, std::string& e
     return ffmpeg.startWriting(picture.width, picture.height, 1, std::string(kPng) + " -f image2pipe", path, error) &&
            ffmpeg.write(picture, error) && ffmpeg.finish(error);
 }
+
+}  // namespace tidemark

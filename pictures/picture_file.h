@@ -6,6 +6,8 @@
 
 #include "host/picture.h"
 
+namespace tidemark {
+
 // The size of the largest phone cameras' photos. Reading one needs a few times four bytes for each pixel.
 constexpr int kMostPixels = 200'000'000;
 
@@ -19,3 +21,5 @@ constexpr char kPng[] = "-c:v png -pred mixed -pix_fmt rgb24";
 
 // Writes a PNG. On failure says why in `error`.
 bool savePicture(const Picture& picture, const std::string& path, std::string& error);
+
+}  // namespace tidemark

@@ -3,6 +3,8 @@
 #include <algorithm>
 #include <cmath>
 
+namespace tidemark {
+
 namespace {
 
 constexpr Rgb kGlazes[] = {
@@ -58,3 +60,5 @@ void layTiles(Canvas& canvas, float unit, const CloudTile& clouds) {
         pixel = mix(colour, kGrout * (0.6f + 0.5f * cloud), grout);
     });
 }
+
+}  // namespace tidemark

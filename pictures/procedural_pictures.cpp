@@ -12,6 +12,8 @@
 #include "pictures/pool_tiles.h"
 #include "pictures/sea_sand.h"
 
+namespace tidemark {
+
 // The net of light is cast while the ground is painted; a browser gives its programs one thread.
 #ifdef __EMSCRIPTEN__
 constexpr auto kBeside = std::launch::deferred;
@@ -103,3 +105,5 @@ Picture waterLight(int side) {
     });
     return toPicture(sky);
 }
+
+}  // namespace tidemark

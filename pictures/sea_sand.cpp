@@ -4,6 +4,8 @@
 #include <cmath>
 #include <numbers>
 
+namespace tidemark {
+
 namespace {
 
 constexpr float kPi = std::numbers::pi_v<float>;
@@ -81,3 +83,5 @@ void rakeSand(Canvas& canvas, float unit, Random& random, const CloudTile& cloud
     star(0.74f, 0.62f, 2.3f, {0.62f, 0.13f, 0.10f});
     star(0.38f, 0.83f, 1.6f, {0.75f, 0.42f, 0.14f});
 }
+
+}  // namespace tidemark

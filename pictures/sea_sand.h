@@ -4,5 +4,9 @@
 #include "pictures/canvas.h"
 #include "pictures/noise.h"
 
+namespace tidemark {
+
 // Covers the canvas; `unit` is about half the distance from rib to rib in pixels.
 void rakeSand(Canvas& canvas, float unit, Random& random, const CloudTile& clouds);
+
+}  // namespace tidemark

@@ -8,6 +8,8 @@
 #include "host/engine_window.h"
 #include "pictures/canvas.h"
 
+namespace tidemark {
+
 namespace {
 
 // Values in rows; beyond an edge those on it go on.
@@ -157,3 +159,5 @@ std::array<Picture, 4> drawInside(const WaterHost& host, const Look& look, const
         drawHeight(host, look, result.width, result.height), drawVelocity(result, engine),
         drawDensity(result.width, result.height, engine), result};
 }
+
+}  // namespace tidemark

@@ -8,6 +8,8 @@
 #include "host/picture.h"
 #include "host/water_host.h"
 
+namespace tidemark {
+
 // The pictures as files: height.png, velocity.png, density.png and result.png.
 std::string insideName(int picture);
 
@@ -15,3 +17,5 @@ std::string insideName(int picture);
 // heights, crests red and troughs blue; the flow, arrows whose length and colour grow with the square root of the
 // speed; the ink alone, on paper; and the frame.
 std::array<Picture, 4> drawInside(const WaterHost& host, const Look& look, const Picture& result);
+
+}  // namespace tidemark

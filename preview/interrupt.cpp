@@ -2,6 +2,8 @@
 
 #include <csignal>
 
+namespace tidemark {
+
 static volatile std::sig_atomic_t noted = 0;
 
 void noteInterrupts() {
@@ -15,3 +17,5 @@ void noteInterrupts() {
 bool interrupted() {
     return noted != 0;
 }
+
+}  // namespace tidemark

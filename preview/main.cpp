@@ -15,6 +15,7 @@
 #include "preview/preview.h"
 #include "preview/window.h"
 
+using namespace tidemark;
 namespace fs = std::filesystem;
 
 namespace {

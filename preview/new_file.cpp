@@ -7,6 +7,8 @@
 #include <cstdio>
 #include <cstring>
 
+namespace tidemark {
+
 namespace fs = std::filesystem;
 
 namespace {
@@ -68,3 +70,5 @@ bool NewFile::keep(std::string& error) {
     part_.clear();
     return true;
 }
+
+}  // namespace tidemark

@@ -4,6 +4,8 @@
 #include <filesystem>
 #include <string>
 
+namespace tidemark {
+
 // All of these say why in `error` on failure.
 
 // Whether a file may be written: there is none of that name, or it may be overwritten.
@@ -36,3 +38,5 @@ private:
     std::filesystem::path path_, part_;
     bool force_ = false;
 };
+
+}  // namespace tidemark

@@ -6,6 +6,8 @@
 #include "pictures/picture_file.h"
 #include "preview/inside.h"
 
+namespace tidemark {
+
 namespace fs = std::filesystem;
 
 namespace {
@@ -136,3 +138,5 @@ bool Output::keepFrames(std::string& error) {
 void Output::tell(const std::string& what, std::uintmax_t bytes) {
     summary_ += (summary_.empty() ? "" : ", ") + what + " (" + sizeInWords(bytes) + ")";
 }
+
+}  // namespace tidemark

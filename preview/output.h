@@ -9,6 +9,8 @@
 #include "preview/new_file.h"
 #include "preview/preview.h"
 
+namespace tidemark {
+
 // The frames of a run as pictures and as a video, and single pictures. What was there before stays unless the options
 // say otherwise. What is destroyed before it has finished leaves no frames and no video.
 class Output {
@@ -48,3 +50,5 @@ private:
 
 // "1.2 MB"
 std::string sizeInWords(std::uintmax_t bytes);
+
+}  // namespace tidemark

@@ -22,6 +22,8 @@
 #include "preview/seam.h"
 #include "preview/touch_script.h"
 
+namespace tidemark {
+
 namespace {
 
 // GL's rows come from the bottom.
@@ -158,3 +160,5 @@ bool runPreview(const PreviewOptions& options, std::string& summary, std::string
     summary = describe(options, output.frames(), plan.round, output.summary());
     return true;
 }
+
+}  // namespace tidemark

@@ -8,6 +8,8 @@
 #include "host/presets.h"
 #include "host/view_size.h"
 
+namespace tidemark {
+
 // An empty picture means the painted one, an empty look that of the preset, an empty script none, an empty output none.
 struct PreviewOptions {
     std::string picture, portrait, landscape, light;  // files; the first where the next two are empty
@@ -43,3 +45,5 @@ constexpr int kLongestSide = 8192;
 // On failure says why in `error`. Otherwise `summary` is a line that tells what was written. Ctrl-C ends the run early,
 // with what was drawn until then.
 bool runPreview(const PreviewOptions& options, std::string& summary, std::string& error);
+
+}  // namespace tidemark

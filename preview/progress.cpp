@@ -4,6 +4,8 @@
 
 #include <cstdio>
 
+namespace tidemark {
+
 Progress::Progress(const std::string& beginning) : watched_(isatty(STDERR_FILENO) != 0) {
     if (watched_) std::fprintf(stderr, "%s ...\n", beginning.c_str());
 }
@@ -22,3 +24,5 @@ void Progress::show(int framesDone, int frames) {
     std::fprintf(stderr, "\r[%s] %d of %d frames", bar.c_str(), framesDone, frames);
     shown_ = true;
 }
+
+}  // namespace tidemark

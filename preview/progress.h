@@ -4,6 +4,8 @@
 #include <chrono>
 #include <string>
 
+namespace tidemark {
+
 class Progress {
 public:
     // Says what comes before the first frame, which takes a while in a large view.
@@ -18,3 +20,5 @@ private:
     bool shown_ = false;
     std::chrono::steady_clock::time_point next_ = {};
 };
+
+}  // namespace tidemark

@@ -12,6 +12,8 @@
 #include "pictures/picture_file.h"
 #include "pictures/procedural_pictures.h"
 
+namespace tidemark {
+
 namespace {
 
 Picture paintGround(Ground ground, int width, int height) {
@@ -85,3 +87,5 @@ std::optional<Look> chooseLook(const PreviewOptions& options, std::string& error
     }
     return look;
 }
+
+}  // namespace tidemark

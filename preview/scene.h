@@ -8,6 +8,8 @@
 #include "host/picture.h"
 #include "preview/preview.h"
 
+namespace tidemark {
+
 // On failure says why in `error`.
 std::optional<Pictures> choosePictures(const PreviewOptions& options, std::string& error);
 
@@ -16,3 +18,5 @@ void fitToDriver(const std::string& file, Picture& picture);
 
 // Says on standard error what it has to change. On failure says why in `error`.
 std::optional<Look> chooseLook(const PreviewOptions& options, std::string& error);
+
+}  // namespace tidemark

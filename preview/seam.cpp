@@ -2,6 +2,8 @@
 
 #include <cstddef>
 
+namespace tidemark {
+
 const Picture* Seam::shown(int number, const Picture& frame) {
     if (number < fade_) {
         beginning_.push_back(frame);
@@ -15,3 +17,5 @@ const Picture* Seam::shown(int number, const Picture& frame) {
     }
     return &mixed;
 }
+
+}  // namespace tidemark

@@ -7,6 +7,8 @@
 
 #include "host/picture.h"
 
+namespace tidemark {
+
 class Seam {
 public:
     // Both counted in frames; without a fade every frame is as it is.
@@ -20,3 +22,5 @@ private:
     int round_, fade_;
     std::vector<Picture> beginning_;
 };
+
+}  // namespace tidemark

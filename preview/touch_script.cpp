@@ -12,6 +12,8 @@
 #include "host/quoted.h"
 #include "host/read_file.h"
 
+namespace tidemark {
+
 namespace {
 
 // Longest time and farthest position that a script may name: an hour, and what an int holds with room to spare.
@@ -133,3 +135,5 @@ void TouchPlayer::deliverBefore(double timeMs, WaterHost& host) {
             static_cast<double>(event.timeMs) / 1000.0);
     }
 }
+
+}  // namespace tidemark

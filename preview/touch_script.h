@@ -16,6 +16,8 @@
 
 #include "host/water_host.h"
 
+namespace tidemark {
+
 struct TouchCoordinate {
     double value;
     bool percent;
@@ -52,3 +54,5 @@ private:
     int width_, height_;
     std::size_t next_ = 0;
 };
+
+}  // namespace tidemark

@@ -21,6 +21,8 @@
 #include "preview/scene.h"
 #include "preview/touch_script.h"
 
+namespace tidemark {
+
 namespace {
 
 struct Stage {
@@ -175,3 +177,5 @@ bool runWindow(PreviewOptions options, std::string& summary, std::string& error)
     run(window, stage);
     return options.record.empty() || saveTouches(options, std::move(stage.touches), summary, error);
 }
+
+}  // namespace tidemark

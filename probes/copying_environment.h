@@ -27,10 +27,10 @@ void copyBack(JNIEnv*, auto reference, auto* copy, jint mode) {
 
 inline JNIEnv* copyingEnvironment() {
     static JNINativeInterface_ table = {};
-    table.GetFloatArrayElements = copyElements<FloatArray, jfloat>;
-    table.GetShortArrayElements = copyElements<ShortArray, jshort>;
-    table.ReleaseFloatArrayElements = copyBack<FloatArray>;
-    table.ReleaseShortArrayElements = copyBack<ShortArray>;
+    table.GetFloatArrayElements = copyElements<tidemark::FloatArray, jfloat>;
+    table.GetShortArrayElements = copyElements<tidemark::ShortArray, jshort>;
+    table.ReleaseFloatArrayElements = copyBack<tidemark::FloatArray>;
+    table.ReleaseShortArrayElements = copyBack<tidemark::ShortArray>;
     static JNIEnv environment = {&table};
     return &environment;
 }

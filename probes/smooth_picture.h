@@ -5,8 +5,8 @@
 #include "host/picture.h"
 
 // Returns a picture of gentle gradients, in which a small position error is a small colour error.
-inline Picture smoothPicture(int width, int height, int variant) {
-    Picture picture = {width, height, {}};
+inline tidemark::Picture smoothPicture(int width, int height, int variant) {
+    tidemark::Picture picture = {width, height, {}};
     for (int y = 0; y < height; ++y) {
         for (int x = 0; x < width; ++x) {
             const double u = (x + 0.5) / width;

@@ -5,6 +5,8 @@
 #include "host/look_values.h"
 #include "host/native_names.h"
 
+using namespace tidemark;
+
 namespace {
 
 // The native part of a NativeWater. It draws with its own arrays; only the pictures belong to Java.

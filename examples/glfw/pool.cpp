@@ -6,6 +6,8 @@
 
 #include <algorithm>
 
+using namespace tidemark;
+
 static Picture tiles(int width, int height) {
     Picture picture{width, height, {}};
     for (int y = 0; y < height; ++y) {

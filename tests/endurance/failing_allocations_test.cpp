@@ -8,6 +8,8 @@
 #include "tests/endurance/strokes.h"
 #include "tests/support/gl_test.h"
 
+using namespace tidemark;
+
 namespace {
 
 class FailingAllocations : public GlTest {

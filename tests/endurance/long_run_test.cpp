@@ -15,6 +15,8 @@
 #include "tests/endurance/strokes.h"
 #include "tests/support/log_recorder.h"
 
+using namespace tidemark;
+
 namespace {
 
 // While `looking`, checks the arrays that the library releases to the host.

@@ -9,6 +9,8 @@
 #include "tests/endurance/strokes.h"
 #include "tests/support/gl_test.h"
 
+using namespace tidemark;
+
 namespace {
 
 // Buffers, textures, framebuffers, programs, shaders.

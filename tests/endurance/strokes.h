@@ -16,7 +16,7 @@ inline bool isFullLength() {
 }
 
 struct StrokeEvent {
-    TouchAction action;
+    tidemark::TouchAction action;
     double x, y;  // fractions of the view; some are outside 0 to 1
 };
 using Stroke = std::vector<StrokeEvent>;
@@ -29,25 +29,25 @@ inline std::vector<Stroke> strokesOfAllKinds() {
     std::vector<Stroke> strokes;
     for (int i = 0; i < 16; ++i) {
         const double length = std::vector{0.0, 0.009, 0.025, 0.08}[static_cast<std::size_t>(i % 4)];  // of a move
-        Stroke stroke = {{TouchAction::down, place(random), place(random)}};
+        Stroke stroke = {{tidemark::TouchAction::down, place(random), place(random)}};
         double direction = 20 * turn(random);
         for (auto moves = 8 + random() % 32; moves > 0; --moves) {
             direction += turn(random);
             const auto [action, x, y] = stroke.back();
             const double way = length * share(random);
-            stroke.push_back({TouchAction::move, x + way * std::cos(direction), y + way * std::sin(direction)});
+            stroke.push_back({tidemark::TouchAction::move, x + way * std::cos(direction), y + way * std::sin(direction)});
         }
         stroke.push_back(stroke.back());
-        stroke.back().action = i % 5 == 4 ? TouchAction::cancel : TouchAction::up;
+        stroke.back().action = i % 5 == 4 ? tidemark::TouchAction::cancel : tidemark::TouchAction::up;
         strokes.push_back(stroke);
     }
     return strokes;
 }
 
 // Sets up the library and loads its pictures. `due` selects the pictures to transfer first.
-inline void setUp(WaterHost& host, bool withInk, unsigned due = 0) {
-    static const Pictures pictures = {smoothPicture(24, 32, 1), smoothPicture(32, 24, 2), smoothPicture(8, 8, 3)};
-    static const PictureSource source = sourceOf(pictures);
+inline void setUp(tidemark::WaterHost& host, bool withInk, unsigned due = 0) {
+    static const tidemark::Pictures pictures = {smoothPicture(24, 32, 1), smoothPicture(32, 24, 2), smoothPicture(8, 8, 3)};
+    static const tidemark::PictureSource source = tidemark::sourceOf(pictures);
     host.setUp(withInk);
     host.loadPictures(source, due);
 }

@@ -11,6 +11,8 @@
 #include "probes/smooth_picture.h"
 #include "tests/support/gl_test.h"
 
+using namespace tidemark;
+
 namespace {
 
 using Frame = LiveWater::Frame;

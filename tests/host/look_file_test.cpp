@@ -8,6 +8,8 @@
 #include "host/look_values.h"
 #include "host/presets.h"
 
+using namespace tidemark;
+
 static std::optional<Look> read(const std::string& text, std::string& error) {
     std::istringstream stream(text);
     return parseLook(stream, "a.look", error);

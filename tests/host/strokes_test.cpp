@@ -10,6 +10,8 @@
 #include "probes/smooth_picture.h"
 #include "tests/support/gl_test.h"
 
+using namespace tidemark;
+
 namespace {
 
 constexpr int kWidth = 540;

@@ -9,6 +9,8 @@
 #include "probes/smooth_picture.h"
 #include "tests/support/gl_test.h"
 
+using namespace tidemark;
+
 namespace {
 
 class Host : public GlTest {

@@ -11,6 +11,8 @@
 #include "water/ripples.h"
 #include "water/waves.h"
 
+using namespace tidemark;
+
 namespace {
 
 struct Ring {

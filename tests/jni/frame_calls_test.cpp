@@ -13,6 +13,8 @@
 #include "tests/support/frame.h"
 #include "tests/support/log_recorder.h"
 
+using namespace tidemark;
+
 namespace {
 
 constexpr int kMeshBytes = 2 * 12 * sizeof(float) + 6 * sizeof(short);

@@ -9,6 +9,8 @@
 #include "tests/support/frame.h"
 #include "tests/support/gl_test.h"
 
+using namespace tidemark;
+
 namespace {
 
 constexpr int kLast = std::numeric_limits<int>::max();

@@ -7,6 +7,8 @@
 #include "tests/support/frame.h"
 #include "tests/support/gl_test.h"
 
+using namespace tidemark;
+
 namespace {
 
 class Misuse : public GlTest {

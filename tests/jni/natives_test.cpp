@@ -8,6 +8,8 @@
 #include "tests/support/frame.h"
 #include "tests/support/log_recorder.h"
 
+using namespace tidemark;
+
 TEST(Natives, copyBitmapsAndKeepTheirPixelsOnFailure) {
     struct Slot {
         void (*transfer)(JNIEnv*, jobject, jobject);

@@ -18,6 +18,8 @@
 #include "probes/smooth_picture.h"
 #include "tests/support/log_recorder.h"
 
+using namespace tidemark;
+
 namespace {
 
 constexpr int kN = 128;

@@ -10,6 +10,8 @@
 
 #include "host/read_file.h"
 
+using namespace tidemark;
+
 using namespace std::string_literals;
 
 class PictureFile : public testing::Test {

@@ -4,6 +4,8 @@
 
 #include <utility>
 
+using namespace tidemark;
+
 TEST(ProceduralPictures, GroundsOfAnySizeAreWholeAndOpaque) {
     for (Picture (*const ground)(int, int) : {riverBed, tiledPool, sandyShore}) {
         for (const auto& [width, height] : {std::pair{216, 384}, {384, 216}, {1, 1}, {3, 200}, {200, 1}}) {

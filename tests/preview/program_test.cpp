@@ -10,6 +10,8 @@
 
 #include "pictures/picture_file.h"
 
+using namespace tidemark;
+
 namespace fs = std::filesystem;
 
 static Picture load(const std::string& path) {

@@ -4,6 +4,8 @@
 
 #include <sstream>
 
+using namespace tidemark;
+
 static std::optional<std::vector<TouchEvent>> parse(const std::string& text, std::string& error) {
     std::istringstream stream(text);
     return parseTouchScript(stream, "a.touch", error);

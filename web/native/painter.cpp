@@ -3,6 +3,8 @@
 
 #include "pictures/procedural_pictures.h"
 
+using namespace tidemark;
+
 namespace {
 
 Picture painted;

@@ -14,6 +14,8 @@
 #include "host/look_values.h"
 #include "host/picture.h"
 
+using namespace tidemark;
+
 namespace {
 
 Look look;

@@ -7,9 +7,11 @@
         libcli11-dev libglfw3-dev ffmpeg)
     lint_packages=(clang clang-format clang-tidy git python3 shellcheck)
     test_packages=(clang libgtest-dev junit4 aapt android-framework-res python3 xz-utils
-        glslang-tools binutils llvm valgrind xvfb xauth xdotool)
+        glslang-tools binutils llvm valgrind xvfb xauth xdotool
+        libpng-dev libsdl2-dev libsdl2-image-dev)
     fuzz_packages=(clang libclang-rt-dev llvm)
-    arm64_packages=(g++-aarch64-linux-gnu qemu-user)
+    arm64_packages=(g++-aarch64-linux-gnu qemu-user mmdebstrap uidmap xvfb xauth xdotool)
+    arm64_root_packages=libglfw3-dev,libpng-dev,libgles-dev,libegl-dev,libegl-mesa0,libgl1-mesa-dri
     android_packages=(clang lld llvm libc++-14-dev libc6-dev-arm64-cross libc6-dev-armel-cross android-liblog-dev
         android-platform-frameworks-native-headers android-libnativehelper-dev android-framework-res
         python3 xz-utils proguard-cli aapt zip zipalign apksigner)

@@ -3,7 +3,7 @@
 #   --native  lint, then both compilers on this machine: as shipped, under the address and undefined behaviour
 #             sanitizers, and some seconds of fuzzing
 #   --arm64   64-bit Arm: vector arithmetic in the machine code of the loops over many numbers, and results, computed in
-#             an emulator, that equal this machine's bit for bit
+#             an emulator, that equal this machine's bit for bit; examples/glfw with the package, in the emulator
 #   --android the sample's APK and the module's AAR: signature, names and pages; the APK's code and libraries run; an
 #             app's layout and Kotlin build with the AAR
 #   --web     the package for web pages and the playground, in Chromium, and the playground in Firefox and WebKitGTK
@@ -40,7 +40,7 @@ test_native() {
     ctest --preset clang -j "$(nproc)" --tests-regex "^(driverless|counting|full|elf)"
 }
 
-test_arm64() {
+test_arm64() (
     install_missing "${build_packages[@]}" "${arm64_packages[@]}"
     (
         cd tests/arm64
@@ -52,7 +52,19 @@ test_arm64() {
     tests/arm64/vectors.sh build/arm64/results
     diff <(build/arm64-reference/results) <(qemu-aarch64 -L /usr/aarch64-linux-gnu build/arm64/results)
     echo "The results are those of this machine, bit for bit."
-}
+
+    export ARM64_ROOT=$PWD/build/arm64-root CMAKE_TOOLCHAIN_FILE=$PWD/cmake/aarch64-linux-gnu.cmake
+    if [ ! -d "$ARM64_ROOT" ]; then
+        rm -rf "$ARM64_ROOT.part"
+        mkdir -p "$ARM64_ROOT.part"
+        mmdebstrap --quiet --variant=extract --architectures=arm64 --include="$arm64_root_packages" bookworm - |
+            tar -x -C "$ARM64_ROOT.part" --no-same-owner --exclude="./dev/*"
+        mv "$ARM64_ROOT.part" "$ARM64_ROOT"
+    fi
+    cmake -S . -B build/arm64-package -G Ninja -DCMAKE_BUILD_TYPE=Release >/dev/null
+    cmake --build build/arm64-package --target TidemarkEffect tidemark_host
+    RUNNER="qemu-aarch64 -L $ARM64_ROOT" tests/package_test.sh . build/arm64-package build/arm64-package/examples glfw
+)
 
 test_android() {
     install_missing "${build_packages[@]}" "${test_packages[@]}" "${android_packages[@]}" "${android_test_packages[@]}"

@@ -1,13 +1,16 @@
 #!/usr/bin/env bash
-# package_test.sh SOURCE BUILD FOLDER: installs the built package into FOLDER, moves it, builds examples/glfw with it and
-# runs that under an X server. Fails if the window stays black, does not come to rest, or does not change after a press.
+# package_test.sh SOURCE BUILD FOLDER EXAMPLE...: installs the built package into FOLDER, moves it, and builds and runs
+# each of the examples with it under an X server. Fails if a window stays black, does not come to rest, or does not
+# change after a press.
+# A CMAKE_TOOLCHAIN_FILE in the environment is that of another machine, whose programs RUNNER runs.
 set -euo pipefail
 fail() {
     echo "The package $*" >&2
     exit 1
 }
 if [ "$1" = --on-screen ]; then
-    "$2" &
+    shift
+    "$@" &
     program=$!
     trap 'kill "$program" 2>/dev/null || true' EXIT
     shot() { # the window's middle, as bytes
@@ -31,10 +34,18 @@ if [ "$1" = --on-screen ]; then
     done
     fail "gives a program that ignores the mouse"
 fi
-rm -rf "$3"
-cmake --install "$2" --prefix "$3/first" >/dev/null
-mv "$3/first" "$3/installed"
-cp -r "$1/examples/glfw" "$3/pool"
-cmake -S "$3/pool" -B "$3/build" -DCMAKE_PREFIX_PATH="$3/installed" -DCMAKE_BUILD_TYPE=Release >/dev/null
-cmake --build "$3/build" >/dev/null
-xvfb-run -a -s "-screen 0 320x320x24 -noreset" "$0" --on-screen "$3/build/pool"
+source=$1 build=$2 folder=$3
+shift 3
+rm -rf "$folder"
+cmake --install "$build" --prefix "$folder/first" >/dev/null
+mv "$folder/first" "$folder/installed"
+ffmpeg -loglevel error -f lavfi -i testsrc2=size=320x320 -frames:v 1 "$folder/photo.png"
+for example in "$@"; do
+    cp -r "$source/examples/$example" "$folder/$example"
+    cmake -S "$folder/$example" -B "$folder/$example/build" -DTidemark_ROOT="$folder/installed" \
+        -DCMAKE_FIND_ROOT_PATH="$folder/installed" -DCMAKE_BUILD_TYPE=Release >/dev/null
+    cmake --build "$folder/$example/build" >/dev/null
+    # shellcheck disable=SC2086  # a runner has arguments
+    xvfb-run -a -s "-screen 0 320x320x24 -noreset" "$0" --on-screen ${RUNNER-} "$folder/$example/build/pool" \
+        "$folder/photo.png"
+done

@@ -1,23 +1,22 @@
-// Water over a tiled pool, in a window: each press of the mouse drops a ring and ink.
+// pool PHOTO.png: water over a photo, in a window. Each press of the mouse drops a ring and ink.
 #include "host/live_water.h"
 #include "host/picture.h"
 #define GLFW_INCLUDE_NONE
 #include <GLFW/glfw3.h>
+#include <png.h>
 
 #include <algorithm>
 
 using namespace tidemark;
 
-static Picture tiles(int width, int height) {
-    Picture picture{width, height, {}};
-    for (int y = 0; y < height; ++y) {
-        for (int x = 0; x < width; ++x) {
-            const bool joint = x % 40 < 2 || y % 40 < 2;
-            for (int channel : {joint ? 200 : 40, joint ? 220 : 140, joint ? 220 : 170, 255})
-                picture.rgba.push_back(static_cast<std::uint8_t>(channel));
-        }
-    }
-    return picture;
+static Picture photo(const char* path) {
+    png_image file = {};
+    file.version = PNG_IMAGE_VERSION;
+    if (!png_image_begin_read_from_file(&file, path)) return {};
+    file.format = PNG_FORMAT_RGBA;
+    Picture picture = {static_cast<int>(file.width), static_cast<int>(file.height), {}};
+    picture.rgba.resize(PNG_IMAGE_SIZE(file));
+    return png_image_finish_read(&file, nullptr, picture.rgba.data(), 0, nullptr) ? picture : Picture{};
 }
 
 static void onButton(GLFWwindow* window, int, int action, int) {
@@ -31,8 +30,9 @@ static void onButton(GLFWwindow* window, int, int action, int) {
             static_cast<float>(y / height), 1.0f, glfwGetTime());
 }
 
-int main() {
-    if (!glfwInit()) return 1;
+int main(int argc, char** argv) {
+    const Picture ground = photo(argc == 2 ? argv[1] : "photo.png");
+    if (!ground.width || !glfwInit()) return 1;
     glfwWindowHint(GLFW_CLIENT_API, GLFW_OPENGL_ES_API);
     glfwWindowHint(GLFW_CONTEXT_CREATION_API, GLFW_EGL_CONTEXT_API);
     glfwWindowHint(GLFW_CONTEXT_VERSION_MAJOR, 2);
@@ -42,7 +42,7 @@ int main() {
     if (!window) return 1;
     glfwMakeContextCurrent(window);
 
-    const Pictures pictures = {tiles(320, 320), tiles(320, 320), tiles(64, 64)};
+    const Pictures pictures = {ground, ground, ground};
     LiveWater water(sourceOf(pictures), 1);
     int width, height;
     glfwGetFramebufferSize(window, &width, &height);

@@ -35,7 +35,8 @@ inline std::vector<Stroke> strokesOfAllKinds() {
             direction += turn(random);
             const auto [action, x, y] = stroke.back();
             const double way = length * share(random);
-            stroke.push_back({tidemark::TouchAction::move, x + way * std::cos(direction), y + way * std::sin(direction)});
+            stroke.push_back(
+                {tidemark::TouchAction::move, x + way * std::cos(direction), y + way * std::sin(direction)});
         }
         stroke.push_back(stroke.back());
         stroke.back().action = i % 5 == 4 ? tidemark::TouchAction::cancel : tidemark::TouchAction::up;
@@ -46,7 +47,8 @@ inline std::vector<Stroke> strokesOfAllKinds() {
 
 // Sets up the library and loads its pictures. `due` selects the pictures to transfer first.
 inline void setUp(tidemark::WaterHost& host, bool withInk, unsigned due = 0) {
-    static const tidemark::Pictures pictures = {smoothPicture(24, 32, 1), smoothPicture(32, 24, 2), smoothPicture(8, 8, 3)};
+    static const tidemark::Pictures pictures = {
+        smoothPicture(24, 32, 1), smoothPicture(32, 24, 2), smoothPicture(8, 8, 3)};
     static const tidemark::PictureSource source = tidemark::sourceOf(pictures);
     host.setUp(withInk);
     host.loadPictures(source, due);

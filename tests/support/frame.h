@@ -9,7 +9,9 @@ struct Frame {
     tidemark::ShortArray indices{6};
 
     void draw(JNIEnv* env = copyingEnvironment()) { draw(env, &positions, &heights, &indices, &mvp); }
-    static void draw(JNIEnv* env, tidemark::FloatArray* p, tidemark::FloatArray* h, tidemark::ShortArray* i, tidemark::FloatArray* m, int indexCount = 6) {
+    static void draw(
+        JNIEnv* env, tidemark::FloatArray* p, tidemark::FloatArray* h, tidemark::ShortArray* i, tidemark::FloatArray* m,
+        int indexCount = 6) {
         tidemark::native::onDrawFrame(
             env, nullptr, p, h, i, 2 * indexCount, 2 * indexCount, indexCount, m, 1, 1, 2, 2, 1.33f, 0.5f, 0.5f, 1.0f,
             0.1f, 0.2f, 0.3f, 1.0f, 1.0f, 40.0f, false);

@@ -143,7 +143,10 @@ int main(int argc, char** argv) {
     add("--light", options.light, "FILE", "Picture of the light on the waves");
     add("--look", options.look, "FILE",
         "Values of the look, above those of the preset: lines of \"key = number\", as in host/look.properties");
-    app.add_flag("--rain", options.rain, "Let it rain; without --script it always does");
+    CLI::Option* const rain = add("--rain", options.rainFrom, "[N]",
+                                  "Let it rain, from second N on; default: throughout if there is no --script")
+                                  ->expected(0, 1)
+                                  ->check(CLI::Range(0.0, 3600.0));
     CLI::Option* const ink = add("--ink", options.inkColor, "#rrggbb", "Colour of the ink, each channel at most bf")
                                  ->transform(CLI::Validator(readColor, ""));
     CLI::Option* const withoutInk = app.add_flag("--no-ink", noInk, "Water without ink")->excludes(ink);
@@ -213,11 +216,12 @@ int main(int argc, char** argv) {
     options.size = {size.first, size.second};
     if (quality) options.size = drawnSize({size.first / density, size.second / density, density}, *quality, 1.0);
     options.withInk = !noInk;
+    bool rains = *rain || (options.script.empty() && !options.inWindow);
     for (const Preset& named : kPresets) {
         if (named.name != preset) continue;
         options.base = named.look;
         options.ground = named.ground;
-        options.rain |= named.rain;
+        rains |= named.rain;
         options.withInk = (named.ink || *ink) && !noInk;
     }
     if (const auto ground = kGrounds.find(picture); ground != kGrounds.end()) {
@@ -231,7 +235,7 @@ int main(int argc, char** argv) {
     if (!fs::exists(options.script) && fs::exists(sceneNamed(options.script))) {
         options.script = sceneNamed(options.script);
     }
-    if (options.script.empty() && !options.inWindow) options.rain = true;
+    if (rains && !options.rainFrom) options.rainFrom = 0.0;
     if (!verbose) quietenLog();
 
     std::string summary, error;

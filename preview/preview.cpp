@@ -83,6 +83,7 @@ bool drawFrames(
     Seam seam(plan.round, plan.fade);
     for (int i = 0; i < plan.total() && !interrupted(); ++i) {
         touches.deliverBefore((i + 1) * 1000.0 / options.framesPerSecond, host);
+        host.rain(options.rainFrom && i % plan.round >= *options.rainFrom * options.framesPerSecond);
         if (host.advance(1.0 / options.framesPerSecond)) {
             host.draw();
             readFrame(frame);
@@ -153,7 +154,6 @@ bool runPreview(const PreviewOptions& options, std::string& summary, std::string
     WaterHost host(*look, width, height, options.seed);
     host.setUp(options.withInk);
     host.loadPictures(sourceOf(*pictures, *look));
-    host.rain(options.rain);
     TouchPlayer touches(repeated(events, plan, options.framesPerSecond), width, height);
     noteInterrupts();
     if (!output.open(error) || !drawFrames(options, *look, plan, host, touches, output, progress, error)) return false;

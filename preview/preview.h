@@ -17,7 +17,7 @@ struct PreviewOptions {
     Look base;                                        // what the file of the look does not name
     std::string look;                                 // file
     std::string script;                               // file
-    bool rain = false;
+    std::optional<double> rainFrom;                   // seconds from the beginning of each round
     Size size = {540, 960};
     std::optional<double> seconds;  // or the script's length and a little for the water to calm
     int framesPerSecond = 60;

@@ -167,7 +167,7 @@ bool runWindow(PreviewOptions options, std::string& summary, std::string& error)
 
     // The ink draws from this generator as well.
     srand48(static_cast<long>(options.seed));
-    Stage stage{LiveWater(sourceOf(*pictures, *look), options.seed), options.withInk, options.rain};
+    Stage stage{LiveWater(sourceOf(*pictures, *look), options.seed), options.withInk, options.rainFrom.has_value()};
     stage.water.setQuality(Quality::high);
     stage.water.setLook(*look);
     stage.water.picturesChanged(kAllPictures);

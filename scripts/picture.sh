@@ -11,7 +11,7 @@ preview() {
     build/release/preview/tidemark-preview --force "$@"
 }
 
-preview --script welcome --rain --size 1260x708 --seconds 3.8 --video out/welcome.mp4
+preview --script welcome --rain 1.9 --size 1260x708 --seconds 3.9 --video out/welcome.mp4
 ffmpeg -v error -y -i out/welcome.mp4 -vf fps=15,scale=840:-1:flags=lanczos \
     -c:v libwebp_anim -quality 55 -compression_level 4 -loop 0 docs/tidemark.webp
 

@@ -67,7 +67,7 @@ TEST_F(Program, TouchesMoveTheWaterInTheFrameThatTheyFallInto) {
 }
 
 TEST_F(Program, SameInputsGiveTheSameBytesInVideosOfEachKind) {
-    const std::string scene = "--size 49x81 --fps 10 --seconds 1 --rain --every 2 ";
+    const std::string scene = "--size 49x81 --fps 10 --seconds 1 --rain 0.4 --every 2 ";
     EXPECT_TRUE(draws(scene + "--seed 5 --out a --video a/rain.mp4"));
     EXPECT_TRUE(draws(scene + "--seed 5 --out b --video b/rain.mp4"));
     EXPECT_TRUE(draws(scene + "--seed 6 --out c --video c/rain.gif"));
@@ -77,6 +77,7 @@ TEST_F(Program, SameInputsGiveTheSameBytesInVideosOfEachKind) {
         ".: a b c new  a: frame-0000.png frame-0001.png frame-0002.png frame-0003.png frame-0004.png rain.mp4  "
         "new: rain.webp 0\n");
     EXPECT_EQ(run("diff -r a b"), "0\n");
+    EXPECT_EQ(load("a/frame-0001.png").rgba, load("c/frame-0001.png").rgba) << "it rains too early";
     EXPECT_NE(load("a/frame-0004.png").rgba, load("c/frame-0004.png").rgba) << "the rain has no seed";
     const std::string probe =
         "ffprobe -v error -count_frames -show_entries stream=width,height,nb_read_frames -of csv=p=0 ";

@@ -3,8 +3,8 @@
 #include <algorithm>
 #include <cstdio>
 
-#include "pictures/picture_file.h"
 #include "preview/inside.h"
+#include "preview/picture_file.h"
 
 namespace tidemark {
 

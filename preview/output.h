@@ -5,7 +5,7 @@
 #include <string>
 #include <vector>
 
-#include "pictures/ffmpeg.h"
+#include "preview/ffmpeg.h"
 #include "preview/new_file.h"
 #include "preview/preview.h"
 

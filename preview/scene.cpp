@@ -9,8 +9,8 @@
 #include <utility>
 
 #include "host/look_file.h"
-#include "pictures/picture_file.h"
 #include "pictures/procedural_pictures.h"
+#include "preview/picture_file.h"
 
 namespace tidemark {
 

@@ -8,7 +8,7 @@
 #include <cstdlib>
 #include <fstream>
 
-#include "pictures/picture_file.h"
+#include "preview/picture_file.h"
 
 using namespace tidemark;
 

@@ -1,4 +1,4 @@
-#include "pictures/picture_file.h"
+#include "preview/picture_file.h"
 
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -8,7 +8,7 @@
 #include <memory>
 #include <utility>
 
-#include "pictures/ffmpeg.h"
+#include "preview/ffmpeg.h"
 
 namespace tidemark {
 

@@ -1,4 +1,4 @@
-#include "pictures/picture_file.h"
+#include "preview/picture_file.h"
 
 #include <gtest/gtest.h>
 #include <sys/stat.h>

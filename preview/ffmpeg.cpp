@@ -1,4 +1,4 @@
-#include "pictures/ffmpeg.h"
+#include "preview/ffmpeg.h"
 
 #include <fcntl.h>
 #include <spawn.h>

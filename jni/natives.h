@@ -45,9 +45,9 @@ Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_transferWaterBitmap
 JNIEXPORT void JNICALL Java_com_zor_android_visualeffect_tidemark_JniTidemarkRender_onInitSetting(
     JNIEnv* env, jobject, jint width, jint height, jboolean withInk);
 
-// Creates the programs and, with ink, the render targets and CPU buffers. With ink it leaves this state: one of the
-// ink's framebuffers bound, a viewport of the ink's size, the clear colour 0, 0, 0, 0 and the blend function
-// GL_SRC_ALPHA, GL_ONE_MINUS_SRC_ALPHA. Bind framebuffer 0 and set your own clear colour before you clear the screen.
+// Creates the programs and, with ink, the render targets and CPU buffers. With ink it leaves one of the ink's
+// framebuffers bound: bind framebuffer 0 and set your own clear colour before you clear the screen. docs/host.md lists
+// the GL state after each method.
 //
 // onInitSetting and onInitGPU delete the objects of an earlier set-up by name. After a context loss your new objects
 // may have the same names, so set up the library before you create objects of your own.

@@ -1,5 +1,5 @@
-// The one window into the engine, for faces that show what lies behind a frame. It needs the library's objects: the
-// shared library hides what it looks at.
+// Read access to the engine's state, for faces that show what is behind a frame. Link the library's objects, not the
+// shared library, which hides these symbols.
 #pragma once
 
 #include <vector>
@@ -7,19 +7,20 @@
 namespace tidemark {
 
 struct EngineView {
-    // The flow, rows from the bottom: x and y of each cell, y upwards.
+    // The flow, rows from the bottom: the velocity's x and y for each cell, y upwards.
     std::vector<float> velocity;
     int gridWidth, gridHeight;
 
-    // The ink, rows from the bottom, 0 to 127.
+    // The ink's density, rows from the bottom, 0 to 127.
     std::vector<float> density;
     int inkWidth, inkHeight;
 
-    // One unit of density adds this to the divisor of red, green and blue.
+    // The amount that one unit of density adds to the divisors of red, green and blue.
     float tint[3];
 };
 
-// The engine's state after the last frame. Needs the context current and a set-up with ink; leaves framebuffer 0 bound.
+// Returns the engine's state after the last frame. Requires the context to be current and a set-up with ink. Leaves
+// framebuffer 0 bound.
 EngineView lookIntoEngine();
 
 }  // namespace tidemark

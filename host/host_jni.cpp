@@ -18,7 +18,7 @@ void JNICALL releaseElements(JNIEnv*, Reference, Element*, jint) {}
 }  // namespace
 
 JNIEnv* hostEnvironment() {
-    // By whichever name this platform's header gives the table.
+    // The table's type has different names in the headers of different platforms.
     using Functions = std::remove_cvref_t<decltype(*JNIEnv::functions)>;
     static constexpr Functions functions = [] {
         Functions table = {};

@@ -1,4 +1,4 @@
-// Java's arrays and the four calls of the Java Native Interface that the library makes, for a host in C++.
+// Java's arrays, and an environment with the four JNI functions that the library calls, for a host in C++.
 #pragma once
 
 #include <jni.h>
@@ -17,7 +17,7 @@ struct HostArray : Reference {
 using FloatArray = HostArray<_jfloatArray, jfloat>;
 using ShortArray = HostArray<_jshortArray, jshort>;
 
-// An environment whose array calls take the arrays above. It hands out their own elements, as nothing moves them.
+// Returns an environment whose functions accept the arrays above. They return the arrays' own elements, without a copy.
 JNIEnv* hostEnvironment();
 
 }  // namespace tidemark

@@ -8,7 +8,7 @@ namespace tidemark {
 
 namespace {
 
-// The library notes these two steps of every set-up at error priority, though nothing is wrong.
+// The library logs these two steps of each set-up at error priority although they are no errors.
 bool marksSetUp(std::string_view message) {
     return message == "CreateSurface" || message == "zorloadShaderScript";
 }

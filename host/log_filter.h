@@ -1,4 +1,4 @@
-// Keeps the library's log quiet: only failures still reach standard error.
+// Passes only the library's failures to standard error.
 #pragma once
 
 namespace tidemark {

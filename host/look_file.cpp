@@ -18,7 +18,7 @@ std::string trimmed(const std::string& text) {
     return first == text.npos ? "" : text.substr(first, text.find_last_not_of(kBlanks) + 1 - first);
 }
 
-// An empty text when the line is a good one.
+// Applies one line. Returns an empty string if the line is valid, otherwise the reason.
 std::string readLine(const std::string& line, Look& look) {
     const std::size_t sign = line.find('=');
     if (sign == line.npos) return "expected \"key = number\"";

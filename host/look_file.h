@@ -1,5 +1,5 @@
-// Looks as files: "key = number" lines as in look.properties, and comments that start with a #. What a file does not
-// name keeps the value of `base`.
+// Files with values of a look: lines of "key = number" as in look.properties, and comments that begin with #. Values
+// that the file does not contain are those of `base`.
 #pragma once
 
 #include <iosfwd>
@@ -10,7 +10,7 @@
 
 namespace tidemark {
 
-// On failure says why in `error`, in one line that starts with "name:line: ".
+// On failure both return nothing and store the reason in `error`, one line that begins with "name:line: ".
 std::optional<Look> parseLook(std::istream& text, const std::string& name, std::string& error, const Look& base = {});
 std::optional<Look> loadLook(const std::string& path, std::string& error, const Look& base = {});
 

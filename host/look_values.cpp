@@ -15,10 +15,10 @@ const LookField* fieldNamed(std::string_view name) {
 bool setValue(Look& look, const LookField& field, double value) {
     const auto set = [&](auto member) {
         using Number = std::remove_reference_t<decltype(look.*member)>;
-        // The float that is nearest to a limit may lie beyond it.
+        // The nearest float to a limit may be beyond it.
         const double least = std::min(field.least, static_cast<double>(static_cast<Number>(field.least)));
         const double most = std::max(field.most, static_cast<double>(static_cast<Number>(field.most)));
-        if (!(value >= least && value <= most)) return false;  // NaN among them
+        if (!(value >= least && value <= most)) return false;  // also rejects NaN
         if (std::is_integral_v<Number> && value != std::floor(value)) return false;
         look.*member = static_cast<Number>(value);
         return true;

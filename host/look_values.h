@@ -1,4 +1,4 @@
-// The values of a look by their names, and the limits that they keep to.
+// Access to the values of a look by name, and their limits.
 #pragma once
 
 #include <string_view>
@@ -7,14 +7,14 @@
 
 namespace tidemark {
 
-// Null if there is none.
+// Returns the field with this name, or null.
 const LookField* fieldNamed(std::string_view name);
 
-// False, and nothing changes, for a value that is not finite, beyond the field's limits, or a fraction where the field
-// holds whole numbers.
+// Sets a value. Returns false and changes nothing if the value is not finite, is outside the field's limits, or is a
+// fraction for an integer field.
 bool setValue(Look& look, const LookField& field, double value);
 
-// Null if all values are within their limits.
+// Returns the first field whose value is outside its limits, or null.
 const LookField* firstInvalid(const Look& look);
 
 }  // namespace tidemark

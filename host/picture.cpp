@@ -13,13 +13,13 @@ namespace tidemark {
 
 namespace {
 
-// The pixels along one axis that one pixel of a smaller picture covers, and the share that each of them has in it.
+// The source pixels along one axis that one pixel of the smaller picture covers, with their weights.
 struct Span {
     int first;
     std::vector<float> shares;
 };
 
-// `length` pixels from `from` on, divided among `count`.
+// Divides `length` pixels, beginning with `from`, into `count` spans.
 std::vector<Span> spans(double from, double length, int count) {
     constexpr double kRounding = 1e-6;  // of a pixel
     std::vector<Span> result;
@@ -36,7 +36,7 @@ std::vector<Span> spans(double from, double length, int count) {
     return result;
 }
 
-// Rows are summed up first, then the columns of the sum.
+// Sums rows first, then the columns of these sums.
 Picture shrunk(const Picture& picture, const std::vector<Span>& columns, const std::vector<Span>& rows) {
     Picture result = {static_cast<int>(columns.size()), static_cast<int>(rows.size()), {}};
     result.rgba.reserve(4 * columns.size() * rows.size());

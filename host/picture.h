@@ -1,4 +1,4 @@
-// Pictures in the host's own memory, for faces whose pictures are there.
+// Pictures in memory, for faces that decode their pictures there.
 #pragma once
 
 #include <cstdint>
@@ -10,7 +10,7 @@ namespace tidemark {
 
 struct Look;
 
-// Rows from the top, four bytes a pixel in R, G, B, A order, no padding.
+// Rows from the top, RGBA with 8 bits per channel, no padding.
 struct Picture {
     int width = 0;
     int height = 0;
@@ -19,19 +19,20 @@ struct Picture {
     bool operator==(const Picture&) const = default;
 };
 
-// The pictures under the water in portrait and in landscape, and the light that its waves reflect.
+// The backgrounds for portrait and landscape, and the light that the waves reflect.
 struct Pictures {
     Picture portrait, landscape, light;
 };
 
-// The largest middle part of `picture` that has the proportions width : height, scaled down to width x height pixels
-// where it has more. Each pixel of the result is the mean of the area that it covers.
+// Returns the largest centred part of `picture` with the proportions width : height. A part with more than width x
+// height pixels is scaled down to that size; each new pixel is the mean of the area that it covers.
 Picture fitted(const Picture& picture, int width, int height);
 
-// Hands a picture over as it is.
+// Transfers a picture to the library without changes.
 void handOver(PictureSlot slot, const Picture& picture);
 
-// Hands over pictures that stay where they are, in the colours that the look gives them, or in their own.
+// Return a source of `pictures`, which must outlive it: with the colours adjusted as the look requires (see shade.h),
+// or unchanged.
 PictureSource sourceOf(const Pictures& pictures, const Look& look);
 PictureSource sourceOf(const Pictures& pictures);
 

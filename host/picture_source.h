@@ -1,4 +1,4 @@
-// How a face gives the library its pictures.
+// The interface through which a face gives pictures to the library.
 #pragma once
 
 #include <functional>
@@ -7,16 +7,16 @@ namespace tidemark {
 
 enum class PictureSlot { portrait = 0, landscape = 1, light = 2 };
 
-// Some of the three slots, as a sum.
+// A set of slots, as a sum.
 enum : unsigned { kPortraitPicture = 1, kLandscapePicture = 2, kBackgrounds = 3, kLightPicture = 4, kAllPictures = 7 };
 
-// The host calls both functions in the middle of a frame, with the context current.
+// The host calls both functions during a frame, with the context current.
 struct PictureSource {
-    // Hands a picture over, by the slot's native::transfer... method. Of a background, the largest middle part in the
-    // proportions width : height; where that part has more than width x height pixels, it is scaled down to as many.
-    // The light is handed over whole, and its width and height are 0.
+    // Transfers a picture with the slot's native::transfer... method. For a background, this is the largest centred
+    // part with the proportions width : height, scaled down to width x height pixels if it has more. For the light,
+    // width and height are 0 and the whole picture is transferred.
     std::function<void(PictureSlot slot, int width, int height)> handOver;
-    // Called with the slot's new texture bound to the active unit, which the face may fill instead. May be empty.
+    // Optional. Called with the slot's new texture bound to the active unit, so that the face can upload pixels itself.
     std::function<void(PictureSlot slot)> loaded;
 };
 

@@ -5,8 +5,8 @@
 
 namespace tidemark {
 
-// Text of a file in quotes for a message of one line: its beginning, with bytes that are not printable ASCII, which a
-// terminal might obey, as \xNN.
+// Returns text from a file in quotes for a message of one line. Long text is truncated; bytes other than printable
+// ASCII, which could control a terminal, become \xNN.
 std::string quoted(std::string_view text);
 
 }  // namespace tidemark

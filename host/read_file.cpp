@@ -17,7 +17,7 @@ std::optional<std::string> readFile(
     };
     struct stat status;
     if (stat(path.c_str(), &status) != 0) return fail(std::strerror(errno));
-    // Before it is opened, which waits for the other end of a pipe.
+    // Checked before the file is opened, because opening a pipe blocks until its other end is open.
     if (!S_ISREG(status.st_mode)) return fail("it is not a regular file");
     if (static_cast<std::uintmax_t>(status.st_size) > mostBytes) {
         return fail("it has more than " + std::to_string(mostBytes) + " bytes");

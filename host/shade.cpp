@@ -6,11 +6,12 @@ namespace tidemark {
 
 namespace {
 
-// Grounds up to this brightness keep their colours; that of white paper takes all of `wet`.
+// Backgrounds up to this mean brightness keep their colours. From here to white, `wet` increases linearly to its full
+// effect.
 constexpr float kDark = 0.35f;
 constexpr float kBright = 0.85f;
 
-// Water takes red first.
+// Water absorbs red first.
 constexpr Shade kMostTaken = {0.62f, 0.54f, 0.46f};
 
 }  // namespace

@@ -1,4 +1,4 @@
-// Factors for the colours of a picture, which apply when it is handed over.
+// Factors for the colours of a picture, applied when it is transferred.
 #pragma once
 
 #include "host/look.h"
@@ -12,7 +12,7 @@ struct Shade {
     bool operator==(const Shade&) const = default;
 };
 
-// `brightness`: the mean of all channels of the picture, 0 to 1.
+// Returns the factors for a picture. `brightness` is the mean of all its channels, 0 to 1.
 Shade shadeOf(const Look& look, PictureSlot slot, float brightness);
 
 }  // namespace tidemark

@@ -6,8 +6,8 @@ namespace tidemark {
 
 namespace {
 
-// Reports that lie farther apart than this, in seconds, do not belong to one movement: the finger has rested between
-// them and set out again before the second one. Some digitizers report 30 times a second.
+// Reports with a longer gap, in seconds, are separate movements: the finger rested after the first and started again
+// before the second. Some digitizers report only 30 times a second.
 constexpr double kLongestMovement = 0.04;
 
 Touch between(const Touch& from, const Touch& to, double time) {
@@ -31,7 +31,7 @@ const std::vector<Touch>& StrokeClock::step(double time) {
     due_.clear();
     auto next = waiting_.begin();
     for (; next != waiting_.end() && next->time <= time; ++next) {
-        if (next->action != TouchAction::down && !isDown_) continue;  // no stroke has begun
+        if (next->action != TouchAction::down && !isDown_) continue;  // before any stroke
         last_ = *next;
         if (next->action == TouchAction::move) continue;
         isDown_ = next->action == TouchAction::down;

@@ -1,5 +1,5 @@
-// Hands touches to the ink in its own time. The ink tells strokes apart by the distance from one of its steps to the
-// next, so it must not see how often a digitizer reports or how many reports one frame brings.
+// Resamples touches at the times of the ink's steps. The library classifies strokes by the distance between two steps,
+// so that distance must not depend on the digitizer's rate or the number of reports in a frame.
 #pragma once
 
 #include <vector>
@@ -11,31 +11,32 @@ enum class TouchAction { down = 0, up = 1, move = 2, cancel = 3 };
 struct Touch {
     TouchAction action;
     float x, y;    // pixels of the view, from its top left corner
-    float weight;  // 1 for a finger
+    float weight;  // 1 for a finger, otherwise relative to a finger
     double time;   // seconds
 };
 
 class StrokeClock {
 public:
-    // Reports come in the order of their times; one that comes late counts as reported with the one before it.
+    // Adds a report. A report with an earlier time than the previous one gets the previous one's time.
     void report(Touch touch);
 
-    // The touches that the ink's step at `time` gets, in their order: each down and up reported until then, and, where
-    // the finger has moved since the last step, one move to its place at that time, between the two reports around it.
-    // Nothing is extrapolated: after the last report the finger rests there. A cancel ends a stroke as an up does.
+    // Returns the touches for the ink step at `time`, in order: every down and up reported until then, and, if the
+    // finger has moved since the last step, one move to its position at `time`, interpolated between the reports before
+    // and after. Positions are never extrapolated: after the last report the finger rests. A cancel ends a stroke as an
+    // up does.
     const std::vector<Touch>& step(double time);
 
-    // Whether a finger is down, or a report still waits for its step.
+    // Returns whether a finger is down or a report has not reached its step yet.
     bool isActive() const { return isDown_ || !waiting_.empty(); }
 
-    // Forgets everything.
+    // Discards all reports and the current stroke.
     void reset();
 
 private:
-    std::vector<Touch> waiting_;  // not yet reached by a step
-    std::vector<Touch> due_;      // of the last step
-    Touch last_ = {};             // the last report that a step has reached
-    Touch given_ = {};            // what the ink got last
+    std::vector<Touch> waiting_;  // reports after the last step
+    std::vector<Touch> due_;      // result of the last step
+    Touch last_ = {};             // last report up to the last step
+    Touch given_ = {};            // last touch that was returned
     bool isDown_ = false;
 };
 

@@ -7,10 +7,10 @@ namespace tidemark {
 
 namespace {
 
-// Smaller views than this are drawn as large, and shown smaller.
+// Smallest drawn size. The display scales smaller views down.
 constexpr double kShortestSide = 64.0;
 
-// More pixels along a side than any graphics processor of today draws at full speed.
+// Longest drawn side: more pixels are too slow on current GPUs.
 constexpr double kLongestSide = 4096.0;
 
 }  // namespace

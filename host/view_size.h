@@ -1,4 +1,4 @@
-// How many pixels a view is drawn with.
+// The number of pixels that are drawn for a view.
 #pragma once
 
 namespace tidemark {
@@ -14,14 +14,14 @@ struct Size {
 struct ViewSize {
     double width = 0.0;  // density-independent pixels
     double height = 0.0;
-    double density = 1.0;  // pixels of the display for each of them
+    double density = 1.0;  // display pixels per density-independent pixel
 
     bool operator==(const ViewSize&) const = default;
 };
 
-// The ink's strokes are so many pixels wide, so their width on a screen follows from the pixels that are drawn for a
-// density-independent one: at most 1, 2 and 3 for low, medium and high; automatic begins with that of medium, of which
-// `resolution` is a share.
+// Returns the size in pixels at which a view is drawn. Ink strokes have a fixed width in pixels, so the number of drawn
+// pixels per density-independent pixel determines their width on the screen: at most 1, 2 and 3 for low, medium and
+// high quality. Automatic quality draws the share `resolution` of medium.
 Size drawnSize(const ViewSize& view, Quality quality, double resolution);
 
 }  // namespace tidemark

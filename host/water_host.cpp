@@ -12,51 +12,51 @@ namespace {
 
 constexpr int kMostInkSteps = 4;
 
-// The ink follows a finger so much later, in seconds: by a report of a digitizer of 60 Hz and a quarter more, so that a
-// step lies between two reports.
+// Delay of the ink behind the finger, in seconds: 1.25 report intervals of a 60 Hz digitizer, so that each step lies
+// between two reports.
 constexpr double kInkDelay = 1.25 / 60;
 
-// The first step may be taken so much too early, so that a frame in time for it is not followed by one with two.
+// A stroke's first step may come earlier by this time, so that a frame that nearly reaches it does not leave two steps
+// for the next frame.
 constexpr double kEarly = 0.3 / 60;
 
-// A drop is raised in so many steps of the waves, whose shares are those of a half period of the sine.
+// A drop is raised in this many wave steps, weighted by the first half period of a sine.
 constexpr int kDropSteps = 8;
 
-// A crater follows the crest of a drop that rebounds, and a lower crest the crater.
+// The phases of a drop that rebounds: a crest, a crater, and a lower crest.
 constexpr int kRebounds = 2;
 constexpr double kHalfTurn = 3.141592653589793;
 
-// More drops at a time than any hand or rain raises.
+// Limit of simultaneous drops, more than fingers and rain raise.
 constexpr std::size_t kMostDrops = 2048;
 
 constexpr float kLightestTouch = 0.3f;
 constexpr float kHeaviestTouch = 1.5f;
 
-// The breeze blows for so long after the last drop, and takes so long to rise and to sink, in seconds.
+// Duration of the breeze after the last drop, and of its rise and fall, in seconds.
 constexpr double kBreezeSeconds = 4.0;
 constexpr double kRisingSeconds = 1.5;
 constexpr double kSinkingSeconds = 4.0;
 
-// Nearer to a step than this, in steps, the heights are those of the step.
+// Within this fraction of a step, the heights are not interpolated.
 constexpr float kAtStep = 0.0625f;
 
-// The peak of a ripple is three times as high, and the water keeps heights of up to 100.
+// The peak of a ripple is three times its amplitude; heights are limited to 100.
 constexpr float kMostAmplitude = 100.0f / 3.0f;
 
-// The mesh that is drawn: cells of at most 6 pixels; indices have 16 bits.
+// Cells of the drawn mesh are at most 6 pixels wide; 16-bit indices limit its size.
 constexpr double kCellPixels = 6.0;
 constexpr double kFewestVertices = 48.0;
 constexpr double kMostVertices = 256.0;
 
-// Steps are taken at the time nearest to theirs, so that neither the jitter of a clock nor rounding brings none to one
-// frame and two to the next.
+// Rounds to the nearest step, so that clock jitter does not give one frame no step and the next frame two.
 int takeSteps(double& due) {
     const int steps = std::max(static_cast<int>(std::floor(due + 0.5)), 0);
     due -= steps;
     return steps;
 }
 
-// A field on a lattice of another size, by its nearest values.
+// Copies a field to a lattice of another size by nearest-neighbour sampling.
 std::vector<float> resampled(const std::vector<float>& field, int from, int to) {
     std::vector<float> result(static_cast<std::size_t>(to) * static_cast<std::size_t>(to));
     const auto nearest = [=](int i) { return (2 * i * (from - 1) + to - 1) / (2 * (to - 1)); };
@@ -99,8 +99,8 @@ int WaterHost::wantedVertices() const {
     return static_cast<int>(std::max(most * meshShare_, kFewestVertices));
 }
 
-// Lays the lattice and the mesh, squares around the view, so that their cells are squares on the screen and rings stay
-// round. The view shows the middle of them.
+// Creates the lattice and the mesh as squares around the view. Their cells are then square on the screen and rings are
+// round; the view shows their middle.
 void WaterHost::fit() {
     const WaveLattice old = lattice_;
     lattice_ = latticeFor(look_, width_, height_);
@@ -118,7 +118,8 @@ void WaterHost::fit() {
         visibleWidth_ != oldWidth || visibleHeight_ != oldHeight) {
         makeMesh(vertices);
     }
-    // A flat surface shows the mesh's extent smaller by the zoom: a picture of less would end before the view does.
+    // A flat surface shows the picture smaller than the mesh by the zoom, so the picture must be larger than the
+    // visible part.
     const auto extent = [this](float visible) {
         constexpr float kRounding = 1e-3f;
         return std::max(static_cast<int>(std::ceil(visible * look_.pictureZoom - kRounding)), 1);
@@ -137,7 +138,7 @@ void WaterHost::makeMesh(int vertices) {
     isMeshFilled_ = false;
 }
 
-// Takes from the library's square what the view shows, with cells whose diagonals can be turned.
+// Keeps the visible part of the library's square mesh, with indices whose diagonals can be turned.
 void WaterHost::fillMesh() {
     const auto side = static_cast<std::size_t>(vertices_);
     FloatArray positions(3 * side * side);
@@ -167,7 +168,7 @@ double WaterHost::proportions() const {
 
 void WaterHost::loadPictures(const PictureSource& pictures, unsigned due, unsigned which) {
     JNIEnv* const env = hostEnvironment();
-    // As many pixels as the view shows of them.
+    // The number of picture pixels that the view shows.
     const int longer = static_cast<int>(std::ceil(std::max(width_, height_) * double{look_.pictureZoom}));
     const int shorter = std::max(static_cast<int>(std::lround(longer * proportions())), 1);
     const auto load = [&](unsigned picture, PictureSlot slot, int width, int height, auto native) {
@@ -186,7 +187,7 @@ void WaterHost::setUp(bool withInk) {
     JNIEnv* const env = hostEnvironment();
     native::onInitSetting(env, nullptr, width_, height_, withInk);
     native::onInitGPU(env, nullptr);
-    // The library would keep a stroke that the switch interrupts and go on with it at the next touch.
+    // Otherwise the library would keep an interrupted stroke and continue it at the next touch.
     if (withInk != withInk_) {
         native::clearInkValue(env, nullptr);
         strokes_.reset();
@@ -267,9 +268,9 @@ void WaterHost::breathe(double seconds) {
     gust_ = std::clamp(gust_, 0.0, 1.0);
 }
 
-// The first step is that of the first touch, so that strokes are the same at any frame rate. Where its time would lie
-// in the middle between two frames of 60 Hz, the jitter of a clock would bring none to one frame and two to the next:
-// it is moved a little.
+// Aligns the ink's first step to the first touch, so that strokes do not depend on the frame rate. If that time is
+// halfway between two 60 Hz frames, clock jitter could give one frame no step and the next two; then the time is
+// shifted slightly.
 void WaterHost::startInk() {
     if (inkStart_ < 0.0 || time_ < inkStart_ - kEarly) return;
     const double due = std::min((time_ - inkStart_) / inkStep() + 1.0, double{kMostInkSteps});
@@ -315,8 +316,8 @@ void WaterHost::raise(Place place, float amplitude, float rebound) {
     drops_.push_back({place.x, place.y, std::clamp(amplitude, -kMostAmplitude, kMostAmplitude), rebound, 0});
 }
 
-// One step of every drop. The shares of the steps of its crest, sin(pi (i + 1/2) / n) sin(pi / 2n), sum up to 1; those
-// that follow, to what the rebound leaves of it.
+// Advances every drop by one step. The weights of a crest's steps, sin(pi (i + 1/2) / n) sin(pi / 2n), add up to 1; the
+// following crater and crest are scaled by the rebound.
 void WaterHost::growDrops() {
     if (drops_.empty()) return;
     for (Drop& drop : drops_) {
@@ -332,8 +333,8 @@ void WaterHost::growDrops() {
 }
 
 void WaterHost::addRipple(const Drop& drop, float share) {
-    // The library counts countA cells across the extent, the lattice has one interval less; these positions hit the
-    // very point. The fast axis runs down a column of the lattice.
+    // The library divides the extent into countA cells, the lattice has one interval less. These positions address the
+    // exact point. The fast axis runs down a column of the lattice.
     const auto extent = static_cast<float>(lattice_.extent);
     const auto n = static_cast<float>(lattice_.points);
     const float row = (0.5f - drop.y / extent) * (n - 1.0f);
@@ -343,7 +344,7 @@ void WaterHost::addRipple(const Drop& drop, float share) {
         (row / n - 0.5f) * extent, (column / n - 0.5f) * extent, drop.amplitude * share);
 }
 
-// The heights at the time of the frame, which on a display faster than the water lies between two steps.
+// Computes the heights at the time of the frame. On a display faster than the wave steps this is between two steps.
 void WaterHost::gatherHeights() {
     const bool moves = calmSteps_ < look_.stepsToRest;
     const auto since = static_cast<float>(dueSteps_);
@@ -366,8 +367,8 @@ void WaterHost::draw() {
         const double due = (time_ - inkTime_) / inkStep();
         const double whole = std::floor(due + 0.5);
         steps = static_cast<int>(std::clamp(whole, 1.0, double{kMostInkSteps}));
-        // Steps that are left out take no time. A frame that comes early does not bring the next steps to the middle
-        // between two frames, where the jitter of a clock would decide between none and two.
+        // Skipped steps take no time. If a frame comes early, the next steps are not moved to the middle between two
+        // frames, where clock jitter could give one frame none and the next two.
         const double behind = due < 0.4 ? -0.25 : due - std::max(whole, 1.0);
         inkTime_ = time_ - (behind + steps) * inkStep();
     }
@@ -382,9 +383,9 @@ void WaterHost::draw() {
                 inkSteps_ = look_.framesToFade;
             }
         }
-        // Only the last one is seen. The others move the ink below a mesh of nothing.
+        // Only the last step's frame is visible. The earlier steps draw a mesh with no vertices.
         drawOnce(i == steps);
-        // Under a finger that rests the ink goes on.
+        // While a finger rests, the ink must go on.
         if (inkSteps_ > 0 && !strokes_.isActive()) --inkSteps_;
     }
     changed_ = isLost_ = false;

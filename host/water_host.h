@@ -1,8 +1,8 @@
-// Does the work of an app around the library, in the order that the library requires: owns the mesh arrays, the view,
-// the transform and the lighting values, turns touches and rain into ripples, steps water and ink in time and tells
-// when there is nothing new to draw. LiveWater puts it on a screen; what only renders pictures may drive it directly.
+// The part of an app that calls the library in the required order. It owns the mesh arrays, the view, the transform and
+// the lighting values, turns touches and rain into ripples, steps water and ink in time, and tells whether there is
+// anything new to draw. LiveWater drives it for a screen; a renderer of videos may drive it directly.
 //
-// Call everything on the one thread that owns the OpenGL ES 2.0 context.
+// Call everything on the thread that owns the OpenGL ES 2.0 context.
 #pragma once
 
 #include <cstdint>
@@ -21,83 +21,85 @@ namespace tidemark {
 
 class WaterHost {
 public:
-    // `seed` fixes where the rain falls. The view is width x height pixels, each at least 1. Every value of the look is
-    // within its limits, see look_values.h.
+    // `seed` determines the rain. The view is width x height pixels, each at least 1. All values of the look are within
+    // their limits, see look_values.h.
     WaterHost(const Look& look, int width, int height, std::uint32_t seed);
 
-    // setUp must follow. The water stays.
+    // Changes the size of the view. Call setUp next. The water is kept, the ink is lost.
     void resize(int width, int height);
 
-    // Shorter by longer side of what the backgrounds are cropped to in portrait and in landscape.
+    // Returns the ratio of the shorter to the longer side to which the backgrounds must be cropped.
     double proportions() const;
 
-    // Sets the library up in the current context, with or without ink. The ink is lost.
+    // Sets the library up in the current context, with or without ink. Ink that was there is lost.
     void setUp(bool withInk);
 
-    // Has pictures handed over (`due`) and loads them and others that the library has already (`which`) into textures.
+    // Requests the pictures `due` from the source, then uploads these and the pictures `which`, which the library
+    // already has.
     void loadPictures(const PictureSource& pictures, unsigned due = kAllPictures, unsigned which = kAllPictures);
 
-    // Takes over all values, which are within their limits; the water and the ink stay.
+    // Sets all values of the look, which must be within their limits. Water and ink are kept.
     void setLook(const Look& look);
     const Look& look() const { return look_; }
 
-    // Draws with a share of the vertices along each side that the size of the view asks for, where the look leaves the
-    // mesh to the host.
+    // Reduces the number of vertices along each side to this share of the number that the view's size requires. Ignored
+    // if the look sets meshVertices.
     void setMeshShare(double share);
 
-    // Where the framebuffer has lost the last frame. The next one then does not wait for a step of the ink.
+    // Requests a frame after the framebuffer has lost the last one. It does not wait for an ink step.
     void redraw() { changed_ = isLost_ = true; }
 
-    // Seconds that have been given to advance() so far. Times of touches are measured from the same zero.
+    // Returns the sum of the seconds passed to advance(), the clock for the times of touches.
     double time() const { return time_; }
 
-    // Before the first setUp touch, splash, advance and clearInk do nothing.
+    // Before the first setUp, touch, splash, advance and clearInk do nothing.
 
-    // One touch: x and y in pixels from the top left corner of the view. A stroke begins with the finger's coming down.
-    // Ripples follow at once, the ink at `time` and a little later. `weight` is 1 for a finger, 0.3 to 1.5 for a pen.
+    // Adds a touch at x, y pixels from the top left of the view. A stroke begins with down. Ripples follow immediately,
+    // the ink shortly after `time`. `weight` is 1 for a finger and 0.3 to 1.5 for a pen.
     void touch(TouchAction action, double x, double y, float weight, double time);
     void touch(TouchAction action, double x, double y, float weight) { touch(action, x, y, weight, time_); }
 
-    // Whether a finger is down.
+    // Returns whether a finger is down.
     bool isTouched() const { return fingerDown_; }
 
-    // Raises the ripple of a finger of this weight that comes down, without a finger and without ink.
+    // Raises the same ripple as a touch of this weight, without ink.
     void splash(double x, double y, float weight);
 
-    // Lets rain fall, `look.rainDropsPerSecond` drops a second, until it is switched off.
+    // Turns rain on or off; it falls at `look.rainDropsPerSecond`.
     void rain(bool falling) { raining_ = falling; }
 
-    // Lets the breeze blow for good. Otherwise it sinks some seconds after the last ripple was raised.
+    // If true, the breeze never ends. Otherwise it fades some seconds after the last ripple.
     void blowAlways(bool always) { blowsAlways_ = always; }
 
-    // Advances the water by `seconds` and says whether there is something to draw: while ink lives, when a step of it
-    // is due, as each frame moves it; otherwise when the picture has changed since the last draw.
+    // Advances the water by `seconds`. Returns whether a frame is due: while there is ink, when one of its steps is
+    // due, because each frame steps the ink; otherwise when the picture has changed since the last draw.
     bool advance(double seconds);
 
-    // When advance() will next find something to draw, on the clock of time(), provided that isResting() is false.
+    // Returns when advance() will next return true, on the clock of time(). Requires isResting() to be false.
     double due() const;
 
-    // Whether the picture stays as it is, however much time passes, until the next call that changes something.
+    // Returns whether the picture stays the same until the next call that changes something.
     bool isResting() const;
 
-    // Whether ink lives, each step of which needs a frame: at most look.inkStepsPerSecond frames a second are drawn
-    // then.
+    // Returns whether there is ink. Each of its steps needs a frame, so at most look.inkStepsPerSecond frames a second
+    // are drawn.
     bool inkMoves() const { return withInk_ && inkStart_ < 0.0 && (strokes_.isActive() || inkSteps_ > 0); }
 
-    // Draws a frame: without ink into the current framebuffer, with ink into framebuffer 0. With ink, moves it by the
-    // steps that are due, at least by one; steps beyond the fourth are left out, so that a late frame does not make the
-    // next one late.
+    // Draws a frame: without ink into the current framebuffer, with ink into framebuffer 0. With ink, also runs the
+    // steps that are due, at least one and at most four; more are skipped, so that one late frame does not delay the
+    // next.
     void draw();
 
-    // Lets all ink vanish with the next frame.
+    // Removes all ink with the next frame.
     void clearInk();
 
-    // One height a point of the lattice: column by column from the left, each from the top.
+    // Returns the heights of the lattice, column by column from the left, each column from the top.
     const std::vector<float>& heights() const { return heights_.values; }
     const WaveLattice& lattice() const { return lattice_; }
 
 private:
-    // A ripple that is being raised. Raised at once, it would be a facetted cone for some frames.
+    // A ripple that is being raised over several steps. Raised in one step it would look like a facetted cone for some
+    // frames.
     struct Drop {
         float x, y;  // model units
         float amplitude;
@@ -132,37 +134,37 @@ private:
     void drawOnce(bool isSeen);
 
     Look look_;
-    int width_ = 0;  // view size, pixels
+    int width_ = 0;  // size of the view in pixels
     int height_ = 0;
     std::minstd_rand random_;
     bool raining_ = false;
     bool withInk_ = false;
     bool isSetUp_ = false;
     bool changed_ = true;  // since the last draw
-    bool isLost_ = false;  // what that has drawn
+    bool isLost_ = false;  // the framebuffer has lost the last frame
     double time_ = 0.0;
 
     int calmSteps_;          // calm steps in a row
-    double dueSteps_ = 0.0;  // of the water that the time passed so far still asks for; below 0 when it is ahead
+    double dueSteps_ = 0.0;  // water steps that are due; negative if the water is ahead
     std::vector<Drop> drops_;
     bool fingerDown_ = false;
-    Place trail_ = {};  // where the finger raised its last ripple
+    Place trail_ = {};  // position of the finger's last ripple
 
     Breeze breeze_;
     bool blowsAlways_ = false;
-    double calmAt_ = 0.0;  // when the breeze begins to sink
-    double gust_ = 0.0;    // its share of its full strength, before it is smoothed
+    double calmAt_ = 0.0;  // when the breeze begins to fade
+    double gust_ = 0.0;    // strength of the breeze, 0 to 1, before smoothing
 
     StrokeClock strokes_;
-    double inkStart_ = -1.0;  // when the ink that rested is to begin, or below 0
-    double inkTime_ = 0.0;    // of the ink's last step
-    int inkSteps_ = 0;        // until the ink has faded: the library does not tell whether any is left
+    double inkStart_ = -1.0;  // when the ink starts after a rest; negative if not set
+    double inkTime_ = 0.0;    // time of the ink's last step
+    int inkSteps_ = 0;        // until the ink has faded: the library does not tell whether any remains
 
-    bool isGathered_ = false;  // the mesh has the heights of the lattice, and no others
+    bool isGathered_ = false;  // the mesh has exactly the lattice's heights
     bool isMeshFilled_ = false;
 
-    // The part of the square mesh that the view shows, in model units, and the whole numbers that the library takes for
-    // the picture's extent.
+    // The part of the square mesh that the view shows, in model units, and the integer extent of the picture that the
+    // library receives.
     float visibleWidth_ = 0.0f;
     float visibleHeight_ = 0.0f;
     int pictureWidth_ = 0;
@@ -174,7 +176,7 @@ private:
 
     double meshShare_ = 1.0;
     SurfaceMesh mesh_{2, 2, 1.0, 1.0};
-    int vertices_ = 0;  // of the mesh, along each side of the square
+    int vertices_ = 0;  // along each side of the square mesh
     FloatArray positions_{0};
     ShortArray indices_{0};
     FloatArray heightAttribs_{0};

@@ -1,4 +1,4 @@
-// The surface that painters draw on.
+// A picture in linear light, on which the painters draw.
 #pragma once
 
 #include <algorithm>
@@ -29,7 +29,7 @@ struct Canvas {
     std::vector<Rgb> pixels;
 };
 
-// A pixel of a picture holds the square roots of its light.
+// Convert between linear light and a picture, whose values are the square roots of the light.
 Picture toPicture(const Canvas& canvas);
 Canvas toCanvas(const Picture& picture);
 

@@ -12,7 +12,7 @@ namespace tidemark {
 namespace {
 
 constexpr int kWaves = 14;
-constexpr float kFocus = 0.011f;     // how far a slope throws the light aside, in squared cells
+constexpr float kFocus = 0.011f;     // displacement of the light per unit of slope, in squared cells
 constexpr float kPhotonStep = 0.5f;  // pixels between neighbouring photons
 
 struct Wave {
@@ -31,7 +31,7 @@ std::array<Wave, kWaves> makeWaves(float cell, unsigned seed) {
     return waves;
 }
 
-// A photon's brightness, shared by the four pixels around the place where it lands.
+// Adds a photon's brightness to the four nearest pixels.
 void deposit(std::vector<float>& map, int width, int height, float x, float y) {
     const float left = std::floor(x);
     const float top = std::floor(y);
@@ -52,7 +52,7 @@ void deposit(std::vector<float>& map, int width, int height, float x, float y) {
 std::vector<float> causticNet(int width, int height, float cell, unsigned seed) {
     std::vector<float> map(static_cast<std::size_t>(width) * static_cast<std::size_t>(height));
     const std::array<Wave, kWaves> waves = makeWaves(cell, seed);
-    // Light from outside the picture is thrown into it, too.
+    // Also emit photons outside the picture, because some land inside.
     const float margin = std::ceil(cell);
     const int columns = static_cast<int>((static_cast<float>(width) + 2.0f * margin) / kPhotonStep);
     const int rows = static_cast<int>((static_cast<float>(height) + 2.0f * margin) / kPhotonStep);
@@ -65,7 +65,7 @@ std::vector<float> causticNet(int width, int height, float cell, unsigned seed) 
             landY[static_cast<std::size_t>(i)] = y;
         }
         for (const Wave& wave : waves) {
-            // Along a row the wave's phase turns by the same angle at every step.
+            // Along a row, each step turns the phase of the wave by the same angle.
             std::complex<float> turn = std::polar(1.0f, wave.kx * -margin + wave.ky * y + wave.phase);
             const std::complex<float> step = std::polar(1.0f, wave.kx * kPhotonStep);
             for (std::size_t i = 0; i < landX.size(); ++i) {

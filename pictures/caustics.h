@@ -1,12 +1,12 @@
-// The net of light that a rippled surface focuses on the ground below.
+// Caustics: the net of light that a rippled surface focuses on the ground.
 #pragma once
 
 #include <vector>
 
 namespace tidemark {
 
-// A width x height map of brightness, 1 on average, rows from the top. `cell` is about the size of a mesh of the
-// net in pixels; equal seeds give equal nets.
+// Returns a map of brightness with a mean of 1, width x height floats, rows from the top. `cell` is the approximate
+// size of the net's meshes in pixels. The same seed gives the same net.
 std::vector<float> causticNet(int width, int height, float cell, unsigned seed);
 
 }  // namespace tidemark

@@ -1,4 +1,4 @@
-// Random numbers and cloudy noise that come out the same on every machine.
+// Random numbers and noise with the same values on every platform.
 #pragma once
 
 #include <cstddef>
@@ -11,7 +11,8 @@ class Random {
 public:
     explicit Random(unsigned seed) : engine_(seed) {}
 
-    // Uniform in [low, high). The distributions of <random> differ from one library to the next.
+    // Returns a number in [low, high), uniformly distributed. The distributions of <random> differ between standard
+    // libraries.
     float in(float low, float high) { return low + (high - low) * static_cast<float>(engine_() >> 8U) * 0x1p-24f; }
     int below(int count) { return static_cast<int>(in(0.0f, static_cast<float>(count))); }
 
@@ -19,10 +20,10 @@ private:
     std::mt19937 engine_;
 };
 
-// Rough as a broken stone: 0 to 1, another value at every place.
+// White noise: returns an independent value from 0 to 1 for each position.
 float grainAt(int column, int row);
 
-// A square of clouds, about 0 to 1 and 0.5 on average, that repeats seamlessly.
+// Cloud noise, about 0 to 1 with a mean of 0.5; the square repeats without a seam.
 class CloudTile {
 public:
     static constexpr int kSide = 512;

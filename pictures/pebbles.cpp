@@ -13,7 +13,7 @@ namespace {
 
 struct Mineral {
     Rgb base, mottle;
-    float veins;  // how many of such pebbles carry a pale vein, 0 to 1
+    float veins;  // share of these pebbles that have a pale vein, 0 to 1
 };
 
 constexpr Mineral kMinerals[] = {
@@ -28,18 +28,18 @@ constexpr Mineral kMinerals[] = {
     {{0.045f, 0.050f, 0.055f}, {0.018f, 0.022f, 0.026f}, 0.3f},   // basalt
 };
 
-// All stones take on some of it.
+// Mixed into the colour of every stone.
 constexpr Rgb kBank = {0.150f, 0.140f, 0.120f};
 
-// Light from the upper left, halfway up.
+// Direction of the light: from the upper left, 45 degrees above the ground.
 constexpr std::array<float, 3> kLight = {-0.50f, -0.58f, 0.643f};
 
 struct Pebble {
     float x, y;                    // centre, in pixels
     float along, across;           // radii
     float cosine, sine;            // of the angle of the longer radius
-    float lobe2, lobe3, lobeSkew;  // how far the outline departs from an ellipse
-    float flatness;                // 0 is a ball, 1 a disc with a rounded rim
+    float lobe2, lobe3, lobeSkew;  // amplitudes of the outline's deviation from an ellipse
+    float flatness;                // 0 for a ball, 1 for a disc with a rounded rim
     float shade;
     Mineral mineral;
     bool veined;
@@ -90,7 +90,7 @@ void castShadow(Canvas& canvas, const Pebble& pebble) {
     });
 }
 
-// The colour of the stone at (u, v), which run from -1 to 1 across it.
+// Returns the colour of the stone at (u, v), each from -1 to 1 across the stone.
 Rgb stoneColour(const Pebble& pebble, const CloudTile& clouds, float u, float v, int column, int row) {
     const float cloud = clouds.at(column * 2 + pebble.cloudX, row * 2 + pebble.cloudY);
     const float grain = grainAt(column, row);
@@ -138,7 +138,7 @@ void drawPebble(Canvas& canvas, const Pebble& pebble, const CloudTile& clouds) {
         const float light = 0.20f + 1.35f * diffuse * (0.6f + 0.4f * diffuse);
         const float glint = 0.05f * gloss * gloss * gloss * gloss;
         const Rgb stone = stoneColour(pebble, clouds, u, v, column, row);
-        // The blue sky lights the sides that do not face the sun.
+        // The sky lights the sides that face away from the sun.
         const Rgb lit = {stone.r * light + glint, stone.g * (light + 0.03f) + glint, stone.b * (light + 0.08f) + glint};
         pixel = mix(pixel, lit, coverage);
     });

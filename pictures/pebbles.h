@@ -1,4 +1,4 @@
-// Pebbles painted one over the other, as they lie on the bed of a river.
+// A river bed: pebbles that overlap each other.
 #pragma once
 
 #include "pictures/canvas.h"
@@ -6,7 +6,7 @@
 
 namespace tidemark {
 
-// Covers the canvas with pebbles; `unit` is the radius of a middling one in pixels.
+// Covers the canvas with pebbles; `unit` is the median radius of a pebble in pixels.
 void scatterPebbles(Canvas& canvas, float unit, Random& random, const CloudTile& clouds);
 
 }  // namespace tidemark

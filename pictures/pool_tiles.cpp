@@ -19,10 +19,11 @@ constexpr Rgb kGrout = {0.300f, 0.330f, 0.300f};
 
 struct Scale {
     int column, row;
-    float x, y;  // from its centre, in radii
+    float x, y;  // position relative to the tile's centre, in radii
 };
 
-// Rows of discs, each row shifted by half a tile and hanging over the one below.
+// Returns the tile at a position. The tiles are rows of discs; each row is shifted by half a tile and overlaps the row
+// below.
 Scale scaleAt(float x, float y, float radius) {
     const int upper = static_cast<int>(std::floor(y / radius));
     Scale scale{};
@@ -52,7 +53,7 @@ void layTiles(Canvas& canvas, float unit, const CloudTile& clouds) {
 
         const float distance = std::sqrt(scale.x * scale.x + scale.y * scale.y);
         const float cloud = clouds.at(column * 2, row * 2);
-        // The glaze runs thin towards the rim and catches the light above the middle.
+        // The glaze is thinner at the rim and reflects light above the middle.
         const float rim = std::clamp(distance, 0.0f, 1.0f);
         const float glint = std::max(0.0f, 1.0f - 3.5f * std::hypot(scale.x + 0.25f, scale.y - 0.3f));
         colour = colour * (0.72f + 0.25f * cloud + 0.40f * rim * rim + 0.5f * glint * glint);

@@ -1,4 +1,4 @@
-// Glazed tiles in the shape of fish scales, as they line a pool.
+// Glazed pool tiles in the shape of fish scales.
 #pragma once
 
 #include "pictures/canvas.h"

@@ -14,7 +14,7 @@
 
 namespace tidemark {
 
-// The net of light is cast while the ground is painted; a browser gives its programs one thread.
+// Compute the caustics in parallel with the ground, except in a browser, where a program has one thread.
 #ifdef __EMSCRIPTEN__
 constexpr auto kBeside = std::launch::deferred;
 #else
@@ -23,12 +23,12 @@ constexpr auto kBeside = std::launch::async;
 
 namespace {
 
-// Rolls bright values off towards white instead of cutting them.
+// Compresses bright values towards white instead of clipping them.
 float expose(float light) {
     return light * (1.0f + light * 0.25f) / (1.0f + light * 0.60f);
 }
 
-// The net at half the resolution, read between its four nearest values.
+// The caustics at half the resolution, sampled bilinearly.
 float sampleHalf(const std::vector<float>& net, int netWidth, int netHeight, int column, int row) {
     const auto at = [&](int x, int y) {
         return net[static_cast<std::size_t>(
@@ -41,7 +41,7 @@ float sampleHalf(const std::vector<float>& net, int netWidth, int netHeight, int
     return 0.5625f * at(x, y) + 0.1875f * (at(besideX, y) + at(x, besideY)) + 0.0625f * at(besideX, besideY);
 }
 
-// The colour of a stone under `depth` of water: 0 is shallow and warm, 1 deep and blue-green.
+// Returns the colour of the ground under `depth` of water: 0 is shallow and warm, 1 deep and blue-green.
 Rgb underWater(Rgb stone, float depth, float caustic) {
     const float sun = (1.30f + 0.28f * std::min(caustic, 3.0f)) * (1.30f - 0.50f * depth);
     return {
@@ -50,7 +50,8 @@ Rgb underWater(Rgb stone, float depth, float caustic) {
         expose(stone.b * sun * (0.92f + 0.06f * depth) + 0.004f + 0.026f * depth)};
 }
 
-// The ground that paintGround(canvas, unit) leaves, under water of depthAt(x, y) in the sun; x and y run from 0 to 1.
+// Returns the ground that paintGround(canvas, unit) draws, with water of depthAt(x, y) and caustics over it; x and y
+// are from 0 to 1.
 template <class PaintGround, class DepthAt>
 Picture flood(int width, int height, float netCell, PaintGround paintGround, DepthAt depthAt) {
     const float unit = 0.045f * std::sqrt(static_cast<float>(width) * static_cast<float>(height));
@@ -93,7 +94,8 @@ Picture sandyShore(int width, int height) {
     return flood(width, height, 0.7f, sand, [](float x, float y) { return 0.75f - 0.25f * x - 0.70f * y; });
 }
 
-// A flat surface shows the very middle, slopes lead outwards from there: sky, with the sun's glitter on it.
+// A flat surface reflects the centre of this picture; slopes reflect the parts around it: the sky with the sun's
+// glitter.
 Picture waterLight(int side) {
     const CloudTile clouds(23);
     const std::vector<float> glitter = causticNet(side, side, static_cast<float>(side) / 12.0f, 9);

@@ -1,5 +1,4 @@
-// Pictures for water without a photo: what lies below it, sunlit, in any size and proportions, and the light that the
-// water throws back. Always the same pixels.
+// Painted backgrounds and light, for water without a photo, in any size. The result depends only on the size.
 #pragma once
 
 #include "host/picture.h"

@@ -10,7 +10,7 @@ namespace {
 
 constexpr float kPi = std::numbers::pi_v<float>;
 
-// Ribs wander, part and meet; their crests are sharper than their troughs.
+// Sand ripples meander, split and join; their crests are sharper than their troughs.
 float ribAt(float x, float y, float unit) {
     const float u = x / unit;
     const float v = y / unit;
@@ -25,7 +25,7 @@ struct Starfish {
     Rgb skin;
 };
 
-// Distance from the middle of a star to its rim at the angle `a` from the nearest arm.
+// Returns the distance from the centre of a starfish to its rim, `a` radians from the nearest arm.
 float reachAt(float a) {
     const float along = std::max(0.0f, std::cos(a));
     return 0.30f + 0.70f * std::pow(along, 14.0f);
@@ -48,7 +48,7 @@ void drawStarfish(Canvas& canvas, const Starfish& star) {
         const auto [rim, across] = at(dx, dy);
         const float coverage = std::clamp((1.0f - rim) * 0.35f * star.size + 0.5f, 0.0f, 1.0f);
         if (coverage <= 0.0f) return;
-        // Rounded arms with a row of pale knobs along their backs.
+        // Rounded arms with a row of pale knobs.
         const float round = std::sqrt(std::max(0.0f, 1.0f - rim * rim));
         const float knob =
             std::max(0.0f, 1.0f - across * 28.0f) * (0.5f + 0.5f * std::cos(std::hypot(dx, dy) / star.size * 55.0f));
@@ -71,7 +71,7 @@ void rakeSand(Canvas& canvas, float unit, Random& random, const CloudTile& cloud
         const float light = 0.80f + 1.5f * slope + 0.35f * (cloud - 0.5f) + 0.22f * (grainAt(column, row) - 0.5f);
         const float trough = 1.0f - ribAt(x, y, unit);
         pixel = mix({0.58f, 0.47f, 0.30f}, {0.36f, 0.29f, 0.20f}, 0.6f * trough * trough) * light;
-        // Dark grains lie where the water drops them.
+        // Dark grains collect in the troughs.
         if (grainAt(column + 7919, row) > 0.985f) pixel = pixel * 0.45f;
     });
     const auto width = static_cast<float>(canvas.width);

@@ -1,4 +1,4 @@
-// Sand as the waves leave it near a beach: ribs, grains, and starfish on it.
+// A beach below the water: rippled sand with starfish.
 #pragma once
 
 #include "pictures/canvas.h"
@@ -6,7 +6,7 @@
 
 namespace tidemark {
 
-// Covers the canvas; `unit` is about half the distance from rib to rib in pixels.
+// Covers the canvas; `unit` is about half the distance between two sand ripples in pixels.
 void rakeSand(Canvas& canvas, float unit, Random& random, const CloudTile& clouds);
 
 }  // namespace tidemark

@@ -23,7 +23,7 @@ Ffmpeg::~Ffmpeg() {
     if (messages_) std::fclose(messages_);
 }
 
-// Without an input the pipe is that, otherwise it is the output.
+// With a file as input, the pipe is ffmpeg's output; without, it is ffmpeg's input.
 bool Ffmpeg::start(const std::string& options, const std::string& output, int input, std::string& error) {
     const bool reads = input >= 0;
     int ends[2];
@@ -34,7 +34,7 @@ bool Ffmpeg::start(const std::string& options, const std::string& output, int in
     }
     const auto [near, far] = reads ? std::pair(ends[0], ends[1]) : std::pair(ends[1], ends[0]);
     pipe_ = fdopen(near, reads ? "r" : "w");
-    // A program that ends early is reported by write, not by a signal.
+    // If ffmpeg ends early, write() must report it instead of SIGPIPE ending this program.
     std::signal(SIGPIPE, SIG_IGN);
 
     std::istringstream words("ffmpeg -nostdin -hide_banner -loglevel error " + options);
@@ -53,7 +53,8 @@ bool Ffmpeg::start(const std::string& options, const std::string& output, int in
         posix_spawn_file_actions_addopen(&actions, STDOUT_FILENO, "/dev/null", O_WRONLY, 0);
     }
     posix_spawn_file_actions_adddup2(&actions, fileno(messages_), STDERR_FILENO);
-    // A group of its own: Ctrl-C in a terminal is for this program alone, which then has the clip finished.
+    // In its own process group ffmpeg does not receive Ctrl-C from the terminal, so that this program can finish the
+    // clip.
     posix_spawnattr_t attributes;
     posix_spawnattr_init(&attributes);
     posix_spawnattr_setflags(&attributes, POSIX_SPAWN_SETPGROUP);
@@ -81,7 +82,7 @@ bool Ffmpeg::startWriting(
     const std::string frames = "-y -f rawvideo -pix_fmt rgba -video_size " + std::to_string(width) + "x" +
                                std::to_string(height) + " -framerate " + std::to_string(framesPerSecond) +
                                " -i pipe:0 ";
-    // The time of day and the encoder's version stay out of the file.
+    // Leave out the creation time and the encoder's version, so that equal frames give equal files.
     return start(frames + options + " -fflags +bitexact -flags:v +bitexact", "file:" + file, -1, error);
 }
 
@@ -107,17 +108,17 @@ std::string Ffmpeg::complaint() const {
     if (!std::fgets(line, sizeof line, messages_)) return "";
     std::string text = line;
     while (!text.empty() && text.back() == '\n') text.pop_back();
-    // The part of ffmpeg that complains, and where in memory: "[png @ 0x55e0a8] ".
+    // Skip the prefix with ffmpeg's component and an address: "[png @ 0x55e0a8] ".
     while (text.starts_with('[') && text.find("] ") != text.npos) text.erase(0, text.find("] ") + 2);
     if (text.starts_with("pipe:0: ")) text.erase(0, 8);
     text.resize(std::min(text.size(), text.find(", see the documentation")));
-    // ffmpeg may quote any bytes of the file, which a terminal could take for commands.
+    // ffmpeg may quote bytes of the file, which could control a terminal.
     std::replace_if(
         text.begin(), text.end(), [](char c) { return c < ' ' || c > '~'; }, '?');
     return text;
 }
 
-// Closes the pipe, so that the program ends, and returns 0 if it ended well.
+// Closes the pipe, which ends ffmpeg, and returns its exit status.
 int Ffmpeg::wait() {
     if (pipe_) std::fclose(pipe_);
     pipe_ = nullptr;

@@ -1,4 +1,4 @@
-// The program ffmpeg as a child process, which reads pictures of all kinds and writes pictures and videos.
+// Runs ffmpeg as a child process to decode pictures and to encode pictures and videos.
 #pragma once
 
 #include <sys/types.h>
@@ -13,28 +13,28 @@ namespace tidemark {
 class Ffmpeg {
 public:
     Ffmpeg() = default;
-    ~Ffmpeg();  // ends the program if it still runs
+    ~Ffmpeg();  // kills ffmpeg if it still runs
     Ffmpeg(const Ffmpeg&) = delete;
     Ffmpeg& operator=(const Ffmpeg&) = delete;
 
-    // The options of both are separated by blanks. On failure these and the next two say why in `error`.
+    // `options` are separated by spaces. On failure the functions return false and store the reason in `error`.
 
-    // Starts the program with the open file `input` as its standard input and its standard output at pipe(). It may
-    // use the processor for so many seconds.
+    // Starts ffmpeg with the open file `input` as standard input and its standard output at pipe(). Its processor time
+    // is limited to `mostSeconds`.
     bool startReading(const std::string& options, int input, int mostSeconds, std::string& error);
 
-    // Starts the program with what write() gives it as its input, RGBA frames of this size, to write a file.
+    // Starts ffmpeg to encode `file` from the frames passed to write(), RGBA of the given size.
     bool startWriting(
         int width, int height, int framesPerSecond, const std::string& options, const std::string& file,
         std::string& error);
     bool write(const Picture& frame, std::string& error);
 
-    // Closes the pipe and waits until the program has ended well.
+    // Closes the pipe and waits for ffmpeg to succeed.
     bool finish(std::string& error);
 
     std::FILE* pipe() const { return pipe_; }
 
-    // The first thing that the program complained about, in one line of printable characters; empty for none.
+    // Returns ffmpeg's first message as one line of printable characters, or an empty string.
     std::string complaint() const;
 
 private:
@@ -43,7 +43,7 @@ private:
 
     pid_t pid_ = -1;
     std::FILE* pipe_ = nullptr;
-    std::FILE* messages_ = nullptr;  // its standard error
+    std::FILE* messages_ = nullptr;  // ffmpeg's standard error
 };
 
 }  // namespace tidemark

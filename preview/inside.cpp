@@ -12,7 +12,7 @@ namespace tidemark {
 
 namespace {
 
-// Values in rows; beyond an edge those on it go on.
+// A grid of values. Beyond an edge it repeats the values at the edge.
 struct Grid {
     const float* values;
     int width, height;
@@ -22,7 +22,7 @@ struct Grid {
 
 constexpr Rgb kPaper = {0.91f, 0.89f, 0.84f};
 
-// Of a row of equally spaced colours the one at `t`, 0 to 1.
+// Returns the colour at `t`, 0 to 1, in a gradient of equally spaced colours.
 template <std::size_t N>
 Rgb colourAt(const Rgb (&colours)[N], float t) {
     const float place = std::clamp(t, 0.0f, 1.0f) * static_cast<float>(N - 1);
@@ -30,15 +30,15 @@ Rgb colourAt(const Rgb (&colours)[N], float t) {
     return mix(colours[below], colours[below + 1], place - static_cast<float>(below));
 }
 
-// The value t of the way from b to c, which lie between a and d (Catmull and Rom, 1974).
+// Interpolates between b and c, t from 0 to 1; a and d are the outer neighbours (Catmull and Rom, 1974).
 float cubic(float a, float b, float c, float d, float t) {
     return b + 0.5f * t * (c - a + t * (2.0f * a - 5.0f * b + 4.0f * c - d + t * (3.0f * (b - c) + d - a)));
 }
 
-// The height of each pixel's middle; the view shows the middle of the square lattice.
+// Returns the height at each pixel's centre. The view shows the middle of the square lattice.
 std::vector<float> heightsInView(const WaterHost& host, int width, int height, float cellsPerPixel) {
     const int n = host.lattice().points;
-    const Grid mesh = {host.heights().data(), n, n};  // a row of it is a column of the mesh
+    const Grid mesh = {host.heights().data(), n, n};  // a row of the grid is a column of the mesh
     const auto place = [=](int pixel, int pixels) {
         return 0.5f * static_cast<float>(n - 1) + 0.5f * static_cast<float>(2 * pixel + 1 - pixels) * cellsPerPixel;
     };
@@ -70,7 +70,7 @@ Picture drawHeight(const WaterHost& host, const Look& look, int width, int heigh
     const Grid view = {heights.data(), width, height};
     Canvas canvas(width, height);
     forAllPixels(canvas, [&](Rgb& pixel, int x, int y) {
-        // Heights of 1.13 and more show the water texture fully. The light comes from the upper left.
+        // At heights of 1.13 and above, the water texture has its full weight. The light is at the upper left.
         const float h = view.at(x, y);
         const float t = 0.5f + 0.5f * std::copysign(std::pow(std::abs(h) / 1.13f, 0.8f), h);
         const float rise = view.at(x + 1, y) - view.at(x - 1, y) + view.at(x, y + 1) - view.at(x, y - 1);
@@ -79,7 +79,7 @@ Picture drawHeight(const WaterHost& host, const Look& look, int width, int heigh
     return toPicture(canvas);
 }
 
-// An arrow with its middle at (x, y), along a unit direction, all in pixels; its shaft grows from the tail.
+// Draws an arrow with its centre at (x, y) and a unit direction, in pixels. A longer arrow has a wider shaft.
 void drawArrow(Canvas& canvas, float x, float y, float directionX, float directionY, float length, Rgb colour) {
     const float head = std::min(0.6f * length, 7.0f);
     forPixelsAround(canvas, x, y, 0.5f * length + 4.0f, [&](Rgb& pixel, int column, int row) {
@@ -88,7 +88,7 @@ void drawArrow(Canvas& canvas, float x, float y, float directionX, float directi
         const float fromTail = 0.5f * length + dx * directionX + dy * directionY;
         const float toTip = length - fromTail;
         const float aside = std::abs(dy * directionX - dx * directionY);
-        // How far inside each part the pixel lies.
+        // The distances by which the pixel is inside the shaft and inside the head.
         const float inHead = std::min(0.45f * toTip - aside, head - toTip);
         const float inShaft = std::min({0.35f + 0.65f * fromTail / length - aside, fromTail, toTip - 0.7f * head});
         pixel = mix(pixel, colour, std::clamp(std::max(inHead, inShaft) + 0.5f, 0.0f, 1.0f));
@@ -99,7 +99,7 @@ Picture drawVelocity(const Picture& result, const EngineView& engine) {
     constexpr Rgb kColours[] = {
         {0.080f, 0.450f, 0.600f}, {0.200f, 0.850f, 0.700f}, {0.900f, 0.850f, 0.220f}, {1.000f, 0.400f, 0.100f}};
     constexpr float kFastest = 60.0f;
-    constexpr int kCells = 2;  // from one arrow to the next
+    constexpr int kCells = 2;  // distance between two arrows
     Canvas canvas = toCanvas(result);
     forAllPixels(canvas, [](Rgb& pixel, int, int) {
         const float grey = 0.3f * pixel.r + 0.6f * pixel.g + 0.1f * pixel.b;
@@ -121,7 +121,7 @@ Picture drawVelocity(const Picture& result, const EngineView& engine) {
     return toPicture(canvas);
 }
 
-// Darkens paper by the formula by which the water's shader darkens the picture.
+// Darkens paper with the formula of the water's fragment shader.
 Picture drawDensity(int width, int height, const EngineView& engine) {
     const Grid ink = {engine.density.data(), engine.inkWidth, engine.inkHeight};
     const float columnsPerPixel = static_cast<float>(ink.width) / static_cast<float>(width);
@@ -138,7 +138,7 @@ Picture drawDensity(int width, int height, const EngineView& engine) {
         const float value = std::lerp(along(j), along(j + 1), up);
         const auto through = [value](float paper, float tint) {
             const float divisor = 1.0f + value * tint;
-            return paper / (divisor * divisor);  // of light; the shader divides its square root
+            return paper / (divisor * divisor);  // in linear light; the shader divides its square root
         };
         const float* const tint = engine.tint;
         pixel = {through(kPaper.r, tint[0]), through(kPaper.g, tint[1]), through(kPaper.b, tint[2])};

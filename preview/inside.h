@@ -1,4 +1,4 @@
-// Draws the heights, the flow and the density behind a frame with ink.
+// Pictures of the heights, the flow and the density of a frame with ink.
 #pragma once
 
 #include <array>
@@ -10,12 +10,12 @@
 
 namespace tidemark {
 
-// The pictures as files: height.png, velocity.png, density.png and result.png.
+// Returns the file name of picture i: height.png, velocity.png, density.png, result.png.
 std::string insideName(int picture);
 
-// Four pictures of the size of `result`, the frame that `host` has just drawn in the current context: the water's
-// heights, crests red and troughs blue; the flow, arrows whose length and colour grow with the square root of the
-// speed; the ink alone, on paper; and the frame.
+// Returns four pictures of the size of `result`, the frame that `host` has just drawn in the current context: the
+// heights, with red crests and blue troughs; the flow, with arrows whose length and colour grow with the square root of
+// the speed; the ink alone on paper; and `result`.
 std::array<Picture, 4> drawInside(const WaterHost& host, const Look& look, const Picture& result);
 
 }  // namespace tidemark

@@ -2,7 +2,7 @@
 
 namespace tidemark {
 
-// From now on Ctrl-C, or a request to end, is only noted. A second one ends the program.
+// From now on the first SIGINT or SIGTERM is only recorded. A second one ends the program.
 void noteInterrupts();
 bool interrupted();
 

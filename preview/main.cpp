@@ -36,7 +36,7 @@ fs::path sceneNamed(const std::string& name) {
     return fs::path(TIDEMARK_SCENES) / (name + ".touch");
 }
 
-// Each scene with the beginning of its comment.
+// Lists the scenes, each with the first words of its file's comment, the presets and the painted pictures.
 std::string listNames() {
     const auto row = [](std::string name, std::string_view text) {
         name.resize(std::max<std::size_t>(name.size(), 16), ' ');
@@ -68,7 +68,7 @@ CLI::Validator endingIn(const std::set<std::string>& endings) {
         ""};
 }
 
-// Leaves a number of the form that the parser knows.
+// Checks a colour and rewrites it as a number that CLI11 can parse.
 std::string readColor(std::string& text) {
     const std::string digits = text.substr(text.starts_with('#') ? 1 : 0);
     if (digits.size() != 6 || digits.find_first_not_of("0123456789abcdefABCDEF") != digits.npos) {
@@ -78,12 +78,12 @@ std::string readColor(std::string& text) {
     return "";
 }
 
-// Ranges let through what is not a number.
+// CLI::Range accepts text that is not a number.
 std::string readNumber(std::string& text) {
     return text.find_first_not_of("0123456789.") == text.npos ? "" : text + " is not a number above 0";
 }
 
-// Returns why the options contradict each other, or an empty text.
+// Returns the reason why two options contradict each other, or an empty string.
 std::string contradiction(const PreviewOptions& options) {
     const bool isWide = options.size.width > options.size.height;
     const bool writesClip = !options.video.empty() || !options.out.empty();
@@ -92,7 +92,7 @@ std::string contradiction(const PreviewOptions& options) {
     if (!writesClip && options.still.empty() && options.inside.empty()) {
         return "nothing to do: name a --video, --out, --still or --inside to write, or open a --window";
     }
-    // Who names both need not mind the view.
+    // With both pictures given, the view may have either orientation.
     if (isWide && options.landscape.empty() && !options.portrait.empty()) return "--portrait is not for a wide view";
     if (!isWide && options.portrait.empty() && !options.landscape.empty()) return "--landscape is for a wide view";
     if (!options.inside.empty() && !options.withInk) return "--inside needs ink";
@@ -126,7 +126,7 @@ int main(int argc, char** argv) {
     app.set_version_flag("--version", "tidemark-preview " TIDEMARK_VERSION, "Print the version");
     app.add_flag_callback(
         "--list", [] { throw CLI::CallForVersion(listNames(), 0); }, "List the scenes, looks and pictures with names");
-    // So that a script's own options may come first.
+    // demo.sh puts its own options first; the user's replace them.
     app.option_defaults()->multi_option_policy(CLI::MultiOptionPolicy::TakeLast);
     const auto add = [&](const char* name, auto& value, const char* type, const char* help) {
         return app.add_option(name, value, help)->type_name(type);

@@ -38,7 +38,7 @@ bool makeFolder(const fs::path& path, std::string& error) {
 bool rename(const fs::path& from, const fs::path& to, bool force, std::string& error) {
     if (renameat2(AT_FDCWD, from.c_str(), AT_FDCWD, to.c_str(), force ? 0 : RENAME_NOREPLACE) == 0) return true;
     if (errno == EEXIST) return mayWrite(to, force, error);
-    // Not every file system can tell in the same breath.
+    // Some file systems do not support RENAME_NOREPLACE.
     if (errno != EINVAL) return cannotWrite(to, error);
     if (!mayWrite(to, force, error)) return false;
     return std::rename(from.c_str(), to.c_str()) == 0 || cannotWrite(to, error);

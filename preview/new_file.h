@@ -1,4 +1,4 @@
-// Files that appear under their names once they are whole.
+// Files that get their name only when they are complete.
 #pragma once
 
 #include <filesystem>
@@ -6,21 +6,21 @@
 
 namespace tidemark {
 
-// All of these say why in `error` on failure.
+// On failure all functions store the reason in `error`.
 
-// Whether a file may be written: there is none of that name, or it may be overwritten.
+// Returns whether a file may be written: it does not exist, or `force` is set.
 bool mayWrite(const std::filesystem::path& path, bool force, std::string& error);
 
-// Makes the folder and what is missing above it; an empty path is the current folder.
+// Creates the folder and its parents. An empty path is the current folder.
 bool makeFolder(const std::filesystem::path& path, std::string& error);
 
-// Gives a file its name. Without `force` a file that has that name by now stays, and this fails.
+// Moves a file to its final name. Without `force`, fails if that name exists.
 bool rename(const std::filesystem::path& from, const std::filesystem::path& to, bool force, std::string& error);
 
-// A name beside this one that no other run uses.
+// Returns a temporary name in the same folder that no other process uses.
 std::filesystem::path partOf(const std::filesystem::path& path);
 
-// A file of which nothing is left when it is destroyed before it was kept.
+// A temporary file that is deleted unless it was kept.
 class NewFile {
 public:
     NewFile() = default;
@@ -28,7 +28,7 @@ public:
     NewFile(const NewFile&) = delete;
     NewFile& operator=(const NewFile&) = delete;
 
-    // Makes an empty file, to be filled under the name part().
+    // Creates the empty file part(), for the caller to fill.
     bool make(const std::filesystem::path& path, bool force, std::string& error);
     std::string part() const { return part_.string(); }
 

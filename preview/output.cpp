@@ -18,7 +18,7 @@ std::string frameName(int picture) {
     return name;
 }
 
-// The frames that are in a folder, as far as they follow each other.
+// Counts the consecutive frames in a folder.
 int countFrames(const fs::path& folder) {
     int count = 0;
     while (fs::exists(folder / frameName(count))) ++count;
@@ -30,7 +30,7 @@ std::string videoFormat(const std::string& ending, int crf) {
         return "-filter_complex split[seen][kept];[seen]palettegen[palette];[kept][palette]paletteuse -loop 0 -f gif";
     }
     if (ending == ".webp") return "-c:v libwebp_anim -quality 80 -loop 0 -f webp";
-    // H.264 halves the resolution of the colours, so it wants even sides.
+    // H.264 stores colours at half the resolution and therefore needs even sides.
     return "-vf pad=ceil(iw/2)*2:ceil(ih/2)*2,scale=out_color_matrix=bt709:out_range=tv -c:v libx264 -pix_fmt yuv420p"
            " -colorspace bt709 -color_primaries bt709 -color_trc bt709 -movflags +faststart -f mp4 -crf " +
            std::to_string(crf);
@@ -75,7 +75,7 @@ bool Output::openFrames(std::string& error) {
     const fs::path part = partOf(fs::path(options_.out) / "frames");
     if (!makeFolder(part, error)) return false;
     part_ = part;
-    // A % begins a number in the names that ffmpeg counts.
+    // ffmpeg interprets % in a file name as the start of a frame number.
     std::string folder;
     for (const char c : part.string()) folder += c == '%' ? "%%" : std::string(1, c);
     return pictures_.startWriting(
@@ -129,7 +129,7 @@ bool Output::keepFrames(std::string& error) {
         bytes += fs::file_size(part);
         if (!rename(part, folder / frameName(i), options_.force, error)) return false;
     }
-    // Those of a longer run before, or the folder would show two films.
+    // Removes the remaining frames of an earlier, longer run; otherwise the folder would mix two runs.
     for (int i = countFrames(folder) - 1; options_.force && i >= count; --i) fs::remove(folder / frameName(i));
     tell((folder / frameName(0)).string() + (count > 1 ? " to " + frameName(count - 1) : ""), bytes);
     return true;

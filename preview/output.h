@@ -11,8 +11,8 @@
 
 namespace tidemark {
 
-// The frames of a run as pictures and as a video, and single pictures. What was there before stays unless the options
-// say otherwise. What is destroyed before it has finished leaves no frames and no video.
+// Writes the frames of a run as pictures and as a video, and single pictures. Existing files are kept unless --force is
+// set. If it is destroyed before finish(), it leaves no frames and no video.
 class Output {
 public:
     explicit Output(const PreviewOptions& options) : options_(options) {}
@@ -20,9 +20,9 @@ public:
     Output(const Output&) = delete;
     Output& operator=(const Output&) = delete;
 
-    // All of these say why in `error` on failure.
+    // On failure all functions store the reason in `error`.
 
-    // Whether all that the options name may be written.
+    // Returns whether all outputs may be written.
     bool check(std::string& error) const;
     bool open(std::string& error);
     bool write(const Picture& frame, std::string& error);
@@ -31,7 +31,7 @@ public:
 
     int frames() const { return frames_; }
 
-    // The files and their sizes, in a part of a line.
+    // Returns the names and sizes of the files, for the closing line.
     std::string summary() const { return summary_; }
 
 private:
@@ -42,13 +42,13 @@ private:
 
     const PreviewOptions& options_;
     Ffmpeg pictures_, video_;
-    std::filesystem::path part_;  // where the frames are before they are kept
+    std::filesystem::path part_;  // temporary folder of the frames
     NewFile videoFile_;
     int frames_ = 0;
     std::string summary_;
 };
 
-// "1.2 MB"
+// Formats a size, for example "1.2 MB".
 std::string sizeInWords(std::uintmax_t bytes);
 
 }  // namespace tidemark

@@ -14,7 +14,8 @@ namespace tidemark {
 
 namespace {
 
-// Ten times as long as the largest picture takes: a small file can ask for hours.
+// Limit of the decoder's processor time in seconds, ten times what the largest photo needs; a small file can be made to
+// take hours.
 constexpr int kMostSeconds = 60;
 
 void coverWhite(Picture& picture) {
@@ -27,7 +28,7 @@ void coverWhite(Picture& picture) {
     }
 }
 
-// The one picture in a stream of PAM, a header of text and the pixels.
+// Reads one picture in PAM format: a text header, then the pixels.
 std::optional<Picture> readPam(std::FILE* stream) {
     Picture picture;
     char end = 0;
@@ -48,7 +49,7 @@ std::optional<Picture> loadPicture(const std::string& path, std::string& error, 
         error = "cannot read the picture " + path + ": " + reason;
         return std::nullopt;
     };
-    // A pipe might never begin.
+    // Reading a pipe could block forever.
     const int input = open(path.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC);
     if (input < 0) return fail(std::strerror(errno));
     const std::unique_ptr<std::FILE, int (*)(std::FILE*)> file(fdopen(input, "r"), std::fclose);
@@ -56,7 +57,8 @@ std::optional<Picture> loadPicture(const std::string& path, std::string& error, 
     if (fstat(input, &status) != 0) return fail(std::strerror(errno));
     if (!S_ISREG(status.st_mode)) return fail("it is not a regular file");
 
-    // Through a pipe ffmpeg tells by the content what it is, and a play list cannot have it open other files.
+    // ffmpeg reads from standard input, so that it detects the format by content and a playlist cannot open other
+    // files.
     const std::string options = "-max_pixels " + std::to_string(mostPixels) +
                                 " -i pipe:0 -frames:v 1"
                                 " -sws_flags bicubic+accurate_rnd+full_chroma_int -f image2pipe -c:v pam -pix_fmt rgba";

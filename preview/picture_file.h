@@ -1,4 +1,4 @@
-// Pictures in files.
+// Reads and writes picture files.
 #pragma once
 
 #include <optional>
@@ -8,18 +8,18 @@
 
 namespace tidemark {
 
-// The size of the largest phone cameras' photos. Reading one needs a few times four bytes for each pixel.
+// 200 megapixels, the largest photos of phones. Decoding needs several times four bytes per pixel.
 constexpr int kMostPixels = 200'000'000;
 
-// A picture of any kind that ffmpeg reads, turned as the camera was held where a JPEG tells, over white where it is
-// transparent. Of one that moves, the first frame. On failure, or for a picture of more than `mostPixels` pixels, says
-// why in `error`. Says on standard error what is wrong with a damaged picture.
+// Decodes a picture in any format that ffmpeg supports: the first frame of an animation, rotated according to a JPEG's
+// EXIF orientation, over white where it is transparent. On failure, or if it has more than `mostPixels` pixels, returns
+// nothing and stores the reason in `error`. Reports damage to standard error.
 std::optional<Picture> loadPicture(const std::string& path, std::string& error, int mostPixels = kMostPixels);
 
-// How ffmpeg writes PNGs.
+// ffmpeg options for PNG.
 constexpr char kPng[] = "-c:v png -pred mixed -pix_fmt rgb24";
 
-// Writes a PNG. On failure says why in `error`.
+// Writes a PNG. On failure returns false and stores the reason in `error`.
 bool savePicture(const Picture& picture, const std::string& path, std::string& error);
 
 }  // namespace tidemark

@@ -26,7 +26,7 @@ namespace tidemark {
 
 namespace {
 
-// GL's rows come from the bottom.
+// Reads framebuffer 0. GL's rows start at the bottom.
 void readFrame(Picture& frame) {
     glReadPixels(0, 0, frame.width, frame.height, GL_RGBA, GL_UNSIGNED_BYTE, frame.rgba.data());
     const auto rowBytes = static_cast<std::ptrdiff_t>(frame.width) * 4;
@@ -36,18 +36,18 @@ void readFrame(Picture& frame) {
     }
 }
 
-// Counted in frames.
+// The lengths of a run's parts, in frames.
 struct Plan {
-    int warmUp = 0;  // rounds of the scene that nobody sees, so that a clip that goes round begins as it ends
+    int warmUp = 0;  // rounds before the clip, so that a looping clip begins in the state in which it ends
     int round;
-    int fade = 0;  // from the end of the clip to its beginning
+    int fade = 0;  // at the end of the clip, into its first frames
 
     int total() const { return warmUp + round + fade; }
 };
 
 Plan makePlan(const PreviewOptions& options, const Look& look, const std::vector<TouchEvent>& events) {
     double seconds = events.empty() ? 4.0 : static_cast<double>(events.back().timeMs) / 1000.0 + 1.5;
-    // One picture needs no more than what leads to it.
+    // A single picture needs only the frames up to it.
     if (options.at)
         seconds = options.out.empty() && options.video.empty() ? *options.at : std::max(seconds, *options.at);
     const auto frames = [&](double time) { return static_cast<int>(std::lround(time * options.framesPerSecond)); };
@@ -55,13 +55,13 @@ Plan makePlan(const PreviewOptions& options, const Look& look, const std::vector
     if (!options.loop) return plan;
     const int calming = frames(std::min(double{look.calmingTime}, 30.0));
     plan.warmUp = (calming + plan.round - 1) / plan.round * plan.round;
-    // The frames that fade in are kept in memory, of which they take at most a gibibyte.
+    // The faded frames are kept in memory, at most 1 GiB.
     const auto affordable = (std::int64_t{1} << 28) / (std::int64_t{options.size.width} * options.size.height);
     plan.fade = static_cast<int>(std::min({std::int64_t{frames(0.5)}, std::int64_t{plan.round / 2}, affordable}));
     return plan;
 }
 
-// The events of each round, one after the other.
+// Repeats the script for each round.
 std::vector<TouchEvent> repeated(const std::vector<TouchEvent>& events, const Plan& plan, int framesPerSecond) {
     std::vector<TouchEvent> all;
     for (int start = 0; start < plan.total(); start += plan.round) {

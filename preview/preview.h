@@ -1,4 +1,4 @@
-// One run of the preview: pictures and touches in, frames out.
+// A run without a window: draws a scene and writes its frames.
 #pragma once
 
 #include <cstdint>
@@ -10,40 +10,40 @@
 
 namespace tidemark {
 
-// An empty picture means the painted one, an empty look that of the preset, an empty script none, an empty output none.
+// Empty paths select the default: a painted picture, the preset's look, no script, no output.
 struct PreviewOptions {
-    std::string picture, portrait, landscape, light;  // files; the first where the next two are empty
+    std::string picture, portrait, landscape, light;  // files; `picture` replaces an empty portrait or landscape
     Ground ground = Ground::pool;                     // the painted picture
-    Look base;                                        // what the file of the look does not name
+    Look base;                                        // values that the file `look` does not contain
     std::string look;                                 // file
     std::string script;                               // file
     std::optional<double> rainFrom;                   // seconds from the beginning of each round
     Size size = {540, 960};
-    std::optional<double> seconds;  // or the script's length and a little for the water to calm
+    std::optional<double> seconds;  // default: the script and 1.5 seconds
     int framesPerSecond = 60;
-    std::string out;           // folder
-    int every = 1;             // frames from one picture in it to the next
+    std::string out;           // folder of the frames
+    int every = 1;             // write every Nth frame into the folder
     std::string video;         // file
-    int crf = 18;              // quality of an MP4, 0 to 51; less is better
-    std::string still;         // file, for one frame
-    std::optional<double> at;  // seconds to that, or the last one
-    std::string inside;        // folder, for what lies behind the last frame; with ink only
-    bool loop = false;         // the end leads over to the beginning
-    bool force = false;        // overwrite
+    int crf = 18;              // quality of an MP4, 0 (best) to 51
+    std::string still;         // file for one frame
+    std::optional<double> at;  // time of that frame in seconds; default: the last one
+    std::string inside;        // folder for the pictures of inside.h; requires ink
+    bool loop = false;         // make the end continue into the beginning
+    bool force = false;        // overwrite existing files
     std::uint32_t seed = 1;
     bool withInk = false;
-    std::optional<std::uint32_t> inkColor;  // 0xrrggbb, instead of the look's own
+    std::optional<std::uint32_t> inkColor;  // 0xrrggbb; default: the look's colour
 
     bool inWindow = false;
     bool fullscreen = false;
-    std::string record;  // file, for the touches in the window
+    std::string record;  // file for the touches in the window
 };
 
-// More than any screen, and still within what drivers draw.
+// A limit above all displays and below the drivers' limits.
 constexpr int kLongestSide = 8192;
 
-// On failure says why in `error`. Otherwise `summary` is a line that tells what was written. Ctrl-C ends the run early,
-// with what was drawn until then.
+// Runs until the end or Ctrl-C, which keeps the frames drawn so far. Stores one line about the written files in
+// `summary`, or on failure the reason in `error`.
 bool runPreview(const PreviewOptions& options, std::string& summary, std::string& error);
 
 }  // namespace tidemark

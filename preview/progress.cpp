@@ -11,7 +11,7 @@ Progress::Progress(const std::string& beginning) : watched_(isatty(STDERR_FILENO
 }
 
 Progress::~Progress() {
-    // Wipes the line, so that what comes next starts on a clean one.
+    // Clears the line for the next message.
     if (shown_) std::fputs("\r\033[K", stderr);
 }
 

@@ -8,11 +8,11 @@ namespace tidemark {
 
 class Progress {
 public:
-    // Says what comes before the first frame, which takes a while in a large view.
+    // Shows a message until the first frame, which can take seconds for a large view.
     explicit Progress(const std::string& beginning);
     ~Progress();
 
-    // A bar, ten times a second.
+    // Draws a bar, at most ten times a second.
     void show(int framesDone, int frames);
 
 private:

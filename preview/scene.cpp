@@ -28,19 +28,19 @@ Picture paintGround(Ground ground, int width, int height) {
     return sandyShore(width, height);
 }
 
-// Ink of this brightness leaves a channel as it is; brighter ink would light the picture up.
+// Ink of this brightness does not change a channel; brighter ink would brighten the picture.
 constexpr std::uint32_t kBrightestChannel = 0xbf;
 
 }  // namespace
 
 std::optional<Pictures> choosePictures(const PreviewOptions& options, std::string& error) {
-    // The painted pictures stay as sharp as the view up to a size where they take too long to make.
+    // Painted pictures have the view's resolution up to a size that still paints quickly.
     const auto [width, height] = options.size;
     const double shrink = std::min(1.0, 2048.0 / std::max(width, height));
     const int shorter = std::max(1, static_cast<int>(std::min(width, height) * shrink));
     const int longer = std::max(1, static_cast<int>(std::max(width, height) * shrink));
     const auto background = [&](const std::string& own, bool isWide) -> std::optional<Picture> {
-        // A view that keeps its size shows one of the two.
+        // Without a window the size is fixed, so only one orientation is needed.
         if (!options.inWindow && isWide != (options.size.width > options.size.height)) {
             return Picture{1, 1, {0, 0, 0, 255}};
         }

@@ -1,4 +1,4 @@
-// Prepares the pictures, the look and the script that the options of a run name.
+// Loads the pictures and the look that the options select.
 #pragma once
 
 #include <optional>
@@ -10,13 +10,13 @@
 
 namespace tidemark {
 
-// On failure says why in `error`.
+// On failure returns nothing and stores the reason in `error`.
 std::optional<Pictures> choosePictures(const PreviewOptions& options, std::string& error);
 
-// Makes a picture that is larger than the current context's driver takes smaller, and says so on standard error.
+// Scales a picture down to the driver's texture limit, and reports that on standard error.
 void fitToDriver(const std::string& file, Picture& picture);
 
-// Says on standard error what it has to change. On failure says why in `error`.
+// Reports changes to the ink's colour on standard error. On failure returns nothing and stores the reason in `error`.
 std::optional<Look> chooseLook(const PreviewOptions& options, std::string& error);
 
 }  // namespace tidemark

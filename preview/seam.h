@@ -1,6 +1,5 @@
-// A clip that goes round without a jump: what would follow its end turns into its beginning. So the clip begins a
-// little into the scene, and it ends with as many frames of the scene's next round, which fade into those that were
-// left out.
+// Makes a clip loop without a jump. The clip starts `fade` frames into the scene; its last frames come from the scene's
+// next round and fade into the frames that were skipped at the beginning.
 #pragma once
 
 #include <vector>
@@ -11,11 +10,11 @@ namespace tidemark {
 
 class Seam {
 public:
-    // Both counted in frames; without a fade every frame is as it is.
+    // Both in frames. With a fade of 0 all frames are unchanged.
     Seam(int round, int fade) : round_(round), fade_(fade) {}
 
-    // Returns the clip's frame for a frame of the scene, counted from 0 to round + fade: null for nothing. Stays as it
-    // is until the next call.
+    // Returns the clip's frame for frame 0 to round + fade - 1 of the scene, or null if there is none. Valid until the
+    // next call.
     const Picture* shown(int number, const Picture& frame);
 
 private:

@@ -16,11 +16,11 @@ namespace tidemark {
 
 namespace {
 
-// Longest time and farthest position that a script may name: an hour, and what an int holds with room to spare.
+// Limits of a script: an hour, and positions that fit an int.
 constexpr std::int64_t kLongestTimeMs = 3600 * 1000;
 constexpr double kFarthest = 1.0e6;
 
-// More than an hour of a finger's moves on a display of 120 frames a second.
+// More than an hour of moves at 120 Hz.
 constexpr std::size_t kMostBytes = 16 << 20;
 
 template <class Number>

@@ -1,11 +1,11 @@
-// Touch scripts: plain text, one event a line, "time_ms action x y pressure".
+// Touch scripts: plain text, one event per line, "time_ms action x y pressure".
 //
-//     # a finger comes down in the middle and leaves again
+//     # a finger goes down in the middle and is lifted again
 //     0    down  50%  50%  1.0
 //     100  up    50%  50%  1.0
 //
-// Times never go back. Actions are down, move, up and cancel. Positions count from the top left corner of the view,
-// in pixels or, with a % sign, in hundredths of its width and height. A # starts a comment.
+// Times never decrease. Actions are down, move, up and cancel. Positions are relative to the top left of the view, in
+// pixels or, with %, in per cent of its width and height. # starts a comment.
 #pragma once
 
 #include <cstdint>
@@ -32,21 +32,21 @@ struct TouchEvent {
     float pressure;
 };
 
-// On failure says why in `error`, in one line that starts with "name:line: ".
+// On failure both return nothing and store the reason in `error`, one line that begins with "name:line: ".
 std::optional<std::vector<TouchEvent>> parseTouchScript(
     std::istream& text, const std::string& name, std::string& error);
 std::optional<std::vector<TouchEvent>> loadTouchScript(const std::string& path, std::string& error);
 
-// The lines of a script, whose parts of a pixel and of a per cent are rounded to thousandths.
+// Formats a script, with positions rounded to thousandths.
 std::string writeTouchScript(const std::vector<TouchEvent>& events);
 
-// Plays a script to a host.
+// Plays a script.
 class TouchPlayer {
 public:
     TouchPlayer(std::vector<TouchEvent> events, int width, int height)
         : events_(std::move(events)), width_(width), height_(height) {}
 
-    // Delivers the events that are due before `timeMs` and have not been delivered yet.
+    // Sends the events before `timeMs` that have not been sent yet.
     void deliverBefore(double timeMs, WaterHost& host);
 
 private:

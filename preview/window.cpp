@@ -67,8 +67,8 @@ void onKey(GLFWwindow* window, int key, int, int action, int) {
     if (key == GLFW_KEY_C) stage.water.clearInk();
 }
 
-// The framebuffer has a window's pixels whatever the host would draw with, so it is told that the display is not finer
-// than the quality. A window that is put away has no pixels.
+// The framebuffer has the window's pixels. The display's density is limited to the quality's, so that the host draws
+// exactly these. A minimized window has no pixels.
 void onResize(GLFWwindow* window, int width, int height) {
     if (width > 0 && height > 0) stageOf(window).water.setView(width, height, 1.0, glfwGetTime());
 }
@@ -97,7 +97,7 @@ void run(GLFWwindow* window, Stage& stage) {
                 glfwWaitEventsTimeout(std::clamp(stage.water.due() - glfwGetTime(), 0.0005, 1.0));
                 break;
             case LiveWater::Frame::resting:
-                glfwWaitEventsTimeout(0.5);  // and sees an interrupt
+                glfwWaitEventsTimeout(0.5);  // so that an interrupt is noticed
                 break;
             case LiveWater::Frame::resize:
                 stage.water.resized();
@@ -107,7 +107,7 @@ void run(GLFWwindow* window, Stage& stage) {
     if (stage.pressed) touch(window, TouchAction::up);
 }
 
-// A script that begins a little before its first touch.
+// Shifts a script so that it begins shortly before its first touch.
 bool saveTouches(
     const PreviewOptions& options, std::vector<TouchEvent> touches, std::string& summary, std::string& error) {
     constexpr std::int64_t kBefore = 200;
@@ -165,7 +165,7 @@ bool runWindow(PreviewOptions options, std::string& summary, std::string& error)
     keepDriverLoaded();
     fitToDriver(options.light, pictures->light);
 
-    // The ink draws from this generator as well.
+    // The library's ink uses this generator.
     srand48(static_cast<long>(options.seed));
     Stage stage{LiveWater(sourceOf(*pictures, *look), options.seed), options.withInk, options.rainFrom.has_value()};
     stage.water.setQuality(Quality::high);

@@ -1,4 +1,4 @@
-// The water in a window, touched with the mouse.
+// A window with the water, touched with the mouse.
 #pragma once
 
 #include <string>
@@ -9,8 +9,8 @@ namespace tidemark {
 
 inline constexpr char kWindowKeys[] = "I switches ink, R rain, C clears the ink, Escape or Ctrl-C closes";
 
-// Returns when the window is closed. Takes the pictures, the look, the size, the seed, the ink and the rain of the
-// options. On failure says why in `error`. Otherwise `summary` tells what was written, if anything was.
+// Runs until the window is closed. Uses the options for pictures, look, size, seed, ink and rain. On failure returns
+// false and stores the reason in `error`. Otherwise stores in `summary` which file was written, if any.
 bool runWindow(PreviewOptions options, std::string& summary, std::string& error);
 
 }  // namespace tidemark

@@ -35,7 +35,7 @@ const std::vector<Touch>& StrokeClock::step(double time) {
         last_ = *next;
         if (next->action == TouchAction::move) continue;
         isDown_ = next->action == TouchAction::down;
-        due_.push_back(given_ = *next);
+        due_.push_back(sent_ = *next);
     }
     waiting_.erase(waiting_.begin(), next);
     if (!isDown_) return due_;
@@ -43,9 +43,9 @@ const std::vector<Touch>& StrokeClock::step(double time) {
     if (!waiting_.empty() && waiting_.front().action != TouchAction::down) {
         place = between(last_, waiting_.front(), time);
     }
-    if (place.x == given_.x && place.y == given_.y) return due_;
+    if (place.x == sent_.x && place.y == sent_.y) return due_;
     place.action = TouchAction::move;
-    due_.push_back(given_ = place);
+    due_.push_back(sent_ = place);
     return due_;
 }
 

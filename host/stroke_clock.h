@@ -36,7 +36,7 @@ private:
     std::vector<Touch> waiting_;  // reports after the last step
     std::vector<Touch> due_;      // result of the last step
     Touch last_ = {};             // last report up to the last step
-    Touch given_ = {};            // last touch that was returned
+    Touch sent_ = {};             // last touch returned by due()
     bool isDown_ = false;
 };
 

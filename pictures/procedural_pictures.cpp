@@ -16,9 +16,9 @@ namespace tidemark {
 
 // Compute the caustics in parallel with the ground, except in a browser, where a program has one thread.
 #ifdef __EMSCRIPTEN__
-constexpr auto kBeside = std::launch::deferred;
+constexpr auto kLaunch = std::launch::deferred;
 #else
-constexpr auto kBeside = std::launch::async;
+constexpr auto kLaunch = std::launch::async;
 #endif
 
 namespace {
@@ -57,7 +57,7 @@ Picture flood(int width, int height, float netCell, PaintGround paintGround, Dep
     const float unit = 0.045f * std::sqrt(static_cast<float>(width) * static_cast<float>(height));
     const int netWidth = (width + 1) / 2;
     const int netHeight = (height + 1) / 2;
-    auto futureNet = std::async(kBeside, causticNet, netWidth, netHeight, unit * netCell, 3U);
+    auto futureNet = std::async(kLaunch, causticNet, netWidth, netHeight, unit * netCell, 3U);
     Canvas bed(width, height);
     paintGround(bed, unit);
 

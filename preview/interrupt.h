@@ -3,7 +3,7 @@
 namespace tidemark {
 
 // From now on the first SIGINT or SIGTERM is only recorded. A second one ends the program.
-void noteInterrupts();
+void recordInterrupts();
 bool interrupted();
 
 }  // namespace tidemark

@@ -89,13 +89,13 @@ std::string contradiction(const PreviewOptions& options) {
     const bool writesClip = !options.video.empty() || !options.out.empty();
     if (options.inWindow) return "";
     if (!options.record.empty()) return "--record is for a --window";
-    if (!writesClip && options.still.empty() && options.inside.empty()) {
-        return "nothing to do: name a --video, --out, --still or --inside to write, or open a --window";
+    if (!writesClip && options.still.empty() && options.fields.empty()) {
+        return "nothing to do: name a --video, --out, --still or --fields to write, or open a --window";
     }
     // With both pictures given, the view may have either orientation.
     if (isWide && options.landscape.empty() && !options.portrait.empty()) return "--portrait is not for a wide view";
     if (!isWide && options.portrait.empty() && !options.landscape.empty()) return "--landscape is for a wide view";
-    if (!options.inside.empty() && !options.withInk) return "--inside needs ink";
+    if (!options.fields.empty() && !options.withInk) return "--fields needs ink";
     if (options.loop && !writesClip) return "--loop is for a --video or --out";
     if (options.at && options.seconds && *options.at > *options.seconds) return "--at is after the end of --seconds";
     if (options.framesPerSecond > 50 && options.video.ends_with(".gif")) {
@@ -187,7 +187,7 @@ int main(int argc, char** argv) {
     CLI::Option* const still = add("--still", options.still, "FILE.png", "One frame to write, the last or that of --at")
                                    ->check(endingIn({".png"}));
     add("--at", options.at, "N", "Seconds to that frame")->check(time)->check(isNumber)->needs(still);
-    add("--inside", options.inside, "FOLDER",
+    add("--fields", options.fields, "FOLDER",
         "Folder for pictures of the heights, the flow and the ink behind the last frame")
         ->excludes(withoutInk);
 

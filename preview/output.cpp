@@ -3,7 +3,7 @@
 #include <algorithm>
 #include <cstdio>
 
-#include "preview/inside.h"
+#include "preview/fields.h"
 #include "preview/picture_file.h"
 
 namespace tidemark {
@@ -62,7 +62,7 @@ bool Output::check(std::string& error) const {
     if (!options_.out.empty()) paths.push_back(fs::path(options_.out) / frameName(0));
     if (!options_.video.empty()) paths.emplace_back(options_.video);
     if (!options_.still.empty()) paths.emplace_back(options_.still);
-    for (int i = 0; i < 4 && !options_.inside.empty(); ++i) paths.push_back(fs::path(options_.inside) / insideName(i));
+    for (int i = 0; i < 4 && !options_.fields.empty(); ++i) paths.push_back(fs::path(options_.fields) / fieldName(i));
     return std::all_of(
         paths.begin(), paths.end(), [&](const fs::path& path) { return mayWrite(path, options_.force, error); });
 }
@@ -104,7 +104,7 @@ bool Output::writePicture(const fs::path& path, const Picture& picture, std::str
     if (!savePicture(picture, file.part(), error)) return cannotWrite(path, error);
     const std::uintmax_t bytes = fs::file_size(file.part());
     if (!file.keep(error)) return false;
-    tell(path, bytes);
+    addToSummary(path, bytes);
     return true;
 }
 
@@ -113,7 +113,7 @@ bool Output::finish(std::string& error) {
         if (!video_.finish(error)) return cannotWrite(options_.video, error);
         const std::uintmax_t bytes = fs::file_size(videoFile_.part());
         if (!videoFile_.keep(error)) return false;
-        tell(options_.video, bytes);
+        addToSummary(options_.video, bytes);
     }
     if (options_.out.empty()) return true;
     if (!pictures_.finish(error)) return cannotWrite("the frames to " + options_.out, error);
@@ -131,11 +131,11 @@ bool Output::keepFrames(std::string& error) {
     }
     // Removes the remaining frames of an earlier, longer run; otherwise the folder would mix two runs.
     for (int i = countFrames(folder) - 1; options_.force && i >= count; --i) fs::remove(folder / frameName(i));
-    tell((folder / frameName(0)).string() + (count > 1 ? " to " + frameName(count - 1) : ""), bytes);
+    addToSummary((folder / frameName(0)).string() + (count > 1 ? " to " + frameName(count - 1) : ""), bytes);
     return true;
 }
 
-void Output::tell(const std::string& what, std::uintmax_t bytes) {
+void Output::addToSummary(const std::string& what, std::uintmax_t bytes) {
     summary_ += (summary_.empty() ? "" : ", ") + what + " (" + sizeInWords(bytes) + ")";
 }
 

@@ -38,7 +38,7 @@ private:
     bool openFrames(std::string& error);
     bool openVideo(std::string& error);
     bool keepFrames(std::string& error);
-    void tell(const std::string& what, std::uintmax_t bytes);
+    void addToSummary(const std::string& what, std::uintmax_t bytes);
 
     const PreviewOptions& options_;
     Ffmpeg pictures_, video_;

@@ -14,7 +14,7 @@
 #include "desktop/headless_context.h"
 #include "host/picture.h"
 #include "host/water_host.h"
-#include "preview/inside.h"
+#include "preview/fields.h"
 #include "preview/interrupt.h"
 #include "preview/output.h"
 #include "preview/progress.h"
@@ -102,10 +102,10 @@ bool drawFrames(
         error = "interrupted before the first frame";
         return false;
     }
-    if (!options.inside.empty()) {
+    if (!options.fields.empty()) {
         int i = 0;
-        for (const Picture& picture : drawInside(host, look, frame)) {
-            const std::filesystem::path path = std::filesystem::path(options.inside) / insideName(i++);
+        for (const Picture& picture : drawFields(host, look, frame)) {
+            const std::filesystem::path path = std::filesystem::path(options.fields) / fieldName(i++);
             if (!output.writePicture(path, picture, error)) return false;
         }
     }
@@ -155,7 +155,7 @@ bool runPreview(const PreviewOptions& options, std::string& summary, std::string
     host.setUp(options.withInk);
     host.loadPictures(sourceOf(*pictures, *look));
     TouchPlayer touches(repeated(events, plan, options.framesPerSecond), width, height);
-    noteInterrupts();
+    recordInterrupts();
     if (!output.open(error) || !drawFrames(options, *look, plan, host, touches, output, progress, error)) return false;
     summary = describe(options, output.frames(), plan.round, output.summary());
     return true;

@@ -27,7 +27,7 @@ struct PreviewOptions {
     int crf = 18;              // quality of an MP4, 0 (best) to 51
     std::string still;         // file for one frame
     std::optional<double> at;  // time of that frame in seconds; default: the last one
-    std::string inside;        // folder for the pictures of inside.h; requires ink
+    std::string fields;        // folder for the pictures of fields.h; requires ink
     bool loop = false;         // make the end continue into the beginning
     bool force = false;        // overwrite existing files
     std::uint32_t seed = 1;

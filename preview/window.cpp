@@ -173,7 +173,7 @@ bool runWindow(PreviewOptions options, std::string& summary, std::string& error)
     stage.water.picturesChanged(kAllPictures);
     stage.water.setInk(stage.withInk);
     stage.water.setRain(stage.raining);
-    noteInterrupts();
+    recordInterrupts();
     run(window, stage);
     return options.record.empty() || saveTouches(options, std::move(stage.touches), summary, error);
 }

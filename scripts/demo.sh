@@ -18,7 +18,7 @@ for option in "$@"; do
     case $option in
         --window | --fullscreen) scene=() size=() output=() ;;
         --size*) size=() ;;
-        --video* | --out* | --still* | --inside*) output=() ;;
+        --video* | --out* | --still* | --fields*) output=() ;;
     esac
 done
 exec "$root/build/release/preview/tidemark-preview" "${scene[@]}" "${size[@]}" "${output[@]}" "$@"

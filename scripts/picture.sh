@@ -1,5 +1,5 @@
 #!/usr/bin/env bash
-# Renews the pictures of the documents: the moving one of the README, and the inside of one stroke for docs/engine.md.
+# Renews the pictures of the documents: the moving one of the README, and the fields behind one stroke for docs/engine.md.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/common.sh
@@ -15,10 +15,10 @@ preview --script welcome --rain 1.9 --size 1260x708 --seconds 3.9 --video out/we
 ffmpeg -v error -y -i out/welcome.mp4 -vf fps=15,scale=840:-1:flags=lanczos \
     -c:v libwebp_anim -quality 55 -compression_level 4 -loop 0 docs/tidemark.webp
 
-preview --script curl --size 540x540 --seconds 0.7 --inside out/inside
-mkdir -p docs/inside
+preview --script curl --size 540x540 --seconds 0.7 --fields out/fields
+mkdir -p docs/fields
 for name in height velocity density result; do
-    ffmpeg -v error -y -i "out/inside/$name.png" -c:v libwebp -quality 85 "docs/inside/$name.webp"
+    ffmpeg -v error -y -i "out/fields/$name.png" -c:v libwebp -quality 85 "docs/fields/$name.webp"
 done
 
 # join DOCUMENT FILTER PICTURE...

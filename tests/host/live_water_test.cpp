@@ -56,7 +56,7 @@ protected:
     std::vector<Rgba> seen() const { return readPixels(kWidth, kHeight); }
 
     // The calls that the next frame makes: P, L and W for hand-overs, | for a set-up, p, l and w for texture loads.
-    std::string told(double seconds = 1.0 / 60) {
+    std::string calls(double seconds = 1.0 / 60) {
         constexpr std::uint32_t kMark = 4711;
         AndroidBitmapInfo* const slots[] = {&bmp_portrait_bg_info, &bmp_landscape_bg_info, &bmp_water_Info};
         for (AndroidBitmapInfo* slot : slots) slot->flags = kMark;
@@ -114,28 +114,28 @@ TEST_F(Live, drawsWhatHasChangedAndRestsOtherwise) {
 
 // While a divider is dragged the water goes on in its old size.
 TEST_F(Live, isSetUpOnceTheViewKeepsItsSizeAndHandsOverWhatIsOfOtherProportions) {
-    EXPECT_EQ(told(), "PLW|pl") << "at once for the first view";
+    EXPECT_EQ(calls(), "PLW|pl") << "at once for the first view";
     for (int i = 1; i < 30; ++i) {
         water.setView(kHeight, kWidth + i, 1.0, now);
-        EXPECT_EQ(told(1.0 / 30), "");
+        EXPECT_EQ(calls(1.0 / 30), "");
     }
     EXPECT_EQ(size, (Size{kWidth, kHeight}));
     water.setView(kHeight, kWidth, 1.0, now);
-    EXPECT_EQ(told(0.05), "");
+    EXPECT_EQ(calls(0.05), "");
     EXPECT_NEAR(water.due(), now + 0.05, 1e-6);
-    EXPECT_EQ(told(0.06), "|") << "the backgrounds fit the view that was turned";
+    EXPECT_EQ(calls(0.06), "|") << "the backgrounds fit the view that was turned";
     EXPECT_EQ(size, (Size{kHeight, kWidth}));
     water.setView(kHeight, kHeight, 1.0, now);
-    EXPECT_EQ(told(0.2), "PL|pl");
+    EXPECT_EQ(calls(0.2), "PL|pl");
     water.setView(2 * kHeight, 2 * kHeight, 1.0, now);
-    EXPECT_EQ(told(0.2), "PL|pl") << "with the pixels of the larger view";
+    EXPECT_EQ(calls(0.2), "PL|pl") << "with the pixels of the larger view";
     water.picturesChanged(kLandscapePicture);
-    EXPECT_EQ(told(), "Ll");
+    EXPECT_EQ(calls(), "Ll");
     renewContext(kWidth, kHeight);
     water.renewContext();
-    EXPECT_EQ(told(), "|plw") << "the library has copies";
+    EXPECT_EQ(calls(), "|plw") << "the library has copies";
     water.setLook({.meshVertices = 64});
-    EXPECT_EQ(told(), "");
+    EXPECT_EQ(calls(), "");
 }
 
 // It would be seen empty until the next step of the ink.

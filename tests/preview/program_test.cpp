@@ -86,9 +86,9 @@ TEST_F(Program, SameInputsGiveTheSameBytesInVideosOfEachKind) {
     EXPECT_EQ(run("head -c 12 new/rain.webp | tail -c 4"), "WEBP0\n");
 }
 
-TEST_F(Program, ShowsTheInsideOfAStroke) {
+TEST_F(Program, DrawsTheFieldsOfAStroke) {
     const std::string scene = "--picture shore --size 100x96 --fps 60 --seconds 0.5 --script curl ";
-    EXPECT_TRUE(draws(scene + "--inside i"));
+    EXPECT_TRUE(draws(scene + "--fields i"));
     for (const std::string name : {"height", "velocity", "density", "result"}) {
         const Picture picture = load("i/" + name + ".png");
         ASSERT_EQ(std::pair(picture.width, picture.height), std::pair(100, 96)) << name;
@@ -99,7 +99,7 @@ TEST_F(Program, ShowsTheInsideOfAStroke) {
         }
         EXPECT_GT(brightest - darkest, 100) << name;  // the dimmed frame below the arrows has less
     }
-    EXPECT_TRUE(draws(scene + "--inside other --seed 2"));
+    EXPECT_TRUE(draws(scene + "--fields other --seed 2"));
     EXPECT_NE(load("i/density.png").rgba, load("other/density.png").rgba) << "the ink has no seed";
 }
 
@@ -210,7 +210,7 @@ TEST_F(Program, RefusesBadInputInOneLine) {
         {2, "--still a.png --landscape a.jpg", "--landscape"},
         {2, "--still a.png --every 2", "--out"},
         {2, "--still a.png --seconds 1 --at 2", "--at"},
-        {2, "--preset quicksilver --inside i", "ink"},
+        {2, "--preset quicksilver --fields i", "ink"},
         {2, "--ink blue", "blue is not #rrggbb"},
         {2, "--ink '#112233' --no-ink", "--no-ink"},
         {2, "--out o --every 0", "not in range 1 to"},

@@ -1,4 +1,4 @@
-#include "preview/inside.h"
+#include "preview/fields.h"
 
 #include <algorithm>
 #include <cmath>
@@ -148,12 +148,12 @@ Picture drawDensity(int width, int height, const EngineView& engine) {
 
 }  // namespace
 
-std::string insideName(int picture) {
+std::string fieldName(int picture) {
     constexpr const char* kNames[] = {"height.png", "velocity.png", "density.png", "result.png"};
     return kNames[picture];
 }
 
-std::array<Picture, 4> drawInside(const WaterHost& host, const Look& look, const Picture& result) {
+std::array<Picture, 4> drawFields(const WaterHost& host, const Look& look, const Picture& result) {
     const EngineView engine = lookIntoEngine();
     return {
         drawHeight(host, look, result.width, result.height), drawVelocity(result, engine),

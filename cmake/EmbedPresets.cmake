@@ -22,6 +22,9 @@ function(embed_presets ini folder)
         set(form "([A-Za-z0-9]+) = ([0-9]+(\\.[0-9]+)?)")
         string(REGEX REPLACE "${form}" "\"\\1\": \\2" look "${values}")
         string(REPLACE "\n" ", " look "${look}")
+        string(REGEX REPLACE "\": " "\", " java_values "${look}")
+        set(pair "[^,]*, [^,]*, ")
+        string(REGEX REPLACE "(${pair}${pair}${pair}[^,]*, [^,]*,) " "\\1\n            " java_values "${java_values}")
         string(APPEND json "${separator}\n    \"${name}\": {\"title\": \"${title}\", \"ground\": \"${ground}\", \
 \"ink\": ${ink}, \"rain\": ${rain},\n        \"look\": {${look}}}")
         set(separator ",")
@@ -31,16 +34,13 @@ function(embed_presets ini folder)
         string(APPEND rows "    {\"${name}\", \"${title}\", Ground::${ground}, ${ink}, ${rain}, [] {\n         Look look@\n\
          ${cpp_values}return look@\n     }()},\n")
         string(TOUPPER "${name}" constant)
-        string(TOUPPER "${ground}" ground)
         string(REPLACE "-" "_" constant ${constant})
         string(APPEND constants "${java_separator}    /** ${title}. */
-    ${constant}(\"${title}\", Ground.${ground}, ${ink}, ${rain})")
+    ${constant}(\"${title}\", ${ink}, ${rain},
+            ${java_values})")
         set(java_separator ",\n")
-        string(REPLACE "\n" "\n                " java_values "${values}")
-        string(APPEND cases "            case ${constant}:\n                ${java_values}break@\n")
     endforeach()
     string(REPLACE "@" ";" rows "${rows}")
-    string(REPLACE "@" ";" cases "${cases}")
     file(CONFIGURE OUTPUT ${folder}/presets.h CONTENT "\
 #pragma once
 

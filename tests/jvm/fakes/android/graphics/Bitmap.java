@@ -55,9 +55,15 @@ public final class Bitmap {
         return new Bitmap(new int[width * height], width, height, config);
     }
 
-    /** No file of a test is turned. */
-    public static Bitmap createBitmap(Bitmap source, int x, int y, int width, int height, Matrix turn, boolean filter) {
-        return source;
+    /** Turns a whole bitmap. */
+    public static Bitmap createBitmap(Bitmap source, int x, int y, int width, int height, Matrix matrix, boolean filter) {
+        int newWidth = matrix.xx == 0 ? height : width;
+        int[] colors = new int[width * height];
+        for (int i = 0; i < colors.length; ++i) {
+            int[] at = matrix.map(2 * (i % width) + 1 - width, 2 * (i / width) + 1 - height);  // twice, from the middle
+            colors[(at[1] + colors.length / newWidth - 1) / 2 * newWidth + (at[0] + newWidth - 1) / 2] = source.colors[i];
+        }
+        return new Bitmap(colors, newWidth, colors.length / newWidth, source.config);
     }
 
     public Bitmap copy(Config config, boolean mutable) {

@@ -25,12 +25,12 @@ public final class Bundle implements Parcelable {
         return (T) values.get(key);
     }
 
-    public void putInt(String key, int value) {
-        values.put(key, value);
+    public Object get(String key) {
+        return values.get(key);
     }
 
-    public int getInt(String key) {
-        return (Integer) values.getOrDefault(key, 0);
+    public void putInt(String key, int value) {
+        values.put(key, value);
     }
 
     public void putBoolean(String key, boolean value) {

@@ -2,8 +2,10 @@ package com.zor.android.visualeffect.tidemark;
 
 import static org.junit.Assert.assertEquals;
 
+import android.os.SystemClock;
 import android.view.MotionEvent;
 
+import org.junit.Before;
 import org.junit.Test;
 
 import java.util.ArrayList;
@@ -15,6 +17,11 @@ public final class FirstFingerTest {
     private final FirstFinger finger =
             new FirstFinger((action, x, y, isStylus, pressure, time) -> heard.add(
                     action + " " + x + " " + y + (isStylus ? " pen " : " ") + pressure + " " + time));
+
+    @Before
+    public void resetClock() {
+        SystemClock.nanos = 0;
+    }
 
     @Test
     public void historyArrivesInOrder() {

@@ -36,6 +36,18 @@ public final class LookTest {
         }
     }
 
+    @Test
+    public void aPresetChangesTheValuesOfItsTableAlone() {
+        Look expected = new Look();
+        expected.touchAmplitude = 1.2f;
+        expected.trailShare = 0.06f;
+        expected.inkStepsPerSecond = 30;
+        expected.inkRed = 0.6f;
+        expected.inkGreen = 0.03f;
+        expected.inkBlue = 0.05f;
+        assertEquals(expected, Preset.RED_INK.look());
+    }
+
     private static Look load(String text) throws IOException {
         return Look.load(new ByteArrayInputStream(text.getBytes()));
     }

@@ -76,7 +76,7 @@ final class Screen {
     }
 
     // Lets the display refresh until a frame is shown, and says whether any was wanted.
-    static boolean goOn() {
+    static boolean refreshUntilFrame() {
         int before = frames;
         do {
             settle();

@@ -24,7 +24,7 @@ public final class WithoutLibraryTest {
         Screen.settle();
         view.drawOn(new Surface((SurfaceTexture) null), 90, 160);
         view.setPicture(1);
-        assertFalse("frames", Screen.goOn());
+        assertFalse("frames", Screen.refreshUntilFrame());
         view.setListener(new TidemarkListener() {
             @Override
             public void onFailure(Failure failure, String message) {

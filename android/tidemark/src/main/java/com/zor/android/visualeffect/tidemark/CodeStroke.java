@@ -2,9 +2,9 @@ package com.zor.android.visualeffect.tidemark;
 
 import android.view.MotionEvent;
 
-/** A stroke that code asks for: touches along a line through points, the same time from each to the next. */
+/** A stroke that the app's code draws: touches along a line through points, with the same time for each part. */
 final class CodeStroke {
-    private final float[] shares;  // x and y of each point, of the view's sides
+    private final float[] shares;  // x and y of each point, as shares of the view's sides
     private final double start;
     private final double seconds;
     private int action = MotionEvent.ACTION_DOWN;
@@ -15,7 +15,7 @@ final class CodeStroke {
         this.seconds = seconds;
     }
 
-    /** Touches the water where the stroke is now, and says whether it goes on. */
+    /** Touches the water at the place of the time {@code now}. Returns false after the last point. */
     boolean follow(NativeWater water, double now) {
         int last = shares.length / 2 - 1;
         double at = action == MotionEvent.ACTION_DOWN ? 0 : Math.min((now - start) / seconds, 1) * last;

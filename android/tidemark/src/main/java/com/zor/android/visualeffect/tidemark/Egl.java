@@ -6,7 +6,7 @@ import android.opengl.EGLContext;
 import android.opengl.EGLDisplay;
 import android.opengl.EGLSurface;
 
-/** The OpenGL ES 2.0 context that all views share. Call it on {@link GlThread} only. */
+/** The OpenGL ES 2.0 context that all views share. Used on {@link GlThread} only. */
 final class Egl {
     private static final int[] CONFIG = {EGL14.EGL_RENDERABLE_TYPE, EGL14.EGL_OPENGL_ES2_BIT, EGL14.EGL_SURFACE_TYPE,
         EGL14.EGL_WINDOW_BIT, EGL14.EGL_RED_SIZE, 8, EGL14.EGL_GREEN_SIZE, 8, EGL14.EGL_BLUE_SIZE, 8, EGL14.EGL_NONE};
@@ -15,9 +15,9 @@ final class Egl {
 
     private EGLDisplay display;
     private EGLConfig config;
-    private EGLContext context;
+    private EGLContext context;  // null while closed
 
-    /** Makes the context where there is none. False where the device has no OpenGL ES 2.0. */
+    /** Creates the context if there is none. Returns false if the device has no OpenGL ES 2.0. */
     boolean open() {
         if (context != null) return true;
         display = EGL14.eglGetDisplay(EGL14.EGL_DEFAULT_DISPLAY);
@@ -25,37 +25,36 @@ final class Egl {
         if (!EGL14.eglInitialize(display, version, 0, version, 1)) return false;
         config = chooseConfig();
         if (config == null) return false;
-        EGLContext made = EGL14.eglCreateContext(display, config, EGL14.EGL_NO_CONTEXT, CONTEXT, 0);
-        if (made == null || made == EGL14.EGL_NO_CONTEXT) return false;
-        context = made;
-        return true;
+        EGLContext created = EGL14.eglCreateContext(display, config, EGL14.EGL_NO_CONTEXT, CONTEXT, 0);
+        if (created != null && created != EGL14.EGL_NO_CONTEXT) context = created;
+        return context != null;
     }
 
-    // Deeper colours come first in the list, and cost time and memory that nobody sees.
+    // The list begins with more than 8 bits a colour, which would cost time and memory and look the same.
     private EGLConfig chooseConfig() {
         EGLConfig[] configs = new EGLConfig[64];
         int[] count = new int[1];
         EGL14.eglChooseConfig(display, CONFIG, 0, configs, 0, configs.length, count, 0);
-        EGLConfig usable = null;
+        EGLConfig withAlpha = null;
         for (int i = 0; i < count[0]; ++i) {
-            if (sizeOf(configs[i], EGL14.EGL_RED_SIZE) != 8) continue;
-            if (sizeOf(configs[i], EGL14.EGL_ALPHA_SIZE) == 0) return configs[i];
-            if (usable == null) usable = configs[i];
+            if (bits(configs[i], EGL14.EGL_RED_SIZE) != 8) continue;
+            if (bits(configs[i], EGL14.EGL_ALPHA_SIZE) == 0) return configs[i];
+            if (withAlpha == null) withAlpha = configs[i];
         }
-        return usable;
+        return withAlpha;
     }
 
-    private int sizeOf(EGLConfig candidate, int component) {
+    private int bits(EGLConfig candidate, int component) {
         int[] bits = new int[1];
         EGL14.eglGetConfigAttrib(display, candidate, component, bits, 0);
         return bits[0];
     }
 
-    /** Null where the window has just gone. */
-    EGLSurface surfaceOf(Object window) {
+    /** Returns null if the window no longer exists. */
+    EGLSurface createSurface(Object window) {
         try {
-            EGLSurface made = EGL14.eglCreateWindowSurface(display, config, window, SURFACE, 0);
-            return made == EGL14.EGL_NO_SURFACE ? null : made;
+            EGLSurface created = EGL14.eglCreateWindowSurface(display, config, window, SURFACE, 0);
+            return created == EGL14.EGL_NO_SURFACE ? null : created;
         } catch (IllegalArgumentException e) {
             return null;
         }
@@ -65,13 +64,13 @@ final class Egl {
         return EGL14.eglMakeCurrent(display, surface, surface, context);
     }
 
-    /** A frame of the current surface takes the place of one that was not yet consumed. */
-    void waitForNobody() {
+    /** Lets a frame of the current surface replace the one before, if that was not shown yet. */
+    void swapWithoutWaiting() {
         EGL14.eglSwapInterval(display, 0);
     }
 
-    /** False where the context is lost or the window has gone. */
-    boolean show(EGLSurface surface) {
+    /** Shows the frame. Returns false if the context is lost or the window no longer exists. */
+    boolean swap(EGLSurface surface) {
         return EGL14.eglSwapBuffers(display, surface);
     }
 
@@ -80,19 +79,19 @@ final class Egl {
     }
 
     void destroy(EGLSurface surface) {
-        leave();
+        makeNoneCurrent();
         EGL14.eglDestroySurface(display, surface);
     }
 
-    /** Frees the context and all that was made in it. */
+    /** Frees the context and its objects. */
     void close() {
         if (context == null) return;
-        leave();
+        makeNoneCurrent();
         EGL14.eglDestroyContext(display, context);
         context = null;
     }
 
-    private void leave() {
+    private void makeNoneCurrent() {
         EGL14.eglMakeCurrent(display, EGL14.EGL_NO_SURFACE, EGL14.EGL_NO_SURFACE, EGL14.EGL_NO_CONTEXT);
     }
 }

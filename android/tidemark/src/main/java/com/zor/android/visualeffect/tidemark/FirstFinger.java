@@ -2,10 +2,10 @@ package com.zor.android.visualeffect.tidemark;
 
 import android.view.MotionEvent;
 
-/** Picks the touches of the finger that came down first; the water takes no others. */
+/** Selects the touches of the finger that came down first. */
 final class FirstFinger {
     interface Listener {
-        /** The position in pixels of the view, and the time in milliseconds of the system's uptime. */
+        /** Called with a position in pixels of the view and a time in milliseconds of the system's uptime. */
         void touch(int action, float x, float y, boolean isStylus, float pressure, long time);
     }
 
@@ -40,11 +40,11 @@ final class FirstFinger {
             case MotionEvent.ACTION_CANCEL:
                 end(MotionEvent.ACTION_CANCEL);
                 break;
-            default:  // further fingers, and what is no touch
+            default:  // further fingers, and events without a touch
         }
     }
 
-    /** Ends a touch whose end will not be seen; the ink stays. */
+    /** Ends a touch whose remaining events will not be passed to {@link #follow}. The ink stays. */
     void lift() {
         end(MotionEvent.ACTION_UP);
     }
@@ -55,7 +55,7 @@ final class FirstFinger {
         finger = NONE;
     }
 
-    // One event may hold several positions, the older ones as its history.
+    // An event may contain several positions. The older ones are its history.
     private void sendMoves(MotionEvent event) {
         int index = event.findPointerIndex(finger);
         if (index < 0) return;

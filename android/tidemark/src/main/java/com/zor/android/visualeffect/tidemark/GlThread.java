@@ -13,22 +13,22 @@ import java.util.List;
 import java.util.concurrent.CountDownLatch;
 
 /**
- * The thread on which all views draw. The library serves one effect, with one set of GL objects, so there is one context,
- * and of the views that are shown the newest one with a picture draws in it.
+ * The thread on which all views draw. The library serves one effect with one set of GL objects, so all views share one
+ * context, and of the visible views the newest one with a picture draws in it.
  */
 final class GlThread {
     private static Handler handler;
 
-    // The rest is used on the thread only.
+    // Used on the GL thread.
     static final Egl EGL = new Egl();
-    private static final List<TidemarkRenderer> SHOWN = new ArrayList<>();  // the newest last
-    private static TidemarkRenderer drawing;  // of these
-    private static Object owner;  // the mark of whose pictures and ink the library has
-    private static boolean isLibraryInUse;
+    private static final List<TidemarkRenderer> VISIBLE = new ArrayList<>();  // the newest last
+    private static TidemarkRenderer drawing;  // one of them, or null
+    private static Object owner;  // the mark of the renderer whose pictures and ink the library has; null for none
+    private static boolean isLibrarySetUp;
 
     private GlThread() {}
 
-    /** Starts the thread with the first view that is shown. */
+    /** Starts the thread, if it does not run. Called when a view gets a window. */
     static synchronized void start(Context context) {
         if (handler != null) return;
         HandlerThread thread = new HandlerThread("Tidemark", Process.THREAD_PRIORITY_DISPLAY);
@@ -37,12 +37,12 @@ final class GlThread {
         context.getApplicationContext().registerComponentCallbacks(new ComponentCallbacks2() {
             @Override
             public void onTrimMemory(int level) {
-                if (level >= TRIM_MEMORY_BACKGROUND) post(GlThread::releaseUnused);
+                if (level >= TRIM_MEMORY_BACKGROUND) post(GlThread::freeUnused);
             }
 
             @Override
             public void onLowMemory() {
-                post(GlThread::releaseUnused);
+                post(GlThread::freeUnused);
             }
 
             @Override
@@ -54,7 +54,7 @@ final class GlThread {
         handler.post(call);
     }
 
-    /** Returns when the call is done. */
+    /** Makes a call on the thread and returns when it is done. */
     static void await(Runnable call) {
         CountDownLatch done = new CountDownLatch(1);
         post(() -> {
@@ -72,43 +72,43 @@ final class GlThread {
         return drawing == renderer;
     }
 
-    /** A renderer that is shown already counts as the newest from now on. */
+    /** Makes a renderer the newest, even if it is visible already. */
     static void show(TidemarkRenderer renderer) {
-        SHOWN.remove(renderer);
-        SHOWN.add(renderer);
+        VISIBLE.remove(renderer);
+        VISIBLE.add(renderer);
         choose();
     }
 
     static void hide(TidemarkRenderer renderer) {
-        SHOWN.remove(renderer);
+        VISIBLE.remove(renderer);
         choose();
     }
 
-    /** Again when a renderer has got its first picture. */
+    /** Chooses the renderer that draws. Called when a renderer may have got its first picture, too. */
     static void choose() {
         TidemarkRenderer before = drawing;
         drawing = null;
-        for (TidemarkRenderer renderer : SHOWN) {
+        for (TidemarkRenderer renderer : VISIBLE) {
             if (renderer.hasPictures()) drawing = renderer;
         }
         if (drawing == before) return;
-        if (before != null && SHOWN.contains(before)) before.rest();
-        if (drawing != null) drawing.goOn();
+        if (before != null && VISIBLE.contains(before)) before.rest();
+        if (drawing != null) drawing.resume();
     }
 
-    /** Before a renderer draws. What another one has left in the library is replaced. */
+    /** Replaces the pictures and the ink of another renderer in the library. Called before each frame. */
     static void takeOver(TidemarkRenderer renderer) {
         if (owner == renderer.mark) return;
-        if (isLibraryInUse) new JniTidemarkRender().clearInkValue();  // or a stroke would go on
+        if (isLibrarySetUp) new JniTidemarkRender().clearInkValue();  // also ends the other renderer's stroke
         renderer.renew(true);
     }
 
     static void hasDrawn(TidemarkRenderer renderer) {
         owner = renderer.mark;
-        isLibraryInUse = true;
+        isLibrarySetUp = true;
     }
 
-    /** The system has taken the context from this renderer, and all that was made in it. */
+    /** Called when a renderer finds that the system has taken the context away, with all GL objects. */
     static void contextLost(TidemarkRenderer renderer) {
         EGL.close();
         if (owner == renderer.mark) {
@@ -118,20 +118,20 @@ final class GlThread {
         }
     }
 
-    /** The renderer's view is out of its window. */
+    /** Called when the renderer's view has left its window. */
     static void end(TidemarkRenderer renderer) {
         hide(renderer);
         if (owner != renderer.mark) return;
         owner = null;
-        releaseUnused();
+        freeUnused();
     }
 
-    // The context, and in the library the copies of the pictures, which it keeps until it gets others.
-    private static void releaseUnused() {
+    // Frees the context, and the library's copies of pictures, which only other pictures replace.
+    private static void freeUnused() {
         if (drawing != null) return;
         EGL.close();
         owner = null;
-        if (!isLibraryInUse) return;
+        if (!isLibrarySetUp) return;
         JniTidemarkRender library = new JniTidemarkRender();
         Bitmap pixel = Pictures.pixel();
         library.transferPortraitBGBitmap(pixel);

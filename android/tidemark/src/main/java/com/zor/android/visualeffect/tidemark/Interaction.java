@@ -2,10 +2,10 @@ package com.zor.android.visualeffect.tidemark;
 
 /** The effect of touches. */
 public enum Interaction {
-    /** A finger draws, and no view around the water can take it away for scrolling. */
+    /** A finger moves the water. A view around it cannot intercept the finger to scroll. */
     PRESS,
-    /** A finger draws until a list or a pager around the water begins to scroll with it. */
+    /** A finger moves the water until a view around it intercepts the finger to scroll. */
     PRESS_OR_SCROLL,
-    /** Touches do not reach the water; the view treats them as any other view does. */
+    /** Touches do not move the water. The view treats them as any other view does. */
     NONE
 }

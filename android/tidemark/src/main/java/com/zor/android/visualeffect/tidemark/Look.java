@@ -7,8 +7,8 @@ import java.io.InputStream;
 import java.util.Properties;
 
 /**
- * Parameters of the water's appearance and motion. Each field has a recommended range and hard limits. Set the fields
- * before you pass the object, or load them from a file in your app.
+ * Parameters of the water's appearance and motion. Each field has a recommended range, and limits outside which methods
+ * that take a look throw an exception. Set the fields before you pass the object, or load them from a file in your app.
  *
  * <p>Generated from {@code host/look.properties}.
  */
@@ -27,24 +27,17 @@ public final class Look implements Cloneable {
     /**
      * How many times smaller than the mesh a flat surface shows the picture, which follows from the distances in the
      * vertex shader: the eye is 30 units before the surface, the picture 30.9 behind it. The view shows the part of
-     * the mesh that the picture fills.
-     * Range 1 to 1.1, limits 0.1 to 10.
+     * the mesh that the picture fills. Range 1 to 1.1, limits 0.1 to 10.
      */
     public float pictureZoom = 1.015f;
-    /**
-     * Speed of rings, view heights a second.
-     * Range 0.05 to 1, limits 0.01 to 3.
-     */
+    /** Speed of rings, view heights a second. Range 0.05 to 1, limits 0.01 to 3. */
     public float ringSpeed = 0.2713f;
     /**
      * Radius of a drop, share of the view's height. The lattice on which the waves move has three cells in it.
      * Range 0.014 to 0.1, limits 0.01 to 0.3.
      */
     public float dropRadius = 0.024f;
-    /**
-     * Seconds until waves have sunk to a twentieth.
-     * Range 1 to 40, limits 0.1 to 1000.
-     */
+    /** Seconds until waves have sunk to a twentieth. Range 1 to 40, limits 0.1 to 1000. */
     public float calmingTime = 6.6f;
     /**
      * Wave steps a second, whatever the frame rate; fast rings take several times as many.
@@ -63,14 +56,12 @@ public final class Look implements Cloneable {
     public int stepsToRest = 30;
     /**
      * By hand instead of calmingTime: factor on every speed at each step. Smaller calms the water sooner; 0.94
-     * exactly also smooths it more. 0 leaves it to calmingTime.
-     * Range 0.9 to 0.998, limits 0 to 1.
+     * exactly also smooths it more. 0 leaves it to calmingTime. Range 0.9 to 0.998, limits 0 to 1.
      */
     public float damping = 0.0f;
     /**
      * By hand instead of ringSpeed: factor on the curvature of the surface at each step. Above 0.5 the waves would
-     * blow up. 0 leaves it to ringSpeed.
-     * Range 0.05 to 0.45, limits 0 to 0.5.
+     * blow up. 0 leaves it to ringSpeed. Range 0.05 to 0.45, limits 0 to 0.5.
      */
     public float waveSpeed = 0.0f;
     /**
@@ -83,56 +74,33 @@ public final class Look implements Cloneable {
      * Range 0 to 1, limits 0 to 10.
      */
     public float alphaMix = 0.5f;
-    /**
-     * Scale of that share.
-     * Range 0 to 1, limits 0 to 10.
-     */
+    /** Scale of that share. Range 0 to 1, limits 0 to 10. */
     public float alphaScale1 = 0.7f;
-    /**
-     * Scale of the other share. The shaders of today do not read it.
-     * Range 0 to 1, limits 0 to 10.
-     */
+    /** Scale of the other share. The shaders of today do not read it. Range 0 to 1, limits 0 to 10. */
     public float alphaScale2 = 1.0f;
-    /**
-     * Extra light on slopes that face the light.
-     * Range 0 to 2, limits 0 to 100.
-     */
+    /** Extra light on slopes that face the light. Range 0 to 2, limits 0 to 100. */
     public float fresnelRatio = 0.8f;
     /**
      * Strength of the highlights; the picture takes up to 5.5 of it, with ink up to 4.5, so more only widens them.
      * Range 1 to 10, limits 0 to 100.
      */
     public float specularRatio = 4.5f;
-    /**
-     * Sharpness of the highlights, from broad to pinpoint.
-     * Range 1 to 200, limits 0 to 1000.
-     */
+    /** Sharpness of the highlights, from broad to pinpoint. Range 1 to 200, limits 0 to 1000. */
     public float exponent = 40.0f;
     /**
      * A third of the height of the ripple that a touch of pressure 1 raises; heights of 1.13 and more show the water
-     * texture fully.
-     * Range 0.2 to 4, limits 0 to 100.
+     * texture fully. Range 0.2 to 4, limits 0 to 100.
      */
     public float touchAmplitude = 2.2f;
     /**
-     * A finger that moves raises one ripple every so many thirds of a drop's radius.
-     * Range 0.5 to 5, limits 0.1 to 100.
+     * A finger that moves raises one ripple every so many thirds of a drop's radius. Range 0.5 to 5, limits 0.1 to 100.
      */
     public float trailCells = 1.5f;
-    /**
-     * Most ripples that one move may raise.
-     * Range 20 to 500, limits 0 to 1000.
-     */
+    /** Most ripples that one move may raise. Range 20 to 500, limits 0 to 1000. */
     public float longestTrail = 200.0f;
-    /**
-     * Height of these ripples as a share of a touch's.
-     * Range 0 to 1, limits 0 to 10.
-     */
+    /** Height of these ripples as a share of a touch's. Range 0 to 1, limits 0 to 10. */
     public float trailShare = 0.12f;
-    /**
-     * A third of the height of the ripple that the largest drop of rain raises.
-     * Range 0.2 to 2, limits 0 to 100.
-     */
+    /** A third of the height of the ripple that the largest drop of rain raises. Range 0.2 to 2, limits 0 to 100. */
     public float rainAmplitude = 0.9f;
     /**
      * Crest and crater that follow a drop, as a share of what came before: fine rings instead of one broad one.
@@ -144,65 +112,34 @@ public final class Look implements Cloneable {
      * Range 0 to 0.5, limits 0 to 10.
      */
     public float breeze = 0.2f;
-    /**
-     * Drops of rain a second.
-     * Range 0 to 60, limits 0 to 1000.
-     */
+    /** Drops of rain a second. Range 0 to 60, limits 0 to 1000. */
     public float rainDropsPerSecond = 3.0f;
     /**
      * How much darker and cooler a bright picture is handed over, so that highlights show on it; a dark one stays as it is.
      * Range 0 to 1, limits 0 to 1.
      */
     public float wet = 0.6f;
-    /**
-     * Share of the ground's red that the water lets through.
-     * Range 0 to 1, limits 0 to 1.
-     */
+    /** Share of the ground's red that the water lets through. Range 0 to 1, limits 0 to 1. */
     public float groundRed = 1.0f;
-    /**
-     * Share of its green.
-     * Range 0 to 1, limits 0 to 1.
-     */
+    /** Share of its green. Range 0 to 1, limits 0 to 1. */
     public float groundGreen = 1.0f;
-    /**
-     * Share of its blue.
-     * Range 0 to 1, limits 0 to 1.
-     */
+    /** Share of its blue. Range 0 to 1, limits 0 to 1. */
     public float groundBlue = 1.0f;
-    /**
-     * Red of the light on the waves, as a share of its picture's.
-     * Range 0 to 1, limits 0 to 1.
-     */
+    /** Red of the light on the waves, as a share of its picture's. Range 0 to 1, limits 0 to 1. */
     public float lightRed = 1.0f;
-    /**
-     * Green of that light.
-     * Range 0 to 1, limits 0 to 1.
-     */
+    /** Green of that light. Range 0 to 1, limits 0 to 1. */
     public float lightGreen = 1.0f;
-    /**
-     * Blue of that light.
-     * Range 0 to 1, limits 0 to 1.
-     */
+    /** Blue of that light. Range 0 to 1, limits 0 to 1. */
     public float lightBlue = 1.0f;
-    /**
-     * Red of the ink. Ink of more than 0.75 would light the picture up.
-     * Range 0 to 0.75, limits 0 to 1.
-     */
+    /** Red of the ink. Ink of more than 0.75 would light the picture up. Range 0 to 0.75, limits 0 to 1. */
     public float inkRed = 0.05f;
-    /**
-     * Green of the ink.
-     * Range 0 to 0.75, limits 0 to 1.
-     */
+    /** Green of the ink. Range 0 to 0.75, limits 0 to 1. */
     public float inkGreen = 0.09f;
-    /**
-     * Blue of the ink.
-     * Range 0 to 0.75, limits 0 to 1.
-     */
+    /** Blue of the ink. Range 0 to 0.75, limits 0 to 1. */
     public float inkBlue = 0.24f;
     /**
      * Steps of the ink a second. Each needs a frame, and while ink lives there are no others: fewer steps make the ink slower
-     * and the water less smooth. A tap takes as many steps whatever their number.
-     * Range 24 to 60, limits 10 to 120.
+     * and the water less smooth. A tap takes as many steps whatever their number. Range 24 to 60, limits 10 to 120.
      */
     public int inkStepsPerSecond = 60;
     /**
@@ -232,14 +169,14 @@ public final class Look implements Cloneable {
         LookFile file = new LookFile(text);
         Look look = new Look();
         look.forEach(file);
-        file.expectNoOthers();
+        file.expectAllRead();
         return look;
     }
 
     /**
      * Converts the look to properties that {@link #load} can read.
      *
-     * @return all fields
+     * @return a new object with all fields
      */
     @NonNull
     public Properties toProperties() {
@@ -299,7 +236,7 @@ public final class Look implements Cloneable {
                 name + " must be " + (float) least + " to " + (float) most + ", not " + (float) value);
     }
 
-    /** Equal looks have the same values. */
+    /** Returns whether the other object is a look with the same values. */
     @Override
     public boolean equals(Object other) {
         return other instanceof Look && toProperties().equals(((Look) other).toProperties());

@@ -1,11 +1,11 @@
 package com.zor.android.visualeffect.tidemark;
 
-/** Whether the water moves by itself. */
+/** Whether the water moves without touches. */
 public enum Motion {
-    /** {@link #REDUCED} where the user has switched the system's animations off, otherwise {@link #FULL}. */
+    /** {@link #REDUCED} if the user has switched the system's animations off, otherwise {@link #FULL}. */
     AUTO,
-    /** It rains, the first drop falls, and a breeze follows a touch, where the view and its look say so. */
+    /** Rain and the first drop fall, and a breeze follows a touch, if the view's settings and its look have them. */
     FULL,
-    /** Only touches and calls move the water. */
+    /** Only touches, and calls of {@code drop} and {@code stroke}, move the water. */
     REDUCED
 }

@@ -3,18 +3,18 @@ package com.zor.android.visualeffect.tidemark;
 import android.graphics.Bitmap;
 
 /**
- * Water on a screen that is looked at: {@code host/live_water.h} method by method, where each is documented. Call
- * everything on {@link GlThread}, {@link #frame} with the context current.
+ * The native part of a view's water. Each native method calls the method of the same name in {@code host/live_water.h},
+ * which documents it. Used on {@link GlThread}; {@link #frame} needs the current context.
  */
 final class NativeWater {
-    /** Hears of a picture that cannot be handed over. */
-    interface Complaints {
-        void hear(String message);
+    interface FailureListener {
+        /** Called when a picture cannot be passed to the library. */
+        void pictureFailed(String message);
     }
 
-    /** Of what {@link #frame} answers: the framebuffer holds another picture. */
+    /** Returned by {@link #frame} when it has drawn. */
     static final int DRAWN = 2;
-    /** The surface must first have {@link #width} x {@link #height} pixels. */
+    /** Returned by {@link #frame} when the surface must get {@link #width} x {@link #height} pixels first. */
     static final int RESIZE = 3;
 
     static {
@@ -23,12 +23,13 @@ final class NativeWater {
     }
 
     private final long handle;
-    private final Complaints complaints;
+    private final FailureListener failures;
     private Pictures pictures;
-    private int handedOver;  // pictures that the library has from this water, as a sum
+    private Look look;
+    private int inLibrary;  // the slots whose picture the library has from this water, as a sum of 1, 2 and 4
 
-    NativeWater(int seed, Complaints complaints) {
-        this.complaints = complaints;
+    NativeWater(int seed, FailureListener failures) {
+        this.failures = failures;
         handle = create(seed);
     }
 
@@ -42,13 +43,15 @@ final class NativeWater {
         picturesChanged(changed);
     }
 
-    /** The library has another water's, or none. */
+    /** Called when the library has the pictures of another water, or none. */
     void renewPictures() {
-        handedOver = 0;
+        inLibrary = 0;
         if (pictures != null) picturesChanged(Pictures.ALL);
     }
 
     void setLook(Look look) {
+        if (look.equals(this.look)) return;
+        this.look = look;
         look.forEach((name, value, least, most, isWhole) -> {
             if (!setLookValue(name, value)) throw new IllegalArgumentException(name + " cannot be " + value);
             return value;
@@ -56,20 +59,20 @@ final class NativeWater {
         applyLook();
     }
 
-    // Called in the middle of a frame. Null leaves the library the picture that it has.
+    // Called by the native code during frame(). With null the library keeps the picture that it has.
     private Bitmap picture(int slot, int width, int height) {
         try {
             Bitmap fitted = pictures.fitted(slot, width, height);
             Pictures.multiply(fitted, shade(slot, Pictures.brightness(fitted)));
-            handedOver |= 1 << slot;
+            inLibrary |= 1 << slot;
             return fitted;
         } catch (RuntimeException | OutOfMemoryError e) {  // recycled meanwhile, or too large
-            complaints.hear("a picture cannot be used: " + e);
-            return (handedOver & 1 << slot) != 0 ? null : Pictures.pixel();
+            failures.pictureFailed("a picture cannot be used: " + e);
+            return (inLibrary & 1 << slot) != 0 ? null : Pictures.pixel();
         }
     }
 
-    // Its memory is not the virtual machine's, and a view does not hear that nobody wants it any more.
+    // Frees native memory. No call tells a view that its app no longer uses it.
     @Override
     protected void finalize() {
         destroy();

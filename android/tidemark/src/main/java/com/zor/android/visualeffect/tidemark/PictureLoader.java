@@ -16,11 +16,15 @@ import java.util.concurrent.LinkedBlockingQueue;
 import java.util.concurrent.ThreadPoolExecutor;
 import java.util.concurrent.TimeUnit;
 
-/** Decodes pictures, with as many pixels as the display can show, upright, on a thread of its own. */
+/** Decodes pictures on a thread of its own, upright and with about as many pixels as the display can show. */
 final class PictureLoader {
     private static final int MOST_PIXELS = 12000000;
 
-    // A thread while there is something to do.
+    // For EXIF's orientations from 1 on: clockwise degrees, and after the rotation the factor on x.
+    private static final int[][] TURNS =
+            {{0, 1}, {0, -1}, {180, 1}, {180, -1}, {90, -1}, {90, 1}, {270, -1}, {270, 1}};
+
+    // The thread ends after five idle seconds.
     private static final ExecutorService THREAD =
             new ThreadPoolExecutor(0, 1, 5, TimeUnit.SECONDS, new LinkedBlockingQueue<>());
 
@@ -30,7 +34,11 @@ final class PictureLoader {
         THREAD.execute(call);
     }
 
-    /** Of a {@code Bitmap}, which comes back as it is, the number of a resource, or a {@code Uri}. */
+    /**
+     * Returns the picture of the number of a resource or of a {@code Uri}; a {@code Bitmap} is returned as it is.
+     *
+     * @param leastSide pixels that the shorter side keeps when a large picture is reduced
+     */
     static Bitmap load(Context context, Object source, int leastSide) throws IOException {
         if (source instanceof Bitmap) return (Bitmap) source;
         BitmapFactory.Options options = new BitmapFactory.Options();
@@ -40,11 +48,14 @@ final class PictureLoader {
         options.inPreferredConfig = Bitmap.Config.ARGB_8888;
         options.inSampleSize = samples(options.outWidth, options.outHeight, leastSide);
         Bitmap picture = decode(context, source, options);
-        if (picture == null) throw new IOException("not a picture: " + source);
+        if (picture == null) throw new IOException("cannot decode " + source + " as a picture");
         return upright(picture, orientation(context, source));
     }
 
-    /** Of each side one pixel in so many, a power of two: the shorter side, along which a view may lie, keeps enough. */
+    /**
+     * Returns the divisor of both sides, a power of two. The shorter side keeps {@code leastSide} pixels, because the
+     * longer side of a view may be along it; very large pictures keep less.
+     */
     static int samples(int width, int height, int leastSide) {
         int samples = 1;
         while (Math.min(width, height) / (2 * samples) >= leastSide
@@ -67,7 +78,7 @@ final class PictureLoader {
         return stream;
     }
 
-    // Cameras store a picture as the sensor saw it and note how it was held.
+    // Cameras store a picture as the sensor has it, with the orientation of the camera.
     private static int orientation(Context context, Object source) throws IOException {
         if (Build.VERSION.SDK_INT < Build.VERSION_CODES.N) return ExifInterface.ORIENTATION_NORMAL;
         try (InputStream stream = open(context, source)) {
@@ -76,35 +87,12 @@ final class PictureLoader {
         }
     }
 
-    private static Bitmap upright(Bitmap picture, int orientation) {
+    /** Turns and mirrors a picture as an EXIF orientation says. */
+    static Bitmap upright(Bitmap picture, int orientation) {
+        if (orientation <= ExifInterface.ORIENTATION_NORMAL || orientation > TURNS.length) return picture;
         Matrix matrix = new Matrix();
-        switch (orientation) {
-            case ExifInterface.ORIENTATION_FLIP_HORIZONTAL:
-                matrix.postScale(-1, 1);
-                break;
-            case ExifInterface.ORIENTATION_ROTATE_180:
-                matrix.postRotate(180);
-                break;
-            case ExifInterface.ORIENTATION_FLIP_VERTICAL:
-                matrix.postScale(1, -1);
-                break;
-            case ExifInterface.ORIENTATION_TRANSPOSE:
-                matrix.postRotate(90);
-                matrix.postScale(-1, 1);
-                break;
-            case ExifInterface.ORIENTATION_ROTATE_90:
-                matrix.postRotate(90);
-                break;
-            case ExifInterface.ORIENTATION_TRANSVERSE:
-                matrix.postRotate(270);
-                matrix.postScale(-1, 1);
-                break;
-            case ExifInterface.ORIENTATION_ROTATE_270:
-                matrix.postRotate(270);
-                break;
-            default:
-                return picture;
-        }
+        matrix.postRotate(TURNS[orientation - 1][0]);
+        matrix.postScale(TURNS[orientation - 1][1], 1);
         return Bitmap.createBitmap(picture, 0, 0, picture.getWidth(), picture.getHeight(), matrix, true);
     }
 }

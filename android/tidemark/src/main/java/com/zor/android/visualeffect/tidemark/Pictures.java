@@ -8,24 +8,24 @@ import android.graphics.Rect;
 
 import java.nio.ByteBuffer;
 
-/** The three pictures of the effect, decoded. The backgrounds may be larger or of other proportions than the view. */
+/** The three decoded pictures of the effect. The backgrounds may have any size and proportions. */
 final class Pictures {
-    /** All three, as a sum of 1, 2 and 4. */
+    /** The slots of all three pictures, as a sum of 1, 2 and 4. */
     static final int ALL = 7;
 
     private static final int LIGHT = 2;
     private static final int LONGEST_SIDE_OF_LIGHT = 1024;
     private static final int WHITE = 0xffffffff;
-    private static final int DEEP_WATER = 0xff0d3b4f;
+    private static final int DARK_BLUE = 0xff0d3b4f;
 
     private final Bitmap[] slots;
 
-    /** By slot: portrait, landscape, light. */
+    /** Takes the pictures for portrait, for landscape, and of the light. */
     Pictures(Bitmap... slots) {
         this.slots = slots;
     }
 
-    /** Those that are other bitmaps than in {@code before}, which may be null. */
+    /** Returns the slots that have another bitmap than in {@code before}, as a sum. {@code before} may be null. */
     int newSince(Pictures before) {
         int which = 0;
         for (int i = 0; i < slots.length; ++i) {
@@ -35,9 +35,8 @@ final class Pictures {
     }
 
     /**
-     * A bitmap as the library takes it: four bytes a pixel, in the colours of the display that it knows, without padding
-     * between rows. Of a background the middle part that has the proportions width : height, with at most so many pixels;
-     * of the light all.
+     * Returns a bitmap in the form that the library takes: RGBA with 8 bits each, sRGB, without padding between rows. A
+     * background is cropped to the proportions width : height around its middle, and scaled down to that size.
      */
     Bitmap fitted(int slot, int width, int height) {
         Bitmap picture = slots[slot];
@@ -46,13 +45,13 @@ final class Pictures {
         return scaled(picture, whole, LONGEST_SIDE_OF_LIGHT, LONGEST_SIDE_OF_LIGHT);
     }
 
-    /** The mean of all channels, 0 to 1. */
+    /** Returns the mean of red, green and blue, 0 to 1. */
     static float brightness(Bitmap picture) {
         int mean = scaled(picture, new Rect(0, 0, picture.getWidth(), picture.getHeight()), 1, 1).getPixel(0, 0);
         return ((mean >> 16 & 255) + (mean >> 8 & 255) + (mean & 255)) / (3 * 255f);
     }
 
-    /** Multiplies a bitmap of {@link #fitted} by an opaque colour. */
+    /** Multiplies a bitmap that {@link #fitted} has returned by an opaque colour. */
     static void multiply(Bitmap fitted, int color) {
         if (color != WHITE) new Canvas(fitted).drawColor(color, PorterDuff.Mode.MULTIPLY);
     }
@@ -67,9 +66,9 @@ final class Pictures {
     }
 
     private static Bitmap scaled(Bitmap picture, Rect part, int width, int height) {
-        // A canvas does not draw what only the GPU has.
+        // A software canvas cannot draw a bitmap in graphics memory.
         Bitmap from = isHardware(picture) ? picture.copy(Bitmap.Config.ARGB_8888, false) : picture;
-        // The filter takes the mean of four pixels, so that none is left out where a side shrinks by half at most.
+        // The filter averages four pixels, so it skips none only if no side shrinks to less than half.
         while (true) {
             int columns = Math.min(part.width(), Math.max(width, (part.width() + 1) / 2));
             int rows = Math.min(part.height(), Math.max(height, (part.height() + 1) / 2));
@@ -84,15 +83,15 @@ final class Pictures {
     }
 
     private static boolean isHardware(Bitmap picture) {
-        return picture.getConfig() != null && picture.getConfig().name().equals("HARDWARE");  // of API 26
+        return picture.getConfig() != null && picture.getConfig().name().equals("HARDWARE");  // since API 26
     }
 
-    /** Stands in for a missing picture. */
+    /** Returns a small picture in place of a missing one. */
     static Bitmap pixel() {
-        return Bitmap.createBitmap(new int[] {DEEP_WATER}, 1, 1, Bitmap.Config.ARGB_8888);
+        return Bitmap.createBitmap(new int[] {DARK_BLUE}, 1, 1, Bitmap.Config.ARGB_8888);
     }
 
-    /** A frame, whose bytes are R, G, B, A and whose rows are from the bottom. */
+    /** Returns a frame as a bitmap. Its bytes are R, G, B, A, and its rows begin at the bottom. */
     static Bitmap upright(ByteBuffer pixels, int width, int height) {
         byte[] row = new byte[4 * width];
         ByteBuffer turned = ByteBuffer.allocateDirect(4 * width * height);

@@ -2,42 +2,52 @@ package com.zor.android.visualeffect.tidemark;
 
 import androidx.annotation.NonNull;
 
+import java.util.Arrays;
+import java.util.List;
+
 /**
- * Looks with names.
+ * Looks with names, each with the ink and the rain that suit it.
  *
  * <p>Generated from {@code host/presets.ini}.
  */
 public enum Preset {
     /** Clear lake. */
-    CLEAR_LAKE("Clear lake", Ground.SHORE, true, false),
+    CLEAR_LAKE("Clear lake", true, false,
+            "breeze", 0.3, "groundRed", 0.6, "groundGreen", 0.92),
     /** Summer rain. */
-    SUMMER_RAIN("Summer rain", Ground.POOL, false, true),
+    SUMMER_RAIN("Summer rain", false, true,
+            "calmingTime", 3.6, "rainDropsPerSecond", 24, "rainAmplitude", 0.9, "groundRed", 0.7,
+            "groundGreen", 0.78, "groundBlue", 0.85),
     /** Heavy glass. */
-    HEAVY_GLASS("Heavy glass", Ground.POOL, false, false),
+    HEAVY_GLASS("Heavy glass", false, false,
+            "refractiveIndex", 2.4, "calmingTime", 4, "ringSpeed", 0.16, "exponent", 120,
+            "specularRatio", 8, "alphaMix", 0.6, "rebound", 0, "breeze", 0.1,
+            "touchAmplitude", 4, "groundRed", 0.75, "groundGreen", 0.95, "groundBlue", 0.85),
     /** Quicksilver. */
-    QUICKSILVER("Quicksilver", Ground.SHORE, false, false),
+    QUICKSILVER("Quicksilver", false, false,
+            "alphaMix", 0.9, "alphaScale1", 0.9, "fresnelRatio", 2, "specularRatio", 6,
+            "exponent", 25, "touchAmplitude", 3, "calmingTime", 10, "ringSpeed", 0.22,
+            "rebound", 0.8, "breeze", 0.4, "groundRed", 0.25, "groundGreen", 0.29,
+            "groundBlue", 0.42, "lightGreen", 0.8, "lightBlue", 0.65),
     /** Honey. */
-    HONEY("Honey", Ground.SHORE, true, false),
+    HONEY("Honey", true, false,
+            "calmingTime", 1.2, "ringSpeed", 0.12, "dropRadius", 0.034, "touchAmplitude", 3.4,
+            "trailShare", 0.2, "alphaMix", 0.8, "exponent", 80, "rebound", 0,
+            "breeze", 0, "inkStepsPerSecond", 30, "groundGreen", 0.66, "groundBlue", 0.2,
+            "lightGreen", 0.8, "lightBlue", 0.4, "inkRed", 0.45, "inkGreen", 0.18,
+            "inkBlue", 0.01),
     /** Red ink. */
-    RED_INK("Red ink", Ground.SHORE, true, false),
+    RED_INK("Red ink", true, false,
+            "touchAmplitude", 1.2, "trailShare", 0.06, "inkStepsPerSecond", 30, "inkRed", 0.6,
+            "inkGreen", 0.03, "inkBlue", 0.05),
     /** Deep swell. */
-    DEEP_SWELL("Deep swell", Ground.POOL, false, false);
+    DEEP_SWELL("Deep swell", false, false,
+            "dropRadius", 0.045, "meshExtent", 20, "calmingTime", 12.5, "ringSpeed", 0.43,
+            "touchAmplitude", 3, "rebound", 0.5, "breeze", 0.5, "groundRed", 0.3,
+            "groundGreen", 0.48, "groundBlue", 0.7);
 
-    /** The picture under the water. */
-    public enum Ground {
-        /** Glazed tiles. */
-        POOL,
-        /** Pebbles. */
-        RIVER,
-        /** Ribbed sand. */
-        SHORE
-    }
-
-    /** For people, in English. */
+    /** The name that an app may show, in English. */
     @NonNull public final String title;
-
-    /** The picture that suits the look. */
-    @NonNull public final Ground ground;
 
     /** Whether touches drop ink. */
     public final boolean ink;
@@ -45,106 +55,27 @@ public enum Preset {
     /** Whether it rains. */
     public final boolean rain;
 
-    Preset(String title, Ground ground, boolean ink, boolean rain) {
+    private final List<Object> values;  // names and numbers by turns, of the fields that differ from a new look's
+
+    Preset(String title, boolean ink, boolean rain, Object... values) {
         this.title = title;
-        this.ground = ground;
         this.ink = ink;
         this.rain = rain;
+        this.values = Arrays.asList(values);
     }
 
     /**
-     * The values.
+     * Creates the look of this preset.
      *
-     * @return a look of its own
+     * @return a new object, which the caller may change
      */
     @NonNull
     public Look look() {
         Look look = new Look();
-        switch (this) {
-            case CLEAR_LAKE:
-                look.breeze = 0.3f;
-                look.groundRed = 0.6f;
-                look.groundGreen = 0.92f;
-                break;
-            case SUMMER_RAIN:
-                look.calmingTime = 3.6f;
-                look.rainDropsPerSecond = 24;
-                look.rainAmplitude = 0.9f;
-                look.groundRed = 0.7f;
-                look.groundGreen = 0.78f;
-                look.groundBlue = 0.85f;
-                break;
-            case HEAVY_GLASS:
-                look.refractiveIndex = 2.4f;
-                look.calmingTime = 4;
-                look.ringSpeed = 0.16f;
-                look.exponent = 120;
-                look.specularRatio = 8;
-                look.alphaMix = 0.6f;
-                look.rebound = 0;
-                look.breeze = 0.1f;
-                look.touchAmplitude = 4;
-                look.groundRed = 0.75f;
-                look.groundGreen = 0.95f;
-                look.groundBlue = 0.85f;
-                break;
-            case QUICKSILVER:
-                look.alphaMix = 0.9f;
-                look.alphaScale1 = 0.9f;
-                look.fresnelRatio = 2;
-                look.specularRatio = 6;
-                look.exponent = 25;
-                look.touchAmplitude = 3;
-                look.calmingTime = 10;
-                look.ringSpeed = 0.22f;
-                look.rebound = 0.8f;
-                look.breeze = 0.4f;
-                look.groundRed = 0.25f;
-                look.groundGreen = 0.29f;
-                look.groundBlue = 0.42f;
-                look.lightGreen = 0.8f;
-                look.lightBlue = 0.65f;
-                break;
-            case HONEY:
-                look.calmingTime = 1.2f;
-                look.ringSpeed = 0.12f;
-                look.dropRadius = 0.034f;
-                look.touchAmplitude = 3.4f;
-                look.trailShare = 0.2f;
-                look.alphaMix = 0.8f;
-                look.exponent = 80;
-                look.rebound = 0;
-                look.breeze = 0;
-                look.inkStepsPerSecond = 30;
-                look.groundGreen = 0.66f;
-                look.groundBlue = 0.2f;
-                look.lightGreen = 0.8f;
-                look.lightBlue = 0.4f;
-                look.inkRed = 0.45f;
-                look.inkGreen = 0.18f;
-                look.inkBlue = 0.01f;
-                break;
-            case RED_INK:
-                look.touchAmplitude = 1.2f;
-                look.trailShare = 0.06f;
-                look.inkStepsPerSecond = 30;
-                look.inkRed = 0.6f;
-                look.inkGreen = 0.03f;
-                look.inkBlue = 0.05f;
-                break;
-            case DEEP_SWELL:
-                look.dropRadius = 0.045f;
-                look.meshExtent = 20;
-                look.calmingTime = 12.5f;
-                look.ringSpeed = 0.43f;
-                look.touchAmplitude = 3;
-                look.rebound = 0.5f;
-                look.breeze = 0.5f;
-                look.groundRed = 0.3f;
-                look.groundGreen = 0.48f;
-                look.groundBlue = 0.7f;
-                break;
-        }
+        look.forEach((name, value, least, most, isWhole) -> {
+            int i = values.indexOf(name);
+            return i < 0 ? value : ((Number) values.get(i + 1)).doubleValue();
+        });
         return look;
     }
 }

@@ -1,13 +1,13 @@
 package com.zor.android.visualeffect.tidemark;
 
-/** How many pixels are drawn, at most, for each density-independent pixel of a side. */
+/** How many pixels are drawn: at most so many for each density-independent pixel of a side, and no more than it has. */
 public enum Quality {
-    /** Two, and fewer where frames would miss the display's pace. */
+    /** At most two, and fewer if frames take longer than the display's refresh. */
     AUTO,
-    /** One. */
+    /** At most one. */
     LOW,
-    /** Two. */
+    /** At most two. */
     MEDIUM,
-    /** Three. */
+    /** At most three. */
     HIGH
 }

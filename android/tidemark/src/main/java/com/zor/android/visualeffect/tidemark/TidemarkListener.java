@@ -4,38 +4,38 @@ import androidx.annotation.MainThread;
 import androidx.annotation.NonNull;
 
 /**
- * Hears what becomes of the water of a {@link TidemarkView}. All methods are called on the main thread. A listener that is
- * set late hears at once of the state that the view is in, and of the last failure.
+ * Called by a {@link TidemarkView} on the main thread when its state changes. A listener that is set late is called at
+ * once with the last failure and the current state.
  */
 @MainThread
 public interface TidemarkListener {
-    /** Why the view stays empty, or as it was. */
+    /** The kind of a failure. */
     enum Failure {
-        /** The device has no OpenGL ES 2.0. */
+        /** The device has no OpenGL ES 2.0. The view stays empty. */
         NO_OPENGL,
-        /** The app holds no native library for the device's processor. */
+        /** The app contains no native library for the device's processor. The view stays empty. */
         NO_LIBRARY,
-        /** A picture cannot be read or decoded, or was recycled; the earlier pictures stay. */
+        /** A picture cannot be read or decoded, or was recycled. The view keeps the picture before. */
         PICTURE
     }
 
     /** The first frame is shown. Called once, before {@link #onCalm}. */
     default void onReady() {}
 
-    /** The water has come to rest: no frames are drawn until something changes. */
+    /** The water is calm: no frames are drawn until something changes. */
     default void onCalm() {}
 
     /** The water moves again. */
     default void onWake() {}
 
-    /** Another view has begun to draw. This one keeps its last picture until {@link #onWake} or {@link #onCalm}. */
+    /** Another view has begun to draw. This one keeps its last frame until {@link #onWake} or {@link #onCalm}. */
     default void onRest() {}
 
     /**
-     * Something failed, of which nothing else tells the app.
+     * Something has failed.
      *
-     * @param failure what to act upon
-     * @param message what to log, in English
+     * @param failure the kind of the failure
+     * @param message the details in English, for a log
      */
     default void onFailure(@NonNull Failure failure, @NonNull String message) {}
 }

@@ -1,5 +1,6 @@
 package com.zor.android.visualeffect.tidemark;
 
+import android.content.Context;
 import android.graphics.Bitmap;
 import android.graphics.SurfaceTexture;
 import android.opengl.EGLSurface;
@@ -14,100 +15,119 @@ import android.view.MotionEvent;
 import java.nio.ByteBuffer;
 
 /**
- * The part of a view that is on {@link GlThread}: draws its water into its window with the display's refresh, and asks for
- * no frames while nothing moves. Times are seconds of {@code System.nanoTime}, which is the clock of touches as well.
+ * The part of a view that runs on {@link GlThread}. It draws the water into the view's window with the display's
+ * refresh, and requests no refresh while nothing moves. Times are seconds of the system's uptime, the clock of touches.
  */
 final class TidemarkRenderer implements Choreographer.FrameCallback {
     /** The state of the water. */
-    enum State { NOT_READY, MOVING, CALM, RESTING }
-
-    /** The view; called on the main thread. */
-    interface View {
-        void becomes(State state);
-
-        void fails(TidemarkListener.Failure failure, String message);
-
-        /** Asks for a surface of so many pixels, of which the renderer then hears by {@link #setWindow}. */
-        void setSurfaceSize(int width, int height);
+    enum State {
+        /** No frame was drawn yet. */
+        NOT_READY,
+        MOVING,
+        CALM,
+        /** Another view draws. */
+        RESTING
     }
 
-    interface Change {
+    /** Called on the main thread. */
+    interface Listener {
+        void stateChanged(State state);
+
+        void failed(TidemarkListener.Failure failure, String message);
+
+        /** The surface shall have this size in pixels; {@link #setWindow} must follow when it has. */
+        void surfaceSizeWanted(int width, int height);
+    }
+
+    private interface Change {
         void apply(NativeWater water);
     }
 
+    static final Handler MAIN = new Handler(Looper.getMainLooper());
     static final double MILLISECOND = 1e-3;
     private static final double NEVER = Double.POSITIVE_INFINITY;
     private static final String TAG = "Tidemark";
 
-    /** Stands for this renderer where it must not be kept in memory, and its view with it. */
+    /** Identifies this renderer for {@link GlThread}, which must not keep it and its view in memory. */
     final Object mark = new Object();
 
-    private final Handler main = new Handler(Looper.getMainLooper());
-    private final View view;
-    private boolean isStarted;  // of the main thread
+    private final Listener listener;
+    private boolean isStarted;  // used on the main thread
 
-    private NativeWater water;  // null where the library does not load
+    // Used on the GL thread.
+    private NativeWater water;  // null before the first window, and if the library cannot be loaded
     private boolean isBroken;
-    private Object window;  // a Surface or a SurfaceTexture; null while the view is not shown
-    private EGLSurface surface;  // of the window
+    private Object window;  // a Surface or a SurfaceTexture; null while the view is not visible
+    private EGLSurface surface;  // on the window
     private int width;  // of the surface, pixels
     private int height;
     private State state = State.NOT_READY;
     private boolean isPaused;
-    private boolean isStale;  // a frame is due in spite of the pause
-    private double lastFrame;
-    private boolean isAwaited;  // the next refresh
-    private CodeStroke stroke;
+    private boolean isStale;  // a frame must be drawn even in a pause
+    private double lastFrame;  // its time
+    private boolean isRefreshRequested;
+    private CodeStroke stroke;  // null if none is being drawn
 
-    TidemarkRenderer(View view) {
-        this.view = view;
+    TidemarkRenderer(Listener listener) {
+        this.listener = listener;
     }
 
     // Called on the main thread.
 
-    /** Changes from before the view is first shown are in the {@link Choices} that it then hands over. */
-    void change(Change change) {
-        if (isStarted) {
-            GlThread.post(() -> {
-                if (water == null) return;
-                change.apply(water);
-                isStale = true;
-                GlThread.choose();
-                schedule();
-            });
-        }
+    /** Whether there was a window. Before, all methods but {@link #setWindow} do nothing. */
+    boolean isStarted() {
+        return isStarted;
+    }
+
+    private void change(Change change) {
+        if (!isStarted) return;
+        GlThread.post(() -> {
+            if (water == null) return;
+            change.apply(water);
+            isStale = true;
+            GlThread.choose();
+            schedule();
+        });
     }
 
     /**
-     * Shows the water in this window from now on, or nowhere. When it returns, the former window is no longer used.
+     * Draws into a window from now on. When the method returns, the previous window is no longer used.
      *
-     * @param choices are taken over with the first window
+     * @param window null for none
      */
-    void setWindow(Object window, int width, int height, Choices choices) {
-        if (window == null && !isStarted) return;
-        isStarted = true;
-        Choices now = choices.clone();
+    void setWindow(Context context, Object window, int width, int height, WaterSettings settings) {
         if (window == null) {
-            GlThread.await(() -> open(null, 0, 0, now));
-        } else {
-            GlThread.post(() -> open(window, width, height, now));
+            if (isStarted) GlThread.await(this::close);
+            return;
         }
+        isStarted = true;
+        GlThread.start(context);
+        WaterSettings current = settings.clone();
+        GlThread.post(() -> open(window, width, height, current));
     }
 
-    /** The view is out of its window: what was made for it is freed, unless another view draws. */
+    void update(WaterSettings settings) {
+        WaterSettings current = settings.clone();
+        change(water -> {
+            current.applyTo(water);
+            isPaused = current.isPaused;
+        });
+    }
+
+    /** Frees graphics memory after the view has left its window, unless another view draws. */
     void end() {
         if (isStarted) GlThread.await(() -> GlThread.end(this));
     }
 
-    /** One position of a touch, as shares of the view's sides. While another view draws, it only ends what began before. */
-    void touch(int action, float x, float y, boolean isStylus, float pressure, long time) {
+    /** Passes on a position as shares of the view's sides. While another view draws, only the end of a touch counts. */
+    void touch(int action, float x, float y, boolean isStylus, float pressure, double seconds) {
         boolean isEnd = action == MotionEvent.ACTION_UP || action == MotionEvent.ACTION_CANCEL;
         change(water -> {
-            if (isEnd || GlThread.draws(this)) water.touch(action, x, y, isStylus, pressure, time * MILLISECOND);
+            if (isEnd || GlThread.draws(this)) water.touch(action, x, y, isStylus, pressure, seconds);
         });
     }
 
-    /** A drop that falls before the first frame is seen in it. One that falls while the view is away is forgotten. */
+    /** Makes a drop fall with the next frame, if this view draws or has not drawn yet. */
     void drop(float x, float y, float strength, boolean withInk) {
         change(water -> {
             if (state == State.NOT_READY || GlThread.draws(this)) water.splash(x, y, strength, withInk);
@@ -120,11 +140,11 @@ final class TidemarkRenderer implements Choreographer.FrameCallback {
         });
     }
 
-    void setPaused(boolean paused) {
-        change(water -> isPaused = paused);
+    void clearInk() {
+        change(NativeWater::clearInk);
     }
 
-    /** Waits for a frame. Null where the view does not draw. */
+    /** Waits for a frame. Returns null if this view does not draw. */
     Bitmap toBitmap() {
         Bitmap[] result = new Bitmap[1];
         if (isStarted) GlThread.await(() -> result[0] = read());
@@ -141,36 +161,36 @@ final class TidemarkRenderer implements Choreographer.FrameCallback {
         return water != null && water.hasPictures();
     }
 
-    /** The library has none of what it had for this water: in the context nothing, and perhaps other pictures. */
+    /** Creates the GL objects again with the next frame, and passes the pictures to the library again if necessary. */
     void renew(boolean withPictures) {
         water.renewContext();
         if (withPictures) water.renewPictures();
     }
 
-    /** Another view draws. */
+    /** Another view draws from now on. */
     void rest() {
         stroke = null;
-        become(State.RESTING);
+        setState(State.RESTING);
     }
 
-    /** No other view draws any more. */
-    void goOn() {
+    /** This view draws from now on. */
+    void resume() {
         water.redraw();
         isStale = true;
         schedule();
     }
 
-    /** Awaits a refresh of the display where one will bring something new. */
+    /** Requests a refresh of the display if it will show something new. */
     void schedule() {
-        if (isAwaited || !canDraw()) return;
+        if (isRefreshRequested || !canDraw()) return;
         if (isPaused ? !isStale : water.due() == NEVER && stroke == null) return;
-        isAwaited = true;
+        isRefreshRequested = true;
         Choreographer.getInstance().postFrameCallback(this);
     }
 
     @Override
     public void doFrame(long nanoTime) {
-        isAwaited = false;
+        isRefreshRequested = false;
         if (!canDraw()) return;
         double now = isPaused && lastFrame > 0 ? lastFrame : nanoTime * 1e-9;
         if (stroke != null && !isPaused && !stroke.follow(water, now)) stroke = null;
@@ -182,20 +202,19 @@ final class TidemarkRenderer implements Choreographer.FrameCallback {
         return window != null && GlThread.draws(this);
     }
 
-    private void open(Object newWindow, int width, int height, Choices choices) {
+    private void open(Object newWindow, int width, int height, WaterSettings settings) {
         if (newWindow != window || width != this.width || height != this.height) closeSurface();
         window = newWindow;
         this.width = width;
         this.height = height;
-        if (window == null || !isReady(choices)) {
-            GlThread.hide(this);
-            return;
-        }
-        boolean isFixed = !choices.hasView();
+        if (!createWater()) return;
+        boolean isFixed = !settings.hasView();
         if (isFixed) {
-            water.setQuality(Quality.HIGH.ordinal());  // which leaves the size as it is
-            water.setView(width, height, 1, now());
+            settings.quality = Quality.HIGH;  // does not reduce the size
+            settings.setView(width, height, 1);
         }
+        settings.applyTo(water);
+        isPaused = settings.isPaused;
         if (isFixed || water.width() == width && water.height() == height) water.resized();
         water.redraw();
         isStale = true;
@@ -203,13 +222,18 @@ final class TidemarkRenderer implements Choreographer.FrameCallback {
         schedule();
     }
 
-    // Loads the library, which the layout editor and an app's tests on a desktop do not have.
-    private boolean isReady(Choices choices) {
+    private void close() {
+        closeSurface();
+        window = null;
+        GlThread.hide(this);
+    }
+
+    // Loads the library, which does not exist in a layout editor and in an app's tests on a desktop.
+    private boolean createWater() {
         if (water != null || isBroken) return water != null;
         try {
-            water = new NativeWater((int) System.nanoTime(), message -> fail(TidemarkListener.Failure.PICTURE, message));
-            choices.applyTo(water);
-            isPaused = choices.isPaused;
+            water = new NativeWater(
+                    (int) System.nanoTime(), message -> fail(TidemarkListener.Failure.PICTURE, message));
         } catch (LinkageError e) {
             isBroken = true;
             fail(TidemarkListener.Failure.NO_LIBRARY, e.toString());
@@ -217,6 +241,7 @@ final class TidemarkRenderer implements Choreographer.FrameCallback {
         return water != null;
     }
 
+    // Copies the frame to `pixels` unless that is null. Returns whether the frame was shown.
     private boolean draw(double now, ByteBuffer pixels) {
         isStale = false;
         if (!makeCurrent()) return false;
@@ -230,9 +255,9 @@ final class TidemarkRenderer implements Choreographer.FrameCallback {
         if (pixels != null) GLES20.glReadPixels(0, 0, width, height, GLES20.GL_RGBA, GLES20.GL_UNSIGNED_BYTE, pixels);
         GlThread.hasDrawn(this);
         lastFrame = now;
-        boolean isShown = GlThread.EGL.show(surface);
+        boolean isShown = GlThread.EGL.swap(surface);
         if (isShown) {
-            become(water.due() == NEVER ? State.CALM : State.MOVING);
+            setState(water.due() == NEVER ? State.CALM : State.MOVING);
         } else {
             surfaceLost();
         }
@@ -247,13 +272,13 @@ final class TidemarkRenderer implements Choreographer.FrameCallback {
             return false;
         }
         boolean isNew = surface == null;
-        if (isNew) surface = GlThread.EGL.surfaceOf(window);
+        if (isNew) surface = GlThread.EGL.createSurface(window);
         if (surface == null || !GlThread.EGL.makeCurrent(surface)) {
             surfaceLost();
             return false;
         }
-        // The main thread consumes the frames of a texture, and may be waiting for this thread.
-        if (isNew && window instanceof SurfaceTexture) GlThread.EGL.waitForNobody();
+        // The main thread takes the frames of a texture, and may be waiting for this thread.
+        if (isNew && window instanceof SurfaceTexture) GlThread.EGL.swapWithoutWaiting();
         return true;
     }
 
@@ -262,7 +287,7 @@ final class TidemarkRenderer implements Choreographer.FrameCallback {
             GlThread.contextLost(this);
             isStale = true;
         } else {
-            window = null;  // the system is about to take it away, or to give another
+            window = null;  // the system will call with another one, or with none
         }
         closeSurface();
     }
@@ -278,7 +303,7 @@ final class TidemarkRenderer implements Choreographer.FrameCallback {
         if (wantedWidth == width && wantedHeight == height) {
             water.resized();
         } else {
-            main.post(() -> view.setSurfaceSize(wantedWidth, wantedHeight));
+            MAIN.post(() -> listener.surfaceSizeWanted(wantedWidth, wantedHeight));
         }
     }
 
@@ -289,14 +314,14 @@ final class TidemarkRenderer implements Choreographer.FrameCallback {
         return draw(lastFrame, pixels) ? Pictures.upright(pixels, width, height) : null;
     }
 
-    private void become(State next) {
+    private void setState(State next) {
         if (next == state) return;
         state = next;
-        main.post(() -> view.becomes(next));
+        MAIN.post(() -> listener.stateChanged(next));
     }
 
     private void fail(TidemarkListener.Failure failure, String message) {
         Log.e(TAG, message);
-        main.post(() -> view.fails(failure, message));
+        MAIN.post(() -> listener.failed(failure, message));
     }
 }

@@ -4,14 +4,8 @@ import android.content.Context;
 import android.content.res.TypedArray;
 import android.graphics.Bitmap;
 import android.net.Uri;
-import android.os.Bundle;
-import android.os.Handler;
-import android.os.Looper;
 import android.os.Parcelable;
-import android.provider.Settings;
 import android.util.AttributeSet;
-import android.util.DisplayMetrics;
-import android.view.GestureDetector;
 import android.view.MotionEvent;
 import android.view.Surface;
 import android.widget.FrameLayout;
@@ -23,107 +17,124 @@ import androidx.annotation.MainThread;
 import androidx.annotation.NonNull;
 import androidx.annotation.Nullable;
 
-import java.io.IOException;
-import java.util.Arrays;
+import java.util.Objects;
 
 /**
  * Rippling water over a picture, which answers to touches. Put it into a layout with {@code app:tidemarkPicture}, or
- * create it and call {@link #setPicture(int)}. Views inside it lie above the water. All methods are to be called on the
- * main thread; they return at once, except {@link #toBitmap}.
+ * create it and call {@link #setPicture(int)}. Views inside it are drawn above the water.
  *
- * <p>The view draws while it is seen and something in it moves. Of several views that are seen, the newest one that has a
- * picture draws, because the native library serves a single effect; the others keep their last picture, and the one before
- * goes on when the newest is hidden.
+ * <p>Call all methods on the main thread. They return at once, except {@link #toBitmap}. Null for a parameter that is
+ * marked as non-null throws an exception.
  *
- * <p>The view saves ink, rain and those pictures that are resources or have a {@code Uri} with the state of the activity,
- * if it has an {@code android:id}. The water itself is not saved.
+ * <p>The view draws while it is visible and something in it moves. If several views are visible, only the newest one
+ * that has a picture draws, because the native library serves a single effect. The others keep their last frame, and
+ * the previous one draws again when the newest is hidden.
+ *
+ * <p>If the view has an {@code android:id}, it saves the ink, the rain, and pictures that are resources or have a
+ * {@code Uri} with the state of the activity. It does not save the water.
  */
 @MainThread
 public class TidemarkView extends FrameLayout {
     private static final int FIRST_DROP_DELAY = 700;  // milliseconds after the first frame
-    private static final float FIRST_DROP_X = 0.5f;  // shares of the view
+    private static final float FIRST_DROP_X = 0.5f;  // as a share of the view
     private static final float FIRST_DROP_Y = 0.42f;
     private static final float BRIGHTEST_INK = 0.75f;  // brighter ink would light the picture up
 
-    private final Events events = new Events();
-    private final Choices choices = new Choices();
-    private final TidemarkRenderer renderer = new TidemarkRenderer(events);
-    private final FirstFinger finger = new FirstFinger(this::touch);
+    private final ListenerNotifier notifier = new ListenerNotifier() {
+        @Override
+        public void stateChanged(TidemarkRenderer.State state) {
+            if (state == TidemarkRenderer.State.RESTING) touches.lift();
+            super.stateChanged(state);
+        }
+
+        @Override
+        void firstFrameShown() {
+            if (firstDrop && !settings.isReduced) TidemarkRenderer.MAIN.postDelayed(
+                    () -> drop(FIRST_DROP_X * width, FIRST_DROP_Y * height), FIRST_DROP_DELAY);
+        }
+
+        @Override
+        public void surfaceSizeWanted(int width, int height) {
+            if (surface != null) surface.setSize(width, height);
+        }
+    };
+    private final WaterSettings settings = new WaterSettings();
+    private final TidemarkRenderer renderer = new TidemarkRenderer(notifier);
+    private final TouchInput touches;
+    private final PictureRequests pictures;
     private final Context context;
-    private final GestureDetector gestures;
     private final WaterSurface surface;  // null in a layout editor
-    private Object[] sources = {null, null, null};  // portrait, landscape, light: a Bitmap, an Integer or a Uri
-    private Object[] shown = sources;  // where they could be decoded
-    private int ticket;  // of the pictures asked for last
-    private Interaction interaction = Interaction.PRESS;
-    private Motion motion = Motion.AUTO;
     private boolean firstDrop;
-    private int width;  // that touches and drops refer to, pixels
-    private int height;
+    private Runnable earlyDrop;  // asked for before the first surface
+    private int width = 1;  // to which touches and drops refer, pixels
+    private int height = 1;
 
     /**
-     * Creates a view in code.
+     * Creates a view with a surface of its own behind the window's.
      *
-     * @param context the activity, or another one
+     * @param context the activity, or another one with resources
      */
     public TidemarkView(@NonNull Context context) {
         this(context, false);
     }
 
     /**
-     * Creates a view in code.
+     * Creates a view.
      *
-     * @param context the activity, or another one
-     * @param onTexture whether it can be faded, clipped and animated as other views, at the cost of a copy of every frame;
-     *     otherwise it has a surface of its own, behind the window's
+     * @param context the activity, or another one with resources
+     * @param onTexture whether the water is drawn on a texture of the window, so that it can be faded, clipped and
+     *     animated as other views can, at the cost of a copy of every frame
      */
     public TidemarkView(@NonNull Context context, boolean onTexture) {
-        super(context);
-        this.context = context;
-        gestures = new GestureDetector(context, new Taps());
-        surface = addSurface(onTexture);
+        this(context, null, onTexture);
     }
 
     /**
-     * Creates a view of a layout.
+     * Creates a view from a layout.
      *
-     * @param context the activity, or another one
-     * @param attributes of the layout; null for none
+     * @param context the activity, or another one with resources
+     * @param attributes the attributes in the layout; null for none
      */
     public TidemarkView(@NonNull Context context, @Nullable AttributeSet attributes) {
+        this(context, attributes, false);
+    }
+
+    private TidemarkView(Context context, AttributeSet attributes, boolean onTexture) {
         super(context, attributes);
         this.context = context;
-        gestures = new GestureDetector(context, new Taps());
-        TypedArray given = context.obtainStyledAttributes(attributes, R.styleable.TidemarkView);
+        touches = new TouchInput(this, this::touch);
+        pictures = new PictureRequests(context, notifier, decoded -> {
+            settings.pictures = decoded;
+            update();
+        });
+        TypedArray values = attributes == null
+                ? null : context.obtainStyledAttributes(attributes, R.styleable.TidemarkView);
+        boolean isTexture =
+                onTexture || values != null && values.getBoolean(R.styleable.TidemarkView_tidemarkTexture, false);
+        surface = isInEditMode() ? null : new WaterSurface(context, isTexture, this::setWindow);
+        if (surface != null) addView(surface.view(), 0);
+        if (values == null) return;
         try {
-            surface = addSurface(given.getBoolean(R.styleable.TidemarkView_tidemarkTexture, false));
-            ViewAttributes.apply(given, this);
+            ViewAttributes.apply(values, this);
         } finally {
-            given.recycle();
+            values.recycle();
         }
     }
 
-    private WaterSurface addSurface(boolean onTexture) {
-        if (isInEditMode()) return null;
-        WaterSurface made = new WaterSurface(context, onTexture, this::setWindow);
-        addView(made.view(), 0);
-        return made;
-    }
-
     /**
-     * Hears what becomes of the water. A listener that is set late hears at once of the state that the view is in.
+     * Sets the object that is called when the state of the water changes or something fails.
      *
-     * @param listener null for nobody
+     * @param listener replaces the previous one; null for none
      */
     public void setListener(@Nullable TidemarkListener listener) {
-        events.setListener(listener);
+        notifier.setListener(listener);
     }
 
     /**
-     * Shows a picture. It may have any size: it is cropped to the view and scaled down to it.
+     * Shows a picture of any size: it is cropped to the view and scaled down to it.
      *
-     * @param picture is not copied: keep it unchanged while the view shows it. Recycling it is harmless; the view then
-     *     keeps what it shows, in the size and the colours that it had, and the listener hears of it.
+     * @param picture is not copied: do not draw into it while the view shows it. If you recycle it, the view keeps what
+     *     it shows, and calls {@link TidemarkListener#onFailure} when it needs the picture in another size or colour
      * @throws IllegalArgumentException for a bitmap that is recycled
      */
     public void setPicture(@NonNull Bitmap picture) {
@@ -131,56 +142,55 @@ public class TidemarkView extends FrameLayout {
     }
 
     /**
-     * Shows a picture, which is decoded on another thread. The last picture stays until then, and also where the new one
-     * cannot be decoded, of which the listener hears. Of several asked for, the last one is shown.
+     * Shows a picture, which is decoded on another thread. Until then the view keeps the picture before; if decoding
+     * fails, it does so for good and calls {@link TidemarkListener#onFailure}. Of several calls, the last one counts.
      *
-     * @param picture a drawable that is a bitmap
+     * @param picture the identifier of a drawable that is a bitmap
      */
     public void setPicture(@DrawableRes int picture) {
-        setSources(picture, picture, null);
+        setPictures(picture, picture, 0);
     }
 
     /**
-     * Shows a picture that the app may read, as {@link #setPicture(int)} does, turned upright.
+     * Shows a picture as {@link #setPicture(int)} does, with its EXIF orientation applied.
      *
-     * @param picture of a content provider or a file
+     * @param picture the address of a document or a file that the app may read
      */
     public void setPicture(@NonNull Uri picture) {
-        setSources(picture, picture, null);
+        pictures.request(picture, picture, null);
     }
 
     /**
-     * Shows one picture in an upright view and another in a wide one.
+     * Shows one picture while the view is higher than wide, and another while it is wider than high.
      *
-     * @param portrait null for the other one
-     * @param landscape null for the other one
-     * @param light what the waves throw back, a square picture; null for the module's own
-     * @throws IllegalArgumentException for a bitmap that is recycled, or where both backgrounds are null
+     * @param portrait null for the same as {@code landscape}
+     * @param landscape null for the same as {@code portrait}
+     * @param light the picture that the waves reflect, best a square one; null for the module's own
+     * @throws IllegalArgumentException for a bitmap that is recycled, or if both backgrounds are null
      */
     public void setPictures(@Nullable Bitmap portrait, @Nullable Bitmap landscape, @Nullable Bitmap light) {
         for (Bitmap bitmap : new Bitmap[] {portrait, landscape, light}) {
             if (bitmap != null && bitmap.isRecycled()) throw new IllegalArgumentException("a picture is recycled");
         }
-        setSources(portrait, landscape, light);
+        pictures.request(portrait, landscape, light);
     }
 
     /**
-     * As {@link #setPictures(Bitmap, Bitmap, Bitmap)}, decoded on another thread.
+     * Shows pictures as {@link #setPictures(Bitmap, Bitmap, Bitmap)} does, decoded as by {@link #setPicture(int)}.
      *
-     * @param portrait 0 for the other one
-     * @param landscape 0 for the other one
+     * @param portrait 0 for the same as {@code landscape}
+     * @param landscape 0 for the same as {@code portrait}
      * @param light 0 for the module's own
-     * @throws IllegalArgumentException where both backgrounds are 0
+     * @throws IllegalArgumentException if both backgrounds are 0
      */
     public void setPictures(@DrawableRes int portrait, @DrawableRes int landscape, @DrawableRes int light) {
-        setSources(sourceOf(portrait), sourceOf(landscape), sourceOf(light));
+        pictures.request(portrait == 0 ? null : portrait, landscape == 0 ? null : landscape, light == 0 ? null : light);
     }
 
     /**
-     * Sets the look, the ink and the rain. The picture stays: the module has none of the {@link Preset#ground grounds},
-     * which an app may bring.
+     * Sets the look, the ink and the rain. The picture does not change.
      *
-     * @param preset a look by name
+     * @param preset a look with a name
      */
     public void setPreset(@NonNull Preset preset) {
         setLook(preset.look());
@@ -189,52 +199,43 @@ public class TidemarkView extends FrameLayout {
     }
 
     /**
-     * Changes how the water looks and moves; the water and the ink stay.
+     * Changes how the water looks and moves. Waves and ink that are there remain.
      *
      * @param look is copied
-     * @throws IllegalArgumentException naming a value that is beyond its limits; nothing changes
+     * @throws IllegalArgumentException if a value is outside its limits; the message names it, and nothing changes
      */
     public void setLook(@NonNull Look look) {
         Look copy = look.clone();
         copy.forEach(Look::checked);
-        if (copy.equals(choices.look)) return;
-        choices.look = copy;
-        applyLook();
+        settings.look = copy;
+        update();
     }
 
-    /**
-     * How the water looks and moves.
-     *
-     * @return a copy
-     */
+    /** {@return a copy of the look that was set last} */
     @NonNull
     public Look getLook() {
-        return choices.look.clone();
+        return settings.look.clone();
     }
 
     /**
-     * Switches the ink; it is off at first. A switch lets all ink vanish.
+     * Switches the ink on or off; it is off at first. Each change removes all ink.
      *
      * @param withInk whether touches drop ink
      */
     public void setInk(boolean withInk) {
-        choices.withInk = withInk;
-        renderer.change(water -> water.setInk(withInk));
+        settings.withInk = withInk;
+        update();
     }
 
-    /**
-     * Whether touches drop ink.
-     *
-     * @return as set last
-     */
+    /** {@return whether touches drop ink} */
     public boolean getInk() {
-        return choices.withInk;
+        return settings.withInk;
     }
 
     /**
-     * Colours the ink, that which is there as well; it changes the look.
+     * Changes the colour of the ink in the look. Ink that is there changes too.
      *
-     * @param color without alpha. Channels brighter than three quarters count as three quarters.
+     * @param color its alpha is ignored, and a channel above three quarters of full brightness counts as three quarters
      */
     public void setInkColor(@ColorInt int color) {
         Look look = getLook();
@@ -244,29 +245,25 @@ public class TidemarkView extends FrameLayout {
         setLook(look);
     }
 
-    /**
-     * The colour of the ink.
-     *
-     * @return opaque
-     */
+    /** {@return the colour of the ink in the look, opaque} */
     @ColorInt
     public int getInkColor() {
-        Look look = choices.look;
+        Look look = settings.look;
         int red = Math.round(255 * look.inkRed);
         int green = Math.round(255 * look.inkGreen);
         return 0xff000000 | red << 16 | green << 8 | Math.round(255 * look.inkBlue);
     }
 
-    /** Lets all ink vanish. */
+    /** Removes all ink. */
     public void clearInk() {
-        renderer.change(NativeWater::clearInk);
+        renderer.clearInk();
     }
 
     /**
-     * Lets it rain; it does not at first. Changes the look where it rains.
+     * Sets the amount of rain; there is none at first. Any amount but 0 is stored in the look.
      *
      * @param dropsPerSecond 0 for no rain
-     * @throws IllegalArgumentException beyond the limits of {@link Look#rainDropsPerSecond}
+     * @throws IllegalArgumentException outside the limits of {@link Look#rainDropsPerSecond}
      */
     public void setRain(@FloatRange(from = 0, to = 1000) float dropsPerSecond) {
         if (dropsPerSecond != 0) {
@@ -274,190 +271,162 @@ public class TidemarkView extends FrameLayout {
             look.rainDropsPerSecond = dropsPerSecond;
             setLook(look);
         }
-        choices.rains = dropsPerSecond != 0;
-        applyRain();
+        settings.rains = dropsPerSecond != 0;
+        update();
     }
 
     /**
-     * Lets it rain as much as the look says, or not.
+     * Switches the rain on or off.
      *
-     * @param falling whether it rains
+     * @param falling whether {@link Look#rainDropsPerSecond} drops fall a second
      */
     public void setRain(boolean falling) {
-        setRain(falling ? choices.look.rainDropsPerSecond : 0);
+        setRain(falling ? settings.look.rainDropsPerSecond : 0);
     }
 
-    /**
-     * How much it rains.
-     *
-     * @return drops a second
-     */
+    /** {@return the amount of rain in drops a second; 0 for none} */
     public float getRain() {
-        return choices.rains ? choices.look.rainDropsPerSecond : 0;
+        return settings.rains ? settings.look.rainDropsPerSecond : 0;
     }
 
     /**
-     * Lets the breeze of the look blow for good, so that the view never stops drawing. It otherwise sinks some seconds
-     * after a touch. {@link Motion#REDUCED} has no breeze.
+     * Keeps the breeze of the look blowing, so that the view never stops drawing. Otherwise the breeze ends some
+     * seconds after a touch. {@link Motion#REDUCED} has no breeze.
      *
      * @param always false at first
      */
     public void setBreezeAlways(boolean always) {
-        choices.breezeAlways = always;
-        renderer.change(water -> water.setBreezeAlways(always));
+        settings.breezeAlways = always;
+        update();
     }
 
-    /**
-     * Whether the breeze blows for good.
-     *
-     * @return as set last
-     */
+    /** {@return whether the breeze blows always} */
     public boolean getBreezeAlways() {
-        return choices.breezeAlways;
+        return settings.breezeAlways;
     }
 
     /**
-     * Chooses how many pixels are drawn; {@link Quality#AUTO} at first.
+     * Sets how many pixels are drawn. After {@link #drawOn}, the view draws as many as the surface has instead.
      *
-     * @param quality at the cost of time and of battery
+     * @param quality {@link Quality#AUTO} at first
      */
     public void setQuality(@NonNull Quality quality) {
-        choices.quality = quality;
-        if (choices.hasView()) renderer.change(water -> water.setQuality(quality.ordinal()));
+        settings.quality = Objects.requireNonNull(quality);
+        update();
     }
 
-    /**
-     * How many pixels are drawn.
-     *
-     * @return as set last
-     */
+    /** {@return the quality that was set last} */
     @NonNull
     public Quality getQuality() {
-        return choices.quality;
+        return settings.quality;
     }
 
     /**
-     * Chooses what touches do; {@link Interaction#PRESS} at first. A disabled view takes none, nor does one without a
-     * picture.
+     * Sets the effect of touches. A view that is disabled, is paused or has no picture ignores them.
      *
-     * @param interaction from the next touch on
+     * @param interaction {@link Interaction#PRESS} at first
      */
     public void setInteraction(@NonNull Interaction interaction) {
-        this.interaction = interaction;
+        touches.interaction = Objects.requireNonNull(interaction);
     }
 
-    /**
-     * Returns the effect of touches.
-     *
-     * @return as set last
-     */
+    /** {@return the effect of touches} */
     @NonNull
     public Interaction getInteraction() {
-        return interaction;
+        return touches.interaction;
     }
 
     /**
-     * Chooses whether the water moves by itself; {@link Motion#AUTO} at first.
+     * Sets whether the rain, the breeze and the first drop move the water.
      *
-     * @param motion for the rain, the breeze and the first drop
+     * @param motion {@link Motion#AUTO} at first
      */
     public void setMotion(@NonNull Motion motion) {
-        this.motion = motion;
-        applyMotion();
+        settings.motion = Objects.requireNonNull(motion);
+        update();
     }
 
-    /**
-     * Whether the water moves by itself.
-     *
-     * @return as set last
-     */
+    /** {@return the motion that was set last} */
     @NonNull
     public Motion getMotion() {
-        return motion;
+        return settings.motion;
     }
 
     /**
-     * Lets one drop fall by itself soon after the first frame, to show that this is water.
+     * Makes one drop fall soon after the first frame, to show that the picture is under water.
      *
-     * @param falling before the first frame
+     * @param falling false at first; has no effect after the first frame
      */
     public void setFirstDrop(boolean falling) {
         firstDrop = falling;
     }
 
-    /**
-     * Whether one drop falls by itself.
-     *
-     * @return as set last
-     */
+    /** {@return whether one drop falls soon after the first frame} */
     public boolean getFirstDrop() {
         return firstDrop;
     }
 
     /**
-     * Lets a drop fall without ink, as {@link #drop(float, float, float, boolean)}.
+     * Makes a drop of strength 1 without ink fall, see {@link #drop(float, float, float, boolean)}.
      *
      * @param x pixels from the left edge of the view
-     * @param y pixels from its top edge
+     * @param y pixels from the top edge of the view
      */
     public void drop(float x, float y) {
         drop(x, y, 1, false);
     }
 
     /**
-     * Lets a drop fall. Before the first frame it waits for that; in a view that another one keeps from drawing, or that
-     * is no longer seen, nothing happens.
+     * Makes a drop fall. Before the first frame it waits for that frame; before the view has a surface, only the last
+     * drop is kept. Later, a view that does not draw ignores the call. Coordinates that are not finite are ignored.
      *
      * @param x pixels from the left edge of the view
-     * @param y pixels from its top edge
-     * @param strength 1 for that of a finger; with ink, 0.3 to 1.5 count
-     * @param withInk whether it drops ink, where the ink is on
+     * @param y pixels from the top edge of the view
+     * @param strength 1 for that of a finger; for the ink, values are limited to 0.3 to 1.5
+     * @param withInk whether the drop brings ink, if ink is on
      */
     public void drop(float x, float y, float strength, boolean withInk) {
-        renderer.drop(x / Math.max(width, 1), y / Math.max(height, 1), strength, withInk);
+        if (!renderer.isStarted()) earlyDrop = () -> drop(x, y, strength, withInk);
+        renderer.drop(x / width, y / height, strength, withInk);
     }
 
     /**
-     * Draws a stroke as a finger would: it ripples, and drops ink where the ink is on. Nothing happens in a view that does
-     * not draw. A stroke replaces the one before.
+     * Draws a stroke as a finger would: with ripples, and with ink if ink is on. It replaces the stroke before. A view
+     * that does not draw ignores the call.
      *
      * @param points x and y of one point after the other, in pixels of the view
-     * @param milliseconds that the stroke takes, the same time from each point to the next
-     * @throws IllegalArgumentException for less than one point, or half a point
+     * @param milliseconds the duration of the stroke, at least 1; each part between two points takes the same time
+     * @throws IllegalArgumentException if the number of values is odd or 0
      */
     public void stroke(@NonNull float[] points, int milliseconds) {
-        if (points.length < 2 || points.length % 2 != 0) throw new IllegalArgumentException("points are pairs");
+        if (points.length == 0 || points.length % 2 != 0) throw new IllegalArgumentException("points are pairs");
         float[] shares = points.clone();
-        for (int i = 0; i < shares.length; ++i) shares[i] /= Math.max(i % 2 == 0 ? width : height, 1);
+        for (int i = 0; i < shares.length; ++i) shares[i] /= i % 2 == 0 ? width : height;
         renderer.stroke(shares, Math.max(milliseconds, 1) * TidemarkRenderer.MILLISECOND);
     }
 
-    /** Lets the water stand still until {@link #play}. */
+    /** Stops the water, the ink and touches until {@link #play}. */
     public void pause() {
-        choices.isPaused = true;
-        finger.lift();
-        renderer.setPaused(true);
+        settings.isPaused = true;
+        touches.lift();
+        update();
     }
 
-    /** Lets the water go on after {@link #pause}. */
+    /** Continues after {@link #pause}. */
     public void play() {
-        choices.isPaused = false;
-        renderer.setPaused(false);
+        settings.isPaused = false;
+        update();
     }
 
-    /**
-     * Whether the water stands still.
-     *
-     * @return since {@link #pause}
-     */
+    /** {@return whether {@link #pause} was called after the last {@link #play}} */
     public boolean isPaused() {
-        return choices.isPaused;
+        return settings.isPaused;
     }
 
     /**
-     * The water as a picture. Waits for a frame, some milliseconds.
+     * Draws a frame and waits for it, for some milliseconds.
      *
-     * @return a bitmap of its own, of as many pixels as are drawn; null where the view does not draw now
+     * @return a new bitmap with as many pixels as the view draws; null if the view does not draw now
      */
     @Nullable
     public Bitmap toBitmap() {
@@ -465,35 +434,28 @@ public class TidemarkView extends FrameLayout {
     }
 
     /**
-     * Draws on a surface of the app's own instead of in a window, for example on that of a live wallpaper. Hand touches to
-     * {@link #onTouchEvent} then. When the method returns, the former surface is no longer used.
+     * Draws on a surface of the app instead of in a window, for example on that of a live wallpaper. Pass touches to
+     * {@link #onTouchEvent} then. When the method returns, the view no longer uses the previous surface.
      *
-     * @param surface null as long as it is not seen
+     * @param surface null while it is not visible
      * @param width of the surface, pixels
      * @param height of the surface, pixels
      */
     public void drawOn(@Nullable Surface surface, int width, int height) {
-        if (surface != null) {
-            this.width = width;
-            this.height = height;
-        }
+        if (surface != null) setSize(width, height);
         setWindow(surface, width, height);
     }
 
-    /** Draws where the first finger is. A short tap is a click, and a finger that rests a long click. */
+    /** Moves the water where the first finger is. A short tap is a click, and a finger that rests a long click. */
     @Override
     public boolean onTouchEvent(@NonNull MotionEvent event) {
-        if (!takesTouches()) {
-            finger.lift();
-            return super.onTouchEvent(event);
-        }
-        finger.follow(event);
-        gestures.onTouchEvent(event);
-        if (event.getActionMasked() == MotionEvent.ACTION_DOWN && interaction == Interaction.PRESS) claimFinger();
-        return true;
+        boolean hasWater = settings.pictures != null && !notifier.isBroken();
+        if (hasWater && isEnabled() && !settings.isPaused && touches.follow(event)) return true;
+        touches.lift();
+        return super.onTouchEvent(event);
     }
 
-    // A list around the view would take the finger's way for scrolling.
+    // A list around the view would intercept the finger to scroll.
     void claimFinger() {
         if (getParent() != null) getParent().requestDisallowInterceptTouchEvent(true);
     }
@@ -502,24 +464,15 @@ public class TidemarkView extends FrameLayout {
     protected void onSizeChanged(int width, int height, int oldWidth, int oldHeight) {
         super.onSizeChanged(width, height, oldWidth, oldHeight);
         if (width == 0 || height == 0) return;
-        this.width = width;
-        this.height = height;
-        double density = context.getResources().getDisplayMetrics().density;
-        choices.density = density;
-        choices.width = width / density;
-        choices.height = height / density;
-        double now = choices.isPaused ? 0 : TidemarkRenderer.now();
-        int quality = choices.quality.ordinal();
-        renderer.change(water -> {
-            water.setQuality(quality);
-            water.setView(width / density, height / density, density, now);
-        });
+        setSize(width, height);
+        settings.setView(width, height, context.getResources().getDisplayMetrics().density);
+        update();
     }
 
     @Override
     protected void onWindowVisibilityChanged(int visibility) {
         super.onWindowVisibilityChanged(visibility);
-        if (surface != null) surface.setSeen(visibility == VISIBLE);
+        if (surface != null) surface.setVisible(visibility == VISIBLE);
     }
 
     @Override
@@ -531,182 +484,36 @@ public class TidemarkView extends FrameLayout {
 
     @Override
     protected Parcelable onSaveInstanceState() {
-        Bundle state = new Bundle();
-        state.putParcelable("view", super.onSaveInstanceState());
-        for (int i = 0; i < sources.length; ++i) {
-            if (sources[i] instanceof Integer) state.putInt("resource" + i, (Integer) sources[i]);
-            if (sources[i] instanceof Uri) state.putParcelable("uri" + i, (Uri) sources[i]);
-        }
-        state.putBoolean("ink", getInk());
-        state.putFloat("rain", getRain());
-        return state;
+        return SavedState.save(this, super.onSaveInstanceState(), pictures.sources());
     }
 
     @Override
-    protected void onRestoreInstanceState(Parcelable saved) {
-        Bundle state = (Bundle) saved;
-        state.setClassLoader(getClass().getClassLoader());
-        super.onRestoreInstanceState(state.getParcelable("view"));
-        Object[] kept = new Object[sources.length];
-        for (int i = 0; i < kept.length; ++i) {
-            int resource = state.getInt("resource" + i);
-            kept[i] = resource != 0 ? resource : state.getParcelable("uri" + i);
-        }
-        if (kept[0] != null || kept[1] != null) setSources(kept);
-        setInk(state.getBoolean("ink"));
-        setRain(state.getFloat("rain"));
+    protected void onRestoreInstanceState(Parcelable state) {
+        super.onRestoreInstanceState(SavedState.ofSuperclass(state));
+        SavedState.restore(state, this, pictures);
     }
 
-    private static Object sourceOf(int resource) {
-        return resource == 0 ? null : resource;
-    }
-
-    // Idempotent, so that what composes its views anew may call it again.
-    private void setSources(Object... asked) {
-        if (asked[0] == null) asked[0] = asked[1];
-        if (asked[1] == null) asked[1] = asked[0];
-        if (asked[0] == null) throw new IllegalArgumentException("there is no picture");
-        if (Arrays.equals(asked, sources)) return;
-        sources = asked;
-        int mine = ++ticket;
-        int longestSide = longestSideOfDisplay();
-        PictureLoader.post(() -> {
-            try {
-                Bitmap portrait = PictureLoader.load(context, asked[0], longestSide);
-                Bitmap landscape =
-                        asked[1].equals(asked[0]) ? portrait : PictureLoader.load(context, asked[1], longestSide);
-                Object light = asked[2] == null ? R.drawable.tidemark_light : asked[2];
-                Pictures pictures = new Pictures(portrait, landscape, PictureLoader.load(context, light, longestSide));
-                events.post(() -> {
-                    if (mine != ticket) return;
-                    shown = asked;
-                    choices.pictures = pictures;
-                    renderer.change(water -> water.setPictures(pictures));
-                });
-            } catch (IOException | RuntimeException | OutOfMemoryError e) {
-                events.post(() -> {
-                    if (mine != ticket) return;
-                    sources = shown;
-                    events.fails(TidemarkListener.Failure.PICTURE, e.toString());
-                });
-            }
-        });
-    }
-
-    private int longestSideOfDisplay() {
-        DisplayMetrics display = context.getResources().getDisplayMetrics();
-        return Math.max(display.widthPixels, display.heightPixels);
-    }
-
-    private void setWindow(Object window, int width, int height) {
-        if (window == null) {
-            finger.lift();
-        } else {
-            GlThread.start(context);
-            applyMotion();  // the user may come from the system's settings
-        }
-        renderer.setWindow(window, width, height, choices);
-    }
-
-    private boolean takesTouches() {
-        boolean isWater = choices.pictures != null && !events.isBroken;
-        return isWater && isEnabled() && !choices.isPaused && interaction != Interaction.NONE;
+    private void setSize(int width, int height) {
+        this.width = Math.max(width, 1);
+        this.height = Math.max(height, 1);
     }
 
     private void touch(int action, float x, float y, boolean isStylus, float pressure, long time) {
-        renderer.touch(action, x / width, y / height, isStylus, pressure, time);
+        renderer.touch(action, x / width, y / height, isStylus, pressure, time * TidemarkRenderer.MILLISECOND);
     }
 
-    private void applyMotion() {
-        boolean wasReduced = choices.isReduced;
-        choices.isReduced = motion == Motion.REDUCED || motion == Motion.AUTO && hasAnimationsOff();
-        if (choices.isReduced == wasReduced) return;
-        applyLook();
-        applyRain();
+    private void setWindow(Object window, int width, int height) {
+        if (window == null) touches.lift();
+        if (window != null) settings.updateReduced(context);
+        renderer.setWindow(context, window, width, height, settings);
+        if (earlyDrop == null || !renderer.isStarted()) return;
+        earlyDrop.run();
+        earlyDrop = null;
     }
 
-    private void applyLook() {
-        Look look = choices.lookInMotion();
-        renderer.change(water -> water.setLook(look));
-    }
-
-    private void applyRain() {
-        boolean falls = choices.rainFalls();
-        renderer.change(water -> water.setRain(falls));
-    }
-
-    private boolean hasAnimationsOff() {
-        return !isInEditMode() && Settings.Global.getFloat(
-                context.getContentResolver(), Settings.Global.ANIMATOR_DURATION_SCALE, 1) == 0;
-    }
-
-    private final class Taps extends GestureDetector.SimpleOnGestureListener {
-        @Override
-        public boolean onSingleTapUp(MotionEvent event) {
-            return performClick();
-        }
-
-        @Override
-        public void onLongPress(MotionEvent event) {
-            performLongClick();
-        }
-    }
-
-    /** What the renderer tells, for the listener that is there then or later. */
-    private final class Events implements TidemarkRenderer.View {
-        private final Handler main = new Handler(Looper.getMainLooper());
-        private TidemarkListener listener;
-        private TidemarkRenderer.State state = TidemarkRenderer.State.NOT_READY;
-        private boolean isReady;
-        private boolean isBroken;
-        private TidemarkListener.Failure failure;
-        private String message;
-
-        void post(Runnable call) {
-            main.post(call);
-        }
-
-        void setListener(TidemarkListener listener) {
-            this.listener = listener;
-            if (listener == null) return;
-            if (failure != null) listener.onFailure(failure, message);
-            if (isReady) listener.onReady();
-            if (state == TidemarkRenderer.State.CALM) listener.onCalm();
-            if (state == TidemarkRenderer.State.RESTING) listener.onRest();
-        }
-
-        @Override
-        public void becomes(TidemarkRenderer.State next) {
-            boolean rests = next == TidemarkRenderer.State.RESTING;
-            boolean becomesReady = !rests && !isReady;
-            state = next;
-            isReady |= !rests;
-            if (rests) finger.lift();
-            if (becomesReady && firstDrop && !choices.isReduced) {
-                main.postDelayed(() -> drop(FIRST_DROP_X * width, FIRST_DROP_Y * height), FIRST_DROP_DELAY);
-            }
-            if (listener == null) return;
-            if (becomesReady) listener.onReady();
-            if (rests) {
-                listener.onRest();
-            } else if (next == TidemarkRenderer.State.CALM) {
-                listener.onCalm();
-            } else if (!becomesReady) {
-                listener.onWake();
-            }
-        }
-
-        @Override
-        public void fails(TidemarkListener.Failure failure, String message) {
-            this.failure = failure;
-            this.message = message;
-            isBroken |= failure != TidemarkListener.Failure.PICTURE;
-            if (listener != null) listener.onFailure(failure, message);
-        }
-
-        @Override
-        public void setSurfaceSize(int width, int height) {
-            if (surface != null) surface.setSize(width, height);
-        }
+    private void update() {
+        if (!renderer.isStarted()) return;
+        settings.updateReduced(context);
+        renderer.update(settings);
     }
 }

@@ -7,14 +7,17 @@ import android.view.SurfaceView;
 import android.view.TextureView;
 import android.view.View;
 
-/** The child of a {@link TidemarkView} on which the water is drawn: a surface of its own, or a texture of the window's. */
+/** The child of a {@link TidemarkView} on which the water is drawn: with a surface of its own, or on a texture. */
 final class WaterSurface implements SurfaceHolder.Callback, TextureView.SurfaceTextureListener {
     interface Listener {
-        /** Null when the water must no longer draw there, which it does not when the method returns. */
+        /**
+         * Called with a Surface or a SurfaceTexture and its size in pixels; with null when the water must not draw any
+         * more, which must be true when the method returns.
+         */
         void setWindow(Object window, int width, int height);
     }
 
-    // One of a fixed size would measure as many pixels as that has.
+    // A SurfaceView with a fixed size would measure itself by that.
     private static final class FillingSurface extends SurfaceView {
         FillingSurface(Context context) {
             super(context);
@@ -27,48 +30,48 @@ final class WaterSurface implements SurfaceHolder.Callback, TextureView.SurfaceT
     }
 
     private final Listener listener;
-    private final SurfaceView own;  // or
-    private final TextureView shared;
-    private SurfaceTexture texture;
-    private int width;
+    private final SurfaceView surfaceView;  // null if there is a textureView
+    private final TextureView textureView;
+    private SurfaceTexture texture;  // null while the textureView has none
+    private int width;  // of the texture, pixels
     private int height;
-    private boolean isSeen = true;
+    private boolean isVisible = true;
 
     WaterSurface(Context context, boolean onTexture, Listener listener) {
         this.listener = listener;
-        own = onTexture ? null : new FillingSurface(context);
-        shared = onTexture ? new TextureView(context) : null;
+        surfaceView = onTexture ? null : new FillingSurface(context);
+        textureView = onTexture ? new TextureView(context) : null;
         if (onTexture) {
-            shared.setSurfaceTextureListener(this);
+            textureView.setSurfaceTextureListener(this);
         } else {
-            own.getHolder().addCallback(this);
+            surfaceView.getHolder().addCallback(this);
         }
     }
 
     View view() {
-        return own != null ? own : shared;
+        return surfaceView != null ? surfaceView : textureView;
     }
 
-    /** In so many pixels the water is drawn; the display's scaler or the window's does the rest. */
+    /** Sets how many pixels are drawn. The display, or the window, scales them to the view. */
     void setSize(int width, int height) {
-        if (own != null) {
-            own.getHolder().setFixedSize(width, height);
+        if (surfaceView != null) {
+            surfaceView.getHolder().setFixedSize(width, height);
         } else if (texture != null) {
             this.width = width;
             this.height = height;
             texture.setDefaultBufferSize(width, height);
-            handOver();
+            setTexture();
         }
     }
 
-    /** A surface of its own goes with its window; a texture stays. */
-    void setSeen(boolean isSeen) {
-        this.isSeen = isSeen;
-        if (texture != null) handOver();
+    /** Stops drawing on a texture, which outlives the visibility of its window. A surface does not. */
+    void setVisible(boolean isVisible) {
+        this.isVisible = isVisible;
+        if (texture != null) setTexture();
     }
 
-    private void handOver() {
-        listener.setWindow(isSeen ? texture : null, width, height);
+    private void setTexture() {
+        listener.setWindow(isVisible ? texture : null, width, height);
     }
 
     @Override
@@ -89,10 +92,10 @@ final class WaterSurface implements SurfaceHolder.Callback, TextureView.SurfaceT
         this.texture = texture;
         this.width = width;
         this.height = height;
-        handOver();
+        setTexture();
     }
 
-    // The size of the view; that of the texture is what setSize() has made it.
+    // The parameters are the size of the view. The texture keeps the one of setSize().
     @Override
     public void onSurfaceTextureSizeChanged(SurfaceTexture texture, int width, int height) {
         texture.setDefaultBufferSize(this.width, this.height);

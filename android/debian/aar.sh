@@ -18,7 +18,7 @@ END
 aapt2 link -I "$framework" --manifest aar/AndroidManifest.xml --static-lib --output-text-symbols aar/R.txt \
     -o aar/linked.apk resources/tidemark.zip
 rm aar/linked.apk
-# An app's build makes the classes of the resources' numbers.
+# The build of an app creates the classes R.
 (cd classes/shipped && zip -q -X -r ../../aar/classes.jar "${package//./\/}" -x '*/sample/*' '*/R.class' '*/R$*.class')
 cp -r "$module/src/main/res" jni aar
 cp "$module/consumer-rules.pro" aar/proguard.txt

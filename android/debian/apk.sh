@@ -1,13 +1,13 @@
 #!/usr/bin/env bash
-# apk.sh SOURCE BINARY: packs the sample, its classes shrunk by the module's own rules, and signs it with a key that is
-# made once for this build. A phone takes the next one over it only with the same key.
+# apk.sh SOURCE BINARY: packs the sample and signs it with a key that the first build creates. A phone installs an update
+# only if it has the same key.
 set -euo pipefail
 source=$1
 here=$(dirname "$0")
 cd "$2"
 rm -rf apk && mkdir apk
 
-# The classes for apps are whole, as tests run the APK's code; those with native methods have only the module's rules.
+# Classes with native methods are shrunk by the module's rules alone. The others are kept, because tests run them.
 python3 "$here/java_api.py" "$JDK" java_api.jar
 proguard -include "$source/android/tidemark/consumer-rules.pro" -include resources/rules.pro \
     -injars classes/shipped -outjars apk/classes.jar -libraryjars "java_api.jar:classes/platform:classes/annotations" \

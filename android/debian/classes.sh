@@ -16,11 +16,11 @@ mapfile -t users < <(java "$source"/android/{tidemark,sample}/src "$source"/{exa
 python3 "$here/classes_of_api.py" platform/api/current.txt generated "${users[@]}"
 mapfile -t api < <(java generated)
 "$JDK/bin/javac" -nowarn -Xlint:none --release 8 -d classes/platform "${api[@]}"
-# Only compilers and editors read annotations.
+# The annotations are not in the packages: only compilers and editors read them.
 mapfile -t annotations < <(java "$here/annotations")
 "$JDK/bin/javac" -Xlint:-options --release 8 -d classes/annotations "${annotations[@]}"
 
-# As Gradle does, which knows the package and the versions from its own files.
+# As Gradle does, add the package and the versions of build.gradle to the manifest.
 module=$source/android/tidemark
 sample=$source/android/sample
 sed "s/<manifest /&package=\"$(gradle_value "$sample/build.gradle" namespace)\" /" \

@@ -3,9 +3,9 @@
 
     classes_of_api.py current.txt OUTPUT SOURCE...
 
-Takes the classes that the sources import or have beside them and those which these need, and of their members the ones
-whose names occur in the sources. A method does nothing and returns nothing, zero or null; or the object that a class
-makes of itself.
+Writes the classes that the sources import or use from their own package, and the classes that these need. Of their
+members it writes those whose names occur in the sources. A method does nothing, and returns null or zero; a static
+method that returns its own class returns a new object, if that has a constructor without parameters.
 """
 import pathlib
 import re
@@ -22,7 +22,7 @@ def without_annotations(line):
     return line
 
 
-# By full name: the declaration and its members, without annotations.
+# Declarations and members without annotations, by the full name of the class.
 classes = {}
 package = None
 for line in api.read_text().splitlines():
@@ -39,7 +39,7 @@ for line in api.read_text().splitlines():
 
 
 def named(signature):
-    """The API's classes that a piece of text names."""
+    """Returns the classes of the API that a piece of text names."""
     return {name for name in re.findall(r"\b[a-z]\w*(?:\.\w+)+", signature) if name in classes}
 
 
@@ -70,7 +70,7 @@ while due - wanted:
     name = (due - wanted).pop()
     wanted.add(name)
     if " interface " in " " + classes[name][0]:
-        # What implements it has its methods.
+        # Classes that implement an interface have its methods.
         words |= {found[1] for member in classes[name][1] if (found := re.search(r"(\w+)\(", member))}
         due |= {other for seen in wanted for member in taken(seen) for other in named(member)}
     outer = name.rpartition(".")[0]

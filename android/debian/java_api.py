@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
-"""java_api.py JDK JAR: the API of Java 11, which the JDK keeps for its compiler, in class files of that version.
+"""java_api.py JDK JAR: writes the API of Java 11, which is a part of the JDK's compiler, as class files of that version.
 
-Debian's shrinker reads none as new as the JDK's own.
+Debian's shrinker cannot read the JDK's own class files, which are newer.
 """
 import sys
 import zipfile

@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# platform_source.sh PACKAGE MEGABYTES FOLDER PATTERN...: downloads one of Debian's source packages of the platform, and
-# takes the files of the patterns into FOLDER. The machine's apt configuration does not change.
+# platform_source.sh PACKAGE MEGABYTES FOLDER PATTERN...: downloads a Debian source package and extracts the files that
+# match the patterns into FOLDER. The machine's apt configuration does not change.
 set -euo pipefail
 package=$1
 megabytes=$2

@@ -1,4 +1,4 @@
-// Memory for what the host keeps in containers: the C++ runtime, whose business this is otherwise, does not come along.
+// Allocates the memory of the host's containers, because the C++ runtime, which usually does, is not linked.
 #include <cstdlib>
 #include <new>
 

@@ -1,4 +1,4 @@
-// The native methods of NativeWater.java, each of which is the host's method of that name.
+// The native methods of NativeWater.java. Each calls the method of the same name in host/live_water.h.
 #include <jni.h>
 
 #include "host/live_water.h"
@@ -9,22 +9,22 @@ using namespace tidemark;
 
 namespace {
 
-// The native part of a NativeWater. It draws with its own arrays; only the pictures belong to Java.
+// The native part of a NativeWater. Java owns only the pictures.
 struct Water {
     explicit Water(std::uint32_t seed)
-        : live({[this](PictureSlot slot, int width, int height) { handOver(slot, width, height); }, {}}, seed) {}
+        : live({[this](PictureSlot slot, int width, int height) { transfer(slot, width, height); }, {}}, seed) {}
 
-    void handOver(PictureSlot slot, int width, int height);
+    void transfer(PictureSlot slot, int width, int height);
 
     LiveWater live;
-    Look look;  // that is being put together
+    Look look;  // set by setLookValue(), used by applyLook()
 
-    // While frame() runs.
+    // Valid while frame() runs.
     JNIEnv* env = nullptr;
     jobject self = nullptr;
 };
 
-// The same for every object of the class.
+// Identifiers of the class's members, which are the same for all objects.
 jfieldID handleField;
 jmethodID pictureMethod;
 
@@ -36,12 +36,12 @@ LiveWater& liveOf(JNIEnv* env, jobject self) {
     return waterOf(env, self).live;
 }
 
-void Water::handOver(PictureSlot slot, int width, int height) {
+void Water::transfer(PictureSlot slot, int width, int height) {
     const jobject bitmap = env->CallObjectMethod(self, pictureMethod, static_cast<jint>(slot), width, height);
     if (env->ExceptionCheck() || !bitmap) return;  // the library keeps the picture that it has
-    constexpr void (*kTransfers[])(JNIEnv*, jobject, jobject) = {
+    constexpr void (*kMethods[])(JNIEnv*, jobject, jobject) = {
         native::transferPortraitBGBitmap, native::transferLandscapeBGBitmap, native::transferWaterBitmap};
-    kTransfers[static_cast<int>(slot)](env, nullptr, bitmap);
+    kMethods[static_cast<int>(slot)](env, nullptr, bitmap);
     env->DeleteLocalRef(bitmap);
 }
 
@@ -74,7 +74,7 @@ NATIVE(void, resized)(JNIEnv* env, jobject self) {
     liveOf(env, self).resized();
 }
 
-// Whether there is such a value, and it may be this one. applyLook() takes over what was set since the last time.
+// Returns false if there is no value of this name, or if it must not have this value. applyLook() uses the values.
 NATIVE(jboolean, setLookValue)(JNIEnv* env, jobject self, jstring name, jdouble value) {
     char characters[64] = {};
     const jsize length = env->GetStringUTFLength(name);
@@ -97,7 +97,7 @@ NATIVE(void, setBreezeAlways)(JNIEnv* env, jobject self, jboolean always) {
     liveOf(env, self).setBreezeAlways(always);
 }
 
-// As a colour of Android's, opaque.
+// Returns an opaque colour in Android's form, ARGB.
 NATIVE(jint, shade)(JNIEnv* env, jobject self, jint slot, jfloat brightness) {
     const Shade shade = liveOf(env, self).shade(static_cast<PictureSlot>(slot), brightness);
     const auto channel = [](float share) { return static_cast<std::uint32_t>(share * 255.0f + 0.5f); };

@@ -9,8 +9,8 @@ import javax.microedition.khronos.egl.EGLConfig;
 import javax.microedition.khronos.opengles.GL10;
 
 /**
- * The smallest host: water over a picture, with ink, drawn all the time. Its frames belong to a {@code GLSurfaceView}
- * with {@code setEGLContextClientVersion(2)}; hand everything else to its thread with {@code queueEvent}.
+ * The smallest host: water over a picture, with ink, drawn all the time. It is the renderer of a {@code GLSurfaceView} with
+ * {@code setEGLContextClientVersion(2)}. Call all other methods on its thread, with {@code queueEvent}.
  */
 public final class MinimalWater implements GLSurfaceView.Renderer {
     private static final int N = 128;  // vertices along each side of a square mesh around the view
@@ -35,7 +35,7 @@ public final class MinimalWater implements GLSurfaceView.Renderer {
     private float visibleHeight;
     private long lastStep;
 
-    /** Bitmaps of the configuration ARGB_8888; the backgrounds cropped to the proportions of the view. */
+    /** Takes bitmaps of the configuration ARGB_8888. Crop the backgrounds to the proportions of the view. */
     public MinimalWater(Bitmap portrait, Bitmap landscape, Bitmap light) {
         this.portrait = portrait;
         this.landscape = landscape;
@@ -69,21 +69,21 @@ public final class MinimalWater implements GLSurfaceView.Renderer {
         lastStep = System.nanoTime();
     }
 
-    /** The water moves 60 times a second, whatever the display does. */
+    /** Takes 60 wave steps a second, whatever the display's refresh rate. */
     @Override
     public void onDrawFrame(GL10 gl) {
         long now = System.nanoTime();
-        if (now - lastStep > 15 * STEP) lastStep = now;  // after a pause there is nothing to make up for
+        if (now - lastStep > 15 * STEP) lastStep = now;  // do not catch up after a pause
         for (; now - lastStep >= STEP; lastStep += STEP) step();
         draw();
     }
 
-    /** Lets the waves run on by one step. */
+    /** Takes one wave step. */
     public void step() {
         library.move(velocity, heights, 1, 1, N - 1, N - 1, N, N, false, DAMPING, WAVE_SPEED);
     }
 
-    /** Shows the water as it is, and moves the ink by one step. */
+    /** Draws the water, and moves the ink by one step. */
     public void draw() {
         for (int i = 0; i < N * N; ++i) {  // column by column from the left, each from the top
             heightAttribs[3 * i] = heights[i];
@@ -95,16 +95,16 @@ public final class MinimalWater implements GLSurfaceView.Renderer {
                 1.75f, 0.5f, 0.7f, 1, 0.05f, 0.15f, 0.45f, 0.8f, 4.5f, 40, width > height);
     }
 
-    /** A touch of the first finger in pixels; of the moves before a frame only the last one. */
+    /** Takes a touch of the first finger, in pixels. If it moves several times before a frame, pass the last position only. */
     public void touch(int x, int y, int action, float pressure) {
         library.onTouch(x, y, action, pressure);
         float across = (x - 0.5f * width) / width * visibleWidth;
         float down = (y - 0.5f * height) / height * visibleHeight;
-        float size = pressure * (action == 0 ? 2 : action == 2 ? 0.25f : 0);  // a finger that comes down, or moves
+        float size = pressure * (action == 0 ? 2 : action == 2 ? 0.25f : 0);  // down: 2, move: 0.25
         library.ripple(heights, EXTENT, EXTENT, N, N, down, across, size);
     }
 
-    /** For a button that clears the ink: whether there is something to clear. */
+    /** Returns whether ink is drawn, for example to enable a button that clears it. */
     public boolean showsInk() {
         return library.getClearInkValue() == 1;
     }

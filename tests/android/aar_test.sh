@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# aar_test.sh AAR SOURCE PLATFORM FOLDER: an app that has no more of the module than the AAR builds what the README
-# shows: the layout, with the platform's resources, and the Kotlin, with its classes.
+# aar_test.sh AAR SOURCE PLATFORM FOLDER: builds the README's layout and Kotlin with the AAR, as an app would, and checks
+# the AAR's libraries, resource names and rules.
 set -euo pipefail
 aar=$1
 source=$2

@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
-# apk_test.sh APK VERSION CLASSES FOLDER: the APK is signed for every Android that it is for, its libraries can be
-# mapped where they are, and nothing that the platform or a library asks for by name is missing. Leaves its parts in
-# FOLDER, the code as a jar.
+# apk_test.sh APK VERSION CLASSES FOLDER: checks the APK's signature for each supported Android, the alignment of its
+# libraries, and the names of classes and methods that the platform and the libraries look up. Unpacks the APK into FOLDER,
+# with the code as a jar.
 set -euo pipefail
 apk=$1
 version=$2
@@ -32,7 +32,7 @@ unzip -q "$apk" -d "$folder"
 [ "$(find "$folder/lib" -name '*.so' | sort | sed 's:.*/lib/::' | tr '\n' ' ')" = "$(
     printf '%s ' {arm64-v8a,armeabi-v7a,x86_64}/libTidemark{Effect,Host}.so)" ] || fail "other libraries than expected"
 ! llvm-readelf -S "$folder"/lib/*/*.so | grep -E '\.(symtab|debug)' || fail "libraries with symbols"
-# By the name of the module, so that it is Debian's Python that runs.
+# The script enjarify would use the first Python in the path, which may lack the module.
 /usr/bin/python3 -O -m enjarify.main "$folder/classes.dex" -o "$folder/classes.jar"
 
 natives() {

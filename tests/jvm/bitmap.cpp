@@ -1,4 +1,4 @@
-// libjnigraphics over the Java class that stands in for android.graphics.Bitmap.
+// libjnigraphics for the fake of android.graphics.Bitmap.
 #include <android/bitmap.h>
 
 static uint32_t side(JNIEnv* env, jobject bitmap, const char* name) {

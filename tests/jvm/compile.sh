@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# compile.sh SOURCE SHIPPED: compiles the example, the tests and what stands in for the platform, in the current folder,
-# against what android/debian compiled.
+# compile.sh SOURCE SHIPPED: compiles the example, the tests and the fakes of the platform into the current folder, with
+# the classes of android/debian in SHIPPED.
 set -euo pipefail
 source=$1
 shipped=$2

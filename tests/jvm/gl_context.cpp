@@ -1,4 +1,4 @@
-// The native half of GlContext.java: EGL on Mesa's software driver, each context with a pbuffer.
+// The native methods of GlContext.java: EGL on Mesa's software driver. Each context has a pbuffer.
 #define EGL_EGLEXT_PROTOTYPES
 #include <EGL/egl.h>
 #include <EGL/eglext.h>

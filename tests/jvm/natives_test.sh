@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# natives_test.sh JAVA HEADER: Java declares the library's native methods, by name and by the order of the parameters'
-# names. Their types are the compiler's to compare.
+# natives_test.sh JAVA HEADER: expects Java to declare the library's native methods, with parameters of the same names in
+# the same order. The compiler compares their types, in signatures.cpp.
 set -euo pipefail
 methods() {
     tr -s '\n ' ' ' | grep -oE "$1\w+\([^)]*\)" |

@@ -1,5 +1,5 @@
-// The calls of examples/minimal-java/MinimalWater.java as WholeRunTest makes it make them, in C++: writes the pictures
-// that it takes, the frames and what the library logs, for those of the Java virtual machine to be held against.
+// Makes in C++ the calls that WholeRunTest causes examples/minimal-java/MinimalWater.java to make. Writes the pictures, the
+// frames and the log to files, with which WholeRunTest compares its own.
 #include <GLES2/gl2.h>
 
 #include <algorithm>
@@ -99,7 +99,7 @@ void keep(const char* name) {
     std::vector<std::uint8_t> pixels(4 * static_cast<std::size_t>(width * height));
     glReadPixels(0, 0, width, height, GL_RGBA, GL_UNSIGNED_BYTE, pixels.data());
     write(name, pixels.data(), pixels.size());
-    if (!kept.insert(pixels).second) std::exit(1);  // shows nothing new
+    if (!kept.insert(pixels).second) std::exit(1);  // equal to an earlier frame
 }
 
 void expectInk(int shown) {

@@ -3,7 +3,7 @@ package android.graphics;
 import java.nio.Buffer;
 import java.nio.ByteBuffer;
 
-/** A picture whose bytes lie in a direct buffer, where the stand-in of libjnigraphics finds them. */
+/** A bitmap with its bytes in a direct buffer, which bitmap.cpp reads. */
 public final class Bitmap {
     public enum Config {
         RGB_565,
@@ -11,9 +11,9 @@ public final class Bitmap {
         HARDWARE
     }
 
-    /** R, G, B, A, rows from the top; null where a pixel has not four bytes that one can read. */
+    /** R, G, B, A, rows from the top; null for other configurations than ARGB_8888. */
     public final ByteBuffer pixels;
-    /** Locks of all bitmaps that are not yet undone, and those that ever were made. */
+    /** The number of locks of all bitmaps that exist now, and that were made since the start. */
     public static int locks;
     public static int locksMade;
 

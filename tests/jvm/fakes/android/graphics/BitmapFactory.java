@@ -5,7 +5,7 @@ import java.io.IOException;
 import java.io.InputStream;
 import java.util.Arrays;
 
-/** Of files that hold nothing but a colour. */
+/** Decodes files that contain a colour, as a number, into bitmaps of that colour. */
 public class BitmapFactory {
     public static class Options {
         public boolean inJustDecodeBounds;

@@ -1,6 +1,6 @@
 package android.graphics;
 
-/** Draws whole pictures, and multiplies them by an opaque colour. */
+/** Draws a part of a bitmap onto a whole one, and multiplies bitmaps by an opaque colour. */
 public class Canvas {
     private final Bitmap target;
 
@@ -21,7 +21,7 @@ public class Canvas {
         target.fill(colors);
     }
 
-    /** As the platform's filter, which takes four pixels for one, however many there are. */
+    /** Averages four pixels for each new one, whatever the scale, as the platform's filter does. */
     public void drawBitmap(Bitmap source, Rect part, Rect whole, Paint paint) {
         if (source.isRecycled()) throw new IllegalStateException("recycled");
         if (source.getConfig() == Bitmap.Config.HARDWARE) throw new IllegalArgumentException("hardware");

@@ -1,6 +1,6 @@
 package android.opengl;
 
-/** EGL over the driver of a test, with one configuration. */
+/** EGL with one configuration, on the driver that a test sets. */
 public class EGL14 {
     public interface Driver {
         long createContext();
@@ -71,7 +71,7 @@ public class EGL14 {
         return driver.swapBuffers();
     }
 
-    /** Only what a lost context leaves. */
+    /** Returns the error of a lost context. */
     public static int eglGetError() {
         return 0x300e;
     }

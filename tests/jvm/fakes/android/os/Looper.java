@@ -3,7 +3,7 @@ package android.os;
 import java.util.concurrent.BlockingQueue;
 import java.util.concurrent.LinkedBlockingQueue;
 
-/** The calls that wait for a thread. */
+/** The queue of calls for a thread. */
 public final class Looper {
     private static final Looper MAIN = new Looper();
     private static final ThreadLocal<Looper> MINE = new ThreadLocal<>();
@@ -18,7 +18,7 @@ public final class Looper {
         return MINE.get();
     }
 
-    /** The main thread is a test's: makes the calls that wait for it, and says whether there were any. */
+    /** Makes the calls for the main thread, which is the thread of the test. Returns false if there were none. */
     public static boolean runMain() {
         boolean any = false;
         for (Runnable call; (call = MAIN.calls.poll()) != null; any = true) call.run();

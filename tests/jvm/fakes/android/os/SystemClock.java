@@ -1,6 +1,6 @@
 package android.os;
 
-/** A clock that a test moves on. */
+/** A clock that a test sets. */
 public final class SystemClock {
     public static volatile long nanos;
 

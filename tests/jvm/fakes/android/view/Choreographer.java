@@ -7,7 +7,7 @@ import java.util.HashMap;
 import java.util.Map;
 import java.util.concurrent.ConcurrentHashMap;
 
-/** Of a display that refreshes when a test says so. */
+/** The refresh of a display, which a test triggers. */
 public final class Choreographer {
     public interface FrameCallback {
         void doFrame(long frameTimeNanos);
@@ -24,7 +24,7 @@ public final class Choreographer {
         awaiting.put(callback, Looper.myLooper());
     }
 
-    /** Whether somebody awaited it. */
+    /** Posts the callbacks. Returns false if there are none. */
     public static boolean refresh(long nanos) {
         Map<FrameCallback, Looper> called = new HashMap<>(DISPLAY.awaiting);
         called.forEach((callback, looper) -> {

@@ -2,7 +2,7 @@ package android.view;
 
 import android.os.SystemClock;
 
-/** A touch whose parts a test fills in; [finger][position], the current position last. */
+/** A touch event of a test. Its positions are indexed by finger and time; the last one is current. */
 public final class MotionEvent {
     public static final int ACTION_DOWN = 0;
     public static final int ACTION_UP = 1;
@@ -14,7 +14,7 @@ public final class MotionEvent {
     public static final int TOOL_TYPE_FINGER = 1;
     public static final int TOOL_TYPE_STYLUS = 2;
 
-    /** Of all fingers; each position is a millisecond later than the one before. */
+    /** The tool of all fingers. */
     public int toolType = TOOL_TYPE_FINGER;
 
     private final int action;
@@ -84,6 +84,7 @@ public final class MotionEvent {
         return getHistoricalEventTime(getHistorySize());
     }
 
+    /** Each position is a millisecond later than the one before. */
     public long getHistoricalEventTime(int position) {
         return SystemClock.uptimeMillis() + position;
     }

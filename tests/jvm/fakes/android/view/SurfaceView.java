@@ -6,7 +6,7 @@ import android.graphics.SurfaceTexture;
 import java.lang.reflect.Proxy;
 
 public class SurfaceView extends View {
-    /** What the view last asked for. */
+    /** The last size of setFixedSize(). */
     public static String sizeSet;
     private static final Surface SURFACE = new Surface((SurfaceTexture) null);
 

@@ -11,11 +11,11 @@ import org.junit.Test;
 import java.util.ArrayList;
 import java.util.List;
 
-/** What the water takes of the touches of several fingers. */
+/** The touches of the first of several fingers. */
 public final class FirstFingerTest {
-    private final List<String> heard = new ArrayList<>();
+    private final List<String> touches = new ArrayList<>();
     private final FirstFinger finger =
-            new FirstFinger((action, x, y, isStylus, pressure, time) -> heard.add(
+            new FirstFinger((action, x, y, isStylus, pressure, time) -> touches.add(
                     action + " " + x + " " + y + (isStylus ? " pen " : " ") + pressure + " " + time));
 
     @Before
@@ -32,14 +32,14 @@ public final class FirstFingerTest {
         finger.follow(moves);
         follow(MotionEvent.ACTION_UP, 0, new int[] {7}, at(13, 23));
         assertEquals(List.of("0 10.4 20.6 1.0 0", "2 11.0 21.0 pen 0.1 0", "2 12.0 22.0 pen 0.2 1",
-                "2 13.0 23.0 pen 0.3 2", "1 13.0 23.0 1.0 0"), heard);
+                "2 13.0 23.0 pen 0.3 2", "1 13.0 23.0 1.0 0"), touches);
     }
 
     @Test
     public void otherFingersAreIgnored() {
         follow(MotionEvent.ACTION_DOWN, 0, new int[] {0}, at(1, 2));
         follow(MotionEvent.ACTION_POINTER_DOWN, 1, new int[] {0, 1}, at(1, 2), at(50, 60));
-        // The first finger need not be the first of an event, and it may leave before the others.
+        // The first finger may have any index in an event, and may be lifted before the others.
         follow(MotionEvent.ACTION_MOVE, 0, new int[] {1, 0}, at(51, 61), at(3, 4));
         follow(MotionEvent.ACTION_POINTER_UP, 0, new int[] {1, 0}, at(51, 61), at(3, 4));
         follow(MotionEvent.ACTION_HOVER_MOVE, 0, new int[] {0}, at(9, 9));
@@ -47,11 +47,11 @@ public final class FirstFingerTest {
         follow(MotionEvent.ACTION_MOVE, 0, new int[] {1}, at(53, 63));
         follow(MotionEvent.ACTION_UP, 0, new int[] {1}, at(53, 63));
         follow(MotionEvent.ACTION_DOWN, 0, new int[] {0}, at(8, 9));
-        assertEquals(List.of("0 1.0 2.0 1.0 0", "2 3.0 4.0 1.0 0", "1 5.0 6.0 1.0 0", "0 8.0 9.0 1.0 0"), heard);
+        assertEquals(List.of("0 1.0 2.0 1.0 0", "2 3.0 4.0 1.0 0", "1 5.0 6.0 1.0 0", "0 8.0 9.0 1.0 0"), touches);
     }
 
     @Test
-    public void anEndComesOnceAndOnlyInATouch() {
+    public void aTouchEndsOnce() {
         finger.lift();
         follow(MotionEvent.ACTION_DOWN, 0, new int[] {0}, at(1, 2));
         finger.lift();
@@ -60,7 +60,7 @@ public final class FirstFingerTest {
         follow(MotionEvent.ACTION_DOWN, 0, new int[] {0}, at(1, 2));
         follow(MotionEvent.ACTION_CANCEL, 0, new int[] {0}, at(3, 4));
         finger.lift();
-        assertEquals(List.of("0 1.0 2.0 1.0 0", "1 1.0 2.0 0.0 0", "0 1.0 2.0 1.0 0", "3 1.0 2.0 0.0 0"), heard);
+        assertEquals(List.of("0 1.0 2.0 1.0 0", "1 1.0 2.0 0.0 0", "0 1.0 2.0 1.0 0", "3 1.0 2.0 0.0 0"), touches);
     }
 
     private void follow(int action, int actionIndex, int[] ids, float[][]... positions) {

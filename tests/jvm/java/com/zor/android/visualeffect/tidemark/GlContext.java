@@ -12,7 +12,7 @@ final class GlContext {
 
     private GlContext() {}
 
-    /** A new context, current on this thread, with a framebuffer of this size. */
+    /** Creates a context with a framebuffer of this size and makes it current on this thread. */
     static void open(int width, int height) {
         release();
         context = create(width, height);
@@ -25,7 +25,7 @@ final class GlContext {
         context = 0;
     }
 
-    /** R, G, B, A, rows from the bottom. */
+    /** Returns the bytes R, G, B, A of the framebuffer, rows from the bottom. */
     static byte[] pixels(int width, int height) {
         ByteBuffer buffer = ByteBuffer.allocateDirect(4 * width * height);
         readPixels(width, height, buffer);
@@ -34,10 +34,10 @@ final class GlContext {
         return pixels;
     }
 
-    /** What the library has logged since the last call, a line each. */
+    /** Returns the lines that the library has logged since the last call. */
     static native String takeLog();
 
-    /** Of the current context. */
+    /** Counts the GL objects of the current context. */
     static native int countObjects();
 
     static native long create(int width, int height);

@@ -11,10 +11,10 @@ import java.io.ByteArrayOutputStream;
 import java.io.IOException;
 import java.util.Properties;
 
-/** Looks as files, and what they refuse. */
+/** Looks as files, invalid values, and presets. */
 public final class LookTest {
     @Test
-    public void everyValueComesBackFromItsFile() throws IOException {
+    public void everyValueCanBeStoredAndLoaded() throws IOException {
         Properties limits = new Properties();
         new Look().forEach((name, value, least, most, isWhole) -> {
             limits.setProperty(name, isWhole ? Integer.toString((int) most) : Float.toString((float) most));
@@ -27,7 +27,7 @@ public final class LookTest {
     }
 
     @Test
-    public void aWrongValueIsNamed() {
+    public void anInvalidValueIsNamed() {
         for (String text : new String[] {"damping = 1.001", "damping = -0.001", "damping = 0.9f", "damping = NaN",
                 "meshVertices = 2.5", "meshVertices = 257", "dampening = 0.9"}) {
             String key = text.substring(0, text.indexOf(' '));

@@ -12,13 +12,13 @@ import android.view.Choreographer;
 
 import java.util.concurrent.CountDownLatch;
 
-// What lies below the views: a display without a screen, of up to 160 x 160 pixels, and the threads.
+// The display of the tests, without a screen and with up to 160 x 160 pixels, and the threads of the views.
 final class Screen {
     static volatile int refreshRate = 60;
     static volatile int width, height;
     static volatile int frames;  // shown so far
-    static volatile byte[] pixels;  // of the last one: R, G, B, A, rows from the bottom
-    static volatile boolean isLost;  // the context, as the next frame is shown
+    static volatile byte[] pixels;  // of the last frame: R, G, B, A, rows from the bottom
+    static volatile boolean isLost;  // the next frame loses the context
     static ComponentCallbacks2 process;
 
     static {
@@ -61,7 +61,7 @@ final class Screen {
         });
     }
 
-    // Until no thread has anything to do.
+    // Waits until no thread has anything to do.
     static void settle() {
         do {
             CountDownLatch decoded = new CountDownLatch(1);
@@ -75,7 +75,7 @@ final class Screen {
         } while (Looper.runMain());
     }
 
-    // Lets the display refresh until a frame is shown, and says whether any was wanted.
+    // Refreshes the display until a frame is shown. Returns false if no view requests a refresh.
     static boolean refreshUntilFrame() {
         int before = frames;
         do {

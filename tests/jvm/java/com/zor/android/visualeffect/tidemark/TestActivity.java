@@ -8,7 +8,7 @@ import java.io.ByteArrayInputStream;
 import java.io.InputStream;
 import java.nio.ByteBuffer;
 
-// On a display of two pixels each; its resources are pictures of the colours that their numbers are.
+// Its display has two pixels for a density-independent one. The number of a resource is the colour of its picture.
 final class TestActivity extends Activity {
     static final int NO_PICTURE = 0x10203;
 

@@ -14,7 +14,7 @@ import java.nio.ByteBuffer;
 import java.nio.file.Files;
 import java.nio.file.Path;
 
-/** The smallest host draws and logs, byte for byte, what the same calls do in C++. */
+/** Pictures and log lines of the smallest host are equal to those of the same calls in C++, byte for byte. */
 public final class WholeRunTest {
     private final Path reference = Path.of(System.getProperty("reference"));
     private MinimalWater water;
@@ -22,11 +22,11 @@ public final class WholeRunTest {
     private int height;
 
     @Test
-    public void javaGetsWhatCppGets() throws IOException {
+    public void picturesAndLogAreThoseOfCpp() throws IOException {
         GlContext.takeLog();
         water = new MinimalWater(picture("portrait", 90, 160), picture("landscape", 160, 90), picture("light", 64, 64));
         surface(90, 160);
-        water.onDrawFrame(null);  // within a step
+        water.onDrawFrame(null);  // before the first step is due
         expectFrame("still");
         water.touch(30, 40, 0, 1);
         for (int i = 1; i <= 30; ++i) {
@@ -65,7 +65,7 @@ public final class WholeRunTest {
     }
 
     private void expectFrame(String name) throws IOException {
-        System.gc();  // moves the young arrays
+        System.gc();  // moves arrays in memory
         assertArrayEquals(name, Files.readAllBytes(reference.resolve(name)), GlContext.pixels(width, height));
     }
 

@@ -12,11 +12,11 @@ import org.junit.Test;
 import java.util.ArrayList;
 import java.util.List;
 
-/** Where the native library is missing, as in a layout editor and in an app's own tests on a desktop. */
+/** A view without the native library, as in an app's own tests on a desktop. */
 public final class WithoutLibraryTest {
     @Test
-    public void onlyTheFirstSurfaceMissesTheLibrary() {
-        List<String> heard = new ArrayList<>();
+    public void onlyTheFirstSurfaceNeedsTheLibrary() {
+        List<String> failures = new ArrayList<>();
         TidemarkView view = new TidemarkView(new TestActivity());
         view.setInk(true);
         view.drop(1, 2);
@@ -28,9 +28,9 @@ public final class WithoutLibraryTest {
         view.setListener(new TidemarkListener() {
             @Override
             public void onFailure(Failure failure, String message) {
-                heard.add(failure.name());
+                failures.add(failure.name());
             }
         });
-        assertEquals(List.of("NO_LIBRARY"), heard);
+        assertEquals(List.of("NO_LIBRARY"), failures);
     }
 }

@@ -36,7 +36,7 @@ public final class MainActivity extends Activity {
         });
     }
 
-    // The water has its saved state by now.
+    // The water has restored its state before this call.
     @Override
     protected void onPostCreate(Bundle savedState) {
         super.onPostCreate(savedState);

@@ -8,7 +8,7 @@ import android.net.Uri;
 import android.os.Bundle;
 import android.widget.CompoundButton;
 
-/** Picture, ink and rain of the wallpaper, which follows at once. */
+/** The settings of the wallpaper: picture, ink and rain. A change takes effect at once. */
 public final class WallpaperSettings extends Activity {
     static final String INK = "ink";
     static final String RAIN = "rain";
@@ -18,7 +18,7 @@ public final class WallpaperSettings extends Activity {
         return context.getSharedPreferences("wallpaper", MODE_PRIVATE);
     }
 
-    /** The user's picture; null for the pebbles. */
+    /** Returns the user's picture, or null for the pebbles. */
     static Uri picture(Context context) {
         String address = of(context).getString(PICTURE, null);
         return address == null ? null : Uri.parse(address);

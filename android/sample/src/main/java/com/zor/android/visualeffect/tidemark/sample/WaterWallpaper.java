@@ -9,7 +9,7 @@ import android.view.SurfaceHolder;
 
 import com.zor.android.visualeffect.tidemark.TidemarkView;
 
-/** Water as a live wallpaper. Of the wallpaper and its preview the one that was shown last draws. */
+/** Water as a live wallpaper. If the wallpaper and its preview are visible, the newer one draws. */
 public final class WaterWallpaper extends WallpaperService {
     @Override
     public Engine onCreateEngine() {

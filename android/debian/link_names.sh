@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# link_names.sh TRIPLE DIRECTORY: builds libraries to link with, which define the names of Android's libraries at API level
-# 21 that our libraries may use. No name is of the C++ runtime.
+# link_names.sh TRIPLE DIRECTORY: builds libraries to link with, which define the names of Android's libraries at API
+# level 21 that our libraries may use. No name is of the C++ runtime.
 set -euo pipefail
 triple=$1
 mkdir -p "$2"

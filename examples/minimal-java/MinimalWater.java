@@ -9,8 +9,8 @@ import javax.microedition.khronos.egl.EGLConfig;
 import javax.microedition.khronos.opengles.GL10;
 
 /**
- * The smallest host: water over a picture, with ink, drawn all the time. It is the renderer of a {@code GLSurfaceView} with
- * {@code setEGLContextClientVersion(2)}. Call all other methods on its thread, with {@code queueEvent}.
+ * The smallest host: water over a picture, with ink, drawn all the time. It is the renderer of a {@code GLSurfaceView}
+ * with {@code setEGLContextClientVersion(2)}. Call all other methods on its thread, with {@code queueEvent}.
  */
 public final class MinimalWater implements GLSurfaceView.Renderer {
     private static final int N = 128;  // vertices along each side of a square mesh around the view
@@ -95,7 +95,7 @@ public final class MinimalWater implements GLSurfaceView.Renderer {
                 1.75f, 0.5f, 0.7f, 1, 0.05f, 0.15f, 0.45f, 0.8f, 4.5f, 40, width > height);
     }
 
-    /** Takes a touch of the first finger, in pixels. If it moves several times before a frame, pass the last position only. */
+    /** Takes a touch of the first finger, in pixels. Of several moves before a frame, pass the last one only. */
     public void touch(int x, int y, int action, float pressure) {
         library.onTouch(x, y, action, pressure);
         float across = (x - 0.5f * width) / width * visibleWidth;

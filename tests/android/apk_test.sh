@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
 # apk_test.sh APK VERSION CLASSES FOLDER: checks the APK's signature for each supported Android, the alignment of its
-# libraries, and the names of classes and methods that the platform and the libraries look up. Unpacks the APK into FOLDER,
-# with the code as a jar.
+# libraries, and the names of classes and methods that the platform and the libraries look up. Unpacks the APK into
+# FOLDER, with the code as a jar.
 set -euo pipefail
 apk=$1
 version=$2

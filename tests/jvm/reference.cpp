@@ -1,5 +1,5 @@
-// Makes in C++ the calls that WholeRunTest causes examples/minimal-java/MinimalWater.java to make. Writes the pictures, the
-// frames and the log to files, with which WholeRunTest compares its own.
+// Makes in C++ the calls that WholeRunTest causes examples/minimal-java/MinimalWater.java to make. Writes the pictures,
+// the frames and the log to files, with which WholeRunTest compares its own.
 #include <GLES2/gl2.h>
 
 #include <algorithm>

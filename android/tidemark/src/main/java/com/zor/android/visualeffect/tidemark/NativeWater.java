@@ -79,44 +79,24 @@ final class NativeWater {
     }
 
     private static native long create(int seed);
-
     private native void destroy();
-
     native void setView(double width, double height, double density, double now);
-
     native void setQuality(int quality);
-
     native int width();
-
     native int height();
-
     native void resized();
-
     private native boolean setLookValue(String name, double value);
-
     private native void applyLook();
-
     native void setInk(boolean withInk);
-
     native void setRain(boolean falling);
-
     native void setBreezeAlways(boolean always);
-
     private native int shade(int slot, float brightness);
-
     native void clearInk();
-
     native void touch(int action, float x, float y, boolean isStylus, float pressure, double time);
-
     native void splash(float x, float y, float weight, boolean withInk);
-
     private native void picturesChanged(int which);
-
     native void redraw();
-
     native void renewContext();
-
     native int frame(double now);
-
     native double due();
 }

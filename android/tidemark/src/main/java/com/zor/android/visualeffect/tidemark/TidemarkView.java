@@ -503,8 +503,11 @@ public class TidemarkView extends FrameLayout {
     }
 
     private void setWindow(Object window, int width, int height) {
-        if (window == null) touches.lift();
-        if (window != null) settings.updateReduced(context);
+        if (window == null) {
+            touches.lift();
+        } else {
+            settings.updateReduced(context);
+        }
         renderer.setWindow(context, window, width, height, settings);
         if (earlyDrop == null || !renderer.isStarted()) return;
         earlyDrop.run();

@@ -10,7 +10,7 @@ import android.widget.Toast;
 import com.zor.android.visualeffect.tidemark.TidemarkListener;
 import com.zor.android.visualeffect.tidemark.TidemarkView;
 
-/** Water over pebbles or a picture of the user's choice, with switches. */
+/** Water over a tiled pool or a picture of the user's choice, with switches. */
 public final class MainActivity extends Activity {
     private TidemarkView water;
     private CompoundButton ink;

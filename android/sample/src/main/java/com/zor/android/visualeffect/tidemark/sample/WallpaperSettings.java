@@ -18,7 +18,7 @@ public final class WallpaperSettings extends Activity {
         return context.getSharedPreferences("wallpaper", MODE_PRIVATE);
     }
 
-    /** Returns the user's picture, or null for the pebbles. */
+    /** Returns the user's picture, or null for the pool. */
     static Uri picture(Context context) {
         String address = of(context).getString(PICTURE, null);
         return address == null ? null : Uri.parse(address);

@@ -69,7 +69,7 @@ public final class WaterWallpaper extends WallpaperService {
             if (picture != null) {
                 water.setPicture(picture);
             } else {
-                water.setPictures(R.drawable.pebbles_tall, R.drawable.pebbles, 0);
+                water.setPictures(R.drawable.pool_tall, R.drawable.pool, 0);
             }
         }
     }

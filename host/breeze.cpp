@@ -1,7 +1,10 @@
 #include "host/breeze.h"
 
 #include <cmath>
-#include <utility>
+#include <cstddef>
+#include <iterator>
+
+#include "base/groups.h"
 
 namespace tidemark {
 
@@ -17,47 +20,63 @@ constexpr Course kCourses[] = {{0.43, 0.35}, {0.29, 1.21}, {0.197, -0.42}, {0.14
 constexpr double kTurn = 6.283185307179586;
 constexpr double kSlowest = 0.23;  // turns a second of the longest wave; shorter ones are faster, as on deep water
 
-double totalLength() {
+constexpr double totalLength() {
     double sum = 0.0;
     for (const Course& course : kCourses) sum += course.length;
     return sum;
 }
 
+// The share of a wave in the height of all. All waves are equally steep.
+constexpr float share(const Course& course) {
+    return static_cast<float>(course.length / totalLength());
+}
+
 }  // namespace
 
-// All waves are equally steep.
-Breeze::Breeze(const WaveLattice& lattice) {
-    for (const auto [length, direction] : kCourses) {
-        const double k = kTurn * lattice.cell / length;
-        Wave wave = {
-            k * std::cos(direction),
-            kTurn * kSlowest * std::sqrt(kCourses[0].length / length),
-            static_cast<float>(length / totalLength()),
-            {},
-            {}};
-        for (int row = 0; row < lattice.points; ++row) {
-            const double phase = k * std::sin(direction) * row;
-            wave.cosines.push_back(static_cast<float>(std::cos(phase)));
-            wave.sines.push_back(static_cast<float>(std::sin(phase)));
+Breeze::Breeze(const WaveLattice& lattice) : points_(lattice.points) {
+    static_assert(std::size(kCourses) == kWaves);
+    const auto turn = [&](const Course& course) { return kTurn * lattice.cell / course.length; };
+    for (int column = 0; column < points_; ++column) {
+        for (const Course& course : kCourses) {
+            const double phase = turn(course) * std::cos(course.direction) * column;
+            columns_.push_back({std::cos(phase), std::sin(phase)});
         }
-        waves_.push_back(std::move(wave));
+    }
+    for (const Course& course : kCourses) {
+        for (int row = 0; row < points_; ++row) {
+            const double phase = turn(course) * std::sin(course.direction) * row;
+            cosines_.push_back(static_cast<float>(std::cos(phase)));
+            sines_.push_back(static_cast<float>(std::sin(phase)));
+        }
     }
 }
 
 void Breeze::blow(float height, double time) {
     height_ = height;
-    time_ = time;
+    for (int i = 0; i < kWaves; ++i) {
+        const double speed = kTurn * kSlowest * std::sqrt(kCourses[0].length / kCourses[i].length);
+        now_[i] = {std::cos(speed * time), std::sin(speed * time)};
+    }
 }
 
 void Breeze::add(int column, int row, int count, float* heights) const {
-    for (const Wave& wave : waves_) {
-        const double phase = wave.turn * column - wave.speed * time_;
-        const float c = height_ * wave.share * static_cast<float>(std::cos(phase));
-        const float s = height_ * wave.share * static_cast<float>(std::sin(phase));
-        const float* const cosines = wave.cosines.data() + row;
-        const float* const sines = wave.sines.data() + row;
-        for (int i = 0; i < count; ++i) heights[i] += c * cosines[i] - s * sines[i];
+    float c[kWaves], s[kWaves];
+    for (int i = 0; i < kWaves; ++i) {
+        const Angle& place = columns_[static_cast<std::size_t>(column * kWaves + i)];
+        const Angle& now = now_[i];
+        c[i] = height_ * share(kCourses[i]) * static_cast<float>(place.cosine * now.cosine + place.sine * now.sine);
+        s[i] = height_ * share(kCourses[i]) * static_cast<float>(place.sine * now.cosine - place.cosine * now.sine);
     }
+    const int points = points_;
+    const float* const cosines = cosines_.data() + row;
+    const float* const sines = sines_.data() + row;
+    forGroups(0, count, [=]<class F>(F, int r) {
+        F h = load<F>(heights + r);
+        for (int i = 0; i < kWaves; ++i) {
+            h = h + (c[i] * load<F>(cosines + i * points + r) - s[i] * load<F>(sines + i * points + r));
+        }
+        store(h, heights + r);
+    });
 }
 
 }  // namespace tidemark

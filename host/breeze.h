@@ -19,14 +19,18 @@ public:
     void add(int column, int row, int count, float* heights) const;
 
 private:
-    struct Wave {
-        double turn, speed;                 // of the phase: a column to the right, a second
-        float share;                        // of the height
-        std::vector<float> cosines, sines;  // of the phase, row by row
+    static constexpr int kWaves = 5;
+
+    // The phase of a wave is the phase of its column plus that of its row minus that of the time. Sums of angles are
+    // taken from the cosines and sines of the parts, so that a frame computes those of the time only.
+    struct Angle {
+        double cosine, sine;
     };
-    std::vector<Wave> waves_;
+    int points_;
+    std::vector<Angle> columns_;          // kWaves a column
+    std::vector<float> cosines_, sines_;  // of the rows, wave by wave
+    Angle now_[kWaves] = {};
     float height_ = 0.0f;
-    double time_ = 0.0;
 };
 
 }  // namespace tidemark

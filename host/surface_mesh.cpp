@@ -1,73 +1,72 @@
 #include "host/surface_mesh.h"
 
 #include <algorithm>
-#include <cmath>
 #include <cstddef>
+#include <cstring>
+
+#include "base/float4.h"
 
 namespace tidemark {
 
 namespace {
 
+// Rows and columns are computed in groups of four.
+constexpr int kGroup = 4;
+
+// Columns of the lattice that are kept: a vertex takes five, and they are read in groups.
+constexpr int kKept = 8;
+
+// Points that are read above the one whose cell a vertex is in; beyond the edge they repeat its height.
+constexpr int kAbove = 2;
+
+typedef short short8 __attribute__((vector_size(16)));
+
 std::ptrdiff_t at(int line, int length) {
     return std::ptrdiff_t{line} * length;
 }
 
-// Lines are turned in groups of four.
-int padded(int lines) {
-    return (lines + 3) / 4 * 4;
+int padded(int count) {
+    return (count + kGroup - 1) / kGroup * kGroup;
 }
 
 std::vector<float> field(int lines, int length) {
     return std::vector<float>(static_cast<std::size_t>(at(lines, length)));
 }
 
-void advance(const float* heights, const float* velocity, float since, int count, float* __restrict out) {
-    for (int i = 0; i < count; ++i) out[i] = heights[i] + since * velocity[i];
+// Makes four columns of four rows, or rows of columns.
+inline void turn(float4 (&lines)[kGroup]) {
+    const float4 firstTop = __builtin_shufflevector(lines[0], lines[1], 0, 4, 1, 5);
+    const float4 lastTop = __builtin_shufflevector(lines[0], lines[1], 2, 6, 3, 7);
+    const float4 firstBottom = __builtin_shufflevector(lines[2], lines[3], 0, 4, 1, 5);
+    const float4 lastBottom = __builtin_shufflevector(lines[2], lines[3], 2, 6, 3, 7);
+    lines[0] = __builtin_shufflevector(firstTop, firstBottom, 0, 1, 4, 5);
+    lines[1] = __builtin_shufflevector(firstTop, firstBottom, 2, 3, 6, 7);
+    lines[2] = __builtin_shufflevector(lastTop, lastBottom, 0, 1, 4, 5);
+    lines[3] = __builtin_shufflevector(lastTop, lastBottom, 2, 3, 6, 7);
 }
 
-// Makes columns of rows, or rows of columns.
-void turn(const float* __restrict in, int lines, int length, float* __restrict out) {
-    for (int line = 0; line < lines; line += 4) {
-        for (int i = 0; i < length; ++i) {
-            for (int k = 0; k < 4; ++k) out[at(i, lines) + line + k] = in[at(line + k, length) + i];
-        }
-    }
+inline float4 everywhere(float value) {
+    return float4{value, value, value, value};
 }
 
-// One line of values between the lines `cell` and `cell` + 1; beyond the edge the last line goes on.
-void blend(const std::vector<float>& lines, int length, int cell, const float* weights, float* __restrict out) {
-    const int last = static_cast<int>(lines.size()) / length - 1;
-    const auto line = [&](int i) { return lines.data() + at(std::clamp(i, 0, last), length); };
-    const float* const a = line(cell - 1);
-    const float* const b = line(cell);
-    const float* const c = line(cell + 1);
-    const float* const d = line(cell + 2);
-    const float wa = weights[0];
-    const float wb = weights[1];
-    const float wc = weights[2];
-    const float wd = weights[3];
-    for (int i = 0; i < length; ++i) out[i] = wa * a[i] + wb * b[i] + wc * c[i] + wd * d[i];
+struct Weights {
+    explicit Weights(const float (&w)[4])
+        : a(everywhere(w[0])), b(everywhere(w[1])), c(everywhere(w[2])), d(everywhere(w[3])) {}
+    float4 a, b, c, d;
+};
+
+inline float4 blend(const Weights& w, float4 a, float4 b, float4 c, float4 d) {
+    return w.a * a + w.b * b + w.c * c + w.d * d;
 }
 
-void interleave(
-    const float* __restrict a, const float* __restrict b, const float* __restrict c, int count, float* __restrict out) {
-    for (int i = 0; i < count; ++i) {
-        out[3 * i] = a[i];
-        out[3 * i + 1] = b[i];
-        out[3 * i + 2] = c[i];
-    }
-}
-
-// The product of both slopes of each vertex.
-void multiplySlopes(
-    const float* __restrict h, const float* __restrict right, const float* __restrict upper, int count,
-    float* __restrict out) {
-    for (int i = 0; i < count; ++i) out[i] = (h[i] - right[i]) * (h[i] - upper[i]);
-}
-
-// Of each cell between two columns: 1 where its waves run to the lower right or the upper left, else 0.
-void compareSlopes(const float* __restrict left, const float* __restrict right, int count, int* __restrict out) {
-    for (int i = 0; i < count; ++i) out[i] = std::signbit(left[i] + left[i + 1] + right[i] + right[i + 1]);
+// Writes three values a vertex, and one value more after the fourth vertex.
+inline void interleave(float4 a, float4 b, float4 c, float* out) {
+    const float4 firstTwo = __builtin_shufflevector(a, b, 0, 4, 1, 5);
+    const float4 lastTwo = __builtin_shufflevector(a, b, 2, 6, 3, 7);
+    store(__builtin_shufflevector(firstTwo, c, 0, 1, 4, 4), out);
+    store(__builtin_shufflevector(firstTwo, c, 2, 3, 5, 5), out + 3);
+    store(__builtin_shufflevector(lastTwo, c, 0, 1, 6, 6), out + 6);
+    store(__builtin_shufflevector(lastTwo, c, 2, 3, 7, 7), out + 9);
 }
 
 }  // namespace
@@ -93,14 +92,14 @@ SurfaceMesh::Axis SurfaceMesh::axis(int points, int vertices, double share) {
 
 SurfaceMesh::SurfaceMesh(int points, int vertices, double width, double height)
     : points_(points), columns_(axis(points, vertices, width)), rows_(axis(points, vertices, height)) {
-    const int columns = padded(columns_.points);
+    const int column = padded(rows_.points);
     const int rows = padded(rows_.seen.count);
-    lattice_ = field(columns, rows_.points);
-    latticeRows_ = field(rows_.points, columns);
-    ownRows_ = upperRows_ = field(rows, columns);
-    own_ = upper_ = field(columns, rows);
-    heights_ = rights_ = uppers_ = slopes_ = slopesBefore_ = field(1, rows);
-    turned_.resize(heights_.size());
+    rows_.places.resize(static_cast<std::size_t>(rows), rows_.places.back());
+    read_ = field(kGroup, column);
+    readRows_ = field(kAbove + column + 1, kGroup);
+    own_ = upper_ = field(kKept, rows);
+    lastColumn_ = field(1, 3 * rows + 1);
+    slopes_ = slopesBefore_ = field(1, rows + 1);
 }
 
 void SurfaceMesh::layCells(std::int16_t* indices) const {
@@ -116,51 +115,136 @@ void SurfaceMesh::layCells(std::int16_t* indices) const {
     }
 }
 
-// Chooses the diagonals of the cells that end at a column of the mesh.
+// Reads four columns of the lattice; beyond the edge the last one goes on.
+void SurfaceMesh::readColumns(
+    int first, const float* heights, const float* velocity, float since, const Breeze* breeze) {
+    const int points = rows_.points;
+    const int length = padded(points);
+    for (int k = 0; k < kGroup; ++k) {
+        const int column = columns_.from + std::min(first + k, columns_.points - 1);
+        const float* const h = heights + at(column, points_) + rows_.from;
+        const float* const v = velocity + at(column, points_) + rows_.from;
+        float* const __restrict line = read_.data() + at(k, length);
+        for (int i = 0; i < points; ++i) line[i] = h[i] + since * v[i];
+        if (breeze) breeze->add(column, rows_.from, points, line);
+    }
+    float* const rows = readRows_.data() + kAbove * kGroup;
+    for (int i = 0; i < points; i += kGroup) {
+        float4 lines[kGroup];
+        for (int k = 0; k < kGroup; ++k) lines[k] = load<float4>(read_.data() + at(k, length) + i);
+        turn(lines);
+        for (int k = 0; k < kGroup; ++k) store(lines[k], rows + (i + k) * kGroup);
+    }
+    for (int i = 1; i <= kAbove; ++i) std::copy_n(rows, kGroup, rows - i * kGroup);
+    std::copy_n(rows + (points - 1) * kGroup, kGroup, rows + points * kGroup);
+}
+
+// Blends the rows of those four columns.
+void SurfaceMesh::blendRows(int first) {
+    const int rows = padded(rows_.seen.count);
+    float* const own = own_.data() + at(first % kKept, rows);
+    float* const upper = upper_.data() + at(first % kKept, rows);
+    const float* const readRows = readRows_.data();
+    const Place* const places = rows_.places.data();
+    for (int r = 0; r < rows; r += kGroup) {
+        float4 owns[kGroup], uppers[kGroup];
+        for (int k = 0; k < kGroup; ++k) {
+            const Place& place = places[r + k];
+            const float* const around = readRows + place.cell * kGroup;  // from two cells above on
+            const float4 a = load<float4>(around);
+            const float4 b = load<float4>(around + kGroup);
+            const float4 c = load<float4>(around + 2 * kGroup);
+            const float4 d = load<float4>(around + 3 * kGroup);
+            const Weights weights(place.weights);
+            owns[k] = blend(weights, b, c, d, load<float4>(around + 4 * kGroup));
+            uppers[k] = blend(weights, a, b, c, d);
+        }
+        turn(owns);
+        turn(uppers);
+        for (int k = 0; k < kGroup; ++k) {
+            store(owns[k], own + k * rows + r);
+            store(uppers[k], upper + k * rows + r);
+        }
+    }
+}
+
+// Writes one value beyond the column's padding.
+void SurfaceMesh::blendColumn(const Place& place, float* attribs) {
+    const int rows = padded(rows_.seen.count);
+    const auto line = [&](const std::vector<float>& lines, int i) {
+        return lines.data() + at(std::clamp(place.cell + i, 0, columns_.points - 1) % kKept, rows);
+    };
+    const float* const own[] = {line(own_, -1), line(own_, 0), line(own_, 1), line(own_, 2), line(own_, 3)};
+    const float* const upper[] = {line(upper_, -1), line(upper_, 0), line(upper_, 1), line(upper_, 2)};
+    const Weights weights(place.weights);
+    float* const slopes = slopes_.data();
+    for (int r = 0; r < rows; r += kGroup) {
+        const float4 b = load<float4>(own[1] + r);
+        const float4 c = load<float4>(own[2] + r);
+        const float4 d = load<float4>(own[3] + r);
+        const float4 height = blend(weights, load<float4>(own[0] + r), b, c, d);
+        const float4 toTheRight = blend(weights, b, c, d, load<float4>(own[4] + r));
+        const float4 above = blend(
+            weights, load<float4>(upper[0] + r), load<float4>(upper[1] + r), load<float4>(upper[2] + r),
+            load<float4>(upper[3] + r));
+        store((height - toTheRight) * (height - above), slopes + r);
+        interleave(height, toTheRight, above, attribs + 3 * r);
+    }
+}
+
+// Chooses the diagonals of the cells that end at a column of the mesh. The third and the fourth index of a cell depend
+// on its diagonal; all are written, as a branch for those that have changed is mispredicted too often.
 void SurfaceMesh::turnDiagonals(int column, std::int16_t* indices) {
     const int rows = rows_.seen.count;
     const int cells = rows - 1;
-    slopes_.swap(slopesBefore_);
-    multiplySlopes(heights_.data(), rights_.data(), uppers_.data(), rows, slopes_.data());
-    if (column == 0) return;
-    compareSlopes(slopesBefore_.data(), slopes_.data(), cells, turned_.data());
-    std::int16_t* cell = indices + 6 * at(column - 1, cells);
-    int topRight = column * rows;
-    for (int r = 0; r < cells; ++r, ++topRight, cell += 6) {
-        const int turned = turned_[static_cast<std::size_t>(r)];
-        cell[2] = static_cast<std::int16_t>(topRight + 1 - turned);
-        cell[3] = static_cast<std::int16_t>(topRight - rows + turned);
+    const float* const left = slopesBefore_.data();
+    const float* const right = slopes_.data();
+    const auto topRight = static_cast<short>(column * rows);
+    const auto topLeft = static_cast<short>(topRight - rows);
+    short8 level = short8{topRight, topLeft, topRight, topLeft, topRight, topLeft, topRight, topLeft} +
+                   short8{1, 0, 2, 1, 3, 2, 4, 3};
+    const auto pairs = [=, &level](int r) {
+        const float4 sum =
+            load<float4>(left + r) + load<float4>(left + r + 1) + load<float4>(right + r) + load<float4>(right + r + 1);
+        const auto isTurned = reinterpret_cast<short8>(reinterpret_cast<int4>(sum) >> 31);
+        const short8 values = level + (isTurned & short8{-1, 1, -1, 1, -1, 1, -1, 1});
+        level += short8{4, 4, 4, 4, 4, 4, 4, 4};
+        return values;
+    };
+    std::int16_t* const cell = indices + 6 * at(column - 1, cells) + 2;
+    const auto write = [=](const short8& values, int r, int k) {
+        std::memcpy(cell + 6 * (r + k), reinterpret_cast<const char*>(&values) + 4 * k, 4);
+    };
+    int r = 0;
+    for (; r + kGroup <= cells; r += kGroup) {
+        const short8 values = pairs(r);
+        for (int k = 0; k < kGroup; ++k) write(values, r, k);
     }
+    const short8 values = pairs(r);
+    for (int k = 0; k < cells - r; ++k) write(values, r, k);
 }
 
 void SurfaceMesh::gather(
     const float* heights, const float* velocity, float since, float* attribs, std::int16_t* indices,
     const Breeze* breeze) {
-    const int columns = padded(columns_.points);
-    const int rows = padded(rows_.seen.count);
-    for (int c = 0; c < columns; ++c) {
-        const int column = columns_.from + std::min(c, columns_.points - 1);
-        const auto first = at(column, points_) + rows_.from;
-        float* const line = lattice_.data() + at(c, rows_.points);
-        advance(heights + first, velocity + first, since, rows_.points, line);
-        if (breeze) breeze->add(column, rows_.from, rows_.points, line);
-    }
-    turn(lattice_.data(), columns, rows_.points, latticeRows_.data());
-    for (int r = 0; r < rows_.seen.count; ++r) {
-        const Place& p = rows_.places[static_cast<std::size_t>(r)];
-        blend(latticeRows_, columns, p.cell, p.weights, ownRows_.data() + at(r, columns));
-        blend(latticeRows_, columns, p.cell - 1, p.weights, upperRows_.data() + at(r, columns));
-    }
-    turn(ownRows_.data(), rows, columns, own_.data());
-    turn(upperRows_.data(), rows, columns, upper_.data());
-    for (int c = 0; c < columns_.seen.count; ++c) {
-        const Place& p = columns_.places[static_cast<std::size_t>(c)];
-        blend(own_, rows, p.cell, p.weights, heights_.data());
-        blend(own_, rows, p.cell + 1, p.weights, rights_.data());
-        blend(upper_, rows, p.cell, p.weights, uppers_.data());
-        interleave(heights_.data(), rights_.data(), uppers_.data(), rows_.seen.count, attribs);
-        attribs += at(3, rows_.seen.count);
-        turnDiagonals(c, indices);
+    const int rows = rows_.seen.count;
+    const float* const end = attribs + at(columns_.seen.count, 3 * rows);
+    int read = 0;
+    for (int c = 0; c < columns_.seen.count; ++c, attribs += 3 * rows) {
+        const Place& place = columns_.places[static_cast<std::size_t>(c)];
+        for (const int needed = std::min(place.cell + 4, columns_.points); read < needed; read += kGroup) {
+            readColumns(read, heights, velocity, since, breeze);
+            blendRows(read);
+        }
+        slopes_.swap(slopesBefore_);
+        // The next column overwrites what the padding of this one has written.
+        if (end - attribs >= static_cast<std::ptrdiff_t>(lastColumn_.size())) {
+            blendColumn(place, attribs);
+        } else {
+            blendColumn(place, lastColumn_.data());
+            std::copy_n(lastColumn_.data(), 3 * rows, attribs);
+        }
+        if (c > 0) turnDiagonals(c, indices);
     }
 }
 

@@ -35,8 +35,8 @@ public:
     // of linear symmetry, 1987).
     //
     // `heights`, `velocity`: points * points values in the same order, and what each gains a step; `since`: steps
-    // passed since then; `attribs`: 3 values a vertex; `indices`: as laid by layCells(); `breeze`: is added
-    // to the heights.
+    // passed since then; `attribs`: 3 values a vertex; `indices`: those that layCells() has laid; `breeze`: is added to
+    // the heights.
     void gather(
         const float* heights, const float* velocity, float since, float* attribs, std::int16_t* indices,
         const Breeze* breeze = nullptr);
@@ -54,17 +54,18 @@ private:
         std::vector<Place> places;  // of the vertices that are seen
     };
     static Axis axis(int points, int vertices, double share);
+    void readColumns(int first, const float* heights, const float* velocity, float since, const Breeze* breeze);
+    void blendRows(int first);
+    void blendColumn(const Place& place, float* attribs);
     void turnDiagonals(int column, std::int16_t* indices);
 
     int points_;
     Axis columns_, rows_;
-    std::vector<float> lattice_;                    // as it is at that time
-    std::vector<float> latticeRows_;                // row by row
-    std::vector<float> ownRows_, upperRows_;        // the lattice's columns at the mesh's rows, and one cell above them
-    std::vector<float> own_, upper_;                // column by column
-    std::vector<float> heights_, rights_, uppers_;  // a column of the mesh
-    std::vector<float> slopes_, slopesBefore_;      // the products of both slopes in this column and in the one before
-    std::vector<int> turned_;                       // which of the cells between them
+    std::vector<float> read_;                   // four columns of the lattice, as it is at that time
+    std::vector<float> readRows_;               // row by row
+    std::vector<float> own_, upper_;            // its last columns at the mesh's rows, and one cell above them
+    std::vector<float> lastColumn_;             // of the mesh
+    std::vector<float> slopes_, slopesBefore_;  // the products of both slopes in this column and in the one before
 };
 
 }  // namespace tidemark

@@ -96,3 +96,102 @@ TEST(SurfaceMesh, isLevelBeyondItsEdgeAndKeepsSlopes) {
     const float* const last = attribs.data() + 3 * (kVertices * kVertices - 1);
     EXPECT_LT(std::fabs(last[1] - last[0]), 0.5f);
 }
+
+namespace {
+
+// The surface of SurfaceMesh::gather(), one vertex at a time.
+struct PlainSurface {
+    struct Place {
+        int cell;
+        float weights[4];
+    };
+    Place place(int vertex) const {
+        const double at = static_cast<double>(vertex) * (points - 1) / (vertices - 1);
+        const int cell = std::min(static_cast<int>(at), points - 2);
+        const auto t = static_cast<float>(at - cell);
+        return {
+            cell,
+            {(1.0f - t) * (1.0f - t) * (1.0f - t) / 6.0f, ((3.0f * t - 6.0f) * t * t + 4.0f) / 6.0f,
+             (((3.0f - 3.0f * t) * t + 3.0f) * t + 1.0f) / 6.0f, t * t * t / 6.0f}};
+    }
+
+    template <class Value>
+    static float blend(const Place& place, Value value) {
+        const float* const w = place.weights;
+        return w[0] * value(place.cell - 1) + w[1] * value(place.cell) + w[2] * value(place.cell + 1) +
+               w[3] * value(place.cell + 2);
+    }
+
+    // The height of a vertex, or so many cells to the right of it and above it.
+    float height(int column, int row, int right, int above) const {
+        const auto inside = [this](int i) { return std::clamp(i, 0, points - 1); };
+        return blend(place(column), [&](int c) {
+            return blend(place(row), [&](int r) {
+                return heights[static_cast<std::size_t>(inside(c + right) * points + inside(r - above))];
+            });
+        });
+    }
+
+    int points, vertices;
+    std::vector<float> heights;
+};
+
+}  // namespace
+
+TEST(SurfaceMesh, equalsThePlainFormulaBitForBit) {
+    struct Size {
+        int points, vertices;
+        double width, height;
+    };
+    for (const Size size :
+         {Size{16, 31, 1, 1}, {40, 96, 9.0 / 16, 1}, {60, 33, 1, 0.7}, {9, 42, 0.2, 0.6}, {2, 2, 1, 1}}) {
+        SCOPED_TRACE(testing::Message() << size.points << ", " << size.vertices);
+        WaveLattice lattice = latticeFor({}, 540, 960);
+        lattice.points = size.points;
+        Breeze breeze(lattice);
+        breeze.blow(0.5f, 12.3);
+        std::vector<float> heights, velocity;
+        for (int i = 0; i < size.points * size.points; ++i) {
+            heights.push_back(static_cast<float>(i * i % 101) / 50.0f - 1.0f);
+            velocity.push_back(static_cast<float>(i * i % 37) / 90.0f);
+        }
+        PlainSurface plain = {size.points, size.vertices, heights};
+        for (std::size_t i = 0; i < heights.size(); ++i) plain.heights[i] = heights[i] + 0.3f * velocity[i];
+        for (int c = 0; c < size.points; ++c) breeze.add(c, 0, size.points, plain.heights.data() + c * size.points);
+
+        SurfaceMesh mesh(size.points, size.vertices, size.width, size.height);
+        const auto [firstColumn, columns] = mesh.columns();
+        const auto [firstRow, rows] = mesh.rows();
+        std::vector<std::int16_t> indices(static_cast<std::size_t>(6 * (columns - 1) * (rows - 1)));
+        mesh.layCells(indices.data());
+        std::vector<float> expected;
+        std::vector<std::int16_t> expectedIndices = indices;
+        for (int i = 0; i < columns * rows; ++i) {
+            const int c = firstColumn + i / rows;
+            const int r = firstRow + i % rows;
+            for (const auto& [right, above] : {std::pair{0, 0}, {1, 0}, {0, 1}}) {
+                expected.push_back(plain.height(c, r, right, above));
+            }
+        }
+        const auto slopes = [&](int vertex) {
+            const float* const v = expected.data() + 3 * vertex;
+            return (v[0] - v[1]) * (v[0] - v[2]);
+        };
+        for (int cell = 0; cell < (columns - 1) * (rows - 1); ++cell) {
+            std::int16_t* const corners = expectedIndices.data() + 6 * cell;
+            const int left = corners[0];
+            const int right = corners[5];
+            if (!std::signbit(slopes(left) + slopes(left + 1) + slopes(right) + slopes(right + 1))) continue;
+            corners[2] = corners[5];
+            corners[3] = corners[1];
+        }
+        constexpr float kUntouched = 1234.0f;
+        expected.push_back(kUntouched);
+        std::vector<float> attribs(expected.size(), kUntouched);
+        // A second frame, from other heights, keeps nothing of the first one.
+        mesh.gather(velocity.data(), heights.data(), 1.0f, attribs.data(), indices.data());
+        mesh.gather(heights.data(), velocity.data(), 0.3f, attribs.data(), indices.data(), &breeze);
+        EXPECT_EQ(attribs, expected);
+        EXPECT_EQ(indices, expectedIndices);
+    }
+}

@@ -25,20 +25,23 @@ void JacobiTShaderImpl::shaderMain(const vec4& fragCoord, float& out) {
 
 void JacobiTShaderImpl::run() {
     if (output.empty()) return;
-    const int width = output.width;
-    const int height = output.height;
-    // Local copies: the compiler must assume that a store to the output changes a float field of this object.
+    // Local copies: the compiler must assume that a store to the output changes a field of this object.
+    const Texture<float> source = Pressure;
+    const Texture<float> divergences = Divergence;
+    const Texture<float> result = output;
+    const int width = result.width;
+    const int height = result.height;
     const float alpha = Alpha;
     const float inverseBeta = InverseBeta;
 
-    std::fill_n(output.row(0), width, 0.0f);
-    std::fill_n(output.row(height - 1), width, 0.0f);
+    std::fill_n(result.row(0), width, 0.0f);
+    std::fill_n(result.row(height - 1), width, 0.0f);
     for (int j = 1; j < height - 1; ++j) {
-        const float* pressure = Pressure.row(j);
-        const float* below = Pressure.row(j - 1);
-        const float* above = Pressure.row(j + 1);
-        const float* divergence = Divergence.row(j);
-        float* out = output.row(j);
+        const float* pressure = source.row(j);
+        const float* below = source.row(j - 1);
+        const float* above = source.row(j + 1);
+        const float* divergence = divergences.row(j);
+        float* out = result.row(j);
 
         out[0] = 0.0f;
         forGroups(1, width - 1, [=]<class F>(F, int i) {

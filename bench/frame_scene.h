@@ -36,6 +36,8 @@ public:
         host_.draw();
     }
 
+    const WaterHost& host() const { return host_; }
+
 private:
     static Look lookWith(int vertices) {
         Look look;

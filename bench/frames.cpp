@@ -10,13 +10,13 @@
 
 #include "bench/frame_scene.h"
 #include "fluid/fluid.h"
+#include "host/breeze.h"
 #include "host/surface_mesh.h"
 #include "jni/globals.h"
 #include "jni/ink_frame.h"
 #include "probes/counting_gl.h"
 #include "probes/gesture_state.h"
 #include "probes/library_blocks.h"
-#include "reference/surface.h"
 
 using namespace tidemark;
 
@@ -39,15 +39,21 @@ void frames(benchmark::State& run, Scene kind, int vertices, int width, int heig
     run.counters["allocations"] = static_cast<double>(allocations) / kCounted;
 }
 
-// Measures the interpolation of mesh heights from a lattice of 128 vertices per side, for a 9:16 view.
-void meshHeights(benchmark::State& run, int vertices) {
-    const Surface waves(128);
-    SurfaceMesh mesh(waves.n, vertices, 9.0 / 16, 1.0);
+// Measures the interpolation of mesh heights, with and without a breeze, from the waves of rain in a 9:16 view.
+void meshHeights(benchmark::State& run, int vertices, bool isBreezy) {
+    const FrameScene scene(Scene::water, 128, 1080, 1920, 120);
+    const WaveLattice& lattice = scene.host().lattice();
+    const std::vector<float>& waves = scene.host().heights();
+    Breeze breeze(lattice);
+    SurfaceMesh mesh(lattice.points, vertices, 9.0 / 16, 1.0);
     const auto seen = static_cast<std::size_t>(mesh.columns().count * mesh.rows().count);
     std::vector<float> attribs(3 * seen);
     std::vector<std::int16_t> indices(6 * seen);
+    mesh.layCells(indices.data());
+    double time = 0.0;
     for (auto _ : run) {
-        mesh.gather(waves.height.data(), waves.velocity.data(), 0.0f, attribs.data(), indices.data());
+        breeze.blow(0.02f, time += 1.0 / 60.0);
+        mesh.gather(waves.data(), waves.data(), 0.0f, attribs.data(), indices.data(), isBreezy ? &breeze : nullptr);
         benchmark::ClobberMemory();
     }
 }
@@ -96,8 +102,10 @@ void registerFrames() {
     for (const Scene scene : {Scene::water, Scene::idleInk, Scene::drag}) addFrames(scene, 128, 1080, 1920);
     for (const int n : {64, 96, 192, 256}) addFrames(Scene::water, n, 1080, 1920);
     for (const int n : {64, 96, 128, 192, 256}) {
-        benchmark::RegisterBenchmark(("mesh heights/" + std::to_string(n)).c_str(), meshHeights, n)
-            ->Unit(benchmark::kMicrosecond);
+        for (const bool isBreezy : {false, true}) {
+            const std::string name = (isBreezy ? "breezy heights/" : "mesh heights/") + std::to_string(n);
+            benchmark::RegisterBenchmark(name.c_str(), meshHeights, n, isBreezy)->Unit(benchmark::kMicrosecond);
+        }
     }
     addFrames(Scene::drag, 128, 540, 960);
     addFrames(Scene::drag, 128, 2160, 3840);

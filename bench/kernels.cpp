@@ -1,10 +1,14 @@
-// Measures each formula, and all kernels of an ink frame together, with every kernel set.
+// Measures each formula, and all kernels of an ink frame together, with every kernel set. The ink's field is noise,
+// whose back-traces end far apart, or that of a fast drag.
 #include "bench/kernels.h"
 
 #include <benchmark/benchmark.h>
 
 #include <string>
+#include <vector>
 
+#include "bench/frame_scene.h"
+#include "jni/globals.h"
 #include "reference/ink_grid.h"
 #include "reference/surface.h"
 
@@ -15,16 +19,16 @@ constexpr const KernelSet* kKernelSets[] = {&kLibrary, &kScalar, &kAutoVectorize
 // The surface is reset after so many steps, before the decay of the waves affects the time of a step.
 constexpr int kStepsPerSurface = 64;
 
-void steps(benchmark::State& state, const KernelSet& kernels, Surface start, bool checkCalm) {
+void steps(benchmark::State& run, const KernelSet& kernels, Surface start, bool checkCalm) {
     Surface surface = start;
     int left = kStepsPerSurface;
-    for (auto _ : state) {
+    for (auto _ : run) {
         benchmark::DoNotOptimize(surface.step(kernels, checkCalm));
         if (--left > 0) continue;
         surface = start;
         left = kStepsPerSurface;
     }
-    state.counters["items"] = static_cast<double>(start.size());
+    run.counters["items"] = static_cast<double>(start.size());
 }
 
 // Returns a calm surface `age` steps after a single drop.
@@ -44,31 +48,31 @@ void addSurface(int n) {
     const std::string size = "/" + std::to_string(n);
     for (const KernelSet* kernels : kKernelSets) {
         const std::string form = std::string("/") + kernels->name;
-        add("wave step" + size + form, [=](benchmark::State& state) { steps(state, *kernels, Surface(n), false); });
+        add("wave step" + size + form, [=](benchmark::State& run) { steps(run, *kernels, Surface(n), false); });
         if (!kernels->ripple) continue;
-        add("ripple" + size + form, [=](benchmark::State& state) {
+        add("ripple" + size + form, [=](benchmark::State& run) {
             Surface surface(n);
-            for (auto _ : state) surface.ripple(*kernels);
+            for (auto _ : run) surface.ripple(*kernels);
         });
     }
     // On a calm surface the calm test never stops early.
     for (const bool checkCalm : {false, true}) {
         add("calm surface" + size + (checkCalm ? "/tested" : "/untested"),
-            [=](benchmark::State& state) { steps(state, kLibrary, Surface(n, 0.0005f), checkCalm); });
+            [=](benchmark::State& run) { steps(run, kLibrary, Surface(n, 0.0005f), checkCalm); });
     }
 }
 
 void addGrid(int viewWidth, int viewHeight) {
     const std::string size = "/" + std::to_string(viewWidth / 12) + "x" + std::to_string(viewHeight / 12);
     const auto addPass = [&](const char* what, const KernelSet& kernels, void (*pass)(const KernelSet&, InkGrid&)) {
-        add(what + size + "/" + kernels.name, [=, &kernels](benchmark::State& state) {
+        add(what + size + "/" + kernels.name, [=, &kernels](benchmark::State& run) {
             InkGrid grid(viewWidth, viewHeight);
             grid.wholeFrame(kLibrary);
-            for (auto _ : state) {
+            for (auto _ : run) {
                 pass(kernels, grid);
                 benchmark::ClobberMemory();
             }
-            state.counters["items"] = grid.width * grid.height;
+            run.counters["items"] = grid.width * grid.height;
         });
     };
     for (const KernelSet* kernels : kKernelSets) {
@@ -83,6 +87,32 @@ void addGrid(int viewWidth, int viewHeight) {
     }
 }
 
+// The velocities of a fast drag after a second.
+std::vector<vec2> dragField(int viewWidth, int viewHeight) {
+    const FrameScene scene(Scene::drag, 128, viewWidth, viewHeight, 60);
+    const Texture<vec2>& field = fluid.VelocityTex;
+    return {field.data, field.data + field.width * field.height};
+}
+
+void addDragGrid(int viewWidth, int viewHeight) {
+    const std::string size = "/" + std::to_string(viewWidth / 12) + "x" + std::to_string(viewHeight / 12);
+    const auto addPass = [&](const char* what, const KernelSet& kernels, void (*pass)(const KernelSet&, InkGrid&)) {
+        add(what + size + "/" + kernels.name, [=, &kernels](benchmark::State& run) {
+            InkGrid grid(viewWidth, viewHeight);
+            grid.velocity = dragField(viewWidth, viewHeight);
+            grid.advect.VelocityTexture.data = grid.advect.SourceTexture.data = grid.velocity.data();
+            for (auto _ : run) {
+                pass(kernels, grid);
+                benchmark::ClobberMemory();
+            }
+        });
+    };
+    for (const KernelSet* kernels : {&kLibrary, &kScalar, &kAutoVectorized}) {
+        addPass("drag advection", *kernels, [](const KernelSet& f, InkGrid& grid) { f.advection(grid.advect); });
+        addPass("drag frame", *kernels, [](const KernelSet& f, InkGrid& grid) { grid.wholeFrame(f); });
+    }
+}
+
 }  // namespace
 
 void registerKernels() {
@@ -90,8 +120,10 @@ void registerKernels() {
     addGrid(540, 960);
     addGrid(1080, 1920);
     addGrid(2160, 3840);
+    addDragGrid(1080, 1920);
+    addDragGrid(2160, 3840);
     for (const int age : {100, 2000, 10000, 30000}) {
         add("aged surface/128/" + std::to_string(age),
-            [=](benchmark::State& state) { steps(state, kLibrary, agedSurface(128, age), true); });
+            [=](benchmark::State& run) { steps(run, kLibrary, agedSurface(128, age), true); });
     }
 }

@@ -17,7 +17,7 @@ await page.addStyleTag({ content: `#tools, #panel, #hint, #brand nav { display: 
     #brand { padding: 44px 52px 80px } #brand h1 { font-size: 68px } #brand p { font-size: 27px; margin-top: 10px }` });
 await takeOver(page);
 await page.evaluate(() => {
-    const { water } = document.querySelector('tidemark-water');
+    const water = document.querySelector('tidemark-water');
     water.drop(850, 330);
     window.frames(34);
     water.drop(560, 470, { strength: 0.7 });

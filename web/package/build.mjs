@@ -1,16 +1,17 @@
-// Makes dist/: the modules, the WebAssembly beside them, and types. Fails where they are larger than promised.
+// Builds dist/: the scripts, the WebAssembly module, the types and the manifest. Fails if a page would load 90 KB or more.
 import { execFileSync } from 'node:child_process';
 import { copyFileSync, mkdirSync, readFileSync, rmSync, writeFileSync } from 'node:fs';
 import { basename, dirname, join } from 'node:path';
 import { fileURLToPath } from 'node:url';
 import { gzipSync } from 'node:zlib';
 import { build } from 'esbuild';
+import { rollup } from 'rollup';
 
 const here = dirname(fileURLToPath(import.meta.url));
 const root = join(here, '../..');
-const most = 90_000;  // bytes, compressed
+const most = 90_000;  // bytes of all files that a page loads, each compressed with gzip -9
 
-// What editors read of the element: the comments of its attributes.
+// The custom elements manifest for editors. Its descriptions are the comments of attributes.ts.
 function manifest() {
     const table = readFileSync(join(here, 'src/attributes.ts'), 'utf8');
     const entries = table.matchAll(/\/\*\*\n +\* (.*)\n +\* @default (.*)\n +\*\/\n +(\w+): \{ kind: '(\w+)'/g);
@@ -21,30 +22,42 @@ function manifest() {
     const events = ['ready', 'calm', 'wake', 'error', 'contextlost', 'contextrestored'].map((name) => ({ name, type: { text: 'CustomEvent' } }));
     const declaration = {
         kind: 'class', customElement: true, name: 'WaterElement', tagName: 'tidemark-water', attributes, events,
-        slots: [{ name: '', description: 'what is above the water' }, { name: 'fallback', description: 'shows until the water does' }],
-        cssParts: [{ name: 'water' }, { name: 'marker', description: 'where a key lets a drop fall' }],
+        slots: [{ name: '', description: 'content above the water' }, { name: 'fallback', description: 'visible until the water is' }],
+        cssParts: [{ name: 'water' }, { name: 'marker', description: 'the point where Enter and Space let a drop fall' }],
         cssStates: ['ready', 'calm', 'paused', 'failed'].map((name) => ({ name })),
     };
     return { schemaVersion: '2.1.0', modules: [{ kind: 'javascript-module', path: 'dist/tidemark-water.js', declarations: [declaration] }] };
 }
 
-rmSync(join(here, 'dist'), { recursive: true, force: true });
-mkdirSync(join(here, 'dist'));
+// Removes the functions that Emscripten's glue declares and never calls. esbuild removes unused code only at the top level.
+const shakeGlue = {
+    name: 'shake-glue',
+    setup: ({ onLoad }) => onLoad({ filter: /\/tidemark-water\.js$/ }, async ({ path }) => {
+        const glue = await rollup({ input: path });
+        const { output: [{ code }] } = await glue.generate({ format: 'es' });
+        return { contents: code };
+    }),
+};
+
 const dist = join(here, 'dist');
-const { metafile } = await build({
-    // The element's module is that of the canvases and a little more.
-    entryPoints: { 'tidemark-water': join(here, 'src/index.ts'), core: join(here, 'src/core.ts') },
+rmSync(dist, { recursive: true, force: true });
+mkdirSync(dist);
+const options = {
     outdir: dist,
-    chunkNames: 'shared',
-    splitting: true,
     bundle: true,
     minify: true,
     format: 'esm',
     target: 'es2022',
-    loader: { '.webp': 'binary', '.css': 'text' },
+    loader: { '.webp': 'binary', '.wasm': 'binary', '.css': 'text' },
+    plugins: [shakeGlue],
     legalComments: 'none',
     metafile: true,
-});
+};
+// Both entries share one file, so a page that imports both loads nothing twice.
+const entryPoints = { 'tidemark-water': join(here, 'src/index.ts'), core: join(here, 'src/core.ts') };
+const { metafile } = await build({ ...options, entryPoints, splitting: true, chunkNames: 'shared' });
+// Bundlers copy each file that `new URL(name, import.meta.url)` names. This entry needs none.
+await build({ ...options, entryPoints: [join(here, 'src/inlined.ts')], define: { 'import.meta.url': 'location.href' } });
 copyFileSync(join(here, 'src/style.css'), join(dist, 'style.css'));
 copyFileSync(join(root, 'build/web/tidemark-water.wasm'), join(dist, 'tidemark-water.wasm'));
 execFileSync('npx', ['tsc', '--project', here], { cwd: here, stdio: 'inherit' });

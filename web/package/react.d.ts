@@ -1,8 +1,8 @@
-// import 'tidemark-water/react' is the same module, and teaches React's JSX the element.
+// import 'tidemark-water/react' loads the same module, and adds the types of the element to React's JSX.
 import type { DetailedHTMLProps, HTMLAttributes } from 'react';
 import type { Look, Properties, WaterElement, WaterEvents } from './dist/index.js';
 
-// A look that is to come from a server is a text.
+// React renders a text on the server, but no object.
 type Props = Partial<Omit<Properties, 'look'>> & { look?: Look | string | null };
 type Listeners = { [Type in keyof WaterEvents as `on${Type}`]?: (event: WaterEvents[Type]) => void };
 

@@ -92,7 +92,7 @@ function toggleFullScreen(): void {
 async function toggleRecording(): Promise<void> {
     if (recording) return recording.stop();
     try {
-        recording = record(water.water!.canvas);
+        recording = record(water.canvas!);
         document.body.classList.add('recording');
         element('record').textContent = 'Stop recording';
         say('Recording: move the water. “Stop” ends it, or a minute.');
@@ -206,7 +206,7 @@ water.addEventListener('error', ({ detail: { code, message } }) => {
 water.addEventListener('contextlost', () => say('The browser took the graphics away. They come back by themselves.', true));
 water.addEventListener('contextrestored', () => say('', true));
 setInterval(() => {
-    if (!element('panel').hidden && water.water) panel.showStatus(water.water);
+    if (!element('panel').hidden) panel.showStatus(water);
 }, 500);
 
 const isBare = new URLSearchParams(location.search).get('ui') === '0';

@@ -1,5 +1,5 @@
 // The panel: what a visitor chooses in plain words, every value of the look under "Expert", and the choice as code.
-import { lookKeys, lookOf, presets, type PresetName, type Water } from 'tidemark-water';
+import { lookKeys, lookOf, presets, type PresetName, type WaterElement } from 'tidemark-water';
 import { codes, toHtml } from './code';
 import { make, makeControls, wordOf } from './controls';
 import { expertSliders } from './expert';
@@ -126,7 +126,7 @@ export function makePanel(root: HTMLElement, settings: Settings, actions: PanelA
             }
             await drawThumbnails((preset, url) => show(tiles.find(({ name }) => name === preset)!.picture, url));
         },
-        showStatus({ calm, cost }: Water) {
+        showStatus({ calm, cost }: WaterElement) {
             status.classList.toggle('calm', calm);
             const rate = cost.frame ? `${cost.frame.toFixed(1)} ms a frame, ` : '';
             status.lastElementChild!.textContent = calm ? 'Calm: no frames are drawn' : `Moving: ${rate}${cost.work.toFixed(1)} ms busy`;

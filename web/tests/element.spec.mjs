@@ -1,8 +1,12 @@
 // The element of the package on pages that are not the playground's.
 import { execFileSync } from 'node:child_process';
 import { cpSync, existsSync, readFileSync } from 'node:fs';
+import { createServer } from 'node:http';
 import { join } from 'node:path';
+import { build } from 'esbuild';
 import { PNG } from 'pngjs';
+import { createElement } from 'react';
+import { renderToString } from 'react-dom/server';
 import { expect, screenshotPath, slope, test } from './page.mjs';
 
 const dist = new URL('../package/dist/', import.meta.url).pathname;
@@ -121,14 +125,14 @@ test('of two pictures given the later stays, through other attributes and anothe
         await water.setPicture(await drawing(30));
         load();
         await earlier;
-        const sizes = [water.water.picture.size()];
+        const sizes = [water.water.chooser.picture.size()];
         water.rain = 3;
         await new Promise(requestAnimationFrame);
-        sizes.push(water.water.picture.size());
+        sizes.push(water.water.chooser.picture.size());
         const { water: same } = water;
         document.querySelector('p').append(water);
         await new Promise(requestAnimationFrame);
-        sizes.push(water.water === same && same.picture.size());
+        sizes.push(water.water === same && same.chooser.picture.size());
         return sizes;
     })).toEqual(Array(3).fill([30, 30]));
 });
@@ -146,7 +150,7 @@ test('what fails is told once, and a paused water shows another picture at anoth
     })).toEqual(['decode']);
     await page.setViewportSize({ width: 300, height: 300 });
     await expect.poll(async () => PNG.sync.read(await element(page).screenshot()).data[4 * 270]).toBeGreaterThan(150);
-    expect(problems.splice(0)).toEqual([/no such numbers: Exponent\./, /decode: words.png/].map((text) => expect.stringMatching(text)));
+    expect(problems.splice(0)).toEqual([/no values with these names: Exponent\./, /decode: words.png/].map((text) => expect.stringMatching(text)));
 });
 
 test('a paused water stands still while something is chosen, through another place, and takes no drops', async ({ page }) => {
@@ -238,9 +242,9 @@ test('canvases of the page show a canvas and a video that move, and give picture
         await video.play();
         const frames = async (until) => { while (!until()) await new Promise(requestAnimationFrame); };
         await frames(() => codes.length > 0);
-        waters[1].lose.loseContext();
+        waters[1].graphics.lose.loseContext();
         await frames(() => waters[1].state === 'lost');
-        waters[1].lose.restoreContext();
+        waters[1].graphics.lose.restoreContext();
         await frames(() => codes.length > 1);
         let more = 20;  // each is told once
         await frames(() => more-- === 0);
@@ -255,7 +259,7 @@ test('a bright still is handed over wet, in the look\'s colours, and shows them 
     await show(page, `${script}<tidemark-water src="white.png"></tidemark-water>`, { files: { 'white.png': white } });
     await element(page).and(page.locator('[shown]')).waitFor();
     const seen = await element(page).evaluate(async (water) => {
-        const { water: { still, lose } } = water;
+        const { water: { still, graphics: { lose } } } = water;
         const frames = async (count) => { while (count-- > 0) await new Promise(requestAnimationFrame); };
         const scratch = new OffscreenCanvas(1, 1).getContext('2d', { willReadFrequently: true });
         const colorOf = (drawable) => {
@@ -290,13 +294,13 @@ test('a high element shows the portrait, and off screen a still picture until it
     const files = { 'wide.png': slope(...wide).buffer, 'high.png': slope(...high).buffer };
     await show(page, `${script}<tidemark-water src="wide.png" src-portrait="high.png" style="height: 40vw"></tidemark-water><p style="margin: 3000px">`, { files });
     await element(page).and(page.locator('[shown]')).waitFor();
-    const size = () => element(page).evaluate(({ water }) => water.picture.size());
+    const size = () => element(page).evaluate(({ water }) => water.chooser.picture.size());
     const live = () => element(page).evaluate(({ water }) => water.state === 'live');
     expect(await size()).toEqual(wide);
     await element(page).evaluate(({ style }) => { style.height = '280px'; });
     await expect.poll(size).toEqual(high);
     // Water that still moves goes on when it is back.
-    await expect.poll(() => element(page).evaluate(({ water: { calm, stale, loop } }) => calm && !stale && !loop.asked)).toBe(true);
+    await expect.poll(() => element(page).evaluate(({ water: { calm, stale, loop } }) => calm && !stale && !loop.request)).toBe(true);
     await page.evaluate(() => scrollTo(0, 2000));
     await expect.poll(live).toBe(false);
     await page.evaluate(() => scrollTo(0, 0));
@@ -325,7 +329,7 @@ test('contexts that the page\'s other graphics take come back, and until then th
     await expect.poll(states).toEqual(['lost', 'lost']);
     expect(await red(first)).toBeGreaterThan(180);  // 255 to the right, and white is told by its green
     await expect.poll(states, { timeout: 60_000 }).toEqual(['live', 'live']);  // by itself, the second after half a minute
-    await first.evaluate(({ water }) => water.lose.loseContext());
+    await first.evaluate(({ water }) => water.graphics.lose.loseContext());
     await expect.poll(async () => (await states())[0]).toBe('lost');
     await first.click();
     await expect.poll(async () => (await states())[0], { timeout: 3000 }).toBe('live');
@@ -414,7 +418,7 @@ test('nothing jumps while the script is on its way, and a picture of two sources
     go();
     await element(page).and(page.locator('[shown]')).waitFor();
     expect(await image.evaluate(({ clientWidth, clientHeight }) => [clientWidth, clientHeight])).toEqual([184, 160]);
-    expect(await element(page).evaluate(({ water }) => water.picture.size())).toEqual([64, 64]);
+    expect(await element(page).evaluate(({ water }) => water.chooser.picture.size())).toEqual([64, 64]);
     expect(await page.evaluate(() => window.shift)).toBe(0);
 });
 
@@ -437,7 +441,7 @@ test.describe('dense canvas', () => {
             }
             await new Promise((resolve) => setTimeout(resolve, 500));
             return [defined, second, water.state, canvas.clientWidth, canvas.width];
-        })).toEqual([undefined, expect.stringMatching(/destroyed first/), 'live', 300, 600]);
+        })).toEqual([undefined, expect.stringMatching(/destroy\(\) first/), 'live', 300, 600]);
         expect(problems.splice(0).every((text) => /none\.png/.test(text))).toBe(true);
     });
 });
@@ -451,8 +455,7 @@ test('pictures: lazy ones far below wait, others come as asked, failed ones are 
     await first.and(page.locator('[shown]')).waitFor();
     const names = () => asked.map((request) => request.url().split('/').pop());
     expect(names()).not.toContain('lazy.png');
-    // The address may lead to another server.
-    expect(await first.evaluate(({ water: { picture: { drawable } } }) => [drawable.crossOrigin, drawable.fetchPriority])).toEqual(['anonymous', 'high']);
+    expect(await first.evaluate(({ water }) => water.chooser.picture.drawable.fetchPriority)).toBe('high');
     await page.evaluate(() => document.querySelector('#far').scrollIntoView());
     await expect.poll(names).toContain('lazy.png');
     await expect.poll(async () => {
@@ -562,6 +565,65 @@ test.describe('dense', () => {
         await element(page).evaluate((water) => { water.quality = 'low'; });
         await expect.poll(size).toEqual([1728, 1080]);
     });
+});
+
+test('`fps` limits the rate of frames', async ({ page }) => {
+    await show(page, `${script}<tidemark-water src="pond.png" breeze="always" fps="10"></tidemark-water>`);
+    await element(page).and(page.locator('[shown]')).waitFor();
+    const times = await element(page).evaluate(async ({ water: { native } }) => {
+        const times = new Set();
+        const { _frame } = native;
+        native._frame = (seconds) => (times.add(seconds), _frame(seconds));
+        while (times.size < 8) await new Promise(requestAnimationFrame);
+        return [...times];
+    });
+    for (let i = 1; i < times.length; ++i) expect(times[i] - times[i - 1]).toBeGreaterThan(0.09);
+});
+
+test('React keeps the attributes that a server has written', async ({ page }) => {
+    const attributes = { src: 'pond.png', srcPortrait: 'tall.png', inkColor: '#ff0000', firstDrop: true, look: '{"exponent":9}' };
+    const contents = `import { createElement } from 'react';
+        import { hydrateRoot } from 'react-dom/client';
+        const attributes = ${JSON.stringify(attributes)};
+        const root = hydrateRoot(document.querySelector('main'), createElement('tidemark-water', attributes), { onRecoverableError: console.error });
+        window.rain = () => root.render(createElement('tidemark-water', { ...attributes, rain: 9 }));`;
+    const { outputFiles: [client] } = await build({ stdin: { contents, resolveDir: new URL('..', import.meta.url).pathname }, bundle: true, write: false });
+    const html = `${script}<main>${renderToString(createElement('tidemark-water', attributes))}</main><script type="module" src="client.js"></script>`;
+    await show(page, html, { files: { 'client.js': client.text, 'tall.png': slope(40, 80).buffer } });
+    await element(page).and(page.locator('[shown]')).waitFor();
+    await page.evaluate(() => window.rain());
+    await expect.poll(() => element(page).evaluate(({ water: { options } }) => options.rain)).toBe(9);
+    expect(await element(page).evaluate(({ water: { options: { src, srcPortrait, inkColor, firstDrop, look } } }) => ({ src, srcPortrait, inkColor, firstDrop, look })))
+        .toEqual({ ...attributes, look: { exponent: 9 } });
+});
+
+test('an address of the page may redirect to a server that allows all pages', async ({ page }) => {
+    const server = createServer(({ url }, response) => {
+        if (url === '/away.png') return response.writeHead(302, { location: `http://127.0.0.1:${server.address().port}/pond.png` }).end();
+        if (url === '/pond.png') return response.writeHead(200, { 'access-control-allow-origin': '*', 'content-type': 'image/png' }).end(slope(64, 64).buffer);
+        const name = url === '/' ? null : join(dist, url);
+        if (name && !existsSync(name)) return response.writeHead(404).end();
+        response.writeHead(200, { 'content-type': types[name?.split('.').pop() ?? 'html'] });
+        return response.end(name ? readFileSync(name) : `<link rel="icon" href="data:,">${script}<tidemark-water src="away.png"></tidemark-water>`);
+    });
+    await new Promise((resolve) => server.listen(0, resolve));
+    try {
+        await page.goto(`http://localhost:${server.address().port}/`);
+        await element(page).and(page.locator('[shown]')).waitFor();
+        expect(await element(page).evaluate(({ water }) => water.chooser.picture.size())).toEqual([64, 64]);
+    } finally {
+        server.close();
+    }
+});
+
+test('the module may have another address, and one entry contains it', async ({ page }) => {
+    const water = '<tidemark-water src="pond.png"></tidemark-water>';
+    const files = { 'moved.wasm': readFileSync(join(dist, 'tidemark-water.wasm')), 'tidemark-water.wasm': 'words' };
+    for (const code of ["import { setModule } from './tidemark-water.js'; setModule('moved.wasm');", "import './inlined.js';"]) {
+        await show(page, `${water}<script type="module">${code}</script>`, { files });
+        await element(page).and(page.locator('[shown]')).waitFor();
+        await page.unrouteAll();
+    }
 });
 
 test('the packed package works in a fresh project, with and without a bundler', async ({ page }, { outputDir }) => {

@@ -98,9 +98,9 @@ for (const [name, start] of Object.entries({ firefox, webkit })) {
             await expect.poll(() => run(() => location.hash)).toMatch(/rain=59/);
 
             await run(() => Object.assign(window.tidemark.water, { rain: 0 }).clearInk());
-            await run(() => window.tidemark.water.water.lose.loseContext());
+            await run(() => window.tidemark.water.water.graphics.lose.loseContext());
             await expect.poll(message).toMatch(/come back/);
-            await run(() => window.tidemark.water.water.lose.restoreContext());
+            await run(() => window.tidemark.water.water.graphics.lose.restoreContext());
             await expect.poll(message).toBe('');
             await expect.poll(red).toBeGreaterThan(240);  // without a touch or another call
             expect(await run(() => window.problems)).toEqual([]);

@@ -36,8 +36,8 @@ export async function open(page, hash = '') {
 export const takeOver = (page) =>
     page.evaluate(() => {
         const { water } = document.querySelector('tidemark-water');
-        const { canvas, gl, native } = water;
-        water.running = () => false;
+        const { canvas, native, graphics: { gl } } = water;
+        water.isRunning = () => false;
         let seconds = performance.now() / 1000;
         performance.now = () => 1000 * seconds;
         const frame = () => water.frame(native, 1000 * (seconds += 1 / 60));

@@ -157,7 +157,7 @@ test('pictures and addresses are taken where they are dropped or pasted', async 
         const options = { dataTransfer: data, clipboardData: data, bubbles: true, cancelable: true };
         document.body.dispatchEvent(type === 'drop' ? new DragEvent(type, options) : new ClipboardEvent(type, options));
     }, [type, text]);
-    const size = () => page.evaluate(() => window.tidemark.water.water.picture.size());
+    const size = () => page.evaluate(() => window.tidemark.water.water.chooser.picture.size());
     for (const [side, type] of [[30, 'drop'], [40, 'paste']]) {
         await give(type, `<svg xmlns="http://www.w3.org/2000/svg" width="${side}" height="${side}"/>`);
         await expect.poll(size).toEqual([side, side]);

@@ -115,6 +115,6 @@ test('a worker that is gone is told and started anew; of two pictures the last c
     await answer(-1, 30);
     await answer(-2, 20);
     await expect(page.locator('body')).not.toHaveClass(/busy/);
-    expect(await page.evaluate(() => window.tidemark.water.water.picture.size())).toEqual([30, 30]);
+    expect(await page.evaluate(() => window.tidemark.water.water.chooser.picture.size())).toEqual([30, 30]);
     await expect(page.locator('#message')).toHaveText('');
 });

@@ -17,7 +17,7 @@ test('shows the photo, and each of two in its turn; a file that is none leaves i
     test.slow();
     await open(page, '#wet=0&groundRed=1&groundGreen=1');
     await takeOver(page);
-    const size = () => page.evaluate(() => window.tidemark.water.water.picture.size());
+    const size = () => page.evaluate(() => window.tidemark.water.water.chooser.picture.size());
     await page.setInputFiles('#files', [slope(400, 200), slope(200, 500)]);
     await expect.poll(size).toEqual([200, 500]);
     expectMiddleOf(await flatPixels(page), page.viewportSize(), [200, 500]);

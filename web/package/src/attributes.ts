@@ -1,11 +1,11 @@
-// What can be chosen of a water. The element has these as attributes and properties, createWater() as options; their
-// comments are the README's table and the descriptions in custom-elements.json.
+// The options of a water. The element has them as attributes and properties, createWater() as options. The README's table
+// and custom-elements.json contain their comments.
 import { warnOnce } from './errors.js';
 import { inkOf, withinRange, type Look } from './look.js';
 import type { Source } from './pictures.js';
 import { presets, type PresetName } from './presets.js';
 
-// A number without a text counts as `usual`.
+// `usual` is the number of an attribute without a value.
 interface Attribute {
     kind: 'text' | 'flag' | 'number' | 'look' | 'color' | 'choice';
     values?: readonly string[];
@@ -14,53 +14,53 @@ interface Attribute {
 
 export const attributes = {
     /**
-     * the picture under the water; `""` waits for `setPicture()`
+     * the picture under the water; with `""` the water waits for `setPicture()`
      * @default the picture in `slot="fallback"`, or plain deep water
      */
     src: { kind: 'text' },
     /**
-     * another one for an element that is higher than wide
+     * the picture for an element that is higher than wide
      * @default `src`
      */
     srcPortrait: { kind: 'text' },
     /**
-     * what the waves throw back, a square picture
+     * the picture that waves reflect, a square
      * @default sky with the sun's glitter
      */
     light: { kind: 'text' },
     /**
-     * `lazy` loads the pictures only when the water is near the view, as with images
+     * `lazy` loads the pictures when the water is near the view, as for images
      * @default `eager`
      */
     loading: { kind: 'choice', values: ['eager', 'lazy'] },
     /**
-     * `high` or `low`, as with images
+     * `high` or `low`, as for images
      * @default `auto`
      */
     fetchPriority: { kind: 'choice', values: ['auto', 'high', 'low'] },
     /**
      * `clear-lake`, `summer-rain`, `heavy-glass`, `quicksilver`, `honey`, `red-ink` or `deep-swell`
-     * @default the look's own values
+     * @default the default look
      */
     preset: { kind: 'choice', values: Object.keys(presets) as PresetName[] },
     /**
-     * touches drop ink; `ink="off"` where a preset would
-     * @default as the preset says, or none
+     * touches draw with ink; `ink="off"` turns off the ink of a preset
+     * @default the preset's, or none
      */
     ink: { kind: 'flag' },
     /**
-     * `#rrggbb`; dark ones look best, and red or violet on warm pictures
-     * @default as the preset says, or blue-black
+     * the colour of the ink, `#rrggbb`. Dark colours look best, and on warm pictures red or violet
+     * @default the preset's, or blue-black
      */
     inkColor: { kind: 'color' },
     /**
-     * drops a second, up to 60; 6 where no number is given
-     * @default as the preset says, or none
+     * drops of rain a second, up to 60; without a number 6
+     * @default the preset's, or none
      */
     rain: { kind: 'number', usual: 6 },
     /**
-     * `always` keeps a breeze on the water, which then never rests
-     * @default it follows a touch, and sinks some seconds later
+     * `always` keeps a breeze on the water, which then is never at rest
+     * @default a breeze begins with a touch and ends some seconds later
      */
     breeze: { kind: 'choice', values: ['always'] },
     /**
@@ -69,47 +69,47 @@ export const attributes = {
      */
     interaction: { kind: 'choice', values: ['press', 'hover', 'hover press', 'press hover', 'none'] },
     /**
-     * `page` takes the pointers of the whole page, for water behind or above it
-     * @default `own`: those on the water and on its content
+     * `page` takes the pointers of the whole page, for water behind or above its content
+     * @default `own`: the pointers on the water and its content
      */
     pointers: { kind: 'choice', values: ['own', 'page'] },
     /**
-     * one drop falls by itself
-     * @default none does
+     * one drop falls when the water is ready
+     * @default no drop falls
      */
     firstDrop: { kind: 'flag' },
     /**
-     * only light and ink, over the page's own content ([what is possible](#recipes))
-     * @default a picture is under the water
+     * light and ink over the content of the page, without a picture ([limits](#recipes))
+     * @default the water is opaque
      */
     transparent: { kind: 'flag' },
     /**
-     * `low`, `medium` or `high`: at most 1, 2 or 3 pixels are drawn along a CSS pixel, and no more than the display has; `auto` begins with `medium` and draws fewer where frames come late
+     * `low`, `medium` and `high` draw at most 1, 2 and 3 pixels along a CSS pixel, and never more than the display has; `auto` begins as `medium` and draws fewer pixels while frames are late
      * @default `auto`
      */
     quality: { kind: 'choice', values: ['auto', 'low', 'medium', 'high'] },
     /**
-     * frames a second at most
-     * @default as many as the display shows
+     * the highest number of frames a second; without a number 30
+     * @default the rate of the display
      */
     fps: { kind: 'number', usual: 30 },
     /**
-     * `full`, `reduced` (only touches move the water), or `auto`: as the visitor wishes
+     * `full`; `reduced`, in which only touches move the water; or `auto`, the visitor's setting
      * @default `auto`
      */
     motion: { kind: 'choice', values: ['auto', 'full', 'reduced'] },
     /**
-     * the water stands still; touches and drops are not taken then
-     * @default it moves
+     * stops the water; touches and drops have no effect
+     * @default the water moves
      */
     paused: { kind: 'flag' },
     /**
-     * any value of the [look](#look), as JSON: `look='{"ringSpeed": 0.4}'`; a number outside its range counts as the nearest in it
-     * @default the preset's
+     * values of the [look](#look), as JSON: `look='{"ringSpeed": 0.4}'`; values outside their range are clamped
+     * @default the values of the preset
      */
     look: { kind: 'look' },
     /**
-     * what a screen reader calls the water; `""` is for water that only decorates
+     * the name of the water for screen readers; `""` for decorative water
      * @default "Water: press to let a drop fall"
      */
     label: { kind: 'text' },
@@ -118,7 +118,7 @@ export const attributes = {
 export type Property = keyof typeof attributes;
 export const properties = Object.keys(attributes) as Property[];
 
-/** As HTML writes it: `ink-color`; `fetchpriority` is that of images. */
+/** The name in HTML: `ink-color`. Images have `fetchpriority` already. */
 export const attributeOf = (property: Property): string =>
     property === 'fetchPriority' ? 'fetchpriority' : property.replace(/[A-Z]/g, (letter) => `-${letter.toLowerCase()}`);
 
@@ -128,11 +128,11 @@ type ValueOf<A extends Attribute> = A extends { values: readonly (infer Value)[]
 /** The properties of the element. */
 export type Properties = { -readonly [P in Property]: ValueOf<(typeof attributes)[P]> | null };
 
-/** What createWater() is given: the same, and pictures in any form. */
+/** The options of createWater(): the same, and pictures of any type. */
 export type Options =
     Partial<Omit<Properties, 'label' | 'src' | 'srcPortrait' | 'light'>> & { [P in 'src' | 'srcPortrait' | 'light']?: Source | null };
 
-/** The value of an attribute's text. */
+/** The value that the text of an attribute has. */
 export function parse(property: Property, text: string | null): unknown {
     const { kind, usual }: Attribute = attributes[property];
     if (text === null) return null;
@@ -142,22 +142,22 @@ export function parse(property: Property, text: string | null): unknown {
     try {
         return JSON.parse(text);
     } catch {
-        warnOnce(`look is no JSON: ${text}`);
+        warnOnce(`look is not JSON: ${text}`);
         return null;
     }
 }
 
-/** Says on the console what is not known. */
+/** Warns of unknown values. */
 export function check(options: Options): void {
     for (const property of properties) {
         const value = (options as Record<string, unknown>)[property];
         const { kind, values }: Attribute = attributes[property];
         if (value === null || value === undefined) continue;
-        if (values && !values.includes(value as string)) warnOnce(`${property} cannot be "${value}", only ${values.join(', ')}.`);
-        if (kind === 'color' && !inkOf(String(value))) warnOnce(`${property} cannot be "${value}", only #rrggbb.`);
-        if (kind === 'number' && Number.isNaN(Number(value))) warnOnce(`${property} is no number.`);
+        if (values && !values.includes(value as string)) warnOnce(`${property} cannot be "${value}". Write one of: ${values.join(', ')}.`);
+        if (kind === 'color' && !inkOf(String(value))) warnOnce(`${property} cannot be "${value}". Write #rrggbb.`);
+        if (kind === 'number' && Number.isNaN(Number(value))) warnOnce(`${property} is not a number: ${value}.`);
     }
     const known = withinRange(options.look ?? {});
     const names = Object.keys(options.look ?? {}).filter((name) => !(name in known)).join(', ');
-    if (names) warnOnce(`the look has no such numbers: ${names}.`);
+    if (names) warnOnce(`the look has no values with these names: ${names}.`);
 }

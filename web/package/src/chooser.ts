@@ -1,20 +1,21 @@
-// Which picture is under the water and which light on it. Of several asked for, the last one stays.
+// Loads the picture under the water and the light on it. Of several requests the last one wins.
 import type { Options } from './attributes.js';
 import type { WaterError } from './errors.js';
-import { Slot } from './native.js';
-import { greyPicture, loadPicture, plainPicture, shippedLight, uploadCover, type Picture, type Place, type Shade, type Source } from './pictures.js';
+import type { Graphics } from './graphics.js';
+import { Slot, slotOf } from './native.js';
+import { greyPicture, loadPicture, placeOf, plainPicture, shippedLight, uploadCover, type Picture, type Source } from './pictures.js';
 
-interface Told {
+interface Owner {
     pictureChanged(): void;
     lightChanged(): void;
-    /** `isNeeded` is false for the light: the water shows without it. */
+    /** `isNeeded` is false for the light, without which the water is drawn as well. */
     failed(error: WaterError, isNeeded: boolean): void;
-    /** A video goes on. */
+    /** A video plays, or was moved to another time. */
     moved(): void;
 }
 
 const lightSide = 512;
-const nothingYet = Symbol();
+const nothing = Symbol();  // no request yet
 const grey = Symbol();
 type Chosen = Source | symbol | null;
 
@@ -22,23 +23,23 @@ export class Chooser {
     picture: Picture | undefined;
     light: Picture | undefined;
 
-    private source: Chosen = nothingYet;
-    private lightSource: Chosen = nothingYet;
+    private source: Chosen = nothing;
+    private lightSource: Chosen = nothing;
     private failed = false;
-    private last = new AbortController();  // ends what the last choice has begun
+    private last = new AbortController();  // of the last request
 
-    constructor(private readonly told: Told) {}
+    constructor(private readonly owner: Owner) {}
 
-    choose(pictures: Options, isPortrait: boolean, anew: boolean): void {
-        this.choosePicture(pictures, isPortrait, anew).catch(() => {});
+    choose(pictures: Options, isPortrait: boolean, isRequested: boolean): void {
+        this.choosePicture(pictures, isPortrait, isRequested).catch(() => {});
         void this.chooseLight(pictures.light ?? null);
     }
 
-    /** What did not load is loaded again only when it is asked for `anew`. */
-    async choosePicture(pictures: Options, isPortrait: boolean, anew = false): Promise<void> {
+    /** A picture that did not load is tried again if the page has requested it again, not when the shape changes. */
+    async choosePicture(pictures: Options, isPortrait: boolean, isRequested = false): Promise<void> {
         const { src = null, srcPortrait, transparent, fetchPriority } = pictures;
         const source: Chosen = transparent ? grey : isPortrait && srcPortrait ? srcPortrait : src;
-        if ((source === this.source && !(anew && this.failed)) || source === '') return;
+        if ((source === this.source && !(isRequested && this.failed)) || source === '') return;
         this.source = source;
         this.failed = false;
         this.last.abort();
@@ -49,45 +50,48 @@ export class Chooser {
             if (signal.aborted) return;
             this.picture = picture;
             if (source instanceof HTMLVideoElement) {
-                for (const type of ['play', 'seeked']) source.addEventListener(type, () => this.told.moved(), { signal });
+                for (const type of ['play', 'seeked']) source.addEventListener(type, () => this.owner.moved(), { signal });
             }
         } catch (error) {
             if (signal.aborted) return;
             this.failed = true;
-            this.told.failed(error as WaterError, true);
+            this.owner.failed(error as WaterError, true);
             throw error;
         }
-        this.told.pictureChanged();
+        this.owner.pictureChanged();
     }
 
     private async chooseLight(source: Source | null): Promise<void> {
         if (source === this.lightSource) return;
         this.lightSource = source;
         const isLast = () => source === this.lightSource;
-        const loaded = source && await loadPicture(source).catch((error) => isLast() && this.told.failed(error, false));
+        const loaded = source && await loadPicture(source).catch((error) => isLast() && this.owner.failed(error, false));
         const light = loaded || (source && this.light) || await shippedLight();
         if (!isLast()) return;
         this.light = light;
-        this.told.lightChanged();
+        this.owner.lightChanged();
     }
 
-    /** Fills the texture that is bound, in the middle of a frame. */
-    fill(gl: WebGLRenderingContext, slot: Slot, width: number, height: number, place: Place, shade: Shade): void {
+    /** Fills the bound texture. The library calls this while it draws a frame. */
+    fill({ gl, canvas, native }: Graphics, slot: Slot, width: number, height: number): void {
         const isLight = slot === Slot.light;
+        if (!isLight && slot !== slotOf(canvas)) return;  // that picture keeps its placeholder of one pixel
         const part = isLight ? 'light' : 'picture';
         const size = isLight ? [lightSide, lightSide] as const : [width, height] as const;
+        const place = placeOf(getComputedStyle(canvas).objectPosition);
+        const shade = (brightness: number) => native!.shade(slot, brightness);
         try {
-            uploadCover(gl, this[part]!, ...size, place, shade);
+            uploadCover(gl!, this[part]!, ...size, place, shade);
         } catch (error) {
-            uploadCover(gl, (this[part] = plainPicture()), ...size, place, shade);
-            // Who hears of it may call in, which is not for the middle of a frame.
-            queueMicrotask(() => this.told.failed(error as WaterError, !isLight));
+            uploadCover(gl!, (this[part] = plainPicture()), ...size, place, shade);
+            // A listener may call the water, which has to finish its frame first.
+            queueMicrotask(() => this.owner.failed(error as WaterError, !isLight));
         }
     }
 
     end(): void {
         this.last.abort();
-        this.lightSource = nothingYet;
+        this.lightSource = nothing;
         this.picture = this.light = undefined;
     }
 }

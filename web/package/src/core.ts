@@ -1,4 +1,4 @@
-// Water in canvases of the page's own.
+// The entry `tidemark-water/core`: water in canvases that the page has.
 export type { Options, Properties } from './attributes.js';
 export { WaterError, type ErrorCode } from './errors.js';
 export { defaultLook, lookKeys, lookOf, type Choices, type Look, type LookKey, type Quality } from './look.js';
@@ -6,4 +6,5 @@ export type { Cost } from './loop.js';
 export { setModule, type ModuleSource } from './native.js';
 export type { Source } from './pictures.js';
 export { presets, type Preset, type PresetName } from './presets.js';
-export { createWater, Water, type DropOptions, type WaterEvents } from './water.js';
+export type { DropOptions } from './touches.js';
+export { createWater, Water, type WaterEvents } from './water.js';

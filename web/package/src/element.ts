@@ -1,46 +1,27 @@
-// <tidemark-water>: water behind its content.
+// The element <tidemark-water>: attributes and properties, fallback, accessibility.
 import { attributeOf, attributes, parse, properties, type Options, type Properties, type Property } from './attributes.js';
 import { WaterError, warnOnce } from './errors.js';
+import { Keys } from './keys.js';
 import type { Look } from './look.js';
+import type { Cost } from './loop.js';
 import type { Source } from './pictures.js';
+import shadowCss from './shadow.css';
 import pageCss from './style.css';
-import { Water, type DropOptions, type WaterEvents } from './water.js';
+import type { DropOptions } from './touches.js';
+import { Water, type WaterEvents } from './water.js';
 
 const events = ['ready', 'error', 'calm', 'wake', 'contextlost', 'contextrestored'];
-// Water inside of these is a part of them, and no control of its own.
-const control = 'button, a[href], summary, label, [role=button], [role=link], [role=tab], [role=option], [role^=menuitem]';
+// Inside one of these the water is not a control of its own.
+const controls = 'button, a[href], summary, label, [role=button], [role=link], [role=tab], [role=option], [role^=menuitem]';
 
-const css = `
-:host { display: block; position: relative; isolation: isolate; overflow: hidden; min-height: 160px;
-    touch-action: pan-y pinch-zoom; }
-:host([hidden]) { display: none; }
-canvas { position: absolute; inset: 0; z-index: -1; width: 100%; height: 100%; object-position: inherit; opacity: 0;
-    transition: opacity 0.5s; user-select: none; -webkit-user-select: none; -webkit-touch-callout: none; outline: none;
-    touch-action: inherit; }
-:host([shown]) canvas { opacity: 1; }
-canvas:focus-visible { box-shadow: inset 0 0 0 3px #fff, inset 0 0 0 5px #0008; }
-i { position: absolute; z-index: -1; width: 36px; height: 36px; margin: -20px; border: 2px solid #fff; border-radius: 50%;
-    box-shadow: 0 0 0 1px #0008, inset 0 0 0 1px #0008; pointer-events: none; visibility: hidden; }
-canvas:focus-visible + i { visibility: visible; }
-slot { object-position: inherit; }
-::slotted([slot='fallback']) { position: absolute; inset: 0; z-index: -2; width: 100%; height: 100%; object-fit: cover;
-    object-position: inherit; }
-:host([shown]) ::slotted([slot='fallback']) { visibility: hidden; transition: visibility 0s 0.6s; }
-:host([transparent]:not([transparent='off'])) { isolation: auto; }
-:host([transparent]:not([transparent='off'])) canvas { z-index: 1; pointer-events: none; mix-blend-mode: hard-light; }
-:host([transparent]:not([transparent='off'])) i { z-index: 1; }
-@media (forced-colors: active) {
-    canvas:focus-visible { outline: 4px solid Highlight; outline-offset: -4px; }
-}
-`;
 const sheets = new WeakMap<Document, CSSStyleSheet[]>();
 
-// Not a <style>, which a strict content security policy refuses. A document takes only its own.
+// A strict content security policy refuses <style>. A document adopts only sheets that its own window has made.
 function sheetsOf(document: Document): CSSStyleSheet[] {
     const known = sheets.get(document);
     if (known) return known;
     const view = document.defaultView ?? globalThis as unknown as Window & typeof globalThis;
-    const made = [css, pageCss].map((text) => {
+    const made = [shadowCss, pageCss].map((text) => {
         const sheet = new view.CSSStyleSheet();
         sheet.replaceSync(text);
         return sheet;
@@ -49,7 +30,7 @@ function sheetsOf(document: Document): CSSStyleSheet[] {
     return made;
 }
 
-// A server that imports this has no elements.
+// On a server, where the package may be imported, there is no HTMLElement.
 const Base = (globalThis.HTMLElement ?? class {}) as typeof HTMLElement;
 
 type ElementEvents = Omit<HTMLElementEventMap, keyof WaterEvents> & WaterEvents;
@@ -64,23 +45,20 @@ export interface WaterElement extends Properties {
 }
 
 export class WaterElement extends Base {
-    // React writes the names of properties where it renders on a server, and HTML has no capitals.
+    // React writes `inkColor` on a server, which HTML reads as `inkcolor`.
     static readonly observedAttributes = properties.flatMap((property) => [...new Set([attributeOf(property), property.toLowerCase()])]);
 
-    /** What draws; null while the element is not in a document. */
-    water: Water | null = null;
-    // Frameworks set every property that is there, so these are not.
+    private water: Water | null = null;  // only while the element is in a document
+    // Private in JavaScript, too: frameworks set each property that an element has.
     #internals: ElementInternals | undefined;
-    #marker: HTMLElement | undefined;
+    #keys: Keys | undefined;
     #own: { src?: Source | null; srcPortrait?: Source | null; look?: Look | null } = {};
     #due = new Set<Property>();
-    #at: [number, number] = [0.5, 0.5];  // where a key drops, as shares of the size
-    #hasKeys = false;
-    #isHeard = false;
+    #hasListener = false;  // for the event `error`
 
     connectedCallback(): void {
         if (this.water) return;
-        // Properties that were set before the element was known.
+        // Properties that were set before the element was defined hide the accessors of its class.
         for (const property of properties) {
             if (!Object.hasOwn(this, property)) continue;
             const value = this[property];
@@ -95,11 +73,11 @@ export class WaterElement extends Base {
     }
 
     disconnectedCallback(): void {
-        // An element that only moves keeps its water.
+        // An element that the page moves is connected again in the same task, and keeps its water.
         queueMicrotask(() => this.isConnected || this.destroy());
     }
 
-    // Another document has other style sheets.
+    // The style sheets belong to the old document.
     adoptedCallback(): void {
         this.destroy();
     }
@@ -112,12 +90,25 @@ export class WaterElement extends Base {
     }
 
     override addEventListener(type: string, listener: EventListenerOrEventListenerObject | null, options?: boolean | AddEventListenerOptions): void {
-        this.#isHeard ||= type === 'error';
+        this.#hasListener ||= type === 'error';
         super.addEventListener(type, listener!, options);
     }
 
+    /** The canvas that is drawn, for `captureStream()`; null while the element is not in a document. */
+    get canvas(): HTMLCanvasElement | null {
+        return this.water?.canvas ?? null;
+    }
+    /** Whether the water is at rest. No frames are drawn then. */
+    get calm(): boolean {
+        return this.water?.calm ?? true;
+    }
+    /** The time between two frames, and the time that the main thread takes for one. */
+    get cost(): Cost {
+        return this.water?.cost ?? { frame: 0, work: 0 };
+    }
+
     override focus(options?: FocusOptions): void {
-        this.water?.canvas.focus(options);
+        this.canvas?.focus(options);
     }
 
     drop(x: number, y: number, options?: DropOptions): void {
@@ -142,7 +133,7 @@ export class WaterElement extends Base {
     toBlob(type?: string, quality?: number): Promise<Blob> {
         return this.water?.toBlob(type, quality) ?? Promise.reject(new Error('not in a document'));
     }
-    /** Frees everything. The element comes back to life when it is put into a document again. */
+    /** Frees everything. Putting the element into a document again starts it anew. */
     destroy(): void {
         this.water?.destroy();
         this.water = null;
@@ -158,7 +149,7 @@ export class WaterElement extends Base {
         root.adoptedStyleSheets = [own!];
         const around = this.getRootNode() as Document | ShadowRoot;
         if (!around.adoptedStyleSheets.includes(page!)) around.adoptedStyleSheets = [...around.adoptedStyleSheets, page!];
-        this.removeAttribute('shown');  // of a copy
+        this.removeAttribute('shown');  // copied by cloneNode()
         const fallback = document.createElement('slot');
         fallback.name = 'fallback';
         fallback.addEventListener('slotchange', () => this.#changed('src'));
@@ -167,25 +158,16 @@ export class WaterElement extends Base {
         still.setAttribute('aria-hidden', 'true');
         const canvas = document.createElement('canvas');
         canvas.setAttribute('part', 'water');
-        this.#marker = document.createElement('i');
-        this.#marker.setAttribute('part', 'marker');
-        root.replaceChildren(fallback, still, canvas, this.#marker, document.createElement('slot'));
-        this.#mark();
+        root.replaceChildren(fallback, still, canvas, this.#keys!.marker, document.createElement('slot'));
         return [canvas, still];
     }
 
     #attach(): ShadowRoot {
         const root = this.attachShadow({ mode: 'open' });
-        const ofCanvas = ({ target }: Event) => target === this.water?.canvas;
-        root.addEventListener('keydown', (event) => ofCanvas(event) && this.#press(event as KeyboardEvent));
-        // After a click the keys go on scrolling the page.
-        let isClicked = false;
-        root.addEventListener('mousedown', () => {
-            this.#hasKeys = false;
-            isClicked = true;
-            setTimeout(() => (isClicked = false));  // it has focused by then
+        this.#keys = new Keys(root, {
+            isCanvas: (target) => target === this.canvas,
+            drop: (x, y) => this.drop(x * this.clientWidth, y * this.clientHeight, { ink: true }),
         });
-        root.addEventListener('focusin', (event) => (this.#hasKeys = ofCanvas(event) && !isClicked));
         return root;
     }
 
@@ -197,17 +179,17 @@ export class WaterElement extends Base {
         if (detail?.isFatal) this.#state('failed', true);
         if (detail?.isFatal) this.#name(true);
         this.dispatchEvent(new CustomEvent(event.type, { detail }));
-        if (detail && !this.#isHeard) warnOnce(`${detail.code}: ${detail.message}`);
+        if (detail && !this.#hasListener) warnOnce(`${detail.code}: ${detail.message}`);
     }
 
-    // For :state() in style sheets, in browsers that have it.
+    // For :state() in style sheets.
     #state(name: string, isOn: unknown): void {
         try {
             this.#internals ??= this.attachInternals();
             if (isOn) this.#internals.states.add(name);
             else this.#internals.states.delete(name);
         } catch {
-            // Older ones have no states, or other names for them.
+            // Older browsers have no states, or require names that begin with dashes.
         }
     }
 
@@ -228,7 +210,7 @@ export class WaterElement extends Base {
     #choices(names: Property[]): Options {
         const options: Record<string, unknown> = {};
         for (const name of names) options[name] = this[name];
-        // A picture for browsers without water is one for those with it.
+        // Without `src`, the picture of the fallback is the picture under the water.
         const image = this.querySelector<HTMLImageElement>(':scope > img[slot=fallback], :scope > [slot=fallback] img');
         if ('src' in options) options.src ??= image?.currentSrc || image?.src;
         for (const [name, value] of Object.entries(this.#own)) if (name in options && value !== undefined) options[name] = value;
@@ -248,28 +230,9 @@ export class WaterElement extends Base {
 
     #isPartOfControl(): boolean {
         for (let node: Element | null = this; node; node = (node.getRootNode() as ShadowRoot).host ?? null) {
-            if (node.closest(control)) return true;
+            if (node.closest(controls)) return true;
         }
         return false;
-    }
-
-    #press(event: KeyboardEvent): void {
-        const step = { ArrowLeft: [-1, 0], ArrowRight: [1, 0], ArrowUp: [0, -1], ArrowDown: [0, 1] }[event.key];
-        const isDrop = event.key === 'Enter' || event.key === ' ';
-        if (!this.#hasKeys || (!step && !isDrop) || event.ctrlKey || event.metaKey || event.altKey) return;
-        event.preventDefault();
-        const { clientWidth, clientHeight } = this;
-        if (step) {
-            this.#at = this.#at.map((share, i) => Math.min(0.96, Math.max(0.04, share + 0.06 * step[i]!))) as [number, number];
-            this.#mark();
-        } else {
-            this.drop(this.#at[0] * clientWidth, this.#at[1] * clientHeight, { ink: true });
-        }
-    }
-
-    #mark(): void {
-        this.#marker!.style.left = `${100 * this.#at[0]}%`;
-        this.#marker!.style.top = `${100 * this.#at[1]}%`;
     }
 
     static {
@@ -289,7 +252,7 @@ export class WaterElement extends Base {
                         this.#changed(property);
                     } else if (value === null || value === undefined) {
                         for (const name of names) this.removeAttribute(name);
-                        this.attributeChangedCallback(names[0]!);  // what was no attribute goes as well
+                        this.attributeChangedCallback(names[0]!);  // removes a value that has no attribute
                     } else if (kind === 'flag') {
                         this.setAttribute(names[0]!, value || value === '' ? '' : 'off');
                     } else {

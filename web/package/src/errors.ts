@@ -1,11 +1,11 @@
 export type ErrorCode =
-    | 'webgl'         // the browser has no WebGL, or has switched it off
+    | 'webgl'         // the browser has no WebGL, or WebGL is switched off
     | 'simd'          // the browser has no WebAssembly with SIMD
     | 'csp'           // the page's content security policy lacks 'wasm-unsafe-eval'
     | 'module'        // tidemark-water.wasm does not load
-    | 'cross-origin'  // another server's picture does not load, or comes without Access-Control-Allow-Origin
+    | 'cross-origin'  // another server's picture does not load, or has no Access-Control-Allow-Origin for this page
     | 'load'          // this server's picture does not load
-    | 'decode';       // the file is not a picture that the browser can show
+    | 'decode';       // the browser cannot decode the file as a picture
 
 export class WaterError extends Error {
     override readonly name = 'WaterError';
@@ -14,17 +14,17 @@ export class WaterError extends Error {
         super(message);
     }
 
-    /** Whether this water cannot be drawn any more. */
+    /** Whether the error ends the water: it cannot be drawn any more. */
     get isFatal(): boolean {
         return ['webgl', 'simd', 'csp', 'module'].includes(this.code);
     }
 }
 
-const said = new Set<string>();
+const warned = new Set<string>();
 
-/** On the console, the same once a page. */
+/** Writes a warning to the console, each text once. */
 export function warnOnce(text: string): void {
-    if (said.has(text)) return;
-    said.add(text);
+    if (warned.has(text)) return;
+    warned.add(text);
     console.warn(`tidemark-water: ${text}`);
 }

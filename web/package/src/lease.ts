@@ -1,22 +1,25 @@
-// Browsers give a page about sixteen WebGL contexts and then take away the one that was used least. So a few are
-// lent out, and a water that nobody sees, that rests, or that only rain moves shows a still picture when another needs one.
-const usual = 12;
-const patience = 30_000;  // milliseconds after which the page may have room again
-const answer = 3000;      // milliseconds that a browser gets to restore a context
+// Lends WebGL contexts to the waters of a page. Browsers allow a page about sixteen contexts; for one more they take away
+// the context that was used least recently. A water that is not visible, at rest, or moved only by rain gives its context
+// to a water that needs it more, and shows a still picture.
+const usualMost = 12;
+const recoveryTime = 30_000;  // milliseconds after a loss until `most` is `usualMost` again
+const restoreTime = 3000;     // milliseconds in which a browser has to restore a context
 
 export interface Claim {
-    /** Who needs it more takes it from who needs it less. */
+    /** The water with the higher number gets the context. */
     urgency(): number;
+    /** Gives the context to another water. */
     park(): void;
+    /** A context may be free. */
     resume(): void;
 }
 
-let most = usual;
+let most = usualMost;
 let recovery = 0;
-const holders = new Set<Claim>();  // the longest held first
+const holders = new Set<Claim>();  // in the order of borrowing
 const waiting = new Set<Claim>();
 
-/** False where all are in use by others as urgent; then resume() is called when that may have changed. */
+/** False where waters that are at least as urgent have all contexts. Then resume() is called when that may have changed. */
 export function borrow(claim: Claim): boolean {
     waiting.delete(claim);
     if (holders.delete(claim) || holders.size < most) {
@@ -39,7 +42,7 @@ export function giveBack(claim: Claim): void {
     holders.delete(claim);
 }
 
-/** When a context may have become free, or less needed. */
+/** Call this when a context is free, or a water has become less urgent. */
 export function offer(): void {
     if (waiting.size === 0) return;
     const first = [...waiting].reduce((most, other) => (other.urgency() > most.urgency() ? other : most));
@@ -47,15 +50,15 @@ export function offer(): void {
     first.resume();
 }
 
-/** The browser has taken the context of `claim`: the page has others, so for a while no more are lent than are left. */
+/** Call this when the browser has taken the context of `claim`. The page has other WebGL, so for a while fewer are lent. */
 export function takenFrom(claim: Claim): void {
     giveBack(claim);
     most = Math.max(1, Math.min(most, holders.size));
     clearTimeout(recovery);
     recovery = window.setTimeout(() => {
-        most = usual;
+        most = usualMost;
         offer();
-    }, patience);
+    }, recoveryTime);
 }
 
 export interface Context {
@@ -64,7 +67,7 @@ export interface Context {
 }
 const contexts = new WeakMap<HTMLCanvasElement, Context>();
 
-/** The canvas's context, also where it is lost; null where there is no WebGL. */
+/** The context of the canvas, even if it is lost; null where the browser has no WebGL. */
 export function contextOf(canvas: HTMLCanvasElement): Context | null {
     const known = contexts.get(canvas);
     if (known) return known;
@@ -76,12 +79,12 @@ export function contextOf(canvas: HTMLCanvasElement): Context | null {
     return made;
 }
 
-/** Asks for a context that this page has given back; false where the browser does not restore it. */
+/** Restores a context that park() has given back. False where the browser does not restore it. */
 export function restored({ gl, lose }: Context): Promise<boolean> {
     return new Promise((resolve) => {
         gl.canvas.addEventListener('webglcontextrestored', () => resolve(true), { once: true });
-        // Only after the event of the loss.
+        // The browser refuses this until the event `webglcontextlost` is over.
         setTimeout(() => gl.isContextLost() && lose?.restoreContext(), 0);
-        setTimeout(() => resolve(!gl.isContextLost()), answer);
+        setTimeout(() => resolve(!gl.isContextLost()), restoreTime);
     });
 }

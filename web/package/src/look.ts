@@ -1,4 +1,4 @@
-// The numbers of host/look.properties, and the whole look that a visitor's choices give.
+// The values of host/look.properties, and the complete look that options give.
 import keys from '../../../build/web/generated/host/look.json';
 import { presets, type PresetName } from './presets.js';
 
@@ -6,40 +6,43 @@ export type Look = Record<string, number>;
 
 export interface LookKey {
     name: string;
-    value: number;  // as shipped
-    min: number;    // of the range that looks well
+    value: number;  // the default
+    min: number;    // of the recommended range
     max: number;
     whole: boolean;
 }
 
-/** In the order of the file, which is that of the fields in C++. */
+/** In the order of the file. */
 export const lookKeys: readonly LookKey[] = keys;
 
 export const defaultLook = (): Look => Object.fromEntries(lookKeys.map(({ name, value }) => [name, value]));
 
-/** How many pixels are drawn. */
+/** The limit of the number of pixels. */
 export type Quality = 'auto' | 'low' | 'medium' | 'high';
 
 export interface Choices {
-    /** At most as many pixels for a CSS pixel as the display has, and as 1, 2 or 3; "auto" as frames keep the pace. */
+    /**
+     * `low`, `medium` and `high` draw at most 1, 2 and 3 pixels along a CSS pixel, and never more than the display has. `auto`
+     * begins as `medium` and draws fewer pixels while frames are late.
+     */
     quality?: Quality | null;
     preset?: PresetName | null;
-    /** "#rrggbb" */
+    /** `#rrggbb` */
     inkColor?: string | null;
     /** Drops a second, up to 60. */
     rain?: number | null;
-    /** Values of host/look.properties, above all other choices. */
+    /** Values of host/look.properties. They override those of all other options. */
     look?: Look | null;
 }
 
-// A shower is many small drops.
+// The more drops a second, the smaller each is.
 const mostDrops = 60;
 const dropHeight = (drops: number) => Math.min(1.2, 1.6 / Math.sqrt(1 + drops / 4));
 
-// Brighter ink would light the picture up.
+// Of a colour channel, 0 to 1. Brighter ink would look like light.
 const brightest = 0.75;
 
-/** Red, green and blue of the ink, 0 to 0.75, for "#rrggbb"; null for anything else. */
+/** Red, green and blue of the ink, 0 to 0.75, for `#rrggbb`; null for any other text. */
 export function inkOf(color: string): Look | null {
     const bytes = /^#([0-9a-f]{2})([0-9a-f]{2})([0-9a-f]{2})$/i.exec(color)?.slice(1);
     if (!bytes) return null;
@@ -47,7 +50,7 @@ export function inkOf(color: string): Look | null {
     return { inkRed: inkRed!, inkGreen: inkGreen!, inkBlue: inkBlue! };
 }
 
-/** The parts of `look` that are known, each the nearest within its range. */
+/** The known values of `look`, each clamped to its range. */
 export function withinRange(look: Look): Look {
     const near: Look = {};
     for (const { name, min, max, whole } of lookKeys) {
@@ -59,7 +62,7 @@ export function withinRange(look: Look): Look {
     return near;
 }
 
-/** The whole look that these choices give, by the names of host/look.properties. */
+/** The complete look that these options give. */
 export function lookOf({ preset, inkColor, rain, look }: Choices): Look {
     const drops = Math.min(rain ?? 0, mostDrops);
     return {

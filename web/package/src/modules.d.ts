@@ -1,4 +1,4 @@
-// What the bundler, the build of the look and the compiler of the WebAssembly make.
+// Types of files that the build generates or that esbuild's loaders import.
 declare module '*/look.json' {
     const keys: { name: string; value: number; min: number; max: number; whole: boolean }[];
     export default keys;
@@ -12,6 +12,10 @@ declare module '*.css' {
     export default text;
 }
 declare module '*.webp' {
+    const bytes: Uint8Array<ArrayBuffer>;
+    export default bytes;
+}
+declare module '*.wasm' {
     const bytes: Uint8Array<ArrayBuffer>;
     export default bytes;
 }

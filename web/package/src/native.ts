@@ -1,5 +1,5 @@
-// The library and its host as WebAssembly: compiled once a page, with an instance for each water, because the library
-// keeps its state in globals.
+// The library and its host as WebAssembly. A page compiles the module once and makes an instance for each water, because
+// the library keeps its state in globals.
 import createInstance from '../../../build/web/tidemark-water.js';
 import { WaterError } from './errors.js';
 import type { Look } from './look.js';
@@ -25,56 +25,62 @@ export enum Slot {
     light = 2,
 }
 
+/** The slot of the picture that a canvas of this shape shows. */
+export const slotOf = ({ width, height }: HTMLCanvasElement): Slot => (width > height ? Slot.landscape : Slot.portrait);
+
 /** Both pictures that may be under the water, for `_picturesChanged`. */
 export const backgrounds = (1 << Slot.portrait) | (1 << Slot.landscape);
 
-// The smallest module with a vector in it: a function that makes one and drops it.
-const vectors = new Uint8Array([
+// A module that a browser without SIMD refuses: its one function makes a vector and drops it.
+const vectorModule = new Uint8Array([
     0, 97, 115, 109, 1, 0, 0, 0, 1, 4, 1, 96, 0, 0, 3, 2, 1, 0, 10, 9, 1, 7, 0, 65, 0, 253, 15, 26, 11,
 ]);
 
-/** Compiled, or its address. */
-export type ModuleSource = string | URL | WebAssembly.Module;
+/** An address, the bytes, or the compiled module. */
+export type ModuleSource = string | URL | BufferSource | WebAssembly.Module;
 
 let source: ModuleSource | undefined;
 let compiled: Promise<WebAssembly.Module> | undefined;
 
-/** Where tidemark-water.wasm is, for waters from now on; beside the script where nothing else is said. */
+/** Sets the module of all waters that are made later. Without a call it is the tidemark-water.wasm beside the script. */
 export function setModule(module: ModuleSource): void {
     source = module;
     compiled = undefined;
 }
 
 async function fetchModule(): Promise<WebAssembly.Module> {
-    if (typeof WebAssembly !== 'object' || !WebAssembly.validate(vectors)) {
+    if (typeof WebAssembly !== 'object' || !WebAssembly.validate(vectorModule)) {
         throw new WaterError('simd', 'This browser has no WebAssembly with SIMD.');
     }
     if (source instanceof WebAssembly.Module) return source;
-    const url = source ?? new URL('tidemark-water.wasm', import.meta.url);
-    const mend = 'setModule() says where it is, see "Bundlers" in the README of tidemark-water';
-    const response = await fetch(url).catch(() => null);
-    if (!response?.ok) throw new WaterError('module', `${url} does not load. ${mend}.`);
+    const given = source ?? new URL('tidemark-water.wasm', import.meta.url);
+    const isAddress = typeof given === 'string' || given instanceof URL;
+    const name = isAddress ? given : 'The argument of setModule()';
+    const mend = 'Call setModule() with the address of the file, see "Bundlers" in the README of tidemark-water';
+    const response = isAddress ? await fetch(given).catch(() => null) : new Response(given);
+    if (!response?.ok) throw new WaterError('module', `${name} does not load. ${mend}.`);
     try {
-        // Not streaming: that would ask every server for the right type of content, for a few dozen kilobytes.
+        // compileStreaming() would need servers that send the content type application/wasm.
         return await WebAssembly.compile(await response.arrayBuffer());
     } catch (error) {
         const text = String(error);
         if (/CSP|content security|unsafe-eval/i.test(text)) {
             throw new WaterError('csp', "The content security policy needs script-src 'wasm-unsafe-eval'.");
         }
-        throw new WaterError('module', `${url} is no module: ${text}. ${mend}.`);
+        throw new WaterError('module', `${name} is not a WebAssembly module: ${text}. ${mend}.`);
     }
 }
 
-// A module that did not load is tried again with the next water.
+// Starts in a microtask: `import` upgrades the elements of the document before the page can call setModule(). After a
+// failure the next water tries again.
 export function compile(): Promise<WebAssembly.Module> {
-    return (compiled ??= fetchModule().catch((error) => {
+    return (compiled ??= Promise.resolve().then(fetchModule).catch((error) => {
         compiled = undefined;
         throw error;
     }));
 }
 
-/** Fills the texture that is bound with width x height pixels; the light has as many as it likes. */
+/** Fills the bound texture with width x height pixels. The light may have another size. */
 export type Load = (slot: Slot, width: number, height: number) => void;
 
 interface Instance {
@@ -104,14 +110,15 @@ interface Instance {
     _frame(seconds: number): number;
 }
 export interface Native extends Instance {
-    setLook(look: Look): void;
-    /** The colour by which a picture of this brightness, 0 to 1, is multiplied, for style sheets. */
+    /** Returns false, and does nothing, where these values are already set. */
+    setDrawing(look: Look, quality: number, ink: boolean): boolean;
+    /** The CSS colour by which a picture of this mean brightness, 0 to 1, is multiplied. */
     shade(slot: Slot, brightness: number): string;
-    /** After a lost context: the same, restored, or another one. */
+    /** Makes all graphics objects anew, after a lost context, in the restored one or in another. */
     renew(context: WebGLRenderingContext): void;
 }
 
-// The compiler's glue marks the canvas, which may outlive the water.
+// The compiler's glue keeps a reference in the canvas, which may outlive the water.
 const unmark = ({ canvas }: WebGLRenderingContext) => delete (canvas as { GLctxObject?: unknown }).GLctxObject;
 
 export async function instantiate(
@@ -129,14 +136,21 @@ export async function instantiate(
     }) as Instance;
     instance._begin(seed);
     unmark(context);
+    let drawing = '';
     return Object.assign(instance, {
-        setLook(look: Look) {
+        setDrawing(look: Look, quality: number, ink: boolean) {
+            const wanted = JSON.stringify([look, quality, ink]);
+            if (wanted === drawing) return false;
+            drawing = wanted;
             const place = instance._nameToFill();
             for (const [name, value] of Object.entries(look)) {
                 instance.HEAPU8.set(new TextEncoder().encode(`${name}\0`), place);
                 if (!instance._setLookValue(value)) console.warn(`tidemark-water: the look refuses ${name} = ${value}.`);
             }
             instance._applyLook();
+            instance._setQuality(quality);
+            instance._setInk(ink);
+            return true;
         },
         shade: (slot: Slot, brightness: number) => `#${instance._shade(slot, brightness).toString(16).padStart(6, '0')}`,
         renew(context: WebGLRenderingContext) {

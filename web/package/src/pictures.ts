@@ -1,5 +1,5 @@
-// Pictures on their way into textures. They go from the browser's decoder to the GPU, cropped and scaled to the view;
-// what stays in memory is the file as it came, which the browser decodes again after a lost context.
+// Loads pictures and uploads them into textures, cropped and scaled to the view. The page keeps no decoded copy: after a
+// lost context the browser decodes the file again.
 import { WaterError } from './errors.js';
 import light from './light.webp';
 
@@ -9,15 +9,15 @@ export type Source =
 export interface Picture {
     drawable: CanvasImageSource;
     size(): [number, number];
-    /** Whether it may change by itself now. */
+    /** Whether it may change from frame to frame. */
     moving(): boolean;
     /** Whether it has changed since the last call. */
     changed(): boolean;
-    /** Whether the look darkens and tints it. Not what moves, which would be measured with every frame. */
+    /** Whether the look darkens and tints it. Moving pictures keep their colours: each frame would have to be measured. */
     shaded: boolean;
 }
 
-/** The colour by which a picture is multiplied whose channels have this mean, 0 to 1. */
+/** The CSS colour by which a picture is multiplied. `brightness` is the mean of its channels, 0 to 1. */
 export type Shade = (brightness: number) => string;
 
 function canvasOf(width: number, height: number): HTMLCanvasElement {
@@ -35,7 +35,7 @@ async function loadImage(url: string, priority: 'high' | 'low' | 'auto', blob?: 
     } catch {
         throw new WaterError('load', `${url} is no address.`);
     }
-    // Also where the address is the page's own: it may lead to another server, and a frame may be a sandbox.
+    // Same-origin addresses, too: they may redirect to another server, and a sandboxed frame has an origin of its own.
     if (/^https?:/.test(address.protocol)) image.crossOrigin = 'anonymous';
     image.fetchPriority = priority;
     image.src = url;
@@ -44,11 +44,11 @@ async function loadImage(url: string, priority: 'high' | 'low' | 'auto', blob?: 
         image.onerror = () => resolve(false);
     });
     if (loaded) {
-        await image.decode().catch(() => {});  // refused for some SVGs, which draw all the same
+        await image.decode().catch(() => {});  // some SVGs are drawn although decode() rejects
         return image;
     }
     if (blob) throw new WaterError('decode', 'The file is not a picture that this browser can show.');
-    // Only a request with cookies could tell another server's refusal from a missing file.
+    // Without cookies, a missing file of another server looks the same as a refusal.
     const away = image.crossOrigin && address.origin !== self.origin;
     const response = away ? null : await fetch(url, { mode: 'no-cors' }).catch(() => null);
     if (away || response?.type === 'opaque') {
@@ -61,7 +61,7 @@ async function loadImage(url: string, priority: 'high' | 'low' | 'auto', blob?: 
 const still = (drawable: CanvasImageSource, size: () => [number, number]): Picture =>
     ({ drawable, size, moving: () => false, changed: () => false, shaded: true });
 
-/** Throws for what a texture would refuse in the middle of a frame. */
+/** Throws if a texture would refuse the picture. */
 function probe(picture: Picture): Picture {
     const context = canvasOf(1, 1).getContext('2d', { willReadFrequently: true });
     const [width, height] = picture.size();
@@ -119,21 +119,21 @@ async function load(source: Source, priority: 'high' | 'low' | 'auto'): Promise<
     } else {
         image = await loadImage(String(source), priority);
     }
-    // A drawing may have proportions and no size.
+    // An SVG may have no size of its own.
     return still(image, () => [image.naturalWidth || 1024, image.naturalHeight || 1024]);
 }
 
-// Where of a picture a view shows its part: 0 is left or top, 1 right or bottom.
+// The part of a picture that a view of another shape shows: 0 is left or top, 1 is right or bottom.
 export type Place = readonly [x: number, y: number];
 
-/** The place that a computed `object-position` names in percents. */
+/** Reads a computed `object-position`, in percent; the middle for other units. */
 export function placeOf(position: string): Place {
     const share = (text = '') => (text.endsWith('%') ? Math.min(Math.max(parseFloat(text) / 100, 0), 1) : 0.5);
     const [x, y] = position.split(' ');
     return [share(x), share(y)];
 }
 
-/** Covers the whole canvas. */
+/** Draws the picture so that it covers the canvas, as `object-fit: cover` does. */
 export function drawCover(canvas: HTMLCanvasElement, picture: Picture, [x, y]: Place): void {
     const { width, height } = canvas;
     const [fullWidth, fullHeight] = picture.size();
@@ -154,9 +154,9 @@ function brightnessOf(canvas: HTMLCanvasElement): number {
     return data.reduce((sum, value, i) => (i % 4 < 3 ? sum + value : sum), 0) / (255 * 3 * side * side);
 }
 
-/** Multiplies the colours of a canvas. */
+/** Multiplies the colours of a canvas by the shade for its brightness. */
 export function multiply(canvas: HTMLCanvasElement, shade: Shade): void {
-    if (shade(1) === '#ffffff') return;  // and then for a darker one as well
+    if (shade(1) === '#ffffff') return;  // the shade of darker pictures is not darker
     const context = canvas.getContext('2d')!;
     context.fillStyle = shade(brightnessOf(canvas));
     context.globalCompositeOperation = 'multiply';
@@ -166,7 +166,7 @@ export function multiply(canvas: HTMLCanvasElement, shade: Shade): void {
 
 let scratch: HTMLCanvasElement | undefined;
 
-/** Fills the texture that is bound with a part of the picture, scaled to width x height. Rows go from the top. */
+/** Fills the bound texture with a part of the picture, scaled to width x height. The first row is the top. */
 export function uploadCover(gl: WebGLRenderingContext, picture: Picture, width: number, height: number, place: Place, shade: Shade): void {
     scratch ??= canvasOf(width, height);
     if (scratch.width !== width) scratch.width = width;
@@ -175,7 +175,7 @@ export function uploadCover(gl: WebGLRenderingContext, picture: Picture, width: 
     try {
         if (picture.shaded) multiply(scratch, shade);
         gl.texImage2D(gl.TEXTURE_2D, 0, gl.RGBA, gl.RGBA, gl.UNSIGNED_BYTE, scratch);
-    } catch {  // a canvas that was drawn on since
+    } catch {  // a picture of another origin was drawn on the canvas after probe()
         scratch = undefined;
         throw new WaterError('cross-origin', 'The picture holds what this page may not use.');
     }
@@ -184,12 +184,12 @@ export function uploadCover(gl: WebGLRenderingContext, picture: Picture, width: 
 
 let shipped: Promise<Picture> | undefined;
 
-/** What the waves throw back: sky with the sun's glitter. */
+/** The light that waves reflect: sky with the sun's glitter. */
 export const shippedLight = (): Promise<Picture> =>
     (shipped ??= createImageBitmap(new Blob([light], { type: 'image/webp' }))
         .then((bitmap) => still(bitmap, () => [bitmap.width, bitmap.height])));
 
-/** Without a picture: deep water. */
+/** Deep water, for a page without a picture. */
 export function plainPicture(): Picture {
     const canvas = canvasOf(256, 256);
     const context = canvas.getContext('2d')!;
@@ -201,7 +201,7 @@ export function plainPicture(): Picture {
     return still(canvas, () => [256, 256]);
 }
 
-/** What `mix-blend-mode: hard-light` leaves out: lighter than this it adds light, darker it takes some. */
+/** Grey, which `mix-blend-mode: hard-light` does not change. Lighter colours add light, darker ones remove it. */
 export function greyPicture(): Picture {
     const canvas = canvasOf(1, 1);
     const context = canvas.getContext('2d')!;

@@ -1,14 +1,13 @@
-// Pointer events to touches. The pointer that comes down first draws; every other one, and a mouse that hovers, only
-// ripples.
+// Turns pointer events into touches. The first pointer that is pressed draws. Other pointers, and a mouse without a pressed
+// button, only make ripples.
 import { TouchAction } from './native.js';
 
-// Of a pointer that only ripples: pixels from one ripple to the next, and their height as a share of a touch's.
-const spacing = 14;
-const hoverHeight = 0.25;
+const spacing = 14;  // pixels between two ripples of one pointer
+const hoverHeight = 0.25;   // of the height of a touch
 const fingerHeight = 0.3;
 const placeEvent = 'tidemark-place';
 
-/** Places are shares of the box, from its top left corner. */
+/** x and y are fractions of the box's width and height, from its top left corner. */
 export interface Touched {
     hovers(): boolean;
     presses(): boolean;
@@ -17,15 +16,15 @@ export interface Touched {
 }
 
 /**
- * Events stay where they are, so that what lies on the water can be clicked, selected and scrolled.
- * @param target where pointers count: the box or, for those of the whole page, the window
+ * Never cancels or captures an event, so that content above the water can be clicked, selected and scrolled.
+ * @param target receives the events: the box or, for pointers of the whole page, the window
  */
 export function followPointers(box: HTMLElement, target: EventTarget, water: Touched, signal: AbortSignal): void {
     const view = box.ownerDocument.defaultView ?? window;
     let drawing: number | null = null;
-    const lastRipple = new Map<number, [number, number]>();  // of each pointer that only ripples
+    const lastRipple = new Map<number, [number, number]>();  // of each pointer that makes ripples
 
-    // Only the browser can undo every transform between the window and the box, and it does so for events.
+    // An event of the box's own has offsetX and offsetY, for which the browser inverts all CSS transforms of the box.
     let offset = [0, 0];
     box.addEventListener(placeEvent, (event) => {
         offset = [(event as PointerEvent).offsetX, (event as PointerEvent).offsetY];
@@ -54,7 +53,7 @@ export function followPointers(box: HTMLElement, target: EventTarget, water: Tou
         drawing = null;
         touch(action, event);
     };
-    // Of the window before anybody can stop them, or a stroke would never end.
+    // In the capture phase: a listener of the page may stop the event, and the stroke would never end.
     const listen = (on: EventTarget, type: string, call: (event: PointerEvent) => void) =>
         on.addEventListener(type, call as EventListener, { signal, passive: true, capture: on === view });
 
@@ -76,11 +75,11 @@ export function followPointers(box: HTMLElement, target: EventTarget, water: Tou
             trail(event, hoverHeight);
         }
     });
-    // A stroke goes on beyond the edges.
+    // A stroke continues outside the box.
     listen(view, 'pointermove', (event) => {
         if (event.pointerId !== drawing) return;
         if (event.buttons === 0) return end(TouchAction.up)(event);
-        // All that the device has reported since the last frame.
+        // The browser sends one event a frame, with all reports of the device since the last one.
         const reports = event.getCoalescedEvents?.() ?? [];
         for (const report of reports.length > 0 ? reports : [event]) touch(TouchAction.move, report);
     });

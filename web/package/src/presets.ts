@@ -1,4 +1,4 @@
-// Looks with names: those of host/presets.ini.
+// The presets of host/presets.ini.
 import named from '../../../build/web/generated/host/presets.json';
 import type { Look } from './look.js';
 
@@ -7,13 +7,13 @@ export type PresetName =
 
 export interface Preset {
     title: string;
-    /** The painted picture that goes with it: tiles, pebbles or sand. */
+    /** The painted picture that suits it: tiles, pebbles or sand. */
     ground: 'pool' | 'river' | 'shore';
     /** Whether touches drop ink. */
     ink: boolean;
     /** Whether it rains. */
     rain: boolean;
-    /** What differs from the default look. */
+    /** The values that differ from the default look. */
     look: Look;
 }
 

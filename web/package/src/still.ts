@@ -1,8 +1,9 @@
-// A picture of the water, for where it cannot be drawn. A canvas with WebGL can be read only in the task that has drawn.
+// A copy of the last frame, or of the picture, to show while the water has no context. A script can read a WebGL canvas
+// only in the task that has drawn it.
 import { drawCover, multiply, placeOf, type Picture, type Shade } from './pictures.js';
 
 export class Still {
-    /** Whether it has what the water shows. */
+    /** Whether it holds what the water shows. */
     isKept = false;
 
     constructor(private readonly canvas: HTMLCanvasElement) {}
@@ -13,7 +14,7 @@ export class Still {
         this.isKept = true;
     }
 
-    /** Water at rest looks like its picture. */
+    /** Shows the picture as calm water does. */
     show(picture: Picture, { width, height }: HTMLCanvasElement, shade: Shade): void {
         this.resize(width, height);
         drawCover(this.canvas, picture, placeOf(getComputedStyle(this.canvas).objectPosition));

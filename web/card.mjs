@@ -1,5 +1,5 @@
-// Draws public/card.jpg, which other sites show for a link to the page, and public/icon.png, out of the built page and
-// its favicon: `npm run card`.
+// Draws public/card.jpg, the picture that other sites show for a link to the page, with the built page, and public/icon.png
+// from its favicon. Run it with `npm run card`.
 import { readFileSync } from 'node:fs';
 import { chromium } from '@playwright/test';
 import { preview } from 'vite';
@@ -18,20 +18,17 @@ await page.addStyleTag({ content: `#tools, #panel, #hint, #brand nav { display: 
 await takeOver(page);
 await page.evaluate(() => {
     const water = document.querySelector('tidemark-water');
-    water.drop(850, 330);
-    window.frames(34);
-    water.drop(560, 470, { strength: 0.7 });
-    window.frames(20);
-    for (let step = 0; step <= 24; ++step) {
-        window.touch(step ? 2 : 0, 620 + 16 * step, 500 - 60 * Math.sin(step / 5));
+    water.drop(500, 430);
+    for (let step = 0; step <= 30; ++step) {
+        window.touch(step ? 2 : 0, 740 + 12 * step, 400 - 80 * Math.sin(step / 6));
         window.frames(1);
     }
-    window.touch(1, 1004, 500 - 60 * Math.sin(24 / 5));
-    window.frames(6);
+    window.touch(1, 1100, 400 - 80 * Math.sin(30 / 6));
+    window.frames(10);
 });
 await page.screenshot({ path: fileOf('card.jpg'), type: 'jpeg', quality: 82 });
 
-// Filled to the edges, which phones cut in a shape of their own.
+// Fills the square, because phones cut icons to a shape of their own.
 const drawing = readFileSync(fileOf('favicon.svg'), 'utf8').replace(/<circle.*\/>/, '<rect width="64" height="64" fill="url(#water)"/>');
 await page.setViewportSize({ width: 512, height: 512 });
 await page.setContent(`<body style="margin: 0">${drawing}`);

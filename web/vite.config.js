@@ -7,10 +7,10 @@ import { presets } from 'tidemark-water/core';
 import { usualPreset } from './src/grounds';
 
 const out = new URL('dist', import.meta.url).pathname;
-const largestSite = 1_000_000;  // bytes before compression
+const largestSite = 1_000_000;  // bytes, not compressed
 
-// The documents that the page links to, as pages with links between them. What is not among them is named without a
-// link, and pictures, which would double the site, are described.
+// Renders the documents that the page links to as HTML pages. Links to other files become plain text, and pictures, which
+// would double the size of the site, become their descriptions.
 const documents = ['README.md', 'web/README.md', 'web/package/README.md', 'android/README.md',
     ...['bench', 'contract', 'engine', 'host', 'look', 'promises'].map((name) => `docs/${name}.md`)];
 
@@ -49,10 +49,10 @@ function renderDocuments() {
     };
 }
 
-// What shared links show needs a whole address, where one is known.
+// The picture of shared links needs an absolute address.
 const site = process.env.SITE ?? '.';
 
-// Adds the licenses, and the service worker, which has to know every file of the site and to change with each.
+// Writes the licenses, and the service worker with the list of all files and a version that changes with each of them.
 function completeSite() {
     return {
         name: 'complete-site',
@@ -62,7 +62,7 @@ function completeSite() {
             const text = (name) => readFileSync(new URL(`../${name}`, import.meta.url), 'utf8');
             writeFileSync(join(out, 'licenses.txt'), `${text('LICENSE')}\n${text('THIRD_PARTY.md')}`);
             const paths = readdirSync(out, { recursive: true }).filter((path) => statSync(join(out, path)).isFile()).sort();
-            const offline = paths.filter((path) => path !== 'card.jpg');  // which only other sites show
+            const offline = paths.filter((path) => path !== 'card.jpg');  // only other sites show it
             const hash = createHash('sha256');
             for (const path of paths) hash.update(path).update(readFileSync(join(out, path)));
             const code = readFileSync(new URL('src/service_worker.js', import.meta.url), 'utf8')
@@ -76,17 +76,17 @@ function completeSite() {
     };
 }
 
-// What the scripts will ask for, asked for with the page, and the painter already started: round trips less until the
-// first picture.
-function hurry() {
+// Adds tags that load the modules together with the page and start the painter, which saves round trips before the first
+// picture.
+function preloadModules() {
     const tags = [
-        // Below what tells the size of the view.
+        // After <meta name=viewport>, because the script reads the size of the view.
         [/\/early_painter-/, (src) => ({ tag: 'script', attrs: { src }, injectTo: 'head' })],
-        [/\/painter-|painter.*\.wasm$/, (href) => ({ tag: 'link', attrs: { rel: 'prefetch', href } })],  // for the worker
+        [/\/painter-|painter.*\.wasm$/, (href) => ({ tag: 'link', attrs: { rel: 'prefetch', href } })],  // loaded by the worker
         [/\.wasm$/, (href) => ({ tag: 'link', attrs: { rel: 'preload', as: 'fetch', crossorigin: true, href } })],
     ];
     return {
-        name: 'hurry',
+        name: 'preload-modules',
         apply: 'build',
         generateBundle(_, bundle) {
             const painter = Object.keys(bundle).find((file) => file.includes('/painter-'));
@@ -105,11 +105,11 @@ function hurry() {
 }
 
 export default defineConfig({
-    appType: 'mpa',  // what is not there is missing, and not this page
-    base: './',  // any folder of any server
+    appType: 'mpa',  // unknown addresses give 404 instead of this page
+    base: './',  // the site works in any folder of a server
     worker: { format: 'es' },
     server: { fs: { allow: ['..'] } },  // host/look.properties and build/web
-    // So strict that a page with scripts of its own in the HTML, or styles, would not work.
+    // Refuses inline scripts and styles.
     preview: { headers: { 'content-security-policy': "default-src 'self'; script-src 'self' 'wasm-unsafe-eval'; img-src * blob: data:" } },
-    plugins: [hurry(), renderDocuments(), completeSite()],
+    plugins: [preloadModules(), renderDocuments(), completeSite()],
 });

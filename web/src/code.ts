@@ -1,10 +1,10 @@
-// The chosen values for a page of one's own and for the hosts.
+// The settings as code, for web pages and for the hosts in Java and C++.
 import { defaultLook, lookKeys, lookOf, type Choices } from 'tidemark-water';
 import { addressOf, withPreset, type Settings } from './settings';
 
 const pictureOf = ({ picture }: Settings) => addressOf(picture) ?? 'picture.jpg';
 
-// What an element or a canvas is told: the preset, and what differs from it.
+// The preset, and the options that differ from it.
 function choices({ preset, ink, inkColor, rain, look }: Settings): Choices & { ink?: boolean } {
     const usual = withPreset(preset);
     return {
@@ -31,7 +31,7 @@ function toJavaScript(settings: Settings): string {
     return `import { createWater } from 'tidemark-water';\ncreateWater(document.querySelector('canvas'), ${JSON.stringify(options, null, 4)});\n`;
 }
 
-// For a `water` that is an Android view or a host in C++.
+// Statements for a `water` that is an Android view or a host in C++.
 function statements(settings: Settings): string {
     const usual = defaultLook();
     const look = lookOf(choices(settings));

@@ -1,4 +1,4 @@
-// Buttons and sliders that show a choice and change it.
+// Buttons and sliders that show a setting and change it.
 export function make<Tag extends keyof HTMLElementTagNameMap>(
     tag: Tag, properties: Partial<HTMLElementTagNameMap[Tag]> = {}, ...children: (Node | string)[]
 ): HTMLElementTagNameMap[Tag] {
@@ -7,7 +7,7 @@ export function make<Tag extends keyof HTMLElementTagNameMap>(
     return element;
 }
 
-// A word for a value, of as many equal parts of its range as there are words.
+// The word for a value. Each word names an equal part of the range.
 export const wordOf = (value: number, min: number, max: number, words: readonly string[]): string =>
     words[Math.min(words.length - 1, Math.floor((words.length * (value - min)) / (max - min)))]!;
 
@@ -22,19 +22,19 @@ export interface Slider {
     word(value: number): string;
 }
 
-// `changed` is called after each change.
+// Calls `changed` after each change.
 export function makeControls(changed: () => void) {
     const refreshers: (() => void)[] = [];
     let sliders = 0;
     return {
-        /** What `refresh` brings up to date. */
+        /** Adds a function that shows the current settings. */
         follow: (refresh: () => void): void => void refreshers.push(refresh),
         refresh: (): void => refreshers.forEach((refresh) => refresh()),
 
         section: (title: string, ...children: (Node | string)[]): HTMLElement =>
             make('fieldset', {}, make('legend', {}, title), ...children),
 
-        /** A section whose title names what is chosen in it. */
+        /** A section whose title names the chosen button. */
         choices(title: string, chosen: () => string, ...children: (Node | string)[]): HTMLElement {
             const name = make('output');
             this.follow(() => (name.textContent = chosen()));

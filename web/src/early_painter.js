@@ -1,5 +1,5 @@
-// Starts the painter, with the picture that the page will ask for first, before the scripts of the page are there: in a
-// file, because content security policies refuse scripts within the page. The build fills in the worker's file.
+// Starts the painter before the scripts of the page are loaded, and requests the picture that the page will show first. A
+// file of its own, because content security policies refuse inline scripts. The build inserts the worker's file.
 if (!location.search.includes('src=')) {
     const painter = globalThis.painter = new Worker('PAINTER', { type: 'module' });
     painter.onerror = () => { globalThis.painter = null; };

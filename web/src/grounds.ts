@@ -1,4 +1,4 @@
-// The pictures that come with the page: paintings, of which each preset has one.
+// The painted pictures of the page. Each preset has one of them.
 import type { Preset, PresetName } from 'tidemark-water';
 
 export type Ground = Preset['ground'];

@@ -1,5 +1,4 @@
-// What was chosen before, so that a change can be taken back. What changes until settle() is one change, as the drag of
-// a slider is.
+// Keeps earlier settings for undo. All changes before settle() are one step, for example the drag of a slider.
 import type { Settings } from './settings';
 
 export function makeHistory(settings: Settings) {

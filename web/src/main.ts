@@ -1,4 +1,4 @@
-// The page around the element: settings flow from the controls into it and into the address.
+// The playground: applies the settings that the controls change to the element and to the address.
 import './style.css';
 import type { ErrorCode, WaterElement } from 'tidemark-water';
 import { makeHistory } from './history';
@@ -29,7 +29,7 @@ const sentences: Partial<Record<ErrorCode, string>> = {
     load: 'That picture does not load.',
 };
 
-// Goes by itself, unless it tells what lasts.
+// Hides the message after five seconds, unless it describes a lasting state.
 function say(text: string, stays = false): void {
     clearTimeout(messageDue);
     element('message').textContent = text;
@@ -50,7 +50,7 @@ function writeAddress(): void {
     try {
         history.replaceState(null, '', `#${toHash(settings)}`);
     } catch {
-        // Some browsers refuse more than a hundred in ten seconds. Then the next change brings it.
+        // WebKit allows a hundred calls in ten seconds. The next change writes the address.
     }
 }
 
@@ -58,11 +58,12 @@ function apply(): void {
     const { picture, preset, ink, inkColor, rain, look } = settings;
     Object.assign(water, { preset, ink, inkColor, rain, look: { ...look } });
     element('ink').ariaPressed = String(ink);
+    element('hint').classList.toggle('dry', !ink);
     element('rain').ariaPressed = String(rain > 0);
     pictures.show(picture);
     panel.refresh();
     clearTimeout(addressDue);
-    const { hash } = location;  // a link that is followed meanwhile brings its own
+    const { hash } = location;  // a link that is followed before the timer fires has its own settings
     addressDue = window.setTimeout(() => location.hash === hash && writeAddress(), 300);
 }
 
@@ -109,6 +110,7 @@ async function toggleRecording(): Promise<void> {
 
 function toggle(part: 'panel' | 'share', open = element(part).hidden): void {
     element(part).hidden = !open;
+    if (open && part === 'share') hideHint();  // it would be below the menu
     element(part === 'panel' ? 'look' : 'more').ariaExpanded = String(open);
     if (part === 'panel' && open && water.hasAttribute('shown')) void panel.drawThumbnails();
 }
@@ -154,7 +156,7 @@ const keys: Record<string, () => unknown> = {
     escape: () => (element('share').hidden ? toggle('panel', false) : toggle('share', false)),
 };
 addEventListener('keydown', (event) => {
-    const key = event.key.toLowerCase();  // Caps Lock
+    const key = event.key.toLowerCase();  // with Caps Lock the letters are capitals
     if (event.altKey) return;
     if (!event.ctrlKey && !event.metaKey) return void keys[key]?.();
     if (key !== 'z' || event.shiftKey) return;
@@ -169,7 +171,7 @@ element('share').onclick = () => toggle('share', false);
 element<HTMLInputElement>('files').onchange = ({ target }) => {
     const input = target as HTMLInputElement;
     if (input.files!.length > 0) take([...input.files!]);
-    input.value = '';  // the same file again is a change as well
+    input.value = '';  // so that choosing the same file again is a change
 };
 function takeOffered(data: DataTransfer | null): void {
     const pictureOrFiles = offered(data);

@@ -1,11 +1,11 @@
-// A worker that paints the built-in pictures, so that the water does not wait for them.
+// The worker that paints the pictures of the page, so that the main thread keeps drawing.
 import createPainter, { type Painter } from '../../build/web/tidemark-painter.js';
 import url from '../../build/web/tidemark-painter.wasm?url';
 import type { Ground } from './grounds';
 
 export interface Painted {
     id: number;
-    bitmap?: ImageBitmap;  // none where it failed
+    bitmap?: ImageBitmap;  // undefined if painting has failed
 }
 
 interface Task {
@@ -16,7 +16,7 @@ interface Task {
 }
 
 const loaded: Promise<Painter> = createPainter({ locateFile: () => url });
-loaded.catch(() => {});  // told with the first task
+loaded.catch(() => {});  // paint() reports it
 
 async function paint({ ground, width, height }: Task): Promise<ImageBitmap> {
     const module = await loaded;

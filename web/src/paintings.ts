@@ -1,4 +1,4 @@
-// The painted pictures, out of a worker, which is started anew where it failed.
+// Requests paintings from the worker, and starts it again after a failure.
 import type { Ground } from './grounds';
 import type { Painted } from './painter';
 
@@ -6,7 +6,7 @@ const waiting = new Map<number, { resolve(bitmap: ImageBitmap): void; reject(err
 let lastId = 0;
 let worker: Painter | undefined;
 
-// The built page starts one before its scripts are there, and asks it for a picture, with the id 0.
+// src/early_painter.js starts a worker before this script is loaded, and requests a picture with the id 0.
 interface Painter extends Worker {
     asked?: string;
     painted?: Painted;
@@ -40,7 +40,7 @@ export function paint(ground: Ground, width: number, height: number): Promise<Im
         const id = isAsked ? 0 : ++lastId;
         waiting.set(id, { resolve, reject });
         if (!isAsked) return worker.postMessage({ id, ground, width, height });
-        worker.asked = undefined;  // a bitmap serves once
+        worker.asked = undefined;  // its bitmap has one user
         if (worker.painted) worker.onmessage!(new MessageEvent('message', { data: worker.painted }));
     });
 }

@@ -1,4 +1,4 @@
-// The panel: what a visitor chooses in plain words, every value of the look under "Expert", and the choice as code.
+// The panel: presets, pictures, inks and sliders, every value of the look under "Expert", and the settings as code.
 import { lookKeys, lookOf, presets, type PresetName, type WaterElement } from 'tidemark-water';
 import { codes, toHtml } from './code';
 import { make, makeControls, wordOf } from './controls';
@@ -21,7 +21,7 @@ export interface PanelActions {
     copy(text: string, what: string): void;
 }
 
-// `settings` is changed in place, and `changed` called after each change.
+// Changes `settings` in place, and calls `changed` after each change.
 export function makePanel(root: HTMLElement, settings: Settings, actions: PanelActions) {
     const controls = makeControls(actions.changed);
     const { follow, section } = controls;
@@ -51,6 +51,7 @@ export function makePanel(root: HTMLElement, settings: Settings, actions: PanelA
     const own = make('button', { type: 'button', ariaLabel: 'Your own picture', onclick: actions.chooseOwnPicture }, '+');
     follow(() => (own.ariaPressed = String(!isGround(settings.picture))));
 
+    const isPresetInk = () => settings.inkColor === withPreset(settings.preset).inkColor;
     const swatches = Object.entries(inks).map(([title, color]) => {
         const swatch = controls.choice(title, () => settings.inkColor === color, () => Object.assign(settings, { inkColor: color, ink: true }));
         swatch.style.background = color;
@@ -83,7 +84,7 @@ export function makePanel(root: HTMLElement, settings: Settings, actions: PanelA
             word: (value) => rains.find(([drops]) => value <= drops)![1],
         }));
 
-    // Text that is shown, and copied by the button below it.
+    // Code, and a button that copies it.
     const code = (language: () => string, text: () => string) => {
         const shown = make('code');
         const pre = make('pre', { tabIndex: 0 }, shown);
@@ -102,7 +103,7 @@ export function makePanel(root: HTMLElement, settings: Settings, actions: PanelA
     root.append(
         section('Preset', row('tiles', ...tiles.map(({ tile }) => tile), surprise), row('actions', undo, back)),
         controls.choices('Picture', () => (isGround(settings.picture) ? grounds[settings.picture] : 'your own'), row('pictures', ...pictures.map(({ swatch }) => swatch), own)),
-        controls.choices('Ink colour', () => nameOf(inks, settings.inkColor, settings.inkColor).toLowerCase(), row('swatches', ...swatches, color)),
+        controls.choices('Ink colour', () => nameOf(inks, settings.inkColor, isPresetInk() ? 'the preset\'s' : 'custom').toLowerCase(), row('swatches', ...swatches, color)),
         water,
         section('On your page', ...code(() => 'HTML', () => toHtml(settings))),
         make('details', {}, make('summary', {}, 'Expert'), status, ...expertSliders(controls, settings)),
@@ -114,7 +115,7 @@ export function makePanel(root: HTMLElement, settings: Settings, actions: PanelA
     let drawn = false;
     return {
         refresh: controls.refresh,
-        /** Once the water shows. */
+        /** Call this when the water is visible. */
         async drawThumbnails(): Promise<void> {
             if (drawn) return;
             drawn = true;

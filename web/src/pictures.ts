@@ -1,5 +1,5 @@
-// What lies under the water: a painting, an address, or the visitor's own photos, of which the portrait one shows in
-// portrait and the landscape one in landscape.
+// Loads the picture under the water: a painting, an address, or photos of the visitor. Of two photos, the portrait one is
+// shown in portrait and the landscape one in landscape.
 import { WaterError, type WaterElement } from 'tidemark-water';
 import { isGround } from './grounds';
 import { paint } from './paintings';
@@ -8,7 +8,7 @@ import { addressOf } from './settings';
 async function isPortrait(file: File): Promise<boolean> {
     const image = new Image();
     image.src = URL.createObjectURL(file);
-    await image.decode().catch(() => {});  // and then it has no size
+    await image.decode().catch(() => {});  // a broken file has no size
     URL.revokeObjectURL(image.src);
     return image.naturalHeight > image.naturalWidth;
 }
@@ -21,18 +21,18 @@ function sizeOf({ clientWidth, clientHeight }: WaterElement): [number, number] {
 export interface Pictures {
     readonly hasPhoto: boolean;
     takePhotos(files: File[]): void;
-    /** Shows what `picture` names, unless it was the last one asked for. */
+    /** Shows the picture with this name, unless it was requested last. */
     show(picture: string): void;
 }
 
-// `failed` is told what shows instead, and why if the water has not said so itself.
+// Calls `failed` with the picture that is still shown, and with a reason unless the water has sent an `error` event.
 export function makePictures(water: WaterElement, failed: (shown: string | null, reason?: string) => void): Pictures {
     let photos: File[] = [];
     let asked: string | null = null;
     let shown: string | null = null;
-    let lastTicket = 0;  // of the picture asked for last
+    let lastTicket = 0;  // of the picture that was requested last
     let repaintDue = 0;
-    let painted = '';    // the size of the last painting
+    let painted = '';    // the size of the last painting, in pixels
 
     async function load(picture: string, isLast: () => boolean): Promise<void> {
         if (isGround(picture)) {
@@ -67,7 +67,7 @@ export function makePictures(water: WaterElement, failed: (shown: string | null,
         }
     }
 
-    // Paintings fit one size; until the next is painted the last one serves, cropped.
+    // A painting fits one size. Until the next one is ready the water crops it.
     addEventListener('resize', () => {
         clearTimeout(repaintDue);
         repaintDue = window.setTimeout(() => {
@@ -87,7 +87,7 @@ export function makePictures(water: WaterElement, failed: (shown: string | null,
     };
 }
 
-// What was dropped or pasted: pictures, or the address of one.
+// Files or an address that were dropped or pasted; null for anything else.
 export function offered(data: DataTransfer | null): File[] | string | null {
     const files = [...(data?.files ?? [])];
     if (files.length > 0) return files;

@@ -1,4 +1,4 @@
-// A look out of the blue that is still a good one: each value lies somewhere between those of two presets.
+// Random settings that look good: each value of the look is between those of two presets.
 import { lookOf, presets, type Look, type PresetName } from 'tidemark-water';
 import { expertKeys } from './expert';
 import { grounds, isGround } from './grounds';

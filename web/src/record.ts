@@ -1,5 +1,7 @@
-// Clips of a canvas, in the first of these forms that the browser writes. The canvas may change its size while it is
-// recorded: avc3 allows that, avc1 does not.
+// Records clips of a canvas.
+
+// The first type that the browser supports is used. The size of the canvas may change during a clip: avc3 allows that, avc1
+// does not.
 const types = ['video/mp4;codecs=avc3', 'video/webm;codecs=vp9', 'video/webm', 'video/mp4'];
 const longest = 60_000;  // milliseconds
 
@@ -7,7 +9,7 @@ export const canRecord = typeof MediaRecorder === 'function' && 'captureStream' 
 
 export interface Recording {
     stop(): void;
-    /** Settles when it has ended, by itself after a minute; empty where nothing was drawn. */
+    /** Resolves after stop() or a minute. Empty if nothing was drawn. */
     clip: Promise<Blob>;
 }
 

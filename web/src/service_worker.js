@@ -1,5 +1,6 @@
-// Keeps the whole site, so that it opens without a network. The build fills in the version and the files.
-// An origin's caches belong to all of its pages, among which may be another playground.
+// Keeps the whole site, so that it opens without a network. The build inserts the version and the files.
+
+// All pages of an origin share its caches, so the names contain the path of this page.
 const ours = `tidemark ${self.registration.scope} `;
 const cacheName = ours + 'VERSION';
 const files = ['FILES'];

@@ -1,4 +1,4 @@
-// All that the visitor chooses, and its form in the address bar: what differs from the preset.
+// The settings of the page, and their text in the address: the differences from the preset.
 import { lookKeys, lookOf, presets, type Look, type PresetName } from 'tidemark-water';
 import { isGround, usualPreset } from './grounds';
 
@@ -8,10 +8,10 @@ export interface Settings {
     ink: boolean;
     inkColor: string;
     rain: number;  // drops a second
-    look: Look;    // what differs from the preset
+    look: Look;    // the values that differ from the preset
 }
 
-// The address of a picture, absolute, which no name of a painting is; null for anything else.
+// The absolute address of a picture; null for other texts, such as the names of paintings.
 export function addressOf(text: string, base?: string): string | null {
     try {
         const { href, protocol } = new URL(text, base);
@@ -21,7 +21,7 @@ export function addressOf(text: string, base?: string): string | null {
     }
 }
 
-// A picture that the page's address brings, as for a frame in another page.
+// The picture that `?src=` names, for example in a frame of another page.
 const src = new URLSearchParams(location.search).get('src');
 const brought = src && addressOf(src, location.href);
 const isOwn = (picture: string) => !isGround(picture);
@@ -29,7 +29,7 @@ const isOwn = (picture: string) => !isGround(picture);
 const colorOf = (...shares: number[]) =>
     `#${shares.map((share) => Math.round(255 * share).toString(16).padStart(2, '0')).join('')}`;
 
-// A preset is a whole look with a picture, which gives way to one of the visitor's own.
+// All settings of a preset. A picture of the visitor's own replaces the preset's.
 export function withPreset(preset: PresetName, picture = brought ?? ''): Settings {
     const { ground, ink, rain } = presets[preset];
     const { inkRed, inkGreen, inkBlue, rainDropsPerSecond } = lookOf({ preset });
@@ -42,7 +42,7 @@ export function withPreset(preset: PresetName, picture = brought ?? ''): Setting
 function differences(settings: Settings): [string, string][] {
     const usual = withPreset(settings.preset);
     const words: [string, string][] = [];
-    // A photo stays with its owner.
+    // A photo is a file of the visitor, so no address leads to it.
     if (settings.picture !== usual.picture && settings.picture !== 'photo') words.push(['picture', settings.picture]);
     if (settings.ink !== usual.ink) words.push(['ink', settings.ink ? '1' : '0']);
     if (settings.inkColor !== usual.inkColor) words.push(['inkColor', settings.inkColor]);
@@ -50,7 +50,7 @@ function differences(settings: Settings): [string, string][] {
     return [...words, ...Object.entries(settings.look).map(([name, value]): [string, string] => [name, String(value)])];
 }
 
-// Whether more than the preset was chosen; a picture of the visitor's own goes with any.
+// Whether the settings differ from the preset, apart from a picture of the visitor's own.
 export const isChanged = (settings: Settings): boolean =>
     differences(settings).some(([name]) => name !== 'picture' || !isOwn(settings.picture));
 
@@ -59,7 +59,7 @@ export function toHash(settings: Settings): string {
     return new URLSearchParams([...preset, ...differences(settings)]).toString();
 }
 
-// Of a link that was cut or made up, takes what can be used.
+// Ignores unknown words and clamps values, because links may be incomplete or edited.
 export function fromHash(hash: string): Settings {
     const words = new URLSearchParams(hash.replace(/^#/, ''));
     const preset = words.get('preset') as PresetName;

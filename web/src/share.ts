@@ -1,6 +1,6 @@
-// What leaves the page: text into the clipboard, files into the visitor's downloads.
+// Copies text to the clipboard and saves files.
 
-// On plain HTTP there is no clipboard, and a visitor may refuse.
+// False without a clipboard, as on plain HTTP, or without the visitor's permission.
 export async function copy(text: string): Promise<boolean> {
     return (await navigator.clipboard?.writeText(text).then(() => true, () => false)) ?? false;
 }

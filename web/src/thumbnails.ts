@@ -1,13 +1,14 @@
-// Small pictures of the grounds, and of each preset: its water after two drops, drawn once on a small stage behind the
-// page and kept for the next visit. A preset that has changed since is drawn again.
+// Small pictures of the grounds and of the presets. A preset's shows its water after two drops, which is drawn once, in a
+// canvas behind the page, and kept in local storage until the preset changes.
 import { createWater, presets, type PresetName } from 'tidemark-water';
 import type { Ground } from './grounds';
 import { paint } from './paintings';
 
 const [width, height] = [144, 108];
 
-async function frames(count: number): Promise<void> {
-    while (count-- > 0) await new Promise(requestAnimationFrame);
+async function drawFor(milliseconds: number): Promise<void> {
+    const end = performance.now() + milliseconds;
+    while (performance.now() < end) await new Promise(requestAnimationFrame);
 }
 
 export async function drawGround(ground: Ground): Promise<string> {
@@ -26,10 +27,10 @@ async function draw(preset: PresetName): Promise<string> {
     try {
         await water.ready;
         water.drop(0.62 * width, 0.42 * height, { strength: 1.5 });
-        await frames(32);
-        // Ink, where the preset has it, is the first to vanish.
+        await drawFor(530);
+        // The ink falls last, because it fades first.
         water.drop(0.3 * width, 0.65 * height, { ink: presets[preset].ink, strength: 1.5 });
-        await frames(10);
+        await drawFor(170);
         const blob = await water.toBlob('image/webp', 0.85);
         return await new Promise((resolve) => {
             const reader = new FileReader();
@@ -42,8 +43,8 @@ async function draw(preset: PresetName): Promise<string> {
     }
 }
 
-// A frame of another site may be refused what is kept.
-function kept(key: string, value?: string): string | null {
+// The browser may block local storage in a frame of another site.
+function stored(key: string, value?: string): string | null {
     try {
         if (value) localStorage.setItem(key, value);
         return localStorage.getItem(key);
@@ -52,19 +53,19 @@ function kept(key: string, value?: string): string | null {
     }
 }
 
-/** Calls `show` for each preset as its picture comes; those that cannot be drawn stay away. */
+/** Calls `show` for each preset when its picture is ready. Stops at the first that cannot be drawn. */
 export async function drawThumbnails(show: (preset: PresetName, url: string) => void): Promise<void> {
     for (const preset of Object.keys(presets) as PresetName[]) {
         const key = `tidemark thumbnail ${preset}`;
         const of = JSON.stringify(presets[preset]);
-        const [drawnOf, url] = kept(key)?.split('\n') ?? [];
+        const [drawnOf, url] = stored(key)?.split('\n') ?? [];
         if (url && drawnOf === of) {
             show(preset, url);
             continue;
         }
         const drawn = await draw(preset).catch(() => null);
         if (!drawn) return;
-        kept(key, `${of}\n${drawn}`);
+        stored(key, `${of}\n${drawn}`);
         show(preset, drawn);
     }
 }

@@ -1,4 +1,4 @@
-// The module of web/native/painter.cpp as the compiler writes it.
+// The types of the module that Emscripten makes of web/native/painter.cpp.
 declare module '*/tidemark-painter.js' {
     export interface Painter {
         HEAPU8: Uint8Array<ArrayBuffer>;

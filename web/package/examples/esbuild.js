@@ -1,6 +1,6 @@
 import { createWater } from 'tidemark-water/core';
 
-// What lies under the water moves: here a canvas that is drawn on.
+// The picture under the water is a canvas that changes.
 const source = document.createElement('canvas');
 source.width = 1200;
 source.height = 600;

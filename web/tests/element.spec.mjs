@@ -1,4 +1,4 @@
-// The element of the package on pages that are not the playground's.
+// Tests of the package's element and canvases, on small pages of their own.
 import { execFileSync } from 'node:child_process';
 import { cpSync, existsSync, readFileSync } from 'node:fs';
 import { createServer } from 'node:http';
@@ -13,21 +13,21 @@ const dist = new URL('../package/dist/', import.meta.url).pathname;
 const script = '<script type="module" src="tidemark-water.js"></script>';
 const types = { html: 'text/html', js: 'text/javascript', css: 'text/css', wasm: 'application/wasm', png: 'image/png', webp: 'image/webp' };
 
-// A page at an address of its own, with the built package beside it and pictures at hand.
+// Opens a page that has the built package and pictures beside it, at any address.
 async function show(page, html, { headers = {}, files = {}, folder = dist, at = 'http://pond.test/page.html', until } = {}) {
     files = { 'pond.png': slope(64, 64).buffer, 'words.png': 'words', 'page.html': `<!doctype html><html lang="en">${html}`, ...files };
     await page.route('**/*.test/**', async (route) => {
         const name = new URL(route.request().url()).pathname.slice(1);
         const body = await files[name] ?? (existsSync(join(folder, name)) && readFileSync(join(folder, name)));
         if (!body) return route.fulfill({ status: 404 });
-        const only = { 'access-control-allow-origin': 'http://pond.test' };  // without it, any page may
+        const only = { 'access-control-allow-origin': 'http://pond.test' };  // `headers` may replace it
         return route.fulfill({ body, headers: { 'content-type': types[name.split('.').pop()], ...only, ...headers } });
     });
     await page.goto(at, { waitUntil: until });
 }
 const element = (page) => page.locator('tidemark-water');
 
-test('200 waters come and go, and leave nothing', async ({ page }) => {
+test('200 waters are added and removed without a leak', async ({ page }) => {
     test.slow();
     await page.addInitScript(() => {
         window.memories = [];
@@ -67,7 +67,7 @@ test('twenty waters that never rest all show their picture, and the touched one 
     await expect(page.locator('tidemark-water[shown]')).toHaveCount(20);
     const moving = () => element(page).evaluateAll((all) => all.map(({ water }) => water.state === 'live'));
     const still = (await moving()).indexOf(false);
-    expect((await moving()).filter(Boolean).length).toBeLessThan(16);  // what browsers give a page
+    expect((await moving()).filter(Boolean).length).toBeLessThan(16);  // the limit of browsers
     await element(page).nth(still).click();
     await expect.poll(async () => (await moving())[still]).toBe(true);
 });
@@ -81,7 +81,7 @@ for (const [code, body, options, lack] of [
     ['simd', '<tidemark-water>', {}, () => { WebAssembly.validate = () => false; }],
     ['webgl', '<tidemark-water src="pond.png">', {}, () => { HTMLCanvasElement.prototype.getContext = () => null; }],
 ]) {
-    test(`what does not work has the code ${code}, and the fallback stays`, async ({ page, problems }) => {
+    test(`a failure has the code ${code}, and the fallback stays`, async ({ page, problems }) => {
         if (lack) await page.addInitScript(lack);
         const asked = [];
         page.on('request', (request) => request.url().endsWith('pond.png') && asked.push(request));
@@ -93,7 +93,7 @@ for (const [code, body, options, lack] of [
         await expect.poll(() => page.evaluate(() => window.codes)).toEqual([code]);
         await expect(page.getByText('A pond')).toBeVisible();
         expect(asked.length).toBeLessThan(2);
-        problems.length = 0;  // the browser's own words on it
+        problems.length = 0;  // the browser and the element have reported it
     });
 }
 
@@ -114,7 +114,7 @@ test('a module that did not load is tried again with the next water', async ({ p
     problems.length = 0;
 });
 
-test('of two pictures given the later stays, through other attributes and another place', async ({ page }) => {
+test('the last of two pictures wins, and stays when attributes change and the element moves', async ({ page }) => {
     await show(page, `${script}<tidemark-water src="pond.png"></tidemark-water><p></p>`);
     await element(page).and(page.locator('[shown]')).waitFor();
     expect(await element(page).evaluate(async (water) => {
@@ -137,7 +137,7 @@ test('of two pictures given the later stays, through other attributes and anothe
     })).toEqual(Array(3).fill([30, 30]));
 });
 
-test('what fails is told once, and a paused water shows another picture at another size', async ({ page, problems }) => {
+test('each failure is reported once, and a paused water shows another picture at another size', async ({ page, problems }) => {
     await show(page, `${script}<tidemark-water light="words.png" look='{"exponent": 9, "Exponent": 9}'><img slot="fallback" src="pond.png" alt=""></tidemark-water>`);
     await expect(element(page).locator('canvas').last()).toHaveCSS('opacity', '1');
     expect(await element(page).evaluate(async (water, codes = []) => {
@@ -153,7 +153,7 @@ test('what fails is told once, and a paused water shows another picture at anoth
     expect(problems.splice(0)).toEqual([/no values with these names: Exponent\./, /decode: words.png/].map((text) => expect.stringMatching(text)));
 });
 
-test('a paused water stands still while something is chosen, through another place, and takes no drops', async ({ page }) => {
+test('a paused water keeps its picture when options change and the element moves, and takes no drops', async ({ page }) => {
     await show(page, `${script}<tidemark-water src="pond.png" ink look='{"breeze": 0}'></tidemark-water><p></p>`);
     await element(page).and(page.locator('[shown]')).waitFor();
     expect(await element(page).evaluate(async (water) => {
@@ -172,7 +172,7 @@ test('a paused water stands still while something is chosen, through another pla
         document.body.append(water);
         return [new Set(pictures).size, water.paused, water.water.options.paused];
     })).toEqual([1, true, true]);
-    // Nor does it catch up on drops that fell where nobody saw them.
+    // Drops that fell while the water was not visible do not follow later.
     await element(page).evaluate((water) => { water.paused = false; });
     await element(page).and(page.locator('[shown]')).waitFor();
     await expect.poll(() => element(page).evaluate(({ water }) => water.calm)).toBe(true);
@@ -189,13 +189,13 @@ test('a paused water stands still while something is chosen, through another pla
     })).toBe(1);
 });
 
-test('in a shadow root content is clicked and rippled, keys drop, and motion keeps to the wish', async ({ page }) => {
+test('in a shadow root content is clickable, keys let drops fall, and motion is reduced', async ({ page }) => {
     await page.emulateMedia({ reducedMotion: 'reduce' });
     await show(page, `${script}<div><template shadowrootmode="open">
         <tidemark-water src="pond.png" rain="20" breeze="always" first-drop><button onclick="this.textContent += '!'">Buy</button></tidemark-water></template>`);
     await element(page).and(page.locator('[shown]')).waitFor();
     const calm = (yes) => expect.poll(() => element(page).evaluate(({ water }) => water.calm)).toBe(yes);
-    await calm(true);  // neither rain nor a drop, nor a breeze below
+    await calm(true);  // without rain, breeze and the first drop
     await page.getByText('Buy').click();
     await calm(false);
     await expect(page.getByText('Buy!')).toBeVisible();
@@ -206,7 +206,7 @@ test('in a shadow root content is clicked and rippled, keys drop, and motion kee
     await calm(false);
 });
 
-test('canvases of the page show a canvas and a video that move, and give pictures out; a server imports the module', async ({ page }) => {
+test('createWater() shows a canvas and a video that change, and toBlob() works; a server may import the module', async ({ page }) => {
     execFileSync('node', ['-e', "import('./tidemark-water.js')"], { cwd: dist });
     await show(page, '<canvas style="width: 100px; height: 100px"></canvas>'.repeat(2));
     const [reds, codes] = await page.evaluate(async () => {
@@ -246,7 +246,7 @@ test('canvases of the page show a canvas and a video that move, and give picture
         await frames(() => waters[1].state === 'lost');
         waters[1].graphics.lose.restoreContext();
         await frames(() => codes.length > 1);
-        let more = 20;  // each is told once
+        let more = 20;  // frames, in which no error is reported again
         await frames(() => more-- === 0);
         return [reds, codes];
     });
@@ -254,7 +254,7 @@ test('canvases of the page show a canvas and a video that move, and give picture
     expect(codes).toEqual(['cross-origin', 'cross-origin']);
 });
 
-test('a bright still is handed over wet, in the look\'s colours, and shows them without a context too; a breeze stays', async ({ page, problems }) => {
+test('the look darkens and tints stills, also without a context; a breeze can be kept', async ({ page, problems }) => {
     const white = PNG.sync.write(Object.assign(new PNG({ width: 2, height: 2 }), { data: Buffer.alloc(16, 255) }));
     await show(page, `${script}<tidemark-water src="white.png"></tidemark-water>`, { files: { 'white.png': white } });
     await element(page).and(page.locator('[shown]')).waitFor();
@@ -289,7 +289,7 @@ test('a bright still is handed over wet, in the look\'s colours, and shows them 
     expect(problems.splice(0).filter((text) => !/loseContext/.test(text))).toEqual([]);
 });
 
-test('a high element shows the portrait, and off screen a still picture until it is touched again', async ({ page }) => {
+test('a high element shows the portrait picture; a water that was off screen shows a still until it is touched', async ({ page }) => {
     const [wide, high] = [[80, 40], [40, 80]];
     const files = { 'wide.png': slope(...wide).buffer, 'high.png': slope(...high).buffer };
     await show(page, `${script}<tidemark-water src="wide.png" src-portrait="high.png" style="height: 40vw"></tidemark-water><p style="margin: 3000px">`, { files });
@@ -299,7 +299,7 @@ test('a high element shows the portrait, and off screen a still picture until it
     expect(await size()).toEqual(wide);
     await element(page).evaluate(({ style }) => { style.height = '280px'; });
     await expect.poll(size).toEqual(high);
-    // Water that still moves goes on when it is back.
+    // Moving water would open a context again as soon as it is visible.
     await expect.poll(() => element(page).evaluate(({ water: { calm, stale, loop } }) => calm && !stale && !loop.request)).toBe(true);
     await page.evaluate(() => scrollTo(0, 2000));
     await expect.poll(live).toBe(false);
@@ -311,7 +311,7 @@ test('a high element shows the portrait, and off screen a still picture until it
     await expect.poll(live).toBe(true);
 });
 
-test('contexts that the page\'s other graphics take come back, and until then the picture shows', async ({ page, problems }) => {
+test('lost contexts are restored, and until then the picture is shown', async ({ page, problems }) => {
     test.slow();
     await page.setViewportSize({ width: 300, height: 400 });
     await show(page, `${script}<tidemark-water src="pond.png"></tidemark-water><tidemark-water src="pond.png" id="opening"></tidemark-water>`);
@@ -327,14 +327,14 @@ test('contexts that the page\'s other graphics take come back, and until then th
         });
     });
     await expect.poll(states).toEqual(['lost', 'lost']);
-    expect(await red(first)).toBeGreaterThan(180);  // 255 to the right, and white is told by its green
-    await expect.poll(states, { timeout: 60_000 }).toEqual(['live', 'live']);  // by itself, the second after half a minute
+    expect(await red(first)).toBeGreaterThan(180);  // the picture is red at the right
+    await expect.poll(states, { timeout: 60_000 }).toEqual(['live', 'live']);  // without a touch, the second after half a minute
     await first.evaluate(({ water }) => water.graphics.lose.loseContext());
     await expect.poll(async () => (await states())[0]).toBe('lost');
     await first.click();
     await expect.poll(async () => (await states())[0], { timeout: 3000 }).toBe('live');
     await expect.poll(() => red(first)).toBeGreaterThan(180);
-    // One that is taken while the water is made shows no black.
+    // A context that is lost while the water opens does not lead to `ready`.
     expect(await page.evaluate(async () => {
         const { getContext } = HTMLCanvasElement.prototype;
         HTMLCanvasElement.prototype.getContext = function (kind, ...more) {
@@ -354,12 +354,12 @@ test('contexts that the page\'s other graphics take come back, and until then th
     expect(problems.splice(0).filter((text) => !/Too many active WebGL contexts|loseContext/.test(text))).toEqual([]);
 });
 
-test('drops land where the pointer is, however the water is turned', async ({ page }) => {
+test('drops fall at the pointer, under any CSS transform', async ({ page }) => {
     await show(page, `${script}<body style="margin: 150px"><tidemark-water src="pond.png" style="width: 200px; height: 300px"></tidemark-water>`);
     await element(page).and(page.locator('[shown]')).waitFor();
     const turns = ['none', 'rotate(30deg)', 'scaleX(-1)', 'perspective(500px) rotateY(50deg)'];
     for (const turn of turns) {
-        // Of a mark at 30, 60 the browser tells the place.
+        // The browser computes where a mark at 30, 60 is on the screen.
         expect(await element(page).evaluate((water, turn) => {
             water.style.transform = turn;
             const mark = water.appendChild(Object.assign(document.createElement('b'), { style: 'position: absolute; left: 30px; top: 60px' }));
@@ -375,7 +375,7 @@ test('drops land where the pointer is, however the water is turned', async ({ pa
     }
 });
 
-test('after a click the keys scroll; from the keyboard they drop, and focus() works', async ({ page }) => {
+test('keys scroll after a click, and let drops fall after focus from the keyboard or focus()', async ({ page }) => {
     await show(page, `${script}<tidemark-water src="pond.png"></tidemark-water><p style="height: 3000px">`);
     await element(page).and(page.locator('[shown]')).waitFor();
     const fallen = () => element(page).evaluate(({ water }) => water.fallen);
@@ -390,7 +390,7 @@ test('after a click the keys scroll; from the keyboard they drop, and focus() wo
         expect(await top()).toBeGreaterThan(50);
     }).toPass();
     expect(await fallen()).toBe(0);
-    await expect(async () => {  // once the browser's smooth scrolling has ended
+    await expect(async () => {  // the browser scrolls smoothly
         await page.evaluate(() => scrollTo(0, 0));
         await page.waitForTimeout(300);
         expect(await top()).toBe(0);
@@ -401,7 +401,7 @@ test('after a click the keys scroll; from the keyboard they drop, and focus() wo
     expect(await top()).toBe(0);
 });
 
-test('nothing jumps while the script is on its way, and a picture of two sources is the fallback', async ({ page }) => {
+test('the layout does not shift when the script arrives late, and a <picture> is the fallback', async ({ page }) => {
     await page.addInitScript(() => {
         window.shift = 0;
         new PerformanceObserver((list) => list.getEntries().forEach(({ value }) => (window.shift += value))).observe({ type: 'layout-shift', buffered: true });
@@ -424,7 +424,7 @@ test('nothing jumps while the script is on its way, and a picture of two sources
 
 test.describe('dense canvas', () => {
     test.use({ deviceScaleFactor: 2 });
-    test('a canvas without a size keeps its own, has one water, and waits for few drops', async ({ page, problems }) => {
+    test('a canvas without a CSS size keeps its size, has one water, and keeps one early drop', async ({ page, problems }) => {
         await show(page, '<canvas></canvas>');
         expect(await page.evaluate(async () => {
             const { createWater } = await import('./core.js');
@@ -432,7 +432,7 @@ test.describe('dense canvas', () => {
             const canvas = document.querySelector('canvas');
             const water = createWater(canvas, { light: 'none.png' });
             for (let i = 0; i < 20_000; ++i) water.drop(1, 1);
-            await water.ready;  // the light is not needed
+            await water.ready;  // although the light does not load
             let second = null;
             try {
                 createWater(canvas);
@@ -446,7 +446,7 @@ test.describe('dense canvas', () => {
     });
 });
 
-test('pictures: lazy ones far below wait, others come as asked, failed ones are tried again, videos leave nothing', async ({ page, problems }) => {
+test('lazy pictures wait, fetchpriority is set, failed pictures are tried again, and videos keep no listeners', async ({ page, problems }) => {
     const asked = [];
     page.on('request', (request) => asked.push(request));
     await show(page, `${script}<tidemark-water src="pond.png" fetchpriority="high"></tidemark-water><div style="height: 5000px"></div>
@@ -461,7 +461,7 @@ test('pictures: lazy ones far below wait, others come as asked, failed ones are 
     await expect.poll(async () => {
         await page.evaluate(() => { document.querySelector('#far').src = 'lazy.png'; });
         return names().filter((name) => name === 'lazy.png').length;
-    }).toBeGreaterThan(2);  // one to find out why
+    }).toBeGreaterThan(2);  // the second request finds out why the first has failed
     expect(await first.evaluate(async (water) => {
         const source = document.createElement('canvas').getContext('2d');
         const video = Object.assign(document.createElement('video'), { srcObject: source.canvas.captureStream(), muted: true });
@@ -485,7 +485,7 @@ test('pictures: lazy ones far below wait, others come as asked, failed ones are 
     expect(problems.splice(0).every((text) => /404|lazy\.png/.test(text))).toBe(true);
 });
 
-test('in another window strokes end, and in a sandboxed frame pictures show', async ({ page }) => {
+test('strokes end in another window, and pictures load in a sandboxed frame', async ({ page }) => {
     await show(page, `${script}<tidemark-water src="pond.png"></tidemark-water><iframe sandbox="allow-scripts" src="frame.html"></iframe><iframe id="other" src="about:blank"></iframe>`,
         { files: { 'frame.html': `<!doctype html>${script}<tidemark-water src="pond.png"></tidemark-water>` }, headers: { 'access-control-allow-origin': '*' } });
     await page.frameLocator('iframe').first().locator('tidemark-water[shown]').waitFor();
@@ -502,7 +502,7 @@ test('in another window strokes end, and in a sandboxed frame pictures show', as
     })).toEqual([0, 1]);
 });
 
-test('people who do not see it: names, tab stops and rings', async ({ page }) => {
+test('accessibility: roles, names, tab stops and the focus ring', async ({ page }) => {
     await page.emulateMedia({ forcedColors: 'active' });
     await show(page, `<title>Ponds</title>${script}<main><h1>Ponds</h1>
         <tidemark-water id="plain"></tidemark-water><tidemark-water id="decor" label=""></tidemark-water><tidemark-water id="hover" interaction="hover" label="Pond"></tidemark-water>
@@ -519,7 +519,7 @@ test('people who do not see it: names, tab stops and rings', async ({ page }) =>
     await expect(element(page).first().locator('canvas').last()).toHaveCSS('outline-style', 'solid');
 });
 
-test('the README has the attributes that the element has', () => {
+test('the README lists the attributes of the element', () => {
     const { attributes } = JSON.parse(readFileSync(join(dist, 'custom-elements.json'))).modules[0].declarations[0];
     const rows = attributes.map(({ name, description, default: without }) => `| \`${name}\` | ${description} | ${without} |\n`);
     expect(readFileSync(join(dist, '../README.md'), 'utf8')).toContain(`| attribute | | without it |\n|---|---|---|\n${rows.join('')}\n`);
@@ -529,7 +529,7 @@ test('the README has the attributes that the element has', () => {
     expect(new Set(attributes.flatMap(({ name, fieldName }) => [name, fieldName.toLowerCase()])).size).toBe(known.length);
 });
 
-test('transparent water leaves the page as it is, lights it, and takes the pointers of the whole page', async ({ page }) => {
+test('calm transparent water is invisible, waves light the page, and the pointers of the whole page count', async ({ page }) => {
     await show(page, `${script}<style>html { background: #345; } body { margin: 0; } tidemark-water { pointer-events: none; }</style>
         <tidemark-water transparent pointers="page" look='{"touchAmplitude": 4}' style="height: 140px"><p style="margin: 60px 0">Text</p></tidemark-water>`);
     await element(page).and(page.locator('[shown]')).waitFor();
@@ -544,7 +544,7 @@ test('transparent water leaves the page as it is, lights it, and takes the point
     }).toPass();
 });
 
-test('both spellings of an attribute count, what is unknown is named once, and states can be styled', async ({ page, problems }) => {
+test('both spellings of an attribute work, unknown values are reported once, and CSS states are set', async ({ page, problems }) => {
     await show(page, `${script}<tidemark-water inkcolor="#ff0000" srcportrait="pond.png" firstdrop fetchpriority="high" look='{"exponent": 9}'></tidemark-water>
         <tidemark-water preset="lake" quality="best" rain="much" breeze="storm"></tidemark-water><tidemark-water preset="lake" ink-color="red" paused></tidemark-water>`);
     await expect(page.locator('tidemark-water[shown]')).toHaveCount(3);
@@ -557,7 +557,7 @@ test('both spellings of an attribute count, what is unknown is named once, and s
 
 test.describe('dense', () => {
     test.use({ deviceScaleFactor: 2, viewport: { width: 1728, height: 1080 } });
-    test('in the highest quality every pixel of the display is drawn', async ({ page }) => {
+    test('high quality draws every pixel of the display', async ({ page }) => {
         await show(page, `${script}<body style="margin: 0"><tidemark-water src="pond.png" quality="high" style="height: 1080px">`);
         await element(page).and(page.locator('[shown]')).waitFor();
         const size = () => element(page).evaluate(({ water: { canvas } }) => [canvas.width, canvas.height]);

@@ -1,4 +1,4 @@
-// The playground in engines that Playwright does not drive as Debian ships them, on a screen of their own.
+// Tests of the playground in Debian's Firefox and WebKitGTK, which Playwright cannot drive.
 import { writeFileSync } from 'node:fs';
 import { expect, test } from '@playwright/test';
 import { PNG } from 'pngjs';
@@ -7,7 +7,7 @@ import { Builder, By } from 'selenium-webdriver';
 import { DriverService } from 'selenium-webdriver/remote/index.js';
 import { screenshotPath } from './page.mjs';
 
-// Software graphics work in neither engine's sandbox.
+// The sandboxes of both engines block software graphics.
 const env = { ...process.env, LIBGL_ALWAYS_SOFTWARE: '1', WEBKIT_DISABLE_SANDBOX_THIS_IS_DANGEROUS: '1' };
 
 const watch = () => {
@@ -16,7 +16,7 @@ const watch = () => {
     onunhandledrejection = ({ reason }) => window.problems.push(String(reason));
 };
 
-// Each adds to `started` what has to be closed.
+// Both functions add the functions that end their processes to `started`.
 async function firefox(started) {
     const extraPrefsFirefox = { 'webgl.force-enabled': true, 'webgl.disable-fail-if-major-performance-caveat': true, 'security.sandbox.content.level': 0 };
     const browser = await puppeteer.launch({ browser: 'firefox', executablePath: '/usr/bin/firefox-esr', headless: false, env, extraPrefsFirefox });
@@ -47,7 +47,7 @@ async function webkit(started) {
     started.push(() => driver.quit());
     return {
         resize: (width, height) => driver.manage().window().setRect({ x: 0, y: 0, width, height }),
-        show: async (url) => (await driver.get(url), driver.executeScript(watch)),  // no earlier in this driver
+        show: async (url) => (await driver.get(url), driver.executeScript(watch)),  // this driver runs no script before the page's
         run: (action) => driver.executeScript(action),
         drag: (y, from, to) => driver.actions().move({ x: from, y }).press().move({ x: to, y }).release().perform(),
         pick: async (file) => (await driver.findElement(By.id('files'))).sendKeys(file),
@@ -64,14 +64,14 @@ for (const [name, start] of Object.entries({ firefox, webkit })) {
             const { run, look } = engine;
             const message = () => run(() => document.querySelector('#message').textContent);
             const calm = () => run(() => window.tidemark.water.water.calm);
-            // The least of a line across the water.
+            // The lowest red along a line across the water.
             const red = async () => {
                 const { width, data } = PNG.sync.read(await look());
                 return Math.min(...Array.from({ length: 200 }, (_, x) => data[4 * (300 * width + 80 + x)]));
             };
             for (const [size, ...extent] of [['desktop', 1200, 900], ['small-phone', 320, 568], ['phone', 390, 844]]) {
                 await engine.resize(...extent);
-                // A photo in its own colours, soon calm. Another address loads the page anew.
+                // The settings keep the colours of a photo, without a breeze. The new address loads the page again.
                 await engine.show(`${baseURL}?${size}#wet=0&groundRed=1&groundGreen=1&breeze=0`);
                 await expect.poll(() => run(() => document.querySelector('#water[shown]') !== null)).toBe(true);
                 await new Promise((resolve) => setTimeout(resolve, 1500));
@@ -84,13 +84,13 @@ for (const [name, start] of Object.entries({ firefox, webkit })) {
             await expect.poll(red).toBeGreaterThan(240);
             await engine.drag(500, 200, 200);
             await expect.poll(calm).toBe(false);
-            // The ink fades within a second, which is a few frames here.
+            // The ink fades within a second, in which these engines draw a few frames.
             await expect(async () => {
                 await engine.drag(300, 100, 260);
                 expect(await red()).toBeLessThan(150);
             }).toPass({ timeout: 20_000 });
 
-            // WebKit refuses more than a hundred addresses in ten seconds.
+            // WebKit allows a hundred calls of replaceState() in ten seconds.
             await run(() => {
                 const slider = [...document.querySelectorAll('#panel label')].find(({ textContent }) => textContent === 'Rain').control;
                 for (let i = 0; i < 180; ++i) Object.assign(slider, { value: i % 60 }).dispatchEvent(new Event('input'));
@@ -102,7 +102,7 @@ for (const [name, start] of Object.entries({ firefox, webkit })) {
             await expect.poll(message).toMatch(/come back/);
             await run(() => window.tidemark.water.water.graphics.lose.restoreContext());
             await expect.poll(message).toBe('');
-            await expect.poll(red).toBeGreaterThan(240);  // without a touch or another call
+            await expect.poll(red).toBeGreaterThan(240);  // without a touch
             expect(await run(() => window.problems)).toEqual([]);
         } finally {
             for (const close of started.reverse()) await close().catch(console.error);

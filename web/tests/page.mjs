@@ -1,4 +1,4 @@
-// A page with water, and its water frame by frame: without the page's loop and its clock.
+// Helpers of the tests: they open pages with water, draw single frames, and compare pictures.
 import { mkdirSync } from 'node:fs';
 import { join } from 'node:path';
 import { test as plain, expect } from '@playwright/test';
@@ -6,14 +6,14 @@ import { PNG } from 'pngjs';
 
 export { expect };
 
-// Where the tests leave a screenshot for people to look at.
+// Screenshots are for people; no test reads them.
 export function screenshotPath(name) {
     const folder = new URL('../../build/web/screens', import.meta.url).pathname;
     mkdirSync(folder, { recursive: true });
     return join(folder, `${name}.png`);
 }
 
-// Fails where the page complains.
+// A test fails if the page reports an error or a warning that the test has not removed from `problems`.
 export const test = plain.extend({
     problems: ({}, use) => use([]),
     page: async ({ page, problems }, use) => {
@@ -26,13 +26,13 @@ export const test = plain.extend({
     },
 });
 
-// Opens the page and waits until it shows water.
+// Opens the playground and waits until its water is visible.
 export async function open(page, hash = '') {
     await page.goto(`./${hash}`);
     await page.waitForSelector('#water[shown]');
 }
 
-// The page's loop stands still from here on; what `play` of the next function does is all that happens.
+// Stops the page's loop and clock, and adds functions to `window` that draw frames of 1/60 s.
 export const takeOver = (page) =>
     page.evaluate(() => {
         const { water } = document.querySelector('tidemark-water');
@@ -47,10 +47,10 @@ export const takeOver = (page) =>
         window.settle = () => {
             for (let i = 0; frame() !== 0; ++i) if (i > 2000) throw new Error('no rest');
         };
-        // In CSS pixels, so many seconds after the last frame.
+        // x and y are in CSS pixels; `later` is in seconds after the last frame.
         window.touch = (action, x, y, later = 0) =>
             native._touch(action, x / canvas.clientWidth, y / canvas.clientHeight, -1, seconds + later);
-        // Only in the task that has drawn: afterwards the browser takes the canvas away. Rows from the top.
+        // Draws and reads in one task, because the browser clears the canvas after it. The first row is the top.
         window.read = () => {
             native._redraw();
             window.frames(1);
@@ -65,7 +65,7 @@ export const takeOver = (page) =>
         };
     });
 
-// Runs `play` in the page, which returns what read() gives, or several.
+// Runs `play` in the page. It returns the result of window.read(), or an array of results.
 export async function pixelsAfter(page, play, argument) {
     const result = await page.evaluate(play, argument);
     return Array.isArray(result) ? result.map((text) => Buffer.from(text, 'base64')) : Buffer.from(result, 'base64');
@@ -73,7 +73,7 @@ export async function pixelsAfter(page, play, argument) {
 
 export const flatPixels = (page) => pixelsAfter(page, () => (window.settle(), window.read()));
 
-// A PNG file whose red grows to the right and whose green grows downwards.
+// A PNG file whose red increases to the right and whose green increases downwards.
 export function slope(width, height) {
     const png = new PNG({ width, height });
     for (let i = 0; i < width * height; ++i) {
@@ -82,7 +82,7 @@ export function slope(width, height) {
     return { name: `${width}x${height}.png`, mimeType: 'image/png', buffer: PNG.sync.write(png) };
 }
 
-// The mean difference of two pictures a channel, 0 to 255.
+// The mean absolute difference of two pictures' channels, 0 to 255.
 export function difference(a, b) {
     let sum = 0;
     for (let i = 0; i < a.length; ++i) sum += Math.abs(a[i] - b[i]);

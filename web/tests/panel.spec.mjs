@@ -1,4 +1,4 @@
-// The panel: what is chosen reaches the water, and leaves the page as code and as a link.
+// Tests of the panel: settings reach the water, and are copied as code and links.
 import { execFileSync } from 'node:child_process';
 import { copyFileSync, mkdirSync, readFileSync, writeFileSync } from 'node:fs';
 import { join } from 'node:path';
@@ -16,9 +16,9 @@ const openPanel = async (page, hash) => {
 const slide = (page, name, value) => page.getByLabel(name, { exact: true }).fill(String(value));
 const press = (page, name) => page.getByRole('button', { name, exact: true }).click();
 
-// A tap and a short stroke on water that was never touched, to where their waves are in full view.
+// Draws a short stroke on calm water, and reads the frame in which its waves are high.
 const touchAndRun = () => {
-    window.frames(1);  // the time since the last one is over
+    window.frames(1);  // this frame covers the time since the page's last one
     for (let x = 60; x <= 140; x += 20) {
         window.touch(x === 60 ? 0 : 2, x, 200);
         window.frames(1);
@@ -30,7 +30,7 @@ const touchAndRun = () => {
 
 test('the value of every slider reaches the water under its own name', async ({ page }) => {
     test.slow();
-    await page.emulateMedia({ reducedMotion: 'reduce' });  // no drop falls by itself
+    await page.emulateMedia({ reducedMotion: 'reduce' });  // no first drop
     const pixelsWith = async (value) => {
         await page.goto('about:blank');
         await open(page, `?src=favicon.svg#ink=0&${value}`);
@@ -48,7 +48,7 @@ test('the value of every slider reaches the water under its own name', async ({ 
     }
 });
 
-test('every value that the file says is seen has its slider, with what the file says about it', async ({ page }) => {
+test('each visible value of look.properties has a slider with the comment of the file', async ({ page }) => {
     await openPanel(page);
     const hidden = ['inkRed', 'inkGreen', 'inkBlue', 'rainDropsPerSecond', 'framesToFade', 'stepsToRest', 'longestFrame', 'alphaScale2'];
     const file = readFileSync(join(root, 'host/look.properties'), 'utf8').matchAll(/# (\w+)[^\n]*\n(?:# .*\n)*(\w+) = /g);
@@ -60,11 +60,11 @@ test('every value that the file says is seen has its slider, with what the file 
     }
     await slide(page, 'Damping', 0.95);
     expect(await settings(page)).toMatchObject({ look: { damping: 0.95 } });
-    await page.getByLabel('Damping').press('Home');  // leaves the choice to the library again
+    await page.getByLabel('Damping').press('Home');  // "auto"
     expect(await settings(page)).toMatchObject({ look: {} });
 });
 
-test('a link brings the same look, and a bad one the nearest', async ({ page, baseURL }) => {
+test('a link restores the look, and values of a wrong link are clamped or ignored', async ({ page, baseURL }) => {
     await openPanel(page);
     await slide(page, 'Calming time', 9);
     await press(page, 'Violet');
@@ -88,7 +88,7 @@ test('a link brings the same look, and a bad one the nearest', async ({ page, ba
     expect(await settings(page)).toMatchObject({ picture: address, preset: 'honey', inkColor: '#732e03' });
 });
 
-test('a preset brings its picture and is marked where it was changed; each change can be taken back', async ({ page }) => {
+test('a preset sets its picture and is marked when changed; each change can be undone', async ({ page }) => {
     await openPanel(page);
     const back = page.getByRole('button', { name: /^Back to/ });
     await press(page, 'Honey');
@@ -106,7 +106,7 @@ test('a preset brings its picture and is marked where it was changed; each chang
     await expect(back).toBeHidden();
     await page.keyboard.press('Control+z');
     expect(await settings(page)).toEqual(changed);
-    await press(page, 'Undo');  // of the drag
+    await press(page, 'Undo');  // undoes the drag
     expect(await settings(page)).toEqual(honey);
     await press(page, 'Random');
     await press(page, 'Undo');
@@ -116,7 +116,7 @@ test('a preset brings its picture and is marked where it was changed; each chang
     await expect(page.getByRole('button', { name: 'Undo' })).toBeDisabled();
 });
 
-test('every preset gets a picture of its own, which is kept for the next visit', async ({ page }) => {
+test('each preset gets a picture, which is stored for the next visit', async ({ page }) => {
     test.slow();
     await page.addInitScript(() => {
         window.stages = 0;
@@ -148,7 +148,7 @@ test('the keys work with Caps Lock and while a slider has the focus', async ({ p
     expect(await settings(page)).toMatchObject({ ink: false });
 });
 
-test('pictures and addresses are taken where they are dropped or pasted', async ({ page, baseURL }) => {
+test('pictures and addresses can be dropped and pasted', async ({ page, baseURL }) => {
     await openPanel(page);
     const give = (type, text) => page.evaluate(([type, text]) => {
         const data = new DataTransfer();
@@ -170,7 +170,7 @@ test('pictures and addresses are taken where they are dropped or pasted', async 
     await expect(page.locator('#message.shown')).toHaveText(/neither a picture/);
 });
 
-test('a link, a picture and a clip leave the page', async ({ page, context }) => {
+test('a link is copied, a picture saved, and a clip recorded', async ({ page, context }) => {
     test.slow();
     await context.grantPermissions(['clipboard-read', 'clipboard-write']);
     await openPanel(page, '#preset=honey');

@@ -1,5 +1,5 @@
-// The built page in the system's Chromium, below a folder, where a path that is not relative does not load, and under
-// the strict content security policy of vite.config.js, whose violations the browser reports as errors of the page.
+// The tests use the system's Chromium. The built page is in a folder, where absolute paths do not load, and under the content
+// security policy of vite.config.js, whose violations the browser reports as errors.
 import { defineConfig } from '@playwright/test';
 
 export default defineConfig({
@@ -22,6 +22,6 @@ export default defineConfig({
     webServer: {
         command: 'npx vite preview --host localhost --port 0 --base /some/where/',  // any free port
         cwd: new URL('..', import.meta.url).pathname,
-        wait: { stdout: /localhost:(\x1b\[1m)?(?<SITE_PORT>\d+)/ },  // in bold
+        wait: { stdout: /localhost:(\x1b\[1m)?(?<SITE_PORT>\d+)/ },  // the number is printed in bold
     },
 });

@@ -1,4 +1,4 @@
-// The page draws what the desktop program draws.
+// Compares frames of the page with frames of the desktop program.
 import { execFile } from 'node:child_process';
 import { mkdirSync, readFileSync, writeFileSync } from 'node:fs';
 import { join } from 'node:path';
@@ -10,35 +10,35 @@ const root = new URL('../..', import.meta.url).pathname;
 const preview = process.env.TIDEMARK_PREVIEW ?? join(root, 'build/release/preview/tidemark-preview');
 const [width, height] = [135, 240];
 
-test.use({ viewport: { width, height }, contextOptions: { reducedMotion: 'reduce' } });  // no drop falls by itself
+test.use({ viewport: { width, height }, contextOptions: { reducedMotion: 'reduce' } });  // no first drop
 
 test('frames of a script equal those of tidemark-preview', async ({ page }, { outputDir }) => {
     test.slow();
     const script = join(root, 'scenes/curl.touch');
     mkdirSync(outputDir, { recursive: true });
-    // The driver that filters textures exactly, as the browser's does; the faster one has weights of 8 bits, which the
-    // two bytes of the ink's texels do not stand.
     const [ground, light] = [slope(width, height), slope(512, 512)].map(({ name, buffer }) => {
         writeFileSync(join(outputDir, name), buffer);
         return { file: join(outputDir, name), url: `data:image/png;base64,${buffer.toString('base64')}` };
     });
     const pictures = ['--portrait', ground.file, '--landscape', ground.file, '--light', light.file];
-    // It tints the ground, the light and the ink, and has no breeze, whose phase is the time since the first frame.
-    // With a step of the ink in every frame it does not count how long the water was there before.
+    // Honey tints the ground, the light and the ink. It has no breeze, which would depend on the time since the first frame, and
+    // with a step of the ink in each frame the ink does not depend on it either.
     const preset = 'honey';
     const look = join(outputDir, 'steps.properties');
     writeFileSync(look, 'inkStepsPerSecond = 60\n');
     const options = ['--preset', preset, '--look', look, ...pictures, '--script', script, '--size', `${width}x${height}`, '--seconds', '0.8', '--every', '12', '--out', outputDir];
+    // Softpipe filters textures exactly, as the browser's driver does. llvmpipe has weights of 8 bits, too few for the ink, which is
+    // packed into two bytes.
     const drawn = promisify(execFile)(preview, options, { env: { ...process.env, GALLIUM_DRIVER: 'softpipe' } });
 
     const actions = ['down', 'up', 'move', 'cancel'];
-    // The program's places are whole pixels.
+    // The program rounds the points of a script to whole pixels.
     const pixels = (text, extent) => Math.round((parseFloat(text) * extent) / 100);
     const touches = readFileSync(script, 'utf8').split('\n').filter((line) => /^\d/.test(line)).map((line) => {
         const [time, action, x, y] = line.split(/\s+/);
         return [Number(time), actions.indexOf(action), pixels(x, width), pixels(y, height)];
     });
-    await page.addInitScript(() => { Math.random = () => 0; });  // the seed is 1, as the program's
+    await page.addInitScript(() => { Math.random = () => 0; });  // so the seed is 1, as in the program
     await open(page, `#preset=${preset}&inkStepsPerSecond=60`);
     await page.evaluate(async ([ground, light]) => {
         const { water } = window.tidemark;

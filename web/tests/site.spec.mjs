@@ -1,4 +1,4 @@
-// The page as a site: screens, links, a missing network, and browsers that cannot show it.
+// Tests of the playground as a site: screens, links, use without a network, and failures of its worker.
 import { difference, expect, flatPixels, open, screenshotPath, takeOver, test } from './page.mjs';
 
 const screens = {
@@ -9,7 +9,7 @@ const screens = {
 };
 for (const [name, screen] of Object.entries(screens)) {
     test.describe(name, () => {
-        test.use({ ...screen, contextOptions: { reducedMotion: 'reduce' } });  // no slow frames make it coarser
+        test.use({ ...screen, contextOptions: { reducedMotion: 'reduce' } });  // no frames, so that their rate does not change the number of pixels
         test('fills the screen, at most twice as dense as the page', async ({ page }) => {
             await open(page);
             const canvas = page.getByRole('button', { name: /Water/ });
@@ -33,7 +33,7 @@ for (const [name, screen] of Object.entries(screens)) {
     });
 }
 
-test('its links, icons and picture exist, and so do those of its documents', async ({ page, baseURL }) => {
+test('all links, icons and pictures of the page and its documents exist', async ({ page, baseURL }) => {
     await page.goto('./');
     const { icons } = await (await page.request.get('./manifest.webmanifest')).json();
     const addresses = new Set(icons.map(({ src }) => new URL(src, baseURL).href));
@@ -42,7 +42,7 @@ test('its links, icons and picture exist, and so do those of its documents', asy
         for (const place of places) addresses.add(new URL(place, page.url()).href.split('#')[0]);
     };
     await collect();
-    for (const address of addresses) {  // and those that are found on the way
+    for (const address of addresses) {  // the loop adds those of each document
         if (!address.startsWith(baseURL)) continue;
         expect((await page.request.get(address)).ok(), address).toBe(true);
         if (!address.endsWith('.html')) continue;
@@ -52,7 +52,7 @@ test('its links, icons and picture exist, and so do those of its documents', asy
     expect([...addresses].filter((address) => address.endsWith('.html')).length).toBeGreaterThan(6);
 });
 
-// The browser reports what the policy refuses as an error of the page; without it nothing would be reported.
+// Without a policy in force, the other tests would not notice its violations.
 test('the strict content security policy is in force', async ({ page, problems }) => {
     await page.goto('./');
     const ran = await page.evaluate(() => {
@@ -64,7 +64,7 @@ test('the strict content security policy is in force', async ({ page, problems }
     expect(problems.splice(0).filter((text) => /Content Security Policy/.test(text)).length).toBeGreaterThan(1);
 });
 
-test('opens without a network once it has been loaded, and no two pictures look alike', async ({ page, context, baseURL }) => {
+test('the page opens without a network after the first visit, and its pictures differ', async ({ page, context, baseURL }) => {
     const [older, neighbour] = [`tidemark ${baseURL} 1`, `tidemark ${baseURL}else/ 1`];
     await page.addInitScript((names) => {
         if (navigator.serviceWorker?.controller === null) for (const name of names) caches.open(name);
@@ -89,7 +89,7 @@ test('opens without a network once it has been loaded, and no two pictures look 
     for (const [a, b] of [[0, 1], [1, 2], [0, 2]]) expect(difference(seen[a], seen[b])).toBeGreaterThan(15);
 });
 
-test('a worker that is gone is told and started anew; of two pictures the last chosen stays', async ({ page }) => {
+test('a failed worker is reported and started again; the last of two pictures wins', async ({ page }) => {
     await page.addInitScript(() => {
         window.works = [];
         window.started = [];
@@ -103,7 +103,7 @@ test('a worker that is gone is told and started anew; of two pictures the last c
     await page.goto('./');
     const answer = (i, side) => page.evaluate(([i, side]) => window.answer(i, side), [i, side]);
     await page.waitForFunction(() => window.works.length > 0);
-    expect(await page.evaluate(() => window.started)).toEqual([expect.stringMatching(/^\.\/assets\/painter/)]);  // by the page
+    expect(await page.evaluate(() => window.started)).toEqual([expect.stringMatching(/^\.\/assets\/painter/)]);  // early_painter.js has started one worker
     await answer(0);
     await expect(page.locator('#message.shown')).toHaveText(/painted pictures do not load/);
     await page.setViewportSize({ width: 500, height: 800 });

@@ -1,4 +1,4 @@
-// What the page does with pointers and photos. Lost contexts are tried in the other engines.
+// Tests of the playground's photos, pointers, sizes and ink.
 import { difference, expect, flatPixels, open, pixelsAfter, slope, takeOver, test } from './page.mjs';
 
 function expectMiddleOf(pixels, view, [width, height]) {
@@ -13,7 +13,7 @@ function expectMiddleOf(pixels, view, [width, height]) {
     }
 }
 
-test('shows the photo, and each of two in its turn; a file that is none leaves it', async ({ page }) => {
+test('a photo is shown, of two the one that fits; a broken file changes nothing', async ({ page }) => {
     test.slow();
     await open(page, '#wet=0&groundRed=1&groundGreen=1');
     await takeOver(page);
@@ -34,7 +34,7 @@ test('shows the photo, and each of two in its turn; a file that is none leaves i
     expectMiddleOf(await flatPixels(page), page.viewportSize(), [400, 200]);
 });
 
-test('a tap raises rings that come to rest, and then no frames are asked for', async ({ page }) => {
+test('a tap raises rings that come to rest, and then no frames are requested', async ({ page }) => {
     await open(page, '#breeze=0');
     const rests = () => page.evaluate(() => window.tidemark.water.water.calm);
     await expect.poll(rests).toBe(true);
@@ -66,7 +66,7 @@ test('pointers become touches: one draws with every report, at its place and tim
         moved.getCoalescedEvents = () => [make('pointermove', 1, 11, 1001), moved];
         document.querySelector('tidemark-water').dispatchEvent(moved);
         send('pointerdown', 2, 90, 1010);
-        send('pointermove', 2, 91, 1019);  // not far enough for another ripple
+        send('pointermove', 2, 91, 1019);  // too near for another ripple
         send('pointermove', 2, 120, 1028);
         send('pointerup', 2, 120, 1029);
         send('pointerup', 1, 13, 1030);
@@ -79,7 +79,7 @@ test('pointers become touches: one draws with every report, at its place and tim
         [1, 13, 15, -1, 1030], [0, 90, 15, 0.25, 1031], [3, 92, 15, -1, 1040], ['ripple', 40]]);
 });
 
-test('a canvas whose size keeps changing is stretched, and gets its pixels and the picture once', async ({ page }) => {
+test('a canvas is stretched while its size changes, and gets its pixels and the picture once', async ({ page }) => {
     await open(page, '?src=favicon.svg');
     await takeOver(page);
     const flat = await flatPixels(page);
@@ -88,14 +88,14 @@ test('a canvas whose size keeps changing is stretched, and gets its pixels and t
         const sizes = [];
         const follow = async (width, height) => {
             Object.assign(document.querySelector('#water').style, { width: `${width}px`, height: `${height}px` });
-            for (let i = 0; i < 2; ++i) await new Promise(requestAnimationFrame);  // until the observer has seen it
+            for (let i = 0; i < 2; ++i) await new Promise(requestAnimationFrame);  // the observer reports the size
             for (let i = 0; i < 3; ++i) {
                 window.frames(1);
                 if (sizes.at(-1) !== canvas.width) sizes.push(canvas.width);
             }
         };
         for (let width = 210; width <= 290; width += 10) await follow(width, 200);
-        await follow(300, 200);  // the view is turned
+        await follow(300, 200);  // another orientation
         window.frames(6);
         sizes.push(canvas.width);
         return sizes;
@@ -104,7 +104,7 @@ test('a canvas whose size keeps changing is stretched, and gets its pixels and t
     expect(mean(await flatPixels(page)) / mean(flat)).toBeCloseTo(1, 1);
 });
 
-test('keys and buttons switch the ink, and clear it', async ({ page }) => {
+test('a key switches the ink off, and a button clears it', async ({ page }) => {
     test.slow();
     await open(page, '#ink=1');
     await takeOver(page);

@@ -1,12 +1,13 @@
 // Tests of the package's element and canvases, on small pages of their own.
 import { execFileSync } from 'node:child_process';
-import { cpSync, existsSync, readFileSync } from 'node:fs';
-import { createServer } from 'node:http';
+import { cpSync, existsSync, readFileSync, writeFileSync } from 'node:fs';
+import { createServer as createHttpServer } from 'node:http';
 import { join } from 'node:path';
 import { build } from 'esbuild';
 import { PNG } from 'pngjs';
 import { createElement } from 'react';
 import { renderToString } from 'react-dom/server';
+import { createServer } from 'vite';
 import { expect, screenshotPath, slope, test } from './page.mjs';
 
 const dist = new URL('../package/dist/', import.meta.url).pathname;
@@ -213,6 +214,8 @@ test('createWater() shows a canvas and a video that change, and toBlob() works; 
         const { createWater } = await import('./tidemark-water.js');
         const source = document.createElement('canvas').getContext('2d');
         const video = Object.assign(document.createElement('video'), { srcObject: source.canvas.captureStream(), muted: true });
+        // Two pictures a second: most frames of the page have no new one.
+        Object.defineProperty(video, 'currentTime', { get: () => Math.floor(performance.now() / 500) });
         const scratch = new OffscreenCanvas(8, 8).getContext('2d', { willReadFrequently: true });
         const canvases = document.querySelectorAll('canvas');
         const light = new OffscreenCanvas(8, 8);
@@ -598,7 +601,7 @@ test('React keeps the attributes that a server has written', async ({ page }) =>
 });
 
 test('an address of the page may redirect to a server that allows all pages', async ({ page }) => {
-    const server = createServer(({ url }, response) => {
+    const server = createHttpServer(({ url }, response) => {
         if (url === '/away.png') return response.writeHead(302, { location: `http://127.0.0.1:${server.address().port}/pond.png` }).end();
         if (url === '/pond.png') return response.writeHead(200, { 'access-control-allow-origin': '*', 'content-type': 'image/png' }).end(slope(64, 64).buffer);
         const name = url === '/' ? null : join(dist, url);
@@ -643,5 +646,15 @@ test('the packed package works in a fresh project, with and without a bundler', 
         const inside = name === 'iframe' ? page.frameLocator('iframe') : page;
         await inside.locator(name === 'esbuild' ? 'canvas[width="952"]' : 'tidemark-water[shown]').first().waitFor();
         await page.screenshot({ animations: 'disabled', path: screenshotPath(name.replace('/', '-')) });
+    }
+    // The development server has a copy of the script and none of the module.
+    writeFileSync(join(outputDir, 'inlined.html'), '<tidemark-water></tidemark-water><script type="module">import "tidemark-water/inlined";</script>');
+    const server = await createServer({ root: outputDir, configFile: false, logLevel: 'error', server: { port: 0 } });
+    try {
+        await server.listen();
+        await page.goto(`${server.resolvedUrls.local[0]}inlined.html`);
+        await page.locator('tidemark-water[shown]').waitFor();
+    } finally {
+        await server.close();
     }
 });

@@ -52,8 +52,9 @@ export class WaterElement extends Base {
     // Private in JavaScript, too: frameworks set each property that an element has.
     #internals: ElementInternals | undefined;
     #keys: Keys | undefined;
-    #own: { src?: Source | null; srcPortrait?: Source | null; look?: Look | null } = {};
-    #due = new Set<Property>();
+    // Values that are not texts, and so no attributes.
+    #objects: { src?: Source | null; srcPortrait?: Source | null; look?: Look | null } = {};
+    #changedProperties = new Set<Property>();
     #hasListener = false;  // for the event `error`
 
     connectedCallback(): void {
@@ -67,7 +68,7 @@ export class WaterElement extends Base {
         }
         const [canvas, still] = this.#build();
         this.water = new Water(canvas, this.#choices(properties), { box: this, still });
-        for (const type of events) this.water.addEventListener(type, (event) => this.#tell(event));
+        for (const type of events) this.water.addEventListener(type, (event) => this.#forward(event));
         this.#name();
         this.#state('paused', this.paused);
     }
@@ -84,8 +85,8 @@ export class WaterElement extends Base {
 
     attributeChangedCallback(name: string): void {
         const property = properties.find((known) => attributeOf(known) === name || known.toLowerCase() === name)!;
-        if (property === 'src' || property === 'srcPortrait') this.#own.src = this.#own.srcPortrait = undefined;
-        if (property === 'look') this.#own.look = undefined;
+        if (property === 'src' || property === 'srcPortrait') this.#objects.src = this.#objects.srcPortrait = undefined;
+        if (property === 'look') this.#objects.look = undefined;
         this.#changed(property);
     }
 
@@ -126,8 +127,8 @@ export class WaterElement extends Base {
         this.#apply();
     }
     async setPicture(source: Source | null, portrait: Source | null = null): Promise<void> {
-        this.#own.src = source;
-        this.#own.srcPortrait = portrait;
+        this.#objects.src = source;
+        this.#objects.srcPortrait = portrait;
         await this.water?.setPicture(source, portrait);
     }
     toBlob(type?: string, quality?: number): Promise<Blob> {
@@ -171,7 +172,7 @@ export class WaterElement extends Base {
         return root;
     }
 
-    #tell(event: Event): void {
+    #forward(event: Event): void {
         const { detail } = event as CustomEvent<WaterError>;
         if (event.type === 'ready') this.setAttribute('shown', '');
         this.#state('ready', this.hasAttribute('shown'));
@@ -194,15 +195,15 @@ export class WaterElement extends Base {
     }
 
     #changed(property: Property): void {
-        if (this.#due.size === 0) queueMicrotask(() => this.#apply());
-        this.#due.add(property);
+        if (this.#changedProperties.size === 0) queueMicrotask(() => this.#apply());
+        this.#changedProperties.add(property);
     }
 
     #apply(): void {
-        if (!this.water || this.#due.size === 0) return;
-        if (this.#due.has('src')) this.#due.add('srcPortrait');
-        this.water.set(this.#choices([...this.#due]));
-        this.#due.clear();
+        if (!this.water || this.#changedProperties.size === 0) return;
+        if (this.#changedProperties.has('src')) this.#changedProperties.add('srcPortrait');
+        this.water.set(this.#choices([...this.#changedProperties]));
+        this.#changedProperties.clear();
         this.#state('paused', this.paused);
         this.#name();
     }
@@ -213,7 +214,7 @@ export class WaterElement extends Base {
         // Without `src`, the picture of the fallback is the picture under the water.
         const image = this.querySelector<HTMLImageElement>(':scope > img[slot=fallback], :scope > [slot=fallback] img');
         if ('src' in options) options.src ??= image?.currentSrc || image?.src;
-        for (const [name, value] of Object.entries(this.#own)) if (name in options && value !== undefined) options[name] = value;
+        for (const [name, value] of Object.entries(this.#objects)) if (name in options && value !== undefined) options[name] = value;
         return options as Options;
     }
 
@@ -243,12 +244,12 @@ export class WaterElement extends Base {
                 configurable: true,
                 enumerable: true,
                 get(this: WaterElement) {
-                    if (property === 'look' && this.#own.look) return this.#own.look;
+                    if (property === 'look' && this.#objects.look) return this.#objects.look;
                     return parse(property, this.getAttribute(names[0]!) ?? this.getAttribute(names[1]!));
                 },
                 set(this: WaterElement, value: unknown) {
                     if (property === 'look' && value && typeof value === 'object') {
-                        this.#own.look = value as Look;
+                        this.#objects.look = value as Look;
                         this.#changed(property);
                     } else if (value === null || value === undefined) {
                         for (const name of names) this.removeAttribute(name);

@@ -38,7 +38,7 @@ export class Touches {
         followPointers(this.box, target, {
             hovers: () => this.owner.allows('hover'),
             presses: () => this.owner.allows('press'),
-            ripple: (x, y, height) => this.let((native) => native._splash(x, y, height)),
+            ripple: (x, y, height) => this.deliver((native) => native._splash(x, y, height)),
             touch: (action, x, y, event) => this.touch(action, x, y, event),
         }, this.pointers.signal);
     }
@@ -46,7 +46,7 @@ export class Touches {
     drop(x: number, y: number, { strength = 1, ink = false }: DropOptions): void {
         const column = x / (this.box.clientWidth || 1);
         const row = y / (this.box.clientHeight || 1);
-        this.let((native) => {
+        this.deliver((native) => {
             if (ink) native._drop(column, row, strength);
             else native._splash(column, row, strength);
         });
@@ -68,10 +68,10 @@ export class Touches {
         const call = (native: Native) => native._touch(action, x, y, pressure, event.timeStamp / 1000);
         if (action === TouchAction.down) {
             const native = this.owner.visibleNative();
-            if (native) this.let(() => call((this.native = native)));
-            else this.let((late) => late._drop(x, y, 1));  // a stroke cannot wait for the first frame
+            if (native) this.deliver(() => call((this.native = native)));
+            else this.deliver((late) => late._drop(x, y, 1));  // a stroke cannot wait for the first frame
         } else if (this.native && action === TouchAction.move) {
-            if (this.owner.visibleNative()) this.let(call);
+            if (this.owner.visibleNative()) this.deliver(call);
         } else if (this.native) {
             call(this.native);
             this.native = undefined;
@@ -79,7 +79,7 @@ export class Touches {
         }
     }
 
-    private let(fall: (native: Native) => void): void {
+    private deliver(fall: (native: Native) => void): void {
         if (!this.owner.takesDrops()) return;
         this.last = performance.now();
         const native = this.owner.visibleNative();

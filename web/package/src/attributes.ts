@@ -155,7 +155,7 @@ export function check(options: Options): void {
         if (value === null || value === undefined) continue;
         if (values && !values.includes(value as string)) warnOnce(`${property} cannot be "${value}". Write one of: ${values.join(', ')}.`);
         if (kind === 'color' && !inkOf(String(value))) warnOnce(`${property} cannot be "${value}". Write #rrggbb.`);
-        if (kind === 'number' && Number.isNaN(Number(value))) warnOnce(`${property} is not a number: ${value}.`);
+        if (kind === 'number' && Number.isNaN(Number(value))) warnOnce(`${property} is not a number.`);
     }
     const known = withinRange(options.look ?? {});
     const names = Object.keys(options.look ?? {}).filter((name) => !(name in known)).join(', ');

@@ -238,7 +238,6 @@ export class Water extends EventTarget {
     private async create(module: WebAssembly.Module, gl: WebGLRenderingContext): Promise<Native> {
         const load: Load = (...slot) => this.chooser.fill(this.graphics, ...slot);
         const native = await instantiate(module, gl, load, 1 + Math.floor(Math.random() * 1e6));
-        this.longestSide = Math.min(gl.getParameter(gl.MAX_TEXTURE_SIZE), ...gl.getParameter(gl.MAX_VIEWPORT_DIMS));
         if (this.chooser.picture) native._picturesChanged(backgrounds);
         if (this.chooser.light) native._picturesChanged(1 << Slot.light);
         this.viewSize = '';
@@ -246,6 +245,8 @@ export class Water extends EventTarget {
     }
 
     private opened(wasLost: boolean): void {
+        const gl = this.graphics.gl!;
+        this.longestSide = Math.min(gl.getParameter(gl.MAX_TEXTURE_SIZE), ...gl.getParameter(gl.MAX_VIEWPORT_DIMS));
         this.stale = true;
         this.apply();
         if (wasLost) this.dispatchEvent(new Event('contextrestored'));

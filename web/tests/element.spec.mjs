@@ -12,11 +12,12 @@ import { expect, screenshotPath, slope, test } from './page.mjs';
 
 const dist = new URL('../package/dist/', import.meta.url).pathname;
 const script = '<script type="module" src="tidemark-water.js"></script>';
+const white = PNG.sync.write(Object.assign(new PNG({ width: 2, height: 2 }), { data: Buffer.alloc(16, 255) }));
 const types = { html: 'text/html', js: 'text/javascript', css: 'text/css', wasm: 'application/wasm', png: 'image/png', webp: 'image/webp' };
 
 // Opens a page that has the built package and pictures beside it, at any address.
 async function show(page, html, { headers = {}, files = {}, folder = dist, at = 'http://pond.test/page.html', until } = {}) {
-    files = { 'pond.png': slope(64, 64).buffer, 'words.png': 'words', 'page.html': `<!doctype html><html lang="en">${html}`, ...files };
+    files = { 'pond.png': slope(64, 64).buffer, 'white.png': white, 'words.png': 'words', 'page.html': `<!doctype html><html lang="en">${html}`, ...files };
     await page.route('**/*.test/**', async (route) => {
         const name = new URL(route.request().url()).pathname.slice(1);
         const body = await files[name] ?? (existsSync(join(folder, name)) && readFileSync(join(folder, name)));
@@ -146,11 +147,12 @@ test('each failure is reported once, and a paused water shows another picture at
         water.pause();
         await water.setPicture(new File(['words'], 'words.png')).catch(() => (water.rain = 3));
         await new Promise((resolve) => setTimeout(resolve, 100));
-        await water.setPicture('pond.png');
+        await water.setPicture('white.png');
         return codes;
     })).toEqual(['decode']);
     await page.setViewportSize({ width: 300, height: 300 });
-    await expect.poll(async () => PNG.sync.read(await element(page).screenshot()).data[4 * 270]).toBeGreaterThan(150);
+    await expect.poll(() => element(page).evaluate(({ canvas: { width } }) => width)).toBe(284);
+    await expect.poll(async () => PNG.sync.read(await element(page).screenshot()).data[4 * 270 + 1]).toBeGreaterThan(150);  // green
     expect(problems.splice(0)).toEqual([/no values with these names: Exponent\./, /decode: words.png/].map((text) => expect.stringMatching(text)));
 });
 
@@ -258,8 +260,7 @@ test('createWater() shows a canvas and a video that change, and toBlob() works; 
 });
 
 test('the look darkens and tints stills, also without a context; a breeze can be kept', async ({ page, problems }) => {
-    const white = PNG.sync.write(Object.assign(new PNG({ width: 2, height: 2 }), { data: Buffer.alloc(16, 255) }));
-    await show(page, `${script}<tidemark-water src="white.png"></tidemark-water>`, { files: { 'white.png': white } });
+    await show(page, `${script}<tidemark-water src="white.png"></tidemark-water>`);
     await element(page).and(page.locator('[shown]')).waitFor();
     const seen = await element(page).evaluate(async (water) => {
         const { water: { still, graphics: { lose } } } = water;

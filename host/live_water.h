@@ -24,6 +24,8 @@ struct LookField;
 // pressure.
 float penWeight(float pressure);
 
+double steadySeconds();
+
 class LiveWater {
 public:
     enum class Frame {
@@ -33,8 +35,11 @@ public:
         resize = 3,  // nothing was drawn: give the surface width() x height() pixels, then call resized()
     };
 
+    // Seconds of a clock that goes on while a frame is drawn.
+    using Clock = double (*)();
+
     // `seed` fixes where the rain falls.
-    LiveWater(PictureSource pictures, std::uint32_t seed);
+    LiveWater(PictureSource pictures, std::uint32_t seed, Clock clock = steadySeconds);
 
     // The view in density-independent pixels, and how many pixels of the display each of them has. Frames go on in the
     // old size until the view has kept its size for a tenth of a second. The ink is lost then, the water stays.
@@ -102,12 +107,14 @@ private:
     };
 
     void prepare();
+    void draw(double seconds);
     void fitSurface();
     bool isSurfaceDue() const;
     double secondsUntil(double now);
 
     WaterHost host_;
     PictureSource pictures_;
+    Clock clock_;
     Pace pace_;
     bool withInk_ = false;
 

@@ -6,12 +6,24 @@ namespace tidemark {
 
 namespace {
 
-constexpr Pace::Level kLevels[] = {{1.0, 1.0}, {0.7, 1.0}, {0.5, 1.0}, {0.5, 0.8}, {0.5, 0.65}, {0.5, 0.5}};
+constexpr Pace::Level kLevels[] = {{1.0, 1.0, 4}, {0.7, 1.0, 3},  {0.5, 1.0, 2},
+                                   {0.5, 0.8, 2}, {0.5, 0.65, 1}, {0.5, 0.5, 1}};
 constexpr int kMeshLevels = 3;
 constexpr int kLowest = static_cast<int>(std::size(kLevels)) - 1;
 
 // An interval of a display that shows every frame varies by less than this.
 constexpr double kLate = 1.4;
+
+// Frames that come so many times too late ask for the coarsest level at once.
+constexpr double kFarTooLate = 3.0;
+
+// A slower display than this, in seconds a frame, there is not.
+constexpr double kSlowestDisplay = 1.0 / 22;
+
+// Frames are judged by the median of as many as come in so many seconds, but no fewer than kFewest.
+constexpr double kJudgedSeconds = 0.35;
+constexpr int kFewest = 3;
+
 constexpr double kStartSeconds = 1.0;
 constexpr double kSettleSeconds = 0.15;
 constexpr double kMostPatience = 60.0;
@@ -30,10 +42,11 @@ Pace::Level Pace::level() const {
 void Pace::setLevel(int level, double now) {
     level_ = level;
     count_ = 0;
+    judged_ = 0.0;
     quietUntil_ = now + kSettleSeconds;
 }
 
-bool Pace::frameDrawn(double now, double shortest) {
+bool Pace::frameDrawn(double now, double shortest, bool keepsResolution) {
     if (quietUntil_ < 0.0) quietUntil_ = now + kStartSeconds;
     const double interval = now - last_;
     const bool follows = isFollowing_;
@@ -41,33 +54,39 @@ bool Pace::frameDrawn(double now, double shortest) {
     last_ = now;
     if (!follows || now < quietUntil_) return false;
     intervals_[static_cast<std::size_t>(count_)] = interval;
-    if (++count_ < static_cast<int>(intervals_.size())) return false;
+    judged_ += interval;
+    const bool isFull = ++count_ == static_cast<int>(intervals_.size());
+    if (!isFull && (count_ < kFewest || judged_ < kJudgedSeconds)) return false;
+    const bool hasChanged = judge(now, shortest, keepsResolution);
     count_ = 0;
-    return judge(now, shortest);
+    judged_ = 0.0;
+    return hasChanged;
 }
 
-bool Pace::judge(double now, double shortest) {
-    auto* const middle = intervals_.begin() + intervals_.size() / 2;
-    std::nth_element(intervals_.begin(), middle, intervals_.end());
+bool Pace::judge(double now, double shortest, bool keepsResolution) {
+    auto* const middle = intervals_.begin() + count_ / 2;
+    std::nth_element(intervals_.begin(), middle, intervals_.begin() + count_);
     const double median = *middle;
     rhythm_ = std::min(rhythm_, std::max(median, 1.0 / 240));
-    const bool isLate = median > kLate * std::max(rhythm_, shortest);
+    const double late = median / std::max(rhythm_, shortest);
+    const bool isLate = late > kLate;
     if (isLate && level_ < lowest_) {
         if (level_ == 0) atBest_ = median;
         // An attempt at a better level has failed.
         if (now < retryAt_ + 2.0) patience_ = std::min(2 * patience_, kMostPatience);
         retryAt_ = now + patience_;
-        setLevel(std::min(level_ + (median > 1.8 * rhythm_ ? 2 : 1), lowest_), now);
+        setLevel(std::min(level_ + (late > kFarTooLate ? kLowest : late > 1.8 ? 2 : 1), lowest_), now);
         return true;
     }
-    if (isLate && median > 0.9 * atBest_ && atBest_ > 0.0) {
+    if (isLate && median > 0.9 * atBest_ && atBest_ > 0.0 && median < kSlowestDisplay) {
         // The coarsest frames come no sooner than the finest: it is the display that is slow.
         rhythm_ = median;
         atBest_ = 0.0;
         setLevel(0, now);
         return true;
     }
-    if (!isLate && level_ > 0 && now >= retryAt_) {
+    const bool isKept = keepsResolution && level_ >= kMeshLevels;
+    if (!isLate && level_ > 0 && now >= retryAt_ && !isKept) {
         retryAt_ = now;
         setLevel(level_ - 1, now);
         return true;

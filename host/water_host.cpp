@@ -358,7 +358,7 @@ void WaterHost::gatherHeights() {
     isGathered_ = atStep && !isBreezy();
 }
 
-void WaterHost::draw() {
+void WaterHost::draw(const std::function<bool()>& isEnough) {
     if (!isMeshFilled_) fillMesh();
     gatherHeights();
     int steps = 1;
@@ -373,6 +373,10 @@ void WaterHost::draw() {
         inkTime_ = time_ - (behind + steps) * inkStep();
     }
     for (int i = 1; i <= steps; ++i) {
+        if (i < steps && isEnough && isEnough()) {
+            inkTime_ += (steps - i) * inkStep();
+            i = steps;
+        }
         if (moves) {
             inkTime_ += inkStep();
             for (const Touch& touch : strokes_.step(inkTime_ - kInkDelay)) {

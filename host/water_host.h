@@ -6,6 +6,7 @@
 #pragma once
 
 #include <cstdint>
+#include <functional>
 #include <random>
 #include <vector>
 
@@ -87,8 +88,8 @@ public:
 
     // Draws a frame: without ink into the current framebuffer, with ink into framebuffer 0. With ink, also runs the
     // steps that are due, at least one and at most four; more are skipped, so that one late frame does not delay the
-    // next.
-    void draw();
+    // next. The steps left when `isEnough` returns true are skipped, too.
+    void draw(const std::function<bool()>& isEnough = {});
 
     // Removes all ink with the next frame.
     void clearInk();

@@ -26,11 +26,12 @@ protected:
         GlTest::SetUp();
         renewContext(kWidth, kHeight);
         resetGestures();
+        secondsAReading = 0.0;
         begin();
     }
 
     void begin(const Look& look = {}) {
-        water = LiveWater(sourceOf(pictures), 1);
+        water = LiveWater(sourceOf(pictures), 1, [] { return clockSeconds += secondsAReading; });
         water.setLook(look);
         water.setView(kWidth, kHeight, 1.0, now);
         water.picturesChanged(kAllPictures);
@@ -76,6 +77,8 @@ protected:
     }
 
     const Pictures pictures = {smoothPicture(72, 128, 1), smoothPicture(128, 72, 2), smoothPicture(16, 16, 3)};
+    // Of the clock that goes on while a frame is drawn.
+    static inline double clockSeconds, secondsAReading;
     LiveWater water{sourceOf(pictures), 1};
     Size size = {0, 0};
     double now = 100.0;
@@ -282,10 +285,9 @@ TEST_F(Live, aLookChangesOnWavingWaterUnlessAValueIsBeyondItsLimits) {
 
 // `count` counts the ink's steps since the finger came down.
 TEST_F(Live, inkMovesByTheClockOnAnyDisplay) {
-    water.setLook({.meshVertices = 24});
     for (const double rate : {15.0, 30.0, 60.0, 75.0, 90.0, 120.0, 144.0}) {
         SCOPED_TRACE(rate);
-        water.setInk(false);
+        begin({.meshVertices = 24});
         next();
         water.setInk(true);
         next();
@@ -308,6 +310,23 @@ TEST_F(Live, inkMovesByTheClockOnAnyDisplay) {
         next();
         EXPECT_LE(count - before, 6) << "nor later";
     }
+}
+
+TEST_F(Live, stepsThatMakeUpForALateFrameTakeAQuarterOfItsTimeAtMost) {
+    water.setInk(true);
+    next();
+    touch();
+    next();
+    for (const auto& [reading, steps] : {std::pair(0.001, 4), {0.004, 4}, {0.006, 3}, {0.01, 2}, {0.1, 1}}) {
+        secondsAReading = reading;
+        count = 0;
+        for (int i = 0; i < 2; ++i) next(1.0 / 15);
+        EXPECT_EQ(count, 2 * steps) << reading;
+    }
+    secondsAReading = 0.0;
+    count = 0;
+    next();
+    EXPECT_EQ(count, 1) << "those left out are not taken later";
 }
 
 // Frames that come at half the display's rate until there are fewer pixels.
@@ -342,12 +361,12 @@ struct Paced {
     Paced() { pace.allowResolution(true); }
 
     // `needed` seconds for a frame at the best level, less at others, on a display that shows 1 / period frames.
-    void run(double seconds, double needed, double period = 1.0 / 60) {
+    void run(double seconds, double needed, double period = 1.0 / 60, bool hasInk = false) {
         for (const double end = now + seconds; now < end;) {
-            const auto [mesh, resolution] = pace.level();
+            const auto [mesh, resolution, inkSteps] = pace.level();
             const double work = needed * (0.3 + 0.2 * mesh + 0.5 * resolution * resolution);
             now += period * std::ceil(work / period - 1e-6);
-            changes += pace.frameDrawn(now, 0.0);
+            changes += pace.frameDrawn(now, 0.0, hasInk);
         }
     }
     double resolution() const { return pace.level().resolution; }
@@ -371,6 +390,30 @@ TEST(Pace, settlesWithinTwoSecondsDoesNotSwingAndRecovers) {
     EXPECT_NEAR(paced.resolution(), settled, 0.2);
     paced.run(80.0, 0.004);
     EXPECT_EQ(std::pair(paced.pace.level().mesh, paced.resolution()), std::pair(1.0, 1.0)) << "there is room again";
+
+    // So slow that the coarsest frames are late as well.
+    for (const double needed : {0.06, 0.25, 0.6}) {
+        Paced slow;
+        slow.run(2.0 + needed, needed);
+        EXPECT_EQ(slow.resolution(), 0.5) << needed;
+        EXPECT_EQ(slow.pace.level().inkSteps, 1);
+        slow.changes = 0;
+        slow.run(60.0, needed);
+        EXPECT_EQ(slow.changes, 0) << needed;
+    }
+
+    Paced stuck;
+    stuck.run(20.0, 0.05, 0.1);
+    EXPECT_EQ(stuck.resolution(), 0.5) << "no display is so slow";
+
+    // A better resolution would lose the ink, a finer mesh does not.
+    Paced inked;
+    inked.run(3.0, 0.03);
+    const double kept = inked.resolution();
+    inked.run(60.0, 0.004, 1.0 / 60, true);
+    EXPECT_EQ(inked.resolution(), kept);
+    inked.run(60.0, 0.004);
+    EXPECT_EQ(inked.resolution(), 1.0);
 
     Paced slowDisplay;
     slowDisplay.run(12.0, 0.01, 1.0 / 30);

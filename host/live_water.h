@@ -136,6 +136,7 @@ private:
 
     // Changes that the next frame passes to the library, because the context is current only there.
     bool setUpDue_ = false;
+    bool isContextNew_ = true;
     unsigned pictureDue_ = 0;   // to be handed over
     unsigned texturesDue_ = 0;  // besides those
     unsigned known_ = 0;        // pictures that were there once

@@ -56,7 +56,8 @@ protected:
 
     std::vector<Rgba> seen() const { return readPixels(kWidth, kHeight); }
 
-    // The calls that the next frame makes: P, L and W for hand-overs, | for a set-up, p, l and w for texture loads.
+    // The calls that the next frame makes: P, L and W for transfers, | for a set-up, * for a program of the water, p, l
+    // and w for texture loads.
     std::string calls(double seconds = 1.0 / 60) {
         constexpr std::uint32_t kMark = 4711;
         AndroidBitmapInfo* const slots[] = {&bmp_portrait_bg_info, &bmp_landscape_bg_info, &bmp_water_Info};
@@ -69,6 +70,7 @@ protected:
         }
         for (const std::string& line : log.take()) {
             if (line == "I onInitSetting") calls += '|';
+            if (line == "I ripple_vertextShader zorCreateShaderProgram()") calls += '*';
             if (line == "I onLoadPortraitBGTextures") calls += 'p';
             if (line == "I onLoadLandscapeBGTextures") calls += 'l';
             if (line.starts_with("I glDelete environment")) calls += 'w';
@@ -117,7 +119,7 @@ TEST_F(Live, drawsWhatHasChangedAndRestsOtherwise) {
 
 // While a divider is dragged the water goes on in its old size.
 TEST_F(Live, isSetUpOnceTheViewKeepsItsSizeAndHandsOverWhatIsOfOtherProportions) {
-    EXPECT_EQ(calls(), "PLW|pl") << "at once for the first view";
+    EXPECT_EQ(calls(), "PLW|*pl") << "at once for the first view";
     for (int i = 1; i < 30; ++i) {
         water.setView(kHeight, kWidth + i, 1.0, now);
         EXPECT_EQ(calls(1.0 / 30), "");
@@ -136,7 +138,7 @@ TEST_F(Live, isSetUpOnceTheViewKeepsItsSizeAndHandsOverWhatIsOfOtherProportions)
     EXPECT_EQ(calls(), "Ll");
     renewContext(kWidth, kHeight);
     water.renewContext();
-    EXPECT_EQ(calls(), "|plw") << "the library has copies";
+    EXPECT_EQ(calls(), "|*plw") << "the library has copies";
     water.setLook({.meshVertices = 64});
     EXPECT_EQ(calls(), "");
 }

@@ -1,9 +1,21 @@
 #!/usr/bin/env bash
-# Builds the benchmarks with both compilers, runs them in turn, and writes docs/bench.md and docs/bench.svg.
+# Builds the benchmarks with both compilers, runs them in turn, and writes docs/bench.md and docs/bench.svg. With --web:
+# measures the package in Chromium instead, and writes docs/bench-page.md.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/common.sh
-no_more_arguments "scripts/bench.sh" "$@"
+if [ "${1-}" = --web ]; then
+    shift
+    no_more_arguments "scripts/bench.sh --web" "$@"
+    install_missing chromium
+    scripts/web.sh --build
+    cmake --build --preset web --target tidemark-water-named
+    echo "Going to download jquery and jquery.ripples with npm"
+    npm --prefix build/web/peer install --no-save --no-audit --no-fund jquery@3 jquery.ripples@0.6.3
+    cd web
+    exec node bench/run.mjs ../build/web/peer ../docs/bench-page.md
+fi
+no_more_arguments "scripts/bench.sh [--web]" "$@"
 install_missing "${build_packages[@]}" "${bench_packages[@]}"
 
 declare -A compilers=([gcc]=g++ [clang]=clang++)

@@ -12,7 +12,7 @@ const largestSite = 1_000_000;  // bytes, not compressed
 // Renders the documents that the page links to as HTML pages. Links to other files become plain text, and pictures, which
 // would double the size of the site, become their descriptions.
 const documents = ['README.md', 'web/README.md', 'web/package/README.md', 'android/README.md',
-    ...['bench', 'contract', 'engine', 'host', 'look', 'promises'].map((name) => `docs/${name}.md`)];
+    ...['bench', 'bench-page', 'contract', 'engine', 'host', 'look', 'promises'].map((name) => `docs/${name}.md`)];
 
 function renderDocuments() {
     const pageOf = (path) => path.replace(/\.md$/, '.html');

@@ -82,7 +82,7 @@ const rank = (values, share) => values.toSorted((a, b) => a - b)[Math.floor(shar
 const median = (values) => rank(values, 0.5);
 
 // `use` gets the tab and a session of the browser's protocol, once the scene shows.
-async function withScene(scene, [width, height], density, use, { script = '/dist/tidemark-water.js', prepare = async () => {} } = {}) {
+export async function withScene(scene, [width, height], density, use, { script = '/dist/tidemark-water.js', prepare = async () => {} } = {}) {
     const context = await browser.newContext({ viewport: { width, height }, deviceScaleFactor: density });
     try {
         const tab = await context.newPage();
@@ -157,7 +157,7 @@ export const profile = (scene, view = middle) => withScene(scene, view, 1, async
         memory: await tab.evaluate(() => document.querySelector('tidemark-water').water.native.HEAPU8.length) };
 }, { script: '/named/index.js' });
 
-const firstPicture = (network) => withScene('first', middle, 1, (tab) => tab.evaluate(() => window.readyAt), {
+export const firstPicture = (network) => withScene('first', middle, 1, (tab) => tab.evaluate(() => window.readyAt), {
     prepare: async (session) => {
         await session.send('Network.enable');
         if (network) await session.send('Network.emulateNetworkConditions', { offline: false, ...network });

@@ -145,20 +145,22 @@ export function drawCover(canvas: HTMLCanvasElement, picture: Picture, [x, y]: P
         width * scale, height * scale, 0, 0, width, height);
 }
 
-function brightnessOf(canvas: HTMLCanvasElement): number {
-    const side = 32;
-    const context = canvasOf(side, side).getContext('2d', { willReadFrequently: true })!;
-    context.imageSmoothingQuality = 'high';
-    context.drawImage(canvas, 0, 0, side, side);
-    const { data } = context.getImageData(0, 0, side, side);
-    return data.reduce((sum, value, i) => (i % 4 < 3 ? sum + value : sum), 0) / (255 * 3 * side * side);
+// Returns the mean brightness of the part of the picture that covers width x height. It is drawn again on a small canvas of
+// the processor, because reading back a canvas of the graphics processor waits for all its pending work.
+function brightnessOf(picture: Picture, width: number, height: number, place: Place): number {
+    const scale = 32 / Math.max(width, height);
+    const small = canvasOf(Math.ceil(width * scale), Math.ceil(height * scale));
+    const context = small.getContext('2d', { alpha: false, willReadFrequently: true })!;
+    drawCover(small, picture, place);
+    const { data } = context.getImageData(0, 0, small.width, small.height);
+    return data.reduce((sum, value, i) => (i % 4 < 3 ? sum + value : sum), 0) / (255 * 0.75 * data.length);
 }
 
-/** Multiplies the colours of a canvas by the shade for its brightness. */
-export function multiply(canvas: HTMLCanvasElement, shade: Shade): void {
+/** Multiplies the colours of a canvas that `picture` covers by the shade for its brightness. */
+export function multiply(canvas: HTMLCanvasElement, picture: Picture, place: Place, shade: Shade): void {
     if (shade(1) === '#ffffff') return;  // the shade of darker pictures is not darker
     const context = canvas.getContext('2d')!;
-    context.fillStyle = shade(brightnessOf(canvas));
+    context.fillStyle = shade(brightnessOf(picture, canvas.width, canvas.height, place));
     context.globalCompositeOperation = 'multiply';
     context.fillRect(0, 0, canvas.width, canvas.height);
     context.globalCompositeOperation = 'source-over';
@@ -173,7 +175,7 @@ export function uploadCover(gl: WebGLRenderingContext, picture: Picture, width: 
     if (scratch.height !== height) scratch.height = height;
     drawCover(scratch, picture, place);
     try {
-        if (picture.shaded) multiply(scratch, shade);
+        if (picture.shaded) multiply(scratch, picture, place, shade);
         gl.texImage2D(gl.TEXTURE_2D, 0, gl.RGBA, gl.RGBA, gl.UNSIGNED_BYTE, scratch);
     } catch {  // a picture of another origin was drawn on the canvas after probe()
         scratch = undefined;

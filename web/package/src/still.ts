@@ -17,8 +17,9 @@ export class Still {
     /** Shows the picture as calm water does. */
     show(picture: Picture, { width, height }: HTMLCanvasElement, shade: Shade): void {
         this.resize(width, height);
-        drawCover(this.canvas, picture, placeOf(getComputedStyle(this.canvas).objectPosition));
-        if (picture.shaded) multiply(this.canvas, shade);
+        const place = placeOf(getComputedStyle(this.canvas).objectPosition);
+        drawCover(this.canvas, picture, place);
+        if (picture.shaded) multiply(this.canvas, picture, place, shade);
         this.isKept = true;
     }
 

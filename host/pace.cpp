@@ -7,7 +7,7 @@ namespace tidemark {
 namespace {
 
 constexpr Pace::Level kLevels[] = {{1.0, 1.0, 4}, {0.7, 1.0, 3},  {0.5, 1.0, 2},
-                                   {0.5, 0.8, 2}, {0.5, 0.65, 1}, {0.5, 0.5, 1}};
+                                   {0.5, 0.8, 2}, {0.5, 0.65, 2}, {0.5, 0.5, 1}};
 constexpr int kMeshLevels = 3;
 constexpr int kLowest = static_cast<int>(std::size(kLevels)) - 1;
 

@@ -56,9 +56,10 @@ protected:
     Density draw(double reports, double frames, bool isResampled = false) {
         resetGestures();
         srand48(1);
-        LiveWater water(sourceOf(pictures), 1);
+        LiveWater water(sourceOf(pictures), 1, [] { return 0.0; });
         water.setLook({.meshVertices = 16, .touchAmplitude = 0.0f, .breeze = 0.0f});
         water.setView(kWidth, kHeight, 1.0, 0.0);
+        water.setShortestFrame(1.0 / frames);  // so that none is late
         water.setInk(true);
         water.picturesChanged(kAllPictures);
         water.frame(0.0);

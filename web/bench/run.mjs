@@ -34,8 +34,8 @@ await build({
 
 const views = [[360, 640], [720, 1280], [1440, 900]];
 const middle = views[1];
-const settled = 3500;   // milliseconds until the pace has chosen how finely to draw
-const measured = 3000;  // milliseconds
+const settled = 3000;   // milliseconds until the pace has chosen how finely to draw
+const measured = 2500;  // milliseconds
 const rounds = 5;
 
 const water = (attributes = '') => `<tidemark-water src="/picture.webp" ${attributes}></tidemark-water>`;
@@ -82,7 +82,7 @@ const rank = (values, share) => values.toSorted((a, b) => a - b)[Math.floor(shar
 const median = (values) => rank(values, 0.5);
 
 // `use` gets the tab and a session of the browser's protocol, once the scene shows.
-export async function withScene(scene, [width, height], density, use, { script = '/dist/tidemark-water.js', prepare = async () => {} } = {}) {
+async function withScene(scene, [width, height], density, use, { script = '/dist/tidemark-water.js', prepare = async () => {} } = {}) {
     const context = await browser.newContext({ viewport: { width, height }, deviceScaleFactor: density });
     try {
         const tab = await context.newPage();
@@ -104,7 +104,7 @@ async function settle(tab, scene) {
 }
 const framesOf = (tab, milliseconds) => tab.evaluate((milliseconds) => window.bench.frames(milliseconds), milliseconds);
 
-export const measure = (scene, view, density, script) => withScene(scene, view, density, async (tab) => {
+const measure = (scene, view, density) => withScene(scene, view, density, async (tab) => {
     await settle(tab, scene);
     const frames = await framesOf(tab, measured);
     const whole = frames.map((frame) => frame.whole);
@@ -115,7 +115,7 @@ export const measure = (scene, view, density, script) => withScene(scene, view, 
     return {
         whole: median(whole), slow: rank(whole, 0.95), rate: 1000 * (frames.length - 1) / (frames.at(-1).now - frames[0].now),
         main: median(frames.map((frame) => frame.main)), size };
-}, { script });
+});
 
 // The profiler's samples of the main thread, as shares.
 const parts = {
@@ -133,7 +133,7 @@ function partOf({ functionName, url }, webgl) {
     if (!url.endsWith('/index.js')) return null;
     return parts['Emscripten\'s GL'].test(functionName) ? 'Emscripten\'s GL' : 'element and pointers';
 }
-export const profile = (scene, view = middle) => withScene(scene, view, 1, async (tab, session) => {
+const profile = (scene) => withScene(scene, middle, 1, async (tab, session) => {
     const interval = 50;  // us
     await settle(tab, scene);
     const webgl = new Set(await tab.evaluate(() => Object.getOwnPropertyNames(WebGLRenderingContext.prototype)));
@@ -157,7 +157,7 @@ export const profile = (scene, view = middle) => withScene(scene, view, 1, async
         memory: await tab.evaluate(() => document.querySelector('tidemark-water').water.native.HEAPU8.length) };
 }, { script: '/named/index.js' });
 
-export const firstPicture = (network) => withScene('first', middle, 1, (tab) => tab.evaluate(() => window.readyAt), {
+const firstPicture = (network) => withScene('first', middle, 1, (tab) => tab.evaluate(() => window.readyAt), {
     prepare: async (session) => {
         await session.send('Network.enable');
         if (network) await session.send('Network.emulateNetworkConditions', { offline: false, ...network });
@@ -203,8 +203,8 @@ async function report() {
     return `# Benchmark of the page
 
 Written by \`scripts/bench.sh --web\`: Chromium ${browser.version()} without a window, its software GPU on
-${cpus().length} cores of: ${cpus()[0].model}, which also did other work (load average ${round(loadavg()[1])}). Compare the rows with
-each other, and times with those of another run only after the ratios.
+${cpus().length} cores of: ${cpus()[0].model}, with a load average of ${round(loadavg()[1])}. Of a load above
+the number of cores most was other work, which makes all times longer: compare rows of one run only.
 
 A whole frame takes from its call until its pixels can be read. A pointer draws circles; in *rain* and *card of 20*, twenty
 waters on a page, only rain falls. Quality is left to itself: the size drawn is what the pace has chosen after
@@ -219,8 +219,7 @@ ${table(['ours / jquery.ripples', 'goal', 'ratio', 'lowest', 'highest'], [['wate
 ${table(['scene', 'view', 'density', 'size drawn', 'whole frame, ms', 'slowest twentieth, ms', 'frames/s', 'main thread, ms'], rows)}
 
 The main thread at ${middle.join('×')}, density 1: medians, with ink of the frames that take one step of it, where there are any, and
-shares of the profiler's samples. *WebGL* contains the browser's side of the driver; the driver itself runs in another
-process. The names of the functions, without which there are no samples, cost little.
+shares of the profiler's samples. *WebGL* is the browser's side of the calls; the driver runs in another process.
 
 ${table(['scene', 'ms', ...Object.keys(parts)], shares)}
 
@@ -233,12 +232,9 @@ ${table(['', ''], [
 `;
 }
 
-if (output) {
-    try {
-        writeFileSync(output, await report());
-    } finally {
-        await browser.close();
-        server.close();
-    }
+try {
+    writeFileSync(output, await report());
+} finally {
+    await browser.close();
+    server.close();
 }
-export { browser, server };

@@ -12,6 +12,8 @@
 #include "reference/ink_grid.h"
 #include "reference/surface.h"
 
+using namespace tidemark;
+
 namespace {
 
 constexpr const KernelSet* kKernelSets[] = {&kLibrary, &kScalar, &kAutoVectorized, &kEigen};

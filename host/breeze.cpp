@@ -11,14 +11,15 @@ namespace tidemark {
 namespace {
 
 struct Course {
-    double length;     // view heights
-    double direction;  // radians
+    double length;     // in view heights
+    double direction;  // in radians
 };
 
-// No two lengths are in a simple ratio, so that the pattern does not come back.
+// No two lengths have a simple ratio, so that the pattern does not repeat.
 constexpr Course kCourses[] = {{0.43, 0.35}, {0.29, 1.21}, {0.197, -0.42}, {0.149, 0.83}, {0.103, 1.71}};
 constexpr double kTurn = 6.283185307179586;
-constexpr double kSlowest = 0.23;  // turns a second of the longest wave; shorter ones are faster, as on deep water
+constexpr double kSlowest =
+    0.23;  // frequency of the longest wave in turns per second; shorter waves are faster, as on deep water
 
 constexpr double totalLength() {
     double sum = 0.0;
@@ -26,7 +27,7 @@ constexpr double totalLength() {
     return sum;
 }
 
-// The share of a wave in the height of all. All waves are equally steep.
+// Returns a wave's share of the total height. All waves have the same steepness.
 constexpr float share(const Course& course) {
     return static_cast<float>(course.length / totalLength());
 }

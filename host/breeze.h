@@ -1,5 +1,4 @@
-// The waves of a breeze: long, low and slow. They are added to the heights that are drawn; the water's own waves never
-// know of them.
+// A breeze: long, low, slow waves. They are added only to the drawn heights and do not affect the water's own waves.
 #pragma once
 
 #include <vector>
@@ -12,23 +11,23 @@ class Breeze {
 public:
     explicit Breeze(const WaveLattice& lattice);
 
-    // Lets the waves be as they are at `time`, in seconds; where crests meet they reach `height`.
+    // Sets the time in seconds, and the height at points where all crests meet.
     void blow(float height, double time);
 
-    // Adds them to `count` heights of a column of the lattice, from `row` on.
+    // Adds the waves to `count` heights of a column of the lattice, beginning with `row`.
     void add(int column, int row, int count, float* heights) const;
 
 private:
     static constexpr int kWaves = 5;
 
-    // The phase of a wave is the phase of its column plus that of its row minus that of the time. Sums of angles are
-    // taken from the cosines and sines of the parts, so that a frame computes those of the time only.
+    // The phase of a wave is the sum of a column's and a row's phase minus the time's. By the angle sum identities a
+    // frame needs the cosine and sine of the time's phase only.
     struct Angle {
         double cosine, sine;
     };
     int points_;
-    std::vector<Angle> columns_;          // kWaves a column
-    std::vector<float> cosines_, sines_;  // of the rows, wave by wave
+    std::vector<Angle> columns_;          // kWaves for each column
+    std::vector<float> cosines_, sines_;  // for each wave, all rows
     Angle now_[kWaves] = {};
     float height_ = 0.0f;
 };

@@ -12,16 +12,16 @@ namespace tidemark {
 
 namespace {
 
-// A view that keeps its size for so long, in seconds, has it for good.
+// A new size is applied after this many seconds without a change.
 constexpr double kSettleSeconds = 0.1;
 
-// Pictures are handed over again where the view has grown by more than this since.
+// Pictures are transferred again if the view has grown by more than this factor.
 constexpr double kGrowth = 1.25;
 
-// More than these nobody asks for before a frame.
+// Limit of splashes before a frame.
 constexpr std::size_t kMostSplashes = 64;
 
-// Steps of the ink that make up for a late frame may take this share of the time since the frame before.
+// The ink steps that make up for a late frame may take this share of the time since the previous frame.
 constexpr double kInkShare = 0.25;
 
 }  // namespace
@@ -33,7 +33,7 @@ double steadySeconds() {
 }
 
 float penWeight(float pressure) {
-    constexpr float kOrdinary = 0.5f;  // the pressure of an ordinary stroke
+    constexpr float kOrdinary = 0.5f;  // pressure of an ordinary stroke
     const float weight = pressure / kOrdinary;
     return weight > 0.3f ? std::min(weight, 1.5f) : 0.3f;
 }
@@ -115,7 +115,7 @@ void LiveWater::prepare() {
         longest_ = longer;
     }
     const unsigned textures = pictureDue_ | texturesDue_;
-    if (setUpDue_) pace_.interrupt();  // not for a picture, because one that moves is loaded with every frame
+    if (setUpDue_) pace_.interrupt();  // but not for a picture, because a moving one is loaded with every frame
     if (std::exchange(setUpDue_, false)) host_.setUp(withInk_, std::exchange(isContextNew_, false));
     if (textures) host_.loadPictures(pictures_, std::exchange(pictureDue_, 0), std::exchange(texturesDue_, 0));
 }
@@ -131,7 +131,7 @@ bool LiveWater::isSurfaceDue() const {
     return wanted_ != surface_ && wanted_ != asked_;
 }
 
-// After a rest there is nothing to make up for.
+// After a rest, one ordinary frame passes.
 double LiveWater::secondsUntil(double now) {
     const double seconds = isRunning_ ? now - now_ : 1.0 / 60;
     if (!isRunning_) pace_.interrupt();
@@ -168,7 +168,7 @@ LiveWater::Frame LiveWater::frame(double now) {
     }
     splashes_.clear();
     for (const Touch& touch : touches_) {
-        // On the host's clock, which stands still while the water rests.
+        // On the host's clock, which stops while the water rests.
         const double ago = std::clamp(now - touch.time, -0.1, 1.0);
         host_.touch(
             touch.action, double{touch.x} * surface_.width, double{touch.y} * surface_.height, touch.weight,
@@ -176,14 +176,14 @@ LiveWater::Frame LiveWater::frame(double now) {
     }
     touches_.clear();
     if (!host_.advance(seconds)) {
-        // A touch may have changed nothing, as one that ends without ink does.
+        // A touch may change nothing, for example a stroke's end without ink.
         isRunning_ = !isResting();
         return isRunning_ ? Frame::waiting : Frame::resting;
     }
     draw(seconds);
-    // A new resolution loses the ink.
+    // A change of the resolution loses the ink.
     const bool hasInk = host_.inkMoves();
-    // Frames of no time, those of water that stands still, follow no pace.
+    // Frames of still water take no time and have no pace.
     if (seconds > 0.0 && pace_.frameDrawn(now, std::max(shortestFrame_, hasInk ? 1.0 / 60 : 0.0), hasInk)) {
         host_.setMeshShare(pace_.level().mesh);
         fitSurface();

@@ -1,9 +1,8 @@
-// Water on a screen that is looked at: takes what happens (touches, another size, other pictures, another look) and
-// draws a frame when something has changed. Every face with a screen is around it: the view on Android, the element in
-// the browser, the window on the desktop.
+// The water on a screen: receives events (touches, size, pictures, look) and draws a frame when something has changed.
+// The view on Android, the element in the browser and the window on the desktop each contain one.
 //
-// Call everything on the one thread that owns the OpenGL ES 2.0 context; the context itself is needed by frame() only.
-// Times are seconds of the clock that the face gives to frame().
+// Call everything on the thread that owns the OpenGL ES 2.0 context. Only frame() requires the context to be current.
+// Times are seconds on the clock of the face that calls frame().
 #pragma once
 
 #include <cstdint>
@@ -20,8 +19,8 @@ namespace tidemark {
 
 struct LookField;
 
-// The weight of a pen's pressure of 0 to 1: 0.3 to 1.5. A finger or a mouse weighs 1, as few screens measure its
-// pressure.
+// Returns the weight of a pen's pressure, 0 to 1: 0.3 to 1.5. A finger or mouse has the weight 1, because few screens
+// measure its pressure.
 float penWeight(float pressure);
 
 double steadySeconds();
@@ -35,69 +34,70 @@ public:
         resize = 3,  // nothing was drawn: give the surface width() x height() pixels, then call resized()
     };
 
-    // Seconds of a clock that goes on while a frame is drawn.
+    // Returns the seconds of a clock that advances during a frame.
     using Clock = double (*)();
 
-    // `seed` fixes where the rain falls.
+    // `seed` determines the rain.
     LiveWater(PictureSource pictures, std::uint32_t seed, Clock clock = steadySeconds);
 
-    // The view in density-independent pixels, and how many pixels of the display each of them has. Frames go on in the
-    // old size until the view has kept its size for a tenth of a second. The ink is lost then, the water stays.
+    // Sets the size of the view in density-independent pixels and the number of display pixels for each of them. The
+    // size is applied after it has not changed for 0.1 seconds; until then frames are drawn in the old size. Water is
+    // kept, ink is lost.
     void setView(double width, double height, double density, double now);
 
-    // How many pixels are drawn for a density-independent one at most; automatic at first.
+    // Limits the number of drawn pixels per density-independent pixel. The default is automatic.
     void setQuality(Quality quality);
 
-    // The least seconds that the face lets pass between two frames, 0 at first: these are not late then.
+    // Sets the face's minimum interval between two frames in seconds, so that such frames do not count as late. The
+    // default is 0.
     void setShortestFrame(double seconds) { shortestFrame_ = seconds; }
 
     int width() const { return wanted_.width; }
     int height() const { return wanted_.height; }
     void resized();
 
-    // Takes over all values; the water and the ink stay. Returns null, or the first value beyond its limits: then
+    // Sets all values; water and ink are kept. Returns null, or the first value outside its limits, in which case
     // nothing changes.
     const LookField* setLook(const Look& look);
 
-    // Whether touches drop ink; they do not at first. A switch ends the stroke that is being drawn.
+    // Sets whether touches add ink; the default is false. A change ends the current stroke.
     void setInk(bool withInk);
 
     void setRain(bool falling) { host_.rain(falling); }
 
-    // Lets the breeze blow for good. Otherwise it sinks some seconds after the last ripple was raised, and the water
-    // rests.
+    // If true, the breeze never ends. Otherwise it fades some seconds after the last ripple, and the water rests.
     void setBreezeAlways(bool always) { host_.blowAlways(always); }
     void clearInk() { host_.clearInk(); }
 
-    // One touch at the time at which it was reported. The place is a share of the view's width and height, from its top
-    // left corner. A cancel ends a stroke as lifting the finger does.
+    // Adds a touch with the time of its report. The position is a fraction of the view's width and height, from the top
+    // left. A cancel ends a stroke as an up does.
     void touch(TouchAction action, float x, float y, float weight, double time);
 
-    // Raises a ripple with the next frame, even if that is the first one. With ink it acts as a finger that comes down
-    // and is lifted at once, unless a finger is down: the ink follows one stroke at a time.
+    // Raises a ripple with the next frame. With ink it acts as a touch that is lifted immediately. While a finger is
+    // down it adds no ink, because the library has one stroke at a time.
     void splash(float x, float y, float weight, bool withInk = false);
 
-    // Nothing is drawn before all three pictures were there once. `which` is a sum of k...Picture.
+    // Reports new pictures, as a sum of k...Picture. Nothing is drawn before all three have been reported once.
     void picturesChanged(unsigned which);
 
-    // The factors that a face multiplies a picture's colours by before it hands it over, see shade.h. A look that
-    // changes it has the pictures handed over again.
+    // Returns the factors for a picture's colours, which the face applies before the transfer; see shade.h. If a new
+    // look changes them, the pictures are requested again.
     Shade shade(PictureSlot slot, float brightness) const { return shadeOf(host_.look(), slot, brightness); }
 
-    // Where the framebuffer has lost the last frame.
+    // Call it when the framebuffer has lost the last frame.
     void redraw() { host_.redraw(); }
 
-    // After a lost context.
+    // Call it after a context loss.
     void renewContext();
 
-    // Whether there is nothing to draw until the next call that changes something.
+    // Returns whether there is nothing to draw until the next call that changes something.
     bool isResting() const;
 
-    // Brings the water to the time `now`, that at which the display shows the frame, and draws it where it has changed:
+    // Advances the water to `now`, the time at which the display shows the frame, and draws it if it has changed:
     // without ink into the current framebuffer, with ink into framebuffer 0.
     Frame frame(double now);
 
-    // When frame() will next have something to do: infinity while the water rests, in the past for the next frame.
+    // Returns when frame() will next draw: infinity while the water rests, a time in the past if immediately.
     double due() const;
 
 private:
@@ -120,28 +120,28 @@ private:
 
     Quality quality_ = Quality::automatic;
     ViewSize view_;
-    Size wanted_ = {0, 0};    // what the view asks for
-    Size asked_ = {0, 0};     // what the face was last told to give the surface
-    Size surface_ = {0, 0};   // what the surface has
-    double settledAt_ = 0.0;  // when the view will have kept its size long enough
+    Size wanted_ = {0, 0};    // size for the view
+    Size asked_ = {0, 0};     // size last requested from the face
+    Size surface_ = {0, 0};   // current size
+    double settledAt_ = 0.0;  // when a new size is applied
 
-    // Reported since the last frame; places are shares of the view, times those of the face.
+    // Events since the last frame. Positions are fractions of the view, times are on the face's clock.
     std::vector<Touch> touches_;
     std::vector<Splash> splashes_;
 
     double longestFrame_ = Look{}.longestFrame;
     double shortestFrame_ = 0.0;
-    bool isRunning_ = false;  // or the last frame was before a rest
-    double now_ = 0.0;        // of the last frame
+    bool isRunning_ = false;  // false before the first frame and after a rest
+    double now_ = 0.0;        // time of the last frame
 
-    // Changes that the next frame passes to the library, because the context is current only there.
+    // Changes that the next frame passes to the library, because only then the context is current.
     bool setUpDue_ = false;
     bool isContextNew_ = true;
-    unsigned pictureDue_ = 0;   // to be handed over
-    unsigned texturesDue_ = 0;  // besides those
-    unsigned known_ = 0;        // pictures that were there once
-    double proportions_ = 0.0;  // to which the backgrounds were last cropped
-    int longest_ = 0;           // and the view's longer side then
+    unsigned pictureDue_ = 0;   // pictures to transfer
+    unsigned texturesDue_ = 0;  // further textures to load
+    unsigned known_ = 0;        // pictures that have been reported
+    double proportions_ = 0.0;  // of the backgrounds at their last transfer
+    int longest_ = 0;           // longer side of the view at that time
 };
 
 }  // namespace tidemark

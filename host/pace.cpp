@@ -6,21 +6,21 @@ namespace tidemark {
 
 namespace {
 
-constexpr Pace::Level kLevels[] = {{1.0, 1.0, 4}, {0.7, 1.0, 3},  {0.5, 1.0, 2},
-                                   {0.5, 0.8, 2}, {0.5, 0.65, 2}, {0.5, 0.5, 1}};
+constexpr Pace::Level kLevels[] = {{1.0, 1.0, 4}, {0.7, 1.0, 4},  {0.5, 1.0, 3},
+                                   {0.5, 0.8, 3}, {0.5, 0.65, 2}, {0.5, 0.5, 2}};
 constexpr int kMeshLevels = 3;
 constexpr int kLowest = static_cast<int>(std::size(kLevels)) - 1;
 
-// An interval of a display that shows every frame varies by less than this.
+// The intervals of a display that shows every frame vary by less than this factor.
 constexpr double kLate = 1.4;
 
-// Frames that come so many times too late ask for the coarsest level at once.
+// Frames that are this many times too late select the coarsest level at once.
 constexpr double kFarTooLate = 3.0;
 
-// A slower display than this, in seconds a frame, there is not.
+// The longest frame interval of a display, in seconds.
 constexpr double kSlowestDisplay = 1.0 / 22;
 
-// Frames are judged by the median of as many as come in so many seconds, but no fewer than kFewest.
+// Frames are judged by their median interval over this time, but at least over kFewest frames.
 constexpr double kJudgedSeconds = 0.35;
 constexpr int kFewest = 3;
 
@@ -79,7 +79,7 @@ bool Pace::judge(double now, double shortest, bool keepsResolution) {
         return true;
     }
     if (isLate && median > 0.9 * atBest_ && atBest_ > 0.0 && median < kSlowestDisplay) {
-        // The coarsest frames come no sooner than the finest: it is the display that is slow.
+        // The coarsest level is not faster than the finest, so the display itself is slow.
         rhythm_ = median;
         atBest_ = 0.0;
         setLevel(0, now);

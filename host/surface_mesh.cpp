@@ -13,10 +13,10 @@ namespace {
 // Rows and columns are computed in groups of four.
 constexpr int kGroup = 4;
 
-// Columns of the lattice that are kept: a vertex takes five, and they are read in groups.
+// Number of lattice columns in the buffers: a vertex needs five, and they are read in groups.
 constexpr int kKept = 8;
 
-// Points that are read above the one whose cell a vertex is in; beyond the edge they repeat its height.
+// Number of rows above a vertex's cell that are read. Beyond the edge they repeat the edge's height.
 constexpr int kAbove = 2;
 
 typedef short short8 __attribute__((vector_size(16)));
@@ -33,7 +33,7 @@ std::vector<float> field(int lines, int length) {
     return std::vector<float>(static_cast<std::size_t>(at(lines, length)));
 }
 
-// Makes four columns of four rows, or rows of columns.
+// Transposes a block of four rows.
 inline void turn(float4 (&lines)[kGroup]) {
     const float4 firstTop = __builtin_shufflevector(lines[0], lines[1], 0, 4, 1, 5);
     const float4 lastTop = __builtin_shufflevector(lines[0], lines[1], 2, 6, 3, 7);
@@ -59,7 +59,7 @@ inline float4 blend(const Weights& w, float4 a, float4 b, float4 c, float4 d) {
     return w.a * a + w.b * b + w.c * c + w.d * d;
 }
 
-// Writes three values a vertex, and one value more after the fourth vertex.
+// Writes three values for each of four vertices, and one more value.
 inline void interleave(float4 a, float4 b, float4 c, float* out) {
     const float4 firstTwo = __builtin_shufflevector(a, b, 0, 4, 1, 5);
     const float4 lastTwo = __builtin_shufflevector(a, b, 2, 6, 3, 7);
@@ -83,7 +83,7 @@ SurfaceMesh::Axis SurfaceMesh::axis(int points, int vertices, double share) {
              {(1.0f - t) * (1.0f - t) * (1.0f - t) / 6.0f, ((3.0f * t - 6.0f) * t * t + 4.0f) / 6.0f,
               (((3.0f - 3.0f * t) * t + 3.0f) * t + 1.0f) / 6.0f, t * t * t / 6.0f}});
     }
-    // With the neighbours two cells before and three behind.
+    // Includes two cells before and three after, which the spline and the slopes need.
     axis.from = std::max(axis.places.front().cell - 2, 0);
     axis.points = std::min(axis.places.back().cell + 4, points) - axis.from;
     for (Place& place : axis.places) place.cell -= axis.from;
@@ -115,7 +115,7 @@ void SurfaceMesh::layCells(std::int16_t* indices) const {
     }
 }
 
-// Reads four columns of the lattice; beyond the edge the last one goes on.
+// Reads four columns of the lattice. Beyond the edge the last column is repeated.
 void SurfaceMesh::readColumns(
     int first, const float* heights, const float* velocity, float since, const Breeze* breeze) {
     const int points = rows_.points;
@@ -139,7 +139,7 @@ void SurfaceMesh::readColumns(
     std::copy_n(rows + (points - 1) * kGroup, kGroup, rows + points * kGroup);
 }
 
-// Blends the rows of those four columns.
+// Interpolates the four columns along their length, at the rows of the mesh.
 void SurfaceMesh::blendRows(int first) {
     const int rows = padded(rows_.seen.count);
     float* const own = own_.data() + at(first % kKept, rows);
@@ -150,7 +150,7 @@ void SurfaceMesh::blendRows(int first) {
         float4 owns[kGroup], uppers[kGroup];
         for (int k = 0; k < kGroup; ++k) {
             const Place& place = places[r + k];
-            const float* const around = readRows + place.cell * kGroup;  // from two cells above on
+            const float* const around = readRows + place.cell * kGroup;  // from two cells above
             const float4 a = load<float4>(around);
             const float4 b = load<float4>(around + kGroup);
             const float4 c = load<float4>(around + 2 * kGroup);
@@ -168,7 +168,7 @@ void SurfaceMesh::blendRows(int first) {
     }
 }
 
-// Writes one value beyond the column's padding.
+// Interpolates one column of the mesh. Writes one value beyond the column's padding.
 void SurfaceMesh::blendColumn(const Place& place, float* attribs) {
     const int rows = padded(rows_.seen.count);
     const auto line = [&](const std::vector<float>& lines, int i) {
@@ -192,8 +192,8 @@ void SurfaceMesh::blendColumn(const Place& place, float* attribs) {
     }
 }
 
-// Chooses the diagonals of the cells that end at a column of the mesh. The third and the fourth index of a cell depend
-// on its diagonal; all are written, as a branch for those that have changed is mispredicted too often.
+// Chooses the diagonals of the cells between this column of the mesh and the previous one. The diagonal determines the
+// third and fourth index of a cell. All are written, because a branch on a change would be mispredicted too often.
 void SurfaceMesh::turnDiagonals(int column, std::int16_t* indices) {
     const int rows = rows_.seen.count;
     const int cells = rows - 1;
@@ -237,7 +237,7 @@ void SurfaceMesh::gather(
             blendRows(read);
         }
         slopes_.swap(slopesBefore_);
-        // The next column overwrites what the padding of this one has written.
+        // The next column overwrites this column's padding.
         if (end - attribs >= static_cast<std::ptrdiff_t>(lastColumn_.size())) {
             blendColumn(place, attribs);
         } else {

@@ -1,5 +1,5 @@
-// The mesh that is drawn. It takes its heights from a smooth surface near those of the lattice, so that it may be
-// finer than the waves, and change without a jump.
+// The drawn mesh. Its heights are sampled from a smooth surface near the lattice's heights, so that the mesh can be
+// finer than the lattice and change its size without a visible jump.
 #pragma once
 
 #include <cstdint>
@@ -11,47 +11,47 @@ namespace tidemark {
 
 class SurfaceMesh {
 public:
-    // A square of `vertices` a side over a lattice of `points` a side, each at least 2, of which only a middle part is
-    // seen: `width` and `height` are its shares of a side, above 0.
+    // A square of vertices x vertices over a lattice of points x points, each at least 2. Only the middle is drawn:
+    // `width` and `height` are its shares of a side, above 0.
     SurfaceMesh(int points, int vertices, double width, double height);
 
-    // The vertices along an axis that what is seen takes.
+    // The range of drawn vertices along an axis.
     struct Seen {
         int first, count;
     };
     Seen columns() const { return columns_.seen; }
     Seen rows() const { return rows_.seen; }
 
-    // The two triangles of each cell that is seen, column by column: 6 * (columns - 1) * (rows - 1) vertices.
+    // Writes the indices of the two triangles of each drawn cell, column by column: 6 * (columns - 1) * (rows - 1).
     void layCells(std::int16_t* indices) const;
 
-    // For each vertex that is seen, column by column from the left and each column from the top: its height, and the
-    // heights one cell of the lattice to the right and above, of which the renderer takes the slope. Beyond the edge
-    // the surface goes on level. A bicubic B-spline (de Boor, A practical guide to splines, 1978): its slopes bend
-    // smoothly, where a surface through the very heights would show the lattice in every crest.
+    // Writes three values for each drawn vertex, column by column from the left, each column from the top: the height,
+    // and the heights one lattice cell to the right and one above, from which the renderer computes the slope. Beyond
+    // the edge the surface is level. The surface is a bicubic B-spline (de Boor, A practical guide to splines, 1978),
+    // whose slopes are smooth; an interpolating surface would show the lattice in every crest.
     //
-    // Also turns the diagonal of each cell along its waves, as one across would cut a crest into teeth. Which way they
-    // run is the sign of the mixed element of the structure tensor (Bigun and Granlund, Optimal orientation detection
-    // of linear symmetry, 1987).
+    // Also turns the diagonal of each cell along its waves, because a diagonal across a crest gives it a jagged edge.
+    // The direction of the waves is the sign of the structure tensor's mixed element (Bigun and Granlund, Optimal
+    // orientation detection of linear symmetry, 1987).
     //
-    // `heights`, `velocity`: points * points values in the same order, and what each gains a step; `since`: steps
-    // passed since then; `attribs`: 3 values a vertex; `indices`: those that layCells() has laid; `breeze`: is added to
-    // the heights.
+    // `heights` and `velocity` have points * points values: the heights at a step and their change per step. `since` is
+    // the time after that step, in steps. `attribs` receives 3 values per vertex. `indices` are those written by
+    // layCells(). `breeze` is added to the heights; it may be null.
     void gather(
         const float* heights, const float* velocity, float since, float* attribs, std::int16_t* indices,
         const Breeze* breeze = nullptr);
 
 private:
-    // Where a vertex lies along an axis: between points `cell` and `cell` + 1 of those that are read. The weights are
-    // those of the four points around it.
+    // The position of a vertex along an axis: between the read points `cell` and `cell` + 1, with the weights of the
+    // four points around it.
     struct Place {
         int cell;
         float weights[4];
     };
     struct Axis {
         Seen seen;
-        int from, points;           // of the lattice, that are read
-        std::vector<Place> places;  // of the vertices that are seen
+        int from, points;           // range of lattice points that are read
+        std::vector<Place> places;  // positions of the drawn vertices
     };
     static Axis axis(int points, int vertices, double share);
     void readColumns(int first, const float* heights, const float* velocity, float since, const Breeze* breeze);
@@ -61,11 +61,11 @@ private:
 
     int points_;
     Axis columns_, rows_;
-    std::vector<float> read_;                   // four columns of the lattice, as it is at that time
-    std::vector<float> readRows_;               // row by row
-    std::vector<float> own_, upper_;            // its last columns at the mesh's rows, and one cell above them
-    std::vector<float> lastColumn_;             // of the mesh
-    std::vector<float> slopes_, slopesBefore_;  // the products of both slopes in this column and in the one before
+    std::vector<float> read_;         // four columns of the lattice at the current time
+    std::vector<float> readRows_;     // the same, row by row
+    std::vector<float> own_, upper_;  // the latest columns at the rows of the mesh, and one cell above these rows
+    std::vector<float> lastColumn_;   // last column of the mesh
+    std::vector<float> slopes_, slopesBefore_;  // product of both slopes in this column and the previous one
 };
 
 }  // namespace tidemark

@@ -7,10 +7,10 @@ namespace tidemark {
 
 namespace {
 
-// Beyond this factor on the curvature a wave of the shortest length grows from rounding errors.
+// Stability limit: with a larger factor on the curvature, the shortest waves grow from rounding errors.
 constexpr double kMostWaveSpeed = 0.45;
 
-// The library's ripples are three cells in radius.
+// The library's ripples have a radius of three cells.
 constexpr double kRippleCells = 3.0;
 
 }  // namespace
@@ -24,7 +24,7 @@ WaveLattice latticeFor(const Look& look, int width, int height) {
         static_cast<int>(std::clamp(std::floor(spanned * kRippleCells / look.dropRadius + 1.5), 16.0, 256.0));
     lattice.extent = std::max(static_cast<int>(std::floor(look.meshExtent * sides + 0.5)), 1);
 
-    // Shorter steps where the waves would outrun the lattice.
+    // Uses shorter steps if the waves would cross more than the stable part of a cell in one.
     const double cell = spanned / (lattice.points - 1);
     lattice.cell = cell;
     const double cellsPerStep = look.ringSpeed / (cell * look.stepsPerSecond);
@@ -32,7 +32,8 @@ WaveLattice latticeFor(const Look& look, int width, int height) {
     lattice.stepsPerSecond = look.stepsPerSecond * static_cast<int>(steps);
     const double waveSpeed = std::min(cellsPerStep / steps * (cellsPerStep / steps), kMostWaveSpeed);
 
-    // A wave sinks half as fast as speeds are damped, and exp(-3) is 5 %. The fraction is exp(-x) but for x^3 / 12.
+    // Waves decay at half the rate at which speeds are damped, and exp(-3) is 5 %. The damping (1 - x/2) / (1 + x/2)
+    // approximates exp(-x) with an error of x^3 / 12.
     const double x = 6.0 / (double{look.calmingTime} * lattice.stepsPerSecond);
     const double damping = std::max((2.0 - x) / (2.0 + x), 0.0);
     lattice.waveSpeed = look.waveSpeed > 0.0f ? look.waveSpeed : static_cast<float>(waveSpeed);

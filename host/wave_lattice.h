@@ -1,5 +1,5 @@
-// The lattice on which the waves live. Its cells are a share of the view and its steps a share of a second, so that
-// waves look and move the same on any view, whatever mesh they are drawn with.
+// The lattice on which the waves are computed. Its cell size is a fraction of the view and its step a fraction of a
+// second, so that waves look and move the same for any view and drawn mesh.
 #pragma once
 
 #include "host/look.h"
@@ -8,14 +8,15 @@ namespace tidemark {
 
 struct WaveLattice {
     int points;          // along each side of a square around the view
-    int extent;          // of that side, model units
-    double cell;         // between two points, view heights
-    int stepsPerSecond;  // that keep the waves stable
-    float damping;       // a step
-    float waveSpeed;     // a step
+    int extent;          // length of that side in model units
+    double cell;         // distance of two points in view heights
+    int stepsPerSecond;  // at least the look's, so that the waves are stable
+    float damping;       // factor per step
+    float waveSpeed;     // factor per step
 };
 
-// Lengths of the look are shares of the view's height: that of an upright view of 9 : 16 with as many pixels.
+// The look's lengths are relative to the view's height. For other proportions, this is the height of a 9 : 16 view with
+// the same number of pixels.
 WaveLattice latticeFor(const Look& look, int width, int height);
 
 }  // namespace tidemark

@@ -1,5 +1,6 @@
-// Replaces Emscripten's tables of locations. The library looks each location up by name in every frame, and its names are
-// string constants: the address of the name is the location here, and WebGL is asked for it once in each program.
+// Replaces Emscripten's tables of uniform and attribute locations. The library looks up each location by name in every
+// frame, and each name is a string constant. Its address serves as the location here, so WebGL is asked only once per
+// name and program.
 mergeInto(LibraryManager.library, {
     $known: function(program, address, find) {
         var locations = program.locations || (program.locations = new Map());
@@ -8,7 +9,7 @@ mergeInto(LibraryManager.library, {
         return location;
     },
 
-    // WebGL ignores the value of a name that the program does not declare: its location is null.
+    // If the program does not declare the name, the location is null and WebGL ignores the value.
     glGetUniformLocation: function(program, name) {
         return name;
     },

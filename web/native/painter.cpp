@@ -1,4 +1,4 @@
-// What the page's worker calls: the built-in pictures. web/src/painter.ts gives them names.
+// The module of the playground's worker: paints the built-in pictures. web/src/painter.ts declares its functions.
 #include <emscripten.h>
 
 #include "pictures/procedural_pictures.h"

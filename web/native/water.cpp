@@ -1,8 +1,8 @@
-// The water of one canvas, as one instance of this module. web/package/src/native.ts gives it types.
+// The water of one canvas, as one instance of this module. web/package/src/native.ts declares its functions.
 //
-// The instance is made with `context`, a WebGL context, and `load(slot, width, height)`, which fills the texture that
-// is bound: pictures go from the browser's decoder to the GPU and never through this module's memory. What the library
-// is handed over is a placeholder of one pixel.
+// The instance is created with `context`, a WebGL context, and `load(slot, width, height)`, which fills the bound
+// texture: pictures go from the browser's decoder to the GPU without passing through this module's memory. The library
+// receives a placeholder of one pixel.
 #include <emscripten.h>
 
 #include <cmath>
@@ -21,10 +21,10 @@ namespace {
 Look look;
 std::optional<LiveWater> water;
 
-// Of a value of the look, where the page writes it.
+// The name of a look's value, written by the page.
 char name[32];
 
-// What the last hand-over of each slot asked for.
+// The sizes of the latest transfer of each slot.
 struct {
     int width, height;
 } wanted[3];
@@ -41,7 +41,7 @@ EM_JS(void, load, (int slot, int width, int height), {
     Module["load"](slot, width, height);
 });
 
-// The names of objects that were lost with their context must not reach the new one.
+// The names of objects that were lost with the old context must not be used in the new one.
 EM_JS(void, forgetObjects, (), {
     for (const table of [GL.buffers, GL.framebuffers, GL.programs, GL.shaders, GL.textures]) table.fill(null);
 });
@@ -69,13 +69,13 @@ extern "C" {
 EMSCRIPTEN_KEEPALIVE void begin(std::uint32_t seed) {
     quietenLog();
     useContext();
-    // The ink draws from this generator.
+    // The library's ink uses this generator.
     srand48(static_cast<long>(seed));
     water.emplace(pageSource(), seed);
 }
 
-// A look is given value by value, each by its name, and then applied. False for a value that the look does not have or
-// whose limits refuse it.
+// A look is set value by value, each by name, and then applied. setLookValue returns false if the look has no such
+// value or it is outside its limits.
 EMSCRIPTEN_KEEPALIVE char* nameToFill() {
     return name;
 }
@@ -87,7 +87,7 @@ EMSCRIPTEN_KEEPALIVE void applyLook() {
     water->setLook(look);
 }
 
-// CSS pixels, and the display's pixels for each.
+// CSS pixels, and display pixels per CSS pixel.
 EMSCRIPTEN_KEEPALIVE void setView(double width, double height, double density, double seconds) {
     water->setView(width, height, density, seconds);
 }
@@ -97,7 +97,7 @@ EMSCRIPTEN_KEEPALIVE void setQuality(int quality) {
 EMSCRIPTEN_KEEPALIVE void setShortestFrame(double seconds) {
     water->setShortestFrame(seconds);
 }
-// What the canvas is to have after frame() has answered `resize`; then resized().
+// The size that the canvas must get after frame() has returned `resize`; then call resized().
 EMSCRIPTEN_KEEPALIVE int width() {
     return water->width();
 }
@@ -121,11 +121,11 @@ EMSCRIPTEN_KEEPALIVE void clearInk() {
     water->clearInk();
 }
 
-// Places are shares of the canvas. A pressure below 0 is that of a finger or a mouse, any other a pen's.
+// Positions are fractions of the canvas. A negative pressure means a finger or a mouse, other values a pen.
 EMSCRIPTEN_KEEPALIVE void touch(int action, float x, float y, float pressure, double seconds) {
     water->touch(static_cast<TouchAction>(action), x, y, pressure < 0.0f ? 1.0f : penWeight(pressure), seconds);
 }
-// A ripple with ink.
+// Raises a ripple with ink.
 EMSCRIPTEN_KEEPALIVE void drop(float x, float y, float weight) {
     water->splash(x, y, weight, true);
 }
@@ -137,7 +137,7 @@ EMSCRIPTEN_KEEPALIVE void splash(float x, float y, float weight) {
 EMSCRIPTEN_KEEPALIVE void picturesChanged(unsigned which) {
     water->picturesChanged(which);
 }
-// The colour that load() multiplies a picture by, 0xRRGGBB.
+// Returns the colour by which load() multiplies a picture, 0xRRGGBB.
 EMSCRIPTEN_KEEPALIVE int shade(int slot, float brightness) {
     const Shade shade = water->shade(static_cast<PictureSlot>(slot), brightness);
     int color = 0;

@@ -398,7 +398,7 @@ TEST(Pace, settlesWithinTwoSecondsDoesNotSwingAndRecovers) {
         Paced slow;
         slow.run(2.0 + needed, needed);
         EXPECT_EQ(slow.resolution(), 0.5) << needed;
-        EXPECT_EQ(slow.pace.level().inkSteps, 1);
+        EXPECT_EQ(slow.pace.level().inkSteps, 2);
         slow.changes = 0;
         slow.run(60.0, needed);
         EXPECT_EQ(slow.changes, 0) << needed;

@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# Builds the sample app, out/tidemark-sample.apk, and the library for apps, out/tidemark.aar, from Debian's parts of
-# Android: the SDK, the NDK and Gradle need not be there.
+# Builds the sample app, out/tidemark-sample.apk, and the library for apps, out/tidemark.aar, with Debian's packages of
+# Android's tools. It needs no SDK, NDK or Gradle.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/common.sh

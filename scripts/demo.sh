@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# Renders the shipped scene into out/: pictures and a short video of moving water. Options go to tidemark-preview, and
-# come before the script's own; those that say what to write, or open a window, replace out/:
+# Renders the demo scene into out/: pictures and a short video. Options are passed to tidemark-preview and override this
+# script's. Options for outputs or a window replace the outputs in out/:
 # scripts/demo.sh --picture my-photo.jpg --video my.gif
 set -euo pipefail
 root=$(cd "$(dirname "$0")/.." && pwd)

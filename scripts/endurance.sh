@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# Runs the endurance tests at their full lengths: a day of simulated use, a thousand lost contexts. As shipped, or with
-# --sanitizers under the sanitizers. Takes minutes.
+# Runs the endurance tests at full length: a day of simulated use, a thousand context losses. With --sanitizers, uses the
+# sanitizers' build. Takes minutes.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/common.sh

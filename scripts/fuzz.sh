@@ -1,9 +1,8 @@
 #!/usr/bin/env bash
-# Fuzzes the native methods for the given minutes, on one core. What is found to be interesting is kept in
-# build/fuzz/corpus for the next run; what of it reaches new code is added to the shipped corpus by
+# Fuzzes the native methods for the given minutes, on one core. New inputs are stored in build/fuzz/corpus for the next
+# run. This command adds those that reach new code to the repository's corpus:
 #   build/fuzz/fuzz/fuzz_natives -merge=1 -use_counters=0 fuzz/corpus build/fuzz/corpus
-# An input that fails is left in build/fuzz/failures; it belongs into fuzz/regressions under a name that tells what is
-# wrong.
+# Inputs that fail are stored in build/fuzz/failures. Move them to fuzz/regressions, under a name that describes the fault.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/common.sh

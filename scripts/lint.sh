@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# Checks the format, runs static analysis for every language, and compares facts that several files state. With --fix, only
-# formats the C++. Java's compiler checks Java when the tests are built.
+# Checks the format, runs static analysis for every language, and compares facts that several files contain. With --fix, only
+# formats the C++. Java is checked by its compiler when the tests are built.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/common.sh

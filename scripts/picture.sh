@@ -1,5 +1,5 @@
 #!/usr/bin/env bash
-# Renews the pictures of the documents: the moving one of the README, and the fields behind one stroke for docs/engine.md.
+# Draws the pictures of the documents: the README's animation, the fields of a stroke for docs/engine.md, and the stills.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 source scripts/common.sh
@@ -41,7 +41,6 @@ for quality in low medium high; do
 done
 join density "[0]scale=540:-1[a];[1]scale=540:-1[b];[2]scale=540:-1[c];[a][b][c]hstack=inputs=3,crop=1620:700:0:300,scale=1200:-1" \
     out/quality-{low,medium,high}.png
-
 
 for preset in clear-lake summer-rain heavy-glass quicksilver honey red-ink deep-swell; do
     preview --preset "$preset" --script strip --size 360x560 --still "out/$preset.png" --at 1.2

@@ -37,7 +37,7 @@ protected:
         water.picturesChanged(kAllPictures);
     }
 
-    // The frame so much later; the surface gets the size that it is to have.
+    // Draws the frame after `seconds`, and resizes the surface if the water requests it.
     Frame next(double seconds = 1.0 / 60) {
         Frame frame = water.frame(now += seconds);
         if (frame != Frame::resize) return frame;
@@ -79,7 +79,7 @@ protected:
     }
 
     const Pictures pictures = {smoothPicture(72, 128, 1), smoothPicture(128, 72, 2), smoothPicture(16, 16, 3)};
-    // Of the clock that goes on while a frame is drawn.
+    // The clock that advances during a frame.
     static inline double clockSeconds, secondsAReading;
     LiveWater water{sourceOf(pictures), 1};
     Size size = {0, 0};
@@ -117,7 +117,7 @@ TEST_F(Live, drawsWhatHasChangedAndRestsOtherwise) {
     EXPECT_LT(framesToRest(), 600);
 }
 
-// While a divider is dragged the water goes on in its old size.
+// While a divider is dragged, frames keep the old size.
 TEST_F(Live, isSetUpOnceTheViewKeepsItsSizeAndHandsOverWhatIsOfOtherProportions) {
     EXPECT_EQ(calls(), "PLW|*pl") << "at once for the first view";
     for (int i = 1; i < 30; ++i) {
@@ -143,7 +143,7 @@ TEST_F(Live, isSetUpOnceTheViewKeepsItsSizeAndHandsOverWhatIsOfOtherProportions)
     EXPECT_EQ(calls(), "");
 }
 
-// It would be seen empty until the next step of the ink.
+// Otherwise the screen would be empty until the next ink step.
 TEST_F(Live, drawsASurfaceOfAnotherSizeAtOnceUnderAFinger) {
     water.setInk(true);
     next();
@@ -184,7 +184,7 @@ TEST_F(Live, drawsAsManyPixelsAsTheQualityAllows) {
     EXPECT_EQ(drawnSize({360, 800, 3.0}, Quality::automatic, 0.5), (Size{360, 800}));
     EXPECT_EQ(drawnSize({360, 800, 3.0}, Quality::medium, 0.5), (Size{720, 1600})) << "what is asked for stays";
     EXPECT_EQ(drawnSize({4000, 2000, 2.0}, Quality::high, 1.0), (Size{4096, 2048}));
-    // A touch falls on the same share of the view whatever is drawn.
+    // A touch has the same relative position for any drawn size.
     for (const Quality quality : {Quality::low, Quality::medium}) {
         begin();
         water.setQuality(quality);
@@ -198,7 +198,7 @@ TEST_F(Live, drawsAsManyPixelsAsTheQualityAllows) {
     }
 }
 
-// Nothing moves but the breeze.
+// Only the breeze moves.
 TEST_F(Live, aBreezeRisesWithATouchAndSinksToRestWithoutAJump) {
     begin({.meshVertices = 24, .touchAmplitude = 0.0f, .breeze = 2.0f});
     next();
@@ -285,7 +285,7 @@ TEST_F(Live, aLookChangesOnWavingWaterUnlessAValueIsBeyondItsLimits) {
     EXPECT_NE(seen(), flat) << "on a coarser lattice too";
 }
 
-// `count` counts the ink's steps since the finger came down.
+// `count` is the number of ink steps since the touch-down.
 TEST_F(Live, inkMovesByTheClockOnAnyDisplay) {
     for (const double rate : {15.0, 30.0, 60.0, 75.0, 90.0, 120.0, 144.0}) {
         SCOPED_TRACE(rate);
@@ -331,7 +331,7 @@ TEST_F(Live, stepsThatMakeUpForALateFrameTakeAQuarterOfItsTimeAtMost) {
     EXPECT_EQ(count, 1) << "those left out are not taken later";
 }
 
-// Frames that come at half the display's rate until there are fewer pixels.
+// A frame takes two refreshes of the display unless it has fewer pixels.
 TEST_F(Live, drawsLessWhereTheDisplayIsKeptWaiting) {
     begin({});
     water.setView(480, 270, 1.0, now);
@@ -344,7 +344,7 @@ TEST_F(Live, drawsLessWhereTheDisplayIsKeptWaiting) {
     };
     int best = 0;
     for (const double end = now + 3.5; now < end;) {
-        water.picturesChanged(kLandscapePicture);  // which moves
+        water.picturesChanged(kLandscapePicture);  // a moving picture
         if (next(size.width > 400 ? 1.0 / 30 : 1.0 / 60) != Frame::drawn) continue;
         best = std::max(best, vertices());
     }
@@ -362,7 +362,8 @@ struct Paced {
 
     Paced() { pace.allowResolution(true); }
 
-    // `needed` seconds for a frame at the best level, less at others, on a display that shows 1 / period frames.
+    // Simulates a display with 1 / period frames a second and frames that need `needed` seconds at the best level, less
+    // at others.
     void run(double seconds, double needed, double period = 1.0 / 60, bool hasInk = false) {
         for (const double end = now + seconds; now < end;) {
             const auto [mesh, resolution, inkSteps] = pace.level();
@@ -393,7 +394,7 @@ TEST(Pace, settlesWithinTwoSecondsDoesNotSwingAndRecovers) {
     paced.run(80.0, 0.004);
     EXPECT_EQ(std::pair(paced.pace.level().mesh, paced.resolution()), std::pair(1.0, 1.0)) << "there is room again";
 
-    // So slow that the coarsest frames are late as well.
+    // Even the coarsest level is late.
     for (const double needed : {0.06, 0.25, 0.6}) {
         Paced slow;
         slow.run(2.0 + needed, needed);
@@ -408,7 +409,7 @@ TEST(Pace, settlesWithinTwoSecondsDoesNotSwingAndRecovers) {
     stuck.run(20.0, 0.05, 0.1);
     EXPECT_EQ(stuck.resolution(), 0.5) << "no display is so slow";
 
-    // A better resolution would lose the ink, a finer mesh does not.
+    // A higher resolution would lose the ink, a finer mesh does not.
     Paced inked;
     inked.run(3.0, 0.03);
     const double kept = inked.resolution();

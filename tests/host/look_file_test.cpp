@@ -57,7 +57,7 @@ TEST(LookValues, OfThePresetsAreWithinTheirLimits) {
 
 TEST(LookValues, NameWhatIsBeyondItsLimits) {
     Look look;
-    look.dropRadius = 0.3f;  // its limit, to the nearest float above
+    look.dropRadius = 0.3f;  // the float nearest to the limit is above it
     EXPECT_EQ(firstInvalid(look), nullptr);
     look.inkBlue = std::nanf("");
     look.framesToFade = -1;

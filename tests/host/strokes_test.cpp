@@ -1,4 +1,4 @@
-// The same stroke, whatever reports it and whatever shows it.
+// The same stroke from different digitizers on different displays.
 #include <algorithm>
 #include <cmath>
 
@@ -16,20 +16,20 @@ namespace {
 
 constexpr int kWidth = 540;
 constexpr int kHeight = 960;
-constexpr double kLength = 1.2;  // of the stroke, seconds
+constexpr double kLength = 1.2;  // duration of the stroke in seconds
 
 struct Point {
     double x, y;
 };
 
-// Slow at first, faster and faster along a curve, slow again.
+// The stroke accelerates along a curve and slows down at its end.
 Point finger(double time) {
     const double t = std::clamp(time / kLength, 0.0, 1.0);
     const double along = t * t * (3 - 2 * t);
     return {110 + 320 * along, 480 + 250 * std::sin(5 * along)};
 }
 
-// One entry for each step of the ink: -2 without a drag, else the class of its speed.
+// The speed class for each ink step, or -2 if there is no drag.
 std::vector<int> classes;
 
 class Strokes : public GlTest {
@@ -40,7 +40,7 @@ protected:
         GlTest::SetUp();
         renewContext(kWidth, kHeight);
         watching.GetShortArrayElements = [](JNIEnv* env, jshortArray indices, jboolean* isCopy) {
-            // Pinned once a step; of interest from the first touch on.
+            // Called once per ink step; recorded from the touch-down on.
             if (state != kIdle || !classes.empty()) classes.push_back(state == kDragging ? isMovingEvent : -2);
             return host->GetShortArrayElements(env, indices, isCopy);
         };
@@ -51,15 +51,15 @@ protected:
         GlTest::TearDown();
     }
 
-    // A digitizer reports `reports` times a second, and frames show it at `frames` a second. Resampled as Android does,
-    // each frame brings the reports until 5 ms before it and the place that is worked out for that time.
+    // The digitizer reports `reports` times and the display draws `frames` times a second. With Android's resampling,
+    // each frame receives the reports until 5 ms before it and an interpolated position for that time.
     Density draw(double reports, double frames, bool isResampled = false) {
         resetGestures();
         srand48(1);
         LiveWater water(sourceOf(pictures), 1, [] { return 0.0; });
         water.setLook({.meshVertices = 16, .touchAmplitude = 0.0f, .breeze = 0.0f});
         water.setView(kWidth, kHeight, 1.0, 0.0);
-        water.setShortestFrame(1.0 / frames);  // so that none is late
+        water.setShortestFrame(1.0 / frames);  // so that no frame is late
         water.setInk(true);
         water.picturesChanged(kAllPictures);
         water.frame(0.0);
@@ -117,7 +117,7 @@ TEST_F(Strokes, areTheSameFromEveryDigitizerOnEveryDisplay) {
     for (const int speed : {kSlowDrag, kMediumDrag, kFastDrag}) {
         EXPECT_GE(std::ranges::count(classes, speed), 3) << "the stroke has all speeds";
     }
-    // A stroke that begins between two steps of the ink may have one more.
+    // A stroke that starts between two ink steps may have one more step.
     const auto sameClasses = [&](int lag) {
         int same = 0;
         for (int i = std::max(lag, 0); i < std::ssize(classes) && i - lag < std::ssize(expectedClasses); ++i) {

@@ -28,7 +28,7 @@ protected:
         return host;
     }
 
-    // Much higher and much wider than the view, so that the crop shows.
+    // The pictures are much higher and wider than the view, so that cropping is visible.
     const Pictures pictures = {smoothPicture(120, 300, 1), smoothPicture(300, 120, 2), smoothPicture(16, 16, 3)};
 };
 
@@ -55,7 +55,7 @@ TEST_F(Host, aFlatSurfaceShowsThePhotoUndistortedAndFillingTheView) {
     host.draw();
     expectMiddleOf(readPixels(kLong, kShort), kLong, kShort, pictures.landscape);
 
-    // The view is turned, which keeps the pictures that were handed over.
+    // Turning the view keeps the transferred pictures.
     renewContext(kShort, kLong);
     host.resize(kShort, kLong);
     host.setUp(false);
@@ -99,7 +99,7 @@ TEST_F(Host, ringsRunAtTheirSpeed) {
     for (const float speed : {0.1f, 0.2713f, 1.0f, 2.0f}) {
         WaterHost host = start(kShort, kLong, false, {.ringSpeed = speed, .calmingTime = 100.0f, .rebound = 0.0f});
         host.splash(kShort / 2, kLong / 2, 1.0f);
-        // From the middle of the steps that raise the drop.
+        // Measured from the middle of the steps that raise the drop.
         const double time = 0.4 / speed + 4.0 / host.lattice().stepsPerSecond;
         for (int i = 0; i < 240; ++i) host.advance(time / 240);
         const int n = host.lattice().points;
@@ -122,7 +122,7 @@ TEST_F(Host, theFrameRateDoesNotChangeTheWater) {
     EXPECT_EQ(after(60.0, 1), after(0.25, 1)) << "a pause is cut to the longest frame";
 }
 
-// Without ripples, so that nothing but the ink asks for frames and changes the picture.
+// There are no ripples, so only the ink requests frames and changes the picture.
 TEST_F(Host, inkBloomsInItsColorFadesAndIsClearedAtOnce) {
     constexpr int width = 150;
     constexpr int height = 200;
@@ -189,7 +189,7 @@ TEST_F(Host, aMoveFollowsAFingerAndRaisesAShortTrailAtMost) {
     EXPECT_TRUE(host.isResting());
     EXPECT_EQ(readPixels(kShort, kLong), clear);
 
-    const auto swelled = [&] {  // the sum of the heights stays once a drop is there
+    const auto swelled = [&] {  // the sum of the heights is constant once a drop is complete
         for (int i = 0; i < 9; ++i) host.advance(1.0 / 60);
         return raised();
     };
@@ -227,7 +227,7 @@ TEST_F(Host, numbersBeyondAllMeasureLeaveTheWaterAlive) {
     EXPECT_GT(highest(6), 1.0f);
 }
 
-// A step, and at the left and right edges of the picture a colour of their own, which must not be smeared.
+// A step function, with different colours at the left and right edge, which must not be smeared.
 TEST_F(Host, thePictureReachesEveryEdgeAtAnySize) {
     for (const auto& [width, height] :
          {std::pair{390, 844},
@@ -257,7 +257,7 @@ TEST_F(Host, thePictureReachesEveryEdgeAtAnySize) {
         host.loadPictures(sourceOf(rulers));
         host.draw();
         const auto pixels = readPixels(width, height);
-        // The ticks along the last pixels before each edge change as often as in the middle.
+        // The ticks at the edges alternate as often as in the middle.
         const auto changes = [&](std::size_t channel, int from, int next) {
             int result = 0;
             for (int i = 1; i < 13; ++i) {
@@ -277,7 +277,8 @@ TEST_F(Host, thePictureReachesEveryEdgeAtAnySize) {
 TEST(Fitted, keepsTheMiddleAndTheMeanOfWhatItScalesDown) {
     Picture fine = {600, 1000, {}};
     for (int i = 0; i < 600 * 1000; ++i) {
-        const auto level = static_cast<std::uint8_t>((i % 600 + i / 600) % 2 ? 255 : 1);  // aliases into anything
+        const auto level =
+            static_cast<std::uint8_t>((i % 600 + i / 600) % 2 ? 255 : 1);  // aliases unless it is averaged
         fine.rgba.insert(fine.rgba.end(), {level, static_cast<std::uint8_t>(i / 600 / 4), 7, 255});
     }
     const Picture small = fitted(fine, 91, 90);
@@ -285,7 +286,7 @@ TEST(Fitted, keepsTheMiddleAndTheMeanOfWhatItScalesDown) {
     for (int i = 0; i < 91 * 90; ++i) {
         const std::uint8_t* const pixel = &small.rgba[static_cast<std::size_t>(4 * i)];
         ASSERT_NEAR(pixel[0], 128, 12);
-        // 600 pixels of width for 91, so the middle 593 rows for 90.
+        // A width of 600 pixels for 91 requires the middle 593 rows for 90.
         ASSERT_NEAR(pixel[1], (500 + (i / 91 + 0.5 - 45) * 600 / 91) / 4, 1.0);
         ASSERT_EQ(std::pair(pixel[2], pixel[3]), std::pair(std::uint8_t{7}, std::uint8_t{255}));
     }

@@ -16,17 +16,17 @@ using namespace tidemark;
 namespace {
 
 struct Ring {
-    double radius;  // of its crest, view heights
+    double radius;  // radius of the crest in view heights
     float height;
 };
 
-// Measures the ring of a drop in the middle, half a second later, on a mesh of `vertices` a side.
+// Measures the ring of a central drop after half a second, with a mesh of vertices x vertices.
 Ring ringAfterHalfASecond(const Look& look, int width, int height, int vertices) {
     const WaveLattice lattice = latticeFor(look, width, height);
     const int n = lattice.points;
     std::vector<float> heights(static_cast<std::size_t>(n * n));
     std::vector<float> velocity(heights.size());
-    addRipple({heights.data(), n, n, n, n}, -0.5f, -0.5f, 1.0f);  // on the middle of n points
+    addRipple({heights.data(), n, n, n, n}, -0.5f, -0.5f, 1.0f);  // at the middle of n points
     for (int i = 0; i < lattice.stepsPerSecond / 2; ++i) {
         stepWaves(velocity.data(), heights.data(), {1, 1, n - 1, n - 1, n}, false, lattice.damping, lattice.waveSpeed);
     }
@@ -80,9 +80,9 @@ TEST(SurfaceMesh, isLevelBeyondItsEdgeAndKeepsSlopes) {
     constexpr int kPoints = 16;
     std::vector<float> heights;
     for (int i = 0; i < kPoints * kPoints; ++i) {
-        heights.push_back(static_cast<float>(2 * (i / kPoints) + i % kPoints));  // 2 a column, 1 a row
+        heights.push_back(static_cast<float>(2 * (i / kPoints) + i % kPoints));  // 2 per column, 1 per row
     }
-    constexpr int kVertices = 31;  // a vertex on every point and between
+    constexpr int kVertices = 31;  // vertices on the points and halfway between
     std::vector<float> attribs(3 * kVertices * kVertices);
     std::vector<std::int16_t> indices(2 * attribs.size());
     SurfaceMesh mesh(kPoints, kVertices, 1.0, 1.0);
@@ -99,7 +99,7 @@ TEST(SurfaceMesh, isLevelBeyondItsEdgeAndKeepsSlopes) {
 
 namespace {
 
-// The surface of SurfaceMesh::gather(), one vertex at a time.
+// Computes the surface of SurfaceMesh::gather() one vertex at a time.
 struct PlainSurface {
     struct Place {
         int cell;
@@ -122,7 +122,7 @@ struct PlainSurface {
                w[3] * value(place.cell + 2);
     }
 
-    // The height of a vertex, or so many cells to the right of it and above it.
+    // Returns the height at a vertex, or `right` and `above` cells from it.
     float height(int column, int row, int right, int above) const {
         const auto inside = [this](int i) { return std::clamp(i, 0, points - 1); };
         return blend(place(column), [&](int c) {
@@ -188,7 +188,7 @@ TEST(SurfaceMesh, equalsThePlainFormulaBitForBit) {
         constexpr float kUntouched = 1234.0f;
         expected.push_back(kUntouched);
         std::vector<float> attribs(expected.size(), kUntouched);
-        // A second frame, from other heights, keeps nothing of the first one.
+        // A second frame with other heights does not depend on the first.
         mesh.gather(velocity.data(), heights.data(), 1.0f, attribs.data(), indices.data());
         mesh.gather(heights.data(), velocity.data(), 0.3f, attribs.data(), indices.data(), &breeze);
         EXPECT_EQ(attribs, expected);

@@ -66,7 +66,7 @@ TEST_F(PictureFile, ReadsPicturesOfManyKinds) {
 TEST_F(PictureFile, TurnsAPhotoAsTheCameraWasHeld) {
     make("a.jpg", "drawbox=x=8:w=8:h=8:color=blue:t=fill");
     std::string error, photo = readFile("a.jpg", "", 10000, error).value_or("");
-    // The right side of the scene is at the top of the picture: turn it clockwise.
+    // EXIF orientation 6: the picture must be rotated clockwise.
     photo.insert(2, "\xff\xe1\0\x22"s + "Exif\0\0MM\0*\0\0\0\x08\0\1\1\x12\0\3\0\0\0\1\0\6\0\0\0\0\0\0"s);
     write("turned.jpg", photo);
     const Picture picture = load("turned.jpg");

@@ -1,4 +1,4 @@
-// The program as a user runs it: files in, files, messages and an exit code out.
+// The program as a process: its files, messages and exit code.
 #include "tests/preview/program.h"
 
 #include <sys/stat.h>
@@ -24,7 +24,7 @@ static void save(const Picture& picture, const std::string& path) {
     ASSERT_TRUE(savePicture(picture, path, error)) << error;
 }
 
-// The mean difference of two pictures' channels.
+// Returns the mean difference of two pictures' channels.
 static double difference(const Picture& a, const Picture& b) {
     double sum = 0;
     for (std::size_t i = 0; i < a.rgba.size(); ++i) sum += std::abs(a.rgba[i] - b.rgba.at(i));
@@ -97,7 +97,7 @@ TEST_F(Program, DrawsTheFieldsOfAStroke) {
             darkest = std::min<int>(darkest, picture.rgba[i]);
             brightest = std::max<int>(brightest, picture.rgba[i]);
         }
-        EXPECT_GT(brightest - darkest, 100) << name;  // the dimmed frame below the arrows has less
+        EXPECT_GT(brightest - darkest, 100) << name;  // the dimmed background of the arrows has a smaller range
     }
     EXPECT_TRUE(draws(scene + "--fields other --seed 2"));
     EXPECT_NE(load("i/density.png").rgba, load("other/density.png").rgba) << "the ink has no seed";

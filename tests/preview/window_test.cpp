@@ -1,4 +1,4 @@
-// The window as a user has it, on an X server without a screen: mouse and keys in, what the server shows out.
+// The window on an X server without a screen: sends mouse and key events and reads the server's pixels.
 #include <chrono>
 #include <fstream>
 #include <functional>
@@ -11,7 +11,7 @@ class Window : public Program {
 protected:
     static void send(const std::string& events) { EXPECT_EQ(run("xdotool " + events), "0\n") << events; }
 
-    // The button stays down, so that ink goes on flowing at the end of the stroke.
+    // The button stays down, so that ink continues to flow at the end of the stroke.
     static void stroke() {
         std::string events = "mousemove 30 80 mousedown 1";
         for (int x = 35; x <= 90; x += 5) events += " sleep 0.02 mousemove " + std::to_string(x) + " 80";
@@ -55,7 +55,7 @@ protected:
 };
 
 TEST_F(Window, ObeysMouseAndKeysAndFillsAnotherSize) {
-    // Water that calms at once over a picture in its own colour, and rain without a pause.
+    // The water calms immediately, the picture has its own colours, and rain has no pauses.
     std::ofstream("../look") << "damping = 0.8\nbreeze = 0\nwet = 0\nrainDropsPerSecond = 60\nframesToFade = 30\n";
     run("ffmpeg -v error -f lavfi -i color=red:size=20x10 -frames:v 1 ../red.png");
     program = std::async(

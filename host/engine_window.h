@@ -1,5 +1,5 @@
-// Read access to the engine's state, for faces that show what is behind a frame. Link the library's objects, not the
-// shared library, which hides these symbols.
+// Read access to the engine's state, for front ends that show what is behind a frame. Link the library's objects, not
+// the shared library, which hides these symbols.
 #pragma once
 
 #include <vector>

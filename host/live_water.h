@@ -2,7 +2,7 @@
 // The view on Android, the element in the browser and the window on the desktop each contain one.
 //
 // Call everything on the thread that owns the OpenGL ES 2.0 context. Only frame() requires the context to be current.
-// Times are seconds on the clock of the face that calls frame().
+// Times are seconds on the clock of the front end that calls frame().
 #pragma once
 
 #include <cstdint>
@@ -48,8 +48,8 @@ public:
     // Limits the number of drawn pixels per density-independent pixel. The default is automatic.
     void setQuality(Quality quality);
 
-    // Sets the face's minimum interval between two frames in seconds, so that such frames do not count as late. The
-    // default is 0.
+    // Sets the front end's minimum interval between two frames in seconds, so that such frames do not count as late.
+    // The default is 0.
     void setShortestFrame(double seconds) { shortestFrame_ = seconds; }
 
     int width() const { return wanted_.width; }
@@ -80,8 +80,8 @@ public:
     // Reports new pictures, as a sum of k...Picture. Nothing is drawn before all three have been reported once.
     void picturesChanged(unsigned which);
 
-    // Returns the factors for a picture's colours, which the face applies before the transfer; see shade.h. If a new
-    // look changes them, the pictures are requested again.
+    // Returns the factors for a picture's colours, which the front end applies before the transfer; see shade.h. If a
+    // new look changes them, the pictures are requested again.
     Shade shade(PictureSlot slot, float brightness) const { return shadeOf(host_.look(), slot, brightness); }
 
     // Call it when the framebuffer has lost the last frame.
@@ -121,11 +121,11 @@ private:
     Quality quality_ = Quality::automatic;
     ViewSize view_;
     Size wanted_ = {0, 0};    // size for the view
-    Size asked_ = {0, 0};     // size last requested from the face
+    Size asked_ = {0, 0};     // size last requested from the front end
     Size surface_ = {0, 0};   // current size
     double settledAt_ = 0.0;  // when a new size is applied
 
-    // Events since the last frame. Positions are fractions of the view, times are on the face's clock.
+    // Events since the last frame. Positions are fractions of the view, times are on the front end's clock.
     std::vector<Touch> touches_;
     std::vector<Splash> splashes_;
 

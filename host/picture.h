@@ -1,4 +1,4 @@
-// Pictures in memory, for faces that decode their pictures there.
+// Pictures in memory, for front ends that decode their pictures there.
 #pragma once
 
 #include <cstdint>

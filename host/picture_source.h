@@ -1,4 +1,4 @@
-// The interface through which a face gives pictures to the library.
+// The interface through which a front end gives pictures to the library.
 #pragma once
 
 #include <functional>
@@ -16,7 +16,8 @@ struct PictureSource {
     // part with the proportions width : height, scaled down to width x height pixels if it has more. For the light,
     // width and height are 0 and the whole picture is transferred.
     std::function<void(PictureSlot slot, int width, int height)> handOver;
-    // Optional. Called with the slot's new texture bound to the active unit, so that the face can upload pixels itself.
+    // Optional. Called with the slot's new texture bound to the active unit, so that the front end can upload pixels
+    // itself.
     std::function<void(PictureSlot slot)> loaded;
 };
 

@@ -4,7 +4,7 @@
 set -euo pipefail
 cd "$1"
 library="base tshader gl water fluid jni"
-faces="host platform desktop pictures jni/natives.h"
+front_ends="host platform desktop pictures jni/natives.h"
 declare -A below=(
     [base]=""
     [tshader]="base"
@@ -17,9 +17,9 @@ declare -A below=(
     [pictures]="host"
     [host]="platform jni/natives.h base/float4.h base/groups.h"
     [examples]="host"
-    [preview]="$faces"
-    [web]="$faces"
-    [android]="$faces"
+    [preview]="$front_ends"
+    [web]="$front_ends"
+    [android]="$front_ends"
     [reference]="$library"
     [probes]="$library host platform"
     [bench]="$library host platform desktop reference probes"

@@ -207,12 +207,12 @@ async function report() {
     return `# Benchmark of the page
 
 Written by \`scripts/bench.sh --web\`: Chromium ${browser.version()} without a window, its software GPU on
-${cpus().length} cores of: ${cpus()[0].model}, with a load average of ${round(loadavg()[1])}. Of a load above
-the number of cores most was other work, which makes all times longer: compare rows of one run only.
+${cpus().length} cores of: ${cpus()[0].model}, with a load average of ${round(loadavg()[1])}. If the load
+average is above the number of cores, other processes slowed this run down: compare rows of the same run only.
 
-A whole frame takes from its call until its pixels can be read. A pointer draws circles; in *rain* and *card of 20*, twenty
-waters on a page, only rain falls. Quality is left to itself: the size drawn is what the pace has chosen after
-${settled / 1000} s.
+A whole frame lasts from its call until its pixels can be read. In *water* and *ink* a pointer draws circles; *rain* and
+*card of 20*, twenty elements on a page, have rain and no pointer. The quality is \`auto\`; "size drawn" is the resolution
+that it has chosen after ${settled / 1000} s.
 
 Whole frames at ${middle.join('×')}, density 1, against those of [jquery.ripples](https://www.npmjs.com/package/jquery.ripples) at its resolution
 512, which draws the same picture under the same circles. Medians of ${rounds} rounds in turn.
@@ -222,8 +222,9 @@ ${table(['ours / jquery.ripples', 'goal', 'ratio', 'lowest', 'highest'], [['wate
 
 ${table(['scene', 'view', 'density', 'size drawn', 'whole frame, ms', 'slowest twentieth, ms', 'frames/s', 'main thread, ms'], rows)}
 
-The main thread at ${middle.join('×')}, density 1: medians, with ink of the frames that take one step of it, where there are any, and
-shares of the profiler's samples. *WebGL* is the browser's side of the calls; the driver runs in another process.
+Main-thread time of a frame at ${middle.join('×')}, density 1. "ms" is the median, with ink of the frames that run exactly one ink
+step if there are any. The other columns are shares of the profiler's samples. *WebGL* is the browser's side of the calls; the
+driver runs in another process.
 
 ${table(['scene', 'ms', ...Object.keys(parts)], shares)}
 

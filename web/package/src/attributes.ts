@@ -84,7 +84,7 @@ export const attributes = {
      */
     transparent: { kind: 'flag' },
     /**
-     * `low`, `medium` and `high` draw at most 1, 2 and 3 pixels along a CSS pixel, and never more than the display has; `auto` begins as `medium` and draws fewer pixels while frames are late
+     * `low`, `medium` and `high` limit the canvas to 1, 2 and 3 pixels per CSS pixel along each axis, and to the display's resolution; `auto` begins as `medium` and draws fewer pixels while frames are late
      * @default `auto`
      */
     quality: { kind: 'choice', values: ['auto', 'low', 'medium', 'high'] },

@@ -14,137 +14,138 @@ import java.util.Properties;
  */
 public final class Look implements Cloneable {
     /**
-     * Vertices along each side of the mesh that is drawn, at the cost of its square; it changes how fine the water is
-     * drawn, not how it moves. 0 chooses by the size of the view and the time that frames take; 1 does the same.
+     * Vertices along each side of the drawn mesh; the cost grows with their square. It affects only the detail of the
+     * drawing, not the motion of the water. 0 and 1 choose the number by the view's size and the time of frames.
      * Range 96 to 256, limits 0 to 256.
      */
     public int meshVertices = 0;
     /**
-     * Height of the view in model units. The eye is 30 units away, so fewer bend the picture more.
-     * Range 16 to 64, limits 1 to 1000.
+     * Height of the view in model units. The eye is 30 units in front of the water, so a smaller height increases the
+     * refraction. Range 16 to 64, limits 1 to 1000.
      */
     public int meshExtent = 32;
     /**
-     * How many times smaller than the mesh a flat surface shows the picture, which follows from the distances in the
-     * vertex shader: the eye is 30 units before the surface, the picture 30.9 behind it. The view shows the part of
-     * the mesh that the picture fills. Range 1 to 1.1, limits 0.1 to 10.
+     * Factor by which a flat surface shows the picture smaller than the mesh. It follows from the distances in the vertex
+     * shader: the eye is 30 units in front of the surface, the picture 30.9 behind it.
+     * Range 1 to 1.1, limits 0.1 to 10.
      */
     public float pictureZoom = 1.015f;
-    /** Speed of rings, view heights a second. Range 0.05 to 1, limits 0.01 to 3. */
+    /** Speed of rings in view heights per second. Range 0.05 to 1, limits 0.01 to 3. */
     public float ringSpeed = 0.2713f;
     /**
-     * Radius of a drop, share of the view's height. The lattice on which the waves move has three cells in it.
+     * Radius of a drop as a fraction of the view's height. A lattice cell is a third of it.
      * Range 0.014 to 0.1, limits 0.01 to 0.3.
      */
     public float dropRadius = 0.024f;
-    /** Seconds until waves have sunk to a twentieth. Range 1 to 40, limits 0.1 to 1000. */
+    /** Time in seconds in which waves decay to 5 %. Range 1 to 40, limits 0.1 to 1000. */
     public float calmingTime = 6.6f;
     /**
-     * Wave steps a second, whatever the frame rate; fast rings take several times as many.
+     * Wave steps per second, whatever the frame rate. Fast rings use a multiple of it.
      * Range 30 to 120, limits 1 to 1000.
      */
     public int stepsPerSecond = 60;
     /**
-     * Longest time that one frame may bring, in seconds: after a pause the water goes on and does not catch up.
+     * Longest time in seconds by which one frame advances the water. After a longer pause the water does not catch up.
      * Range 0.05 to 1, limits 0 to 10.
      */
     public float longestFrame = 0.25f;
     /**
-     * A wave's turning point is slow as well, so the water rests only after this many calm steps in a row.
-     * Range 10 to 120, limits 1 to 10000.
+     * Number of successive calm steps before the water rests. A single calm step does not suffice, because waves are slow
+     * at their turning points. Range 10 to 120, limits 1 to 10000.
      */
     public int stepsToRest = 30;
     /**
-     * By hand instead of calmingTime: factor on every speed at each step. Smaller calms the water sooner; 0.94
-     * exactly also smooths it more. 0 leaves it to calmingTime. Range 0.9 to 0.998, limits 0 to 1.
+     * Factor on every speed per step, instead of calmingTime. A smaller value calms the water sooner; exactly 0.94 also
+     * smooths it more. 0 uses calmingTime. Range 0.9 to 0.998, limits 0 to 1.
      */
     public float damping = 0.0f;
     /**
-     * By hand instead of ringSpeed: factor on the curvature of the surface at each step. Above 0.5 the waves would
-     * blow up. 0 leaves it to ringSpeed. Range 0.05 to 0.45, limits 0 to 0.5.
+     * Factor on the surface's curvature per step, instead of ringSpeed. Waves are unstable above 0.5. 0 uses ringSpeed.
+     * Range 0.05 to 0.45, limits 0 to 0.5.
      */
     public float waveSpeed = 0.0f;
     /**
-     * Refractive index of the water, 1 for no bending. Real water has 1.33, which a small screen hardly shows.
+     * Refractive index of the water; 1 does not refract. Real water has 1.33, which is hardly visible on a small screen.
      * Range 1 to 2.5, limits 1 to 10.
      */
     public float refractiveIndex = 1.75f;
     /**
-     * Share of the water texture on a wave; the texture's weight is alphaMix * alphaScale1.
+     * Weight of the light's picture on a wave. The weight in the shader is alphaMix * alphaScale1.
      * Range 0 to 1, limits 0 to 10.
      */
     public float alphaMix = 0.5f;
-    /** Scale of that share. Range 0 to 1, limits 0 to 10. */
+    /** Factor on alphaMix. Range 0 to 1, limits 0 to 10. */
     public float alphaScale1 = 0.7f;
-    /** Scale of the other share. The shaders of today do not read it. Range 0 to 1, limits 0 to 10. */
+    /** Factor on 1 - alphaMix. The current shaders do not use it. Range 0 to 1, limits 0 to 10. */
     public float alphaScale2 = 1.0f;
-    /** Extra light on slopes that face the light. Range 0 to 2, limits 0 to 100. */
+    /** Additional light on slopes that face the light. Range 0 to 2, limits 0 to 100. */
     public float fresnelRatio = 0.8f;
     /**
-     * Strength of the highlights; the picture takes up to 5.5 of it, with ink up to 4.5, so more only widens them.
-     * Range 1 to 10, limits 0 to 100.
+     * Strength of the highlights. The picture is saturated at 5.5, with ink at 4.5; larger values only widen the
+     * highlights. Range 1 to 10, limits 0 to 100.
      */
     public float specularRatio = 4.5f;
-    /** Sharpness of the highlights, from broad to pinpoint. Range 1 to 200, limits 0 to 1000. */
+    /** Exponent of the highlights: small values are broad, large values sharp. Range 1 to 200, limits 0 to 1000. */
     public float exponent = 40.0f;
     /**
-     * A third of the height of the ripple that a touch of pressure 1 raises; heights of 1.13 and more show the water
-     * texture fully. Range 0.2 to 4, limits 0 to 100.
+     * Amplitude of the ripple of a touch with pressure 1; the peak is three times as high. At heights of 1.13 and above
+     * the light's picture has its full weight. Range 0.2 to 4, limits 0 to 100.
      */
     public float touchAmplitude = 2.2f;
-    /**
-     * A finger that moves raises one ripple every so many thirds of a drop's radius. Range 0.5 to 5, limits 0.1 to 100.
-     */
+    /** Distance between the ripples of a moving finger, in thirds of dropRadius. Range 0.5 to 5, limits 0.1 to 100. */
     public float trailCells = 1.5f;
-    /** Most ripples that one move may raise. Range 20 to 500, limits 0 to 1000. */
+    /** Limit of the ripples of one move. Range 20 to 500, limits 0 to 1000. */
     public float longestTrail = 200.0f;
-    /** Height of these ripples as a share of a touch's. Range 0 to 1, limits 0 to 10. */
+    /** Amplitude of these ripples as a fraction of touchAmplitude. Range 0 to 1, limits 0 to 10. */
     public float trailShare = 0.12f;
-    /** A third of the height of the ripple that the largest drop of rain raises. Range 0.2 to 2, limits 0 to 100. */
+    /**
+     * Amplitude of the ripple of the largest raindrops; the peak is three times as high.
+     * Range 0.2 to 2, limits 0 to 100.
+     */
     public float rainAmplitude = 0.9f;
     /**
-     * Crest and crater that follow a drop, as a share of what came before: fine rings instead of one broad one.
-     * Range 0 to 0.9, limits 0 to 1.
+     * Amplitude of the crater and the second crest after a drop, each as a fraction of the preceding one. It makes several
+     * narrow rings instead of a broad one. Range 0 to 0.9, limits 0 to 1.
      */
     public float rebound = 0.7f;
     /**
-     * Height of the waves of a breeze, which rises with a touch and sinks some seconds later. 0 for none.
+     * Height of the breeze's waves. The breeze begins with a touch and ends some seconds later. 0 disables it.
      * Range 0 to 0.5, limits 0 to 10.
      */
     public float breeze = 0.2f;
-    /** Drops of rain a second. Range 0 to 60, limits 0 to 1000. */
+    /** Raindrops per second. Range 0 to 60, limits 0 to 1000. */
     public float rainDropsPerSecond = 3.0f;
     /**
-     * How much darker and cooler a bright picture is handed over, so that highlights show on it; a dark one stays as it is.
-     * Range 0 to 1, limits 0 to 1.
+     * Strength with which bright pictures are darkened and cooled, so that highlights are visible on them. Dark pictures
+     * do not change. Range 0 to 1, limits 0 to 1.
      */
     public float wet = 0.6f;
-    /** Share of the ground's red that the water lets through. Range 0 to 1, limits 0 to 1. */
+    /** Factor on the red of the background. Range 0 to 1, limits 0 to 1. */
     public float groundRed = 1.0f;
-    /** Share of its green. Range 0 to 1, limits 0 to 1. */
+    /** Factor on the green of the background. Range 0 to 1, limits 0 to 1. */
     public float groundGreen = 1.0f;
-    /** Share of its blue. Range 0 to 1, limits 0 to 1. */
+    /** Factor on the blue of the background. Range 0 to 1, limits 0 to 1. */
     public float groundBlue = 1.0f;
-    /** Red of the light on the waves, as a share of its picture's. Range 0 to 1, limits 0 to 1. */
+    /** Factor on the red of the light's picture. Range 0 to 1, limits 0 to 1. */
     public float lightRed = 1.0f;
-    /** Green of that light. Range 0 to 1, limits 0 to 1. */
+    /** Factor on the green of the light's picture. Range 0 to 1, limits 0 to 1. */
     public float lightGreen = 1.0f;
-    /** Blue of that light. Range 0 to 1, limits 0 to 1. */
+    /** Factor on the blue of the light's picture. Range 0 to 1, limits 0 to 1. */
     public float lightBlue = 1.0f;
-    /** Red of the ink. Ink of more than 0.75 would light the picture up. Range 0 to 0.75, limits 0 to 1. */
+    /** Red of the ink. Ink above 0.75 would brighten the picture. Range 0 to 0.75, limits 0 to 1. */
     public float inkRed = 0.05f;
     /** Green of the ink. Range 0 to 0.75, limits 0 to 1. */
     public float inkGreen = 0.09f;
     /** Blue of the ink. Range 0 to 0.75, limits 0 to 1. */
     public float inkBlue = 0.24f;
     /**
-     * Steps of the ink a second. Each needs a frame, and while ink lives there are no others: fewer steps make the ink slower
-     * and the water less smooth. A tap takes as many steps whatever their number. Range 24 to 60, limits 10 to 120.
+     * Ink steps per second. While there is ink, frames are drawn only for its steps, so fewer steps slow the ink and make
+     * the water less smooth. A tap takes the same number of steps in any case. Range 24 to 60, limits 10 to 120.
      */
     public int inkStepsPerSecond = 60;
     /**
-     * Steps of the ink after the last touch until it has faded below the smallest
-     * step of its texture: the slowest preset keeps 0.94 of it a step, and 127 * 0.94^n &lt; 1 / 255 for n = 168.
+     * Number of ink steps after the last touch until the ink has faded below the smallest value of its texture. The
+     * slowest preset keeps 0.94 per step, and 127 * 0.94^n &lt; 1 / 255 for n = 168.
      * Range 168 to 300, limits 0 to 10000.
      */
     public int framesToFade = 180;

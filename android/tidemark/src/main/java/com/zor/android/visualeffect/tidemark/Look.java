@@ -14,19 +14,19 @@ import java.util.Properties;
  */
 public final class Look implements Cloneable {
     /**
-     * Vertices along each side of the drawn mesh; the cost grows with their square. It affects only the detail of the
-     * drawing, not the motion of the water. 0 and 1 choose the number by the view's size and the time of frames.
-     * Range 96 to 256, limits 0 to 256.
+     * Vertices along each side of the drawn mesh; the cost grows with their square. It affects only the detail of
+     * the drawing, not the motion of the water. 0 and 1 choose the number by the view's size and the time of
+     * frames. Range 96 to 256, limits 0 to 256.
      */
     public int meshVertices = 0;
     /**
-     * Height of the view in model units. The eye is 30 units in front of the water, so a smaller height increases the
-     * refraction. Range 16 to 64, limits 1 to 1000.
+     * Height of the view in model units. The eye is 30 units in front of the water, so a smaller height increases
+     * the refraction. Range 16 to 64, limits 1 to 1000.
      */
     public int meshExtent = 32;
     /**
-     * Factor by which a flat surface shows the picture smaller than the mesh. It follows from the distances in the vertex
-     * shader: the eye is 30 units in front of the surface, the picture 30.9 behind it.
+     * Factor by which a flat surface shows the picture smaller than the mesh. It follows from the distances in the
+     * vertex shader: the eye is 30 units in front of the surface, the picture 30.9 behind it.
      * Range 1 to 1.1, limits 0.1 to 10.
      */
     public float pictureZoom = 1.015f;
@@ -45,28 +45,28 @@ public final class Look implements Cloneable {
      */
     public int stepsPerSecond = 60;
     /**
-     * Longest time in seconds by which one frame advances the water. After a longer pause the water does not catch up.
-     * Range 0.05 to 1, limits 0 to 10.
+     * Longest time in seconds by which one frame advances the water. After a longer pause the water does not catch
+     * up. Range 0.05 to 1, limits 0 to 10.
      */
     public float longestFrame = 0.25f;
     /**
-     * Number of successive calm steps before the water rests. A single calm step does not suffice, because waves are slow
-     * at their turning points. Range 10 to 120, limits 1 to 10000.
+     * Number of successive calm steps before the water rests. A single calm step does not suffice, because waves
+     * are slow at their turning points. Range 10 to 120, limits 1 to 10000.
      */
     public int stepsToRest = 30;
     /**
-     * Factor on every speed per step, instead of calmingTime. A smaller value calms the water sooner; exactly 0.94 also
-     * smooths it more. 0 uses calmingTime. Range 0.9 to 0.998, limits 0 to 1.
+     * Factor on every speed per step, instead of calmingTime. A smaller value calms the water sooner; exactly 0.94
+     * also smooths it more. 0 uses calmingTime. Range 0.9 to 0.998, limits 0 to 1.
      */
     public float damping = 0.0f;
     /**
-     * Factor on the surface's curvature per step, instead of ringSpeed. Waves are unstable above 0.5. 0 uses ringSpeed.
-     * Range 0.05 to 0.45, limits 0 to 0.5.
+     * Factor on the surface's curvature per step, instead of ringSpeed. Waves are unstable above 0.5. 0 uses
+     * ringSpeed. Range 0.05 to 0.45, limits 0 to 0.5.
      */
     public float waveSpeed = 0.0f;
     /**
-     * Refractive index of the water; 1 does not refract. Real water has 1.33, which is hardly visible on a small screen.
-     * Range 1 to 2.5, limits 1 to 10.
+     * Refractive index of the water; 1 does not refract. Real water has 1.33, which is hardly visible on a small
+     * screen. Range 1 to 2.5, limits 1 to 10.
      */
     public float refractiveIndex = 1.75f;
     /**
@@ -88,8 +88,8 @@ public final class Look implements Cloneable {
     /** Exponent of the highlights: small values are broad, large values sharp. Range 1 to 200, limits 0 to 1000. */
     public float exponent = 40.0f;
     /**
-     * Amplitude of the ripple of a touch with pressure 1; the peak is three times as high. At heights of 1.13 and above
-     * the light's picture has its full weight. Range 0.2 to 4, limits 0 to 100.
+     * Amplitude of the ripple of a touch with pressure 1; the peak is three times as high. At heights of 1.13 and
+     * above the light's picture has its full weight. Range 0.2 to 4, limits 0 to 100.
      */
     public float touchAmplitude = 2.2f;
     /** Distance between the ripples of a moving finger, in thirds of dropRadius. Range 0.5 to 5, limits 0.1 to 100. */
@@ -104,8 +104,8 @@ public final class Look implements Cloneable {
      */
     public float rainAmplitude = 0.9f;
     /**
-     * Amplitude of the crater and the second crest after a drop, each as a fraction of the preceding one. It makes several
-     * narrow rings instead of a broad one. Range 0 to 0.9, limits 0 to 1.
+     * Amplitude of the crater and the second crest after a drop, each as a fraction of the preceding one. It makes
+     * several narrow rings instead of a broad one. Range 0 to 0.9, limits 0 to 1.
      */
     public float rebound = 0.7f;
     /**
@@ -116,8 +116,8 @@ public final class Look implements Cloneable {
     /** Raindrops per second. Range 0 to 60, limits 0 to 1000. */
     public float rainDropsPerSecond = 3.0f;
     /**
-     * Strength with which bright pictures are darkened and cooled, so that highlights are visible on them. Dark pictures
-     * do not change. Range 0 to 1, limits 0 to 1.
+     * Strength with which bright pictures are darkened and cooled, so that highlights are visible on them. Dark
+     * pictures do not change. Range 0 to 1, limits 0 to 1.
      */
     public float wet = 0.6f;
     /** Factor on the red of the background. Range 0 to 1, limits 0 to 1. */
@@ -139,13 +139,14 @@ public final class Look implements Cloneable {
     /** Blue of the ink. Range 0 to 0.75, limits 0 to 1. */
     public float inkBlue = 0.24f;
     /**
-     * Ink steps per second. While there is ink, frames are drawn only for its steps, so fewer steps slow the ink and make
-     * the water less smooth. A tap takes the same number of steps in any case. Range 24 to 60, limits 10 to 120.
+     * Ink steps per second. While there is ink, frames are drawn only for its steps, so fewer steps slow the ink
+     * and make the water less smooth. A tap takes the same number of steps in any case.
+     * Range 24 to 60, limits 10 to 120.
      */
     public int inkStepsPerSecond = 60;
     /**
-     * Number of ink steps after the last touch until the ink has faded below the smallest value of its texture. The
-     * slowest preset keeps 0.94 per step, and 127 * 0.94^n &lt; 1 / 255 for n = 168.
+     * Number of ink steps after the last touch until the ink has faded below the smallest value of its texture.
+     * The slowest preset keeps 0.94 per step, and 127 * 0.94^n &lt; 1 / 255 for n = 168.
      * Range 168 to 300, limits 0 to 10000.
      */
     public int framesToFade = 180;

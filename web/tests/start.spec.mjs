@@ -1,4 +1,4 @@
-// What the first picture has to wait for.
+// The work that delays the first picture.
 import { expect, open, test } from './page.mjs';
 
 // To read from a canvas that the graphics draw is to wait until they have done all that they were told.

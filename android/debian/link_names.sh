@@ -14,5 +14,5 @@ library libGLESv2.so "${gl[@]}"
 library liblog.so __android_log_print
 library libjnigraphics.so AndroidBitmap_{getInfo,lockPixels,unlockPixels}
 library libm.so ceil ceilf cos exp floor floorf lround lroundf pow sin sincos
-library libc.so __cxa_atexit abort free lrand48 malloc memcmp memcpy memmove memset realloc strlen \
+library libc.so __cxa_atexit abort clock_gettime free lrand48 malloc memcmp memcpy memmove memset realloc strlen \
     __aeabi_{idiv,memclr,memclr4,memclr8,memcpy,memcpy4,memcpy8,memmove,memmove4,memmove8}

@@ -103,7 +103,7 @@ void LiveWater::picturesChanged(unsigned which) {
 }
 
 void LiveWater::renewContext() {
-    setUpDue_ = isContextNew_ = true;
+    setUpDue_ = true;
     texturesDue_ = kAllPictures;
 }
 
@@ -116,7 +116,7 @@ void LiveWater::prepare() {
     }
     const unsigned textures = pictureDue_ | texturesDue_;
     if (setUpDue_) pace_.interrupt();  // but not for a picture, because a moving one is loaded with every frame
-    if (std::exchange(setUpDue_, false)) host_.setUp(withInk_, std::exchange(isContextNew_, false));
+    if (std::exchange(setUpDue_, false)) host_.setUp(withInk_);
     if (textures) host_.loadPictures(pictures_, std::exchange(pictureDue_, 0), std::exchange(texturesDue_, 0));
 }
 

@@ -136,7 +136,6 @@ private:
 
     // Changes that the next frame passes to the library, because only then the context is current.
     bool setUpDue_ = false;
-    bool isContextNew_ = true;
     unsigned pictureDue_ = 0;   // pictures to transfer
     unsigned texturesDue_ = 0;  // further textures to load
     unsigned known_ = 0;        // pictures that have been reported

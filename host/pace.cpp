@@ -20,7 +20,7 @@ constexpr double kFarTooLate = 3.0;
 // The longest frame interval of a display, in seconds.
 constexpr double kSlowestDisplay = 1.0 / 22;
 
-// Frames are judged by their median interval over this time, but at least over kFewest frames.
+// Frames are judged when they fill the list of intervals or this time, but at least kFewest of them.
 constexpr double kJudgedSeconds = 0.35;
 constexpr int kFewest = 3;
 
@@ -64,7 +64,9 @@ bool Pace::frameDrawn(double now, double shortest, bool keepsResolution) {
 }
 
 bool Pace::judge(double now, double shortest, bool keepsResolution) {
-    auto* const middle = intervals_.begin() + count_ / 2;
+    // A few late frames after a pause are not a slow screen: fewer intervals count only if all of them are late.
+    const bool isFull = count_ == static_cast<int>(intervals_.size());
+    auto* const middle = intervals_.begin() + (isFull ? count_ / 2 : 0);
     std::nth_element(intervals_.begin(), middle, intervals_.begin() + count_);
     const double median = *middle;
     rhythm_ = std::min(rhythm_, std::max(median, 1.0 / 240));

@@ -36,7 +36,7 @@ private:
     std::vector<Touch> waiting_;  // reports after the last step
     std::vector<Touch> due_;      // result of the last step
     Touch last_ = {};             // last report up to the last step
-    Touch sent_ = {};             // last touch returned by due()
+    Touch sent_ = {};             // last touch returned by step()
     bool isDown_ = false;
 };
 

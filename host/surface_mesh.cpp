@@ -19,7 +19,7 @@ constexpr int kKept = 8;
 // Number of rows above a vertex's cell that are read. Beyond the edge they repeat the edge's height.
 constexpr int kAbove = 2;
 
-typedef short short8 __attribute__((vector_size(16)));
+typedef unsigned short ushort8 __attribute__((vector_size(16)));
 
 std::ptrdiff_t at(int line, int length) {
     return std::ptrdiff_t{line} * length;
@@ -199,28 +199,28 @@ void SurfaceMesh::turnDiagonals(int column, std::int16_t* indices) {
     const int cells = rows - 1;
     const float* const left = slopesBefore_.data();
     const float* const right = slopes_.data();
-    const auto topRight = static_cast<short>(column * rows);
-    const auto topLeft = static_cast<short>(topRight - rows);
-    short8 level = short8{topRight, topLeft, topRight, topLeft, topRight, topLeft, topRight, topLeft} +
-                   short8{1, 0, 2, 1, 3, 2, 4, 3};
+    const auto topRight = static_cast<unsigned short>(column * rows);
+    const auto topLeft = static_cast<unsigned short>(topRight - rows);
+    ushort8 level = ushort8{topRight, topLeft, topRight, topLeft, topRight, topLeft, topRight, topLeft} +
+                    ushort8{1, 0, 2, 1, 3, 2, 4, 3};
     const auto pairs = [=, &level](int r) {
         const float4 sum =
             load<float4>(left + r) + load<float4>(left + r + 1) + load<float4>(right + r) + load<float4>(right + r + 1);
-        const auto isTurned = reinterpret_cast<short8>(reinterpret_cast<int4>(sum) >> 31);
-        const short8 values = level + (isTurned & short8{-1, 1, -1, 1, -1, 1, -1, 1});
-        level += short8{4, 4, 4, 4, 4, 4, 4, 4};
+        const auto isTurned = reinterpret_cast<ushort8>(reinterpret_cast<int4>(sum) >> 31);
+        const ushort8 values = level + (isTurned & ushort8{0xffff, 1, 0xffff, 1, 0xffff, 1, 0xffff, 1});
+        level += ushort8{4, 4, 4, 4, 4, 4, 4, 4};
         return values;
     };
     std::int16_t* const cell = indices + 6 * at(column - 1, cells) + 2;
-    const auto write = [=](const short8& values, int r, int k) {
+    const auto write = [=](const ushort8& values, int r, int k) {
         std::memcpy(cell + 6 * (r + k), reinterpret_cast<const char*>(&values) + 4 * k, 4);
     };
     int r = 0;
     for (; r + kGroup <= cells; r += kGroup) {
-        const short8 values = pairs(r);
+        const ushort8 values = pairs(r);
         for (int k = 0; k < kGroup; ++k) write(values, r, k);
     }
-    const short8 values = pairs(r);
+    const ushort8 values = pairs(r);
     for (int k = 0; k < cells - r; ++k) write(values, r, k);
 }
 

@@ -18,8 +18,11 @@ constexpr double kLongestSide = 4096.0;
 Size drawnSize(const ViewSize& view, Quality quality, double resolution) {
     const double most = quality == Quality::low ? 1.0 : quality == Quality::high ? 3.0 : 2.0;
     const double longer = std::max(view.width, view.height);
-    const double scale = std::min(
-        std::min(view.density, most) * (quality == Quality::automatic ? resolution : 1.0), kLongestSide / longer);
+    const double whole = std::min(view.density, most);
+    // A small view keeps its proportions: it draws all its pixels rather than sides of the smallest size.
+    const double least = std::min(whole, kShortestSide / std::min(view.width, view.height));
+    const double scale =
+        std::min(quality == Quality::automatic ? std::max(whole * resolution, least) : whole, kLongestSide / longer);
     const auto side = [scale](double length) {
         return static_cast<int>(std::lround(std::max(length * scale, kShortestSide)));
     };

@@ -183,10 +183,10 @@ void WaterHost::loadPictures(const PictureSource& pictures, unsigned due, unsign
     load(kLightPicture, PictureSlot::light, 0, 0, native::onLoadWaterTextures);
 }
 
-void WaterHost::setUp(bool withInk, bool isContextNew) {
+void WaterHost::setUp(bool withInk) {
     JNIEnv* const env = hostEnvironment();
     native::onInitSetting(env, nullptr, width_, height_, withInk);
-    if (isContextNew || withInk || withInk_) native::onInitGPU(env, nullptr);
+    native::onInitGPU(env, nullptr);
     // Otherwise the library would keep an interrupted stroke and continue it at the next touch.
     if (withInk != withInk_) {
         native::clearInkValue(env, nullptr);

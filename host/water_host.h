@@ -32,9 +32,8 @@ public:
     // Returns the ratio of the shorter to the longer side to which the backgrounds must be cropped.
     double proportions() const;
 
-    // Sets the library up in the current context, with or without ink. Ink that was there is lost. In a context that is
-    // not new, water without ink before and after keeps its program.
-    void setUp(bool withInk, bool isContextNew = true);
+    // Sets the library up in the current context, with or without ink. Ink that was there is lost.
+    void setUp(bool withInk);
 
     // Requests the pictures `due` from the source, then uploads these and the pictures `which`, which the library
     // already has.

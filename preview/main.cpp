@@ -78,7 +78,7 @@ std::string readColor(std::string& text) {
     return "";
 }
 
-// CLI::Range accepts text that is not a number.
+// CLI::Range accepts "nan" and hexadecimal numbers.
 std::string readNumber(std::string& text) {
     return text.find_first_not_of("0123456789.") == text.npos ? "" : text + " is not a number above 0";
 }
@@ -87,7 +87,7 @@ std::string readNumber(std::string& text) {
 std::string contradiction(const PreviewOptions& options) {
     const bool isWide = options.size.width > options.size.height;
     const bool writesClip = !options.video.empty() || !options.out.empty();
-    if (options.inWindow) return "";
+    if (options.inWindow) return options.rainFrom.value_or(0.0) > 0.0 ? "--rain N is not for a window" : "";
     if (!options.record.empty()) return "--record is for a --window";
     if (!writesClip && options.still.empty() && options.fields.empty()) {
         return "nothing to do: name a --video, --out, --still or --fields to write, or open a --window";
@@ -143,10 +143,12 @@ int main(int argc, char** argv) {
     add("--light", options.light, "FILE", "Picture of the light on the waves");
     add("--look", options.look, "FILE",
         "Values of the look, above those of the preset: lines of \"key = number\", as in host/look.properties");
+    const CLI::Validator isNumber(readNumber, "");
     CLI::Option* const rain = add("--rain", options.rainFrom, "[N]",
                                   "Let it rain, from second N on; default: throughout if there is no --script")
                                   ->expected(0, 1)
-                                  ->check(CLI::Range(0.0, 3600.0));
+                                  ->check(CLI::Range(0.0, 3600.0))
+                                  ->check(isNumber);
     CLI::Option* const ink = add("--ink", options.inkColor, "#rrggbb", "Colour of the ink, each channel at most bf")
                                  ->transform(CLI::Validator(readColor, ""));
     CLI::Option* const withoutInk = app.add_flag("--no-ink", noInk, "Water without ink")->excludes(ink);
@@ -158,7 +160,6 @@ int main(int argc, char** argv) {
 
     const std::string clip = "What a run without a window draws and writes";
     app.option_defaults()->group(clip);
-    const CLI::Validator isNumber(readNumber, "");
     const CLI::Range time(0.001, 3600.0);
     add("--script", options.script, "NAME|FILE",
         "Touches to play: a scene, or lines of \"time_ms action x y pressure\"");

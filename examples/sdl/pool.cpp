@@ -33,6 +33,7 @@ int main(int argc, char** argv) {
     const Pictures pictures = {ground, ground, ground};
     LiveWater water(sourceOf(pictures), 1);
     water.setView(320, 320, 1.0, seconds());
+    water.setQuality(Quality::high);
     water.picturesChanged(kAllPictures);
     water.setInk(true);
     while (true) {

@@ -195,7 +195,7 @@ test('a paused water keeps its picture when options change and the element moves
 test('in a shadow root content is clickable, keys let drops fall, and motion is reduced', async ({ page }) => {
     await page.emulateMedia({ reducedMotion: 'reduce' });
     await show(page, `${script}<div><template shadowrootmode="open">
-        <tidemark-water src="pond.png" rain="20" breeze="always" first-drop><button onclick="this.textContent += '!'">Buy</button></tidemark-water></template>`);
+        <tidemark-water src="pond.png" rain="20" breeze="always" first-drop><template shadowrootmode="open">Old</template><button onclick="this.textContent += '!'">Buy</button></tidemark-water></template>`);
     await element(page).and(page.locator('[shown]')).waitFor();
     const calm = (yes) => expect.poll(() => element(page).evaluate(({ water }) => water.calm)).toBe(yes);
     await calm(true);  // without rain, breeze and the first drop

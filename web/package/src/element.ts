@@ -146,7 +146,7 @@ export class WaterElement extends Base {
     #build(): [HTMLCanvasElement, HTMLCanvasElement] {
         const { ownerDocument: document } = this;
         const [own, page] = sheetsOf(document);
-        const root = this.shadowRoot ?? this.#attach();
+        const root = this.#keys ? this.shadowRoot! : this.#attach();
         root.adoptedStyleSheets = [own!];
         const around = this.getRootNode() as Document | ShadowRoot;
         if (!around.adoptedStyleSheets.includes(page!)) around.adoptedStyleSheets = [...around.adoptedStyleSheets, page!];

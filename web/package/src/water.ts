@@ -113,6 +113,7 @@ export class Water extends EventTarget {
 
     /** Changes the options that are named. */
     set(options: Options): void {
+        if (this.end.signal.aborted) return;
         const { paused } = this.options;
         if ('pointers' in options) this.touches.follow(options.pointers === 'page' ? this.sight.view : this.box);
         // Each frame moves the ink, so the last one is copied before anything can draw another.

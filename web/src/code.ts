@@ -45,5 +45,5 @@ function statements(settings: Settings): string {
 export const codes: Readonly<Record<string, (settings: Settings) => string>> = {
     JavaScript: toJavaScript,
     Java: (settings) => `Look look = new Look();\n${statements(settings)}`,
-    'C++': (settings) => `Look look;\n${statements(settings)}`,
+    'C++': (settings) => `tidemark::Look look;\n${statements(settings)}`,
 };

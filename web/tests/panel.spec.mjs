@@ -228,7 +228,7 @@ test('the copied code compiles in both languages and holds the values', async ({
     writeFileSync(join(outputDir, 'copied.cpp'), `#include "host/look.h"
 #include <cstdio>
 struct Water {
-    void setLook(const Look& look) { std::printf("%d %.2f %.1f %.3f %.2f", look.meshExtent, look.calmingTime, look.exponent, look.inkRed, look.refractiveIndex); }
+    void setLook(const tidemark::Look& look) { std::printf("%d %.2f %.1f %.3f %.2f", look.meshExtent, look.calmingTime, look.exponent, look.inkRed, look.refractiveIndex); }
     void setInk(bool withInk) { std::printf(withInk ? " true" : " false"); }
     void setRain(bool falling) { std::printf(falling ? " true" : " false"); }
 };

@@ -117,8 +117,10 @@ export class Graphics {
 
     private watchContext(): void {
         const { canvas, signal } = this;
-        canvas.addEventListener('webglcontextlost', () => this.state === 'live' && this.lost(), { signal });
-        canvas.addEventListener('webglcontextrestored', () => this.state === 'lost' && void this.open(), { signal });
+        // The events are asynchronous: those of a canvas that was replaced may come after its successor is live.
+        const isIn = (state: State) => canvas === this.canvas && this.state === state;
+        canvas.addEventListener('webglcontextlost', () => isIn('live') && this.lost(), { signal });
+        canvas.addEventListener('webglcontextrestored', () => isIn('lost') && void this.open(), { signal });
     }
 
     private lost(): void {

@@ -108,6 +108,11 @@ void LiveWater::renewContext() {
 }
 
 void LiveWater::prepare() {
+    if (std::exchange(setUpDue_, false)) {
+        host_.setUp(withInk_);
+        pace_.interrupt();  // but not for a picture, because a moving one is loaded with every frame
+    }
+    if (known_ != kAllPictures) return;
     const int longer = std::max(surface_.width, surface_.height);
     if (host_.proportions() != proportions_ || longer > kGrowth * longest_) {
         pictureDue_ |= kBackgrounds;
@@ -115,20 +120,23 @@ void LiveWater::prepare() {
         longest_ = longer;
     }
     const unsigned textures = pictureDue_ | texturesDue_;
-    if (setUpDue_) pace_.interrupt();  // but not for a picture, because a moving one is loaded with every frame
-    if (std::exchange(setUpDue_, false)) host_.setUp(withInk_);
     if (textures) host_.loadPictures(pictures_, std::exchange(pictureDue_, 0), std::exchange(texturesDue_, 0));
 }
 
 bool LiveWater::isResting() const {
-    if (known_ != kAllPictures || view_.width == 0.0) return true;
-    if (isSurfaceDue()) return false;
-    return surface_.width == 0 ||
-           (!setUpDue_ && !pictureDue_ && touches_.empty() && splashes_.empty() && host_.isResting());
+    return !isSurfaceDue() && (surface_.width == 0 || isStill());
+}
+
+bool LiveWater::isChangeDue() const {
+    return setUpDue_ || (known_ == kAllPictures && (pictureDue_ || !touches_.empty() || !splashes_.empty()));
+}
+
+bool LiveWater::isStill() const {
+    return !isChangeDue() && (known_ != kAllPictures || host_.isResting());
 }
 
 bool LiveWater::isSurfaceDue() const {
-    return wanted_ != surface_ && wanted_ != asked_;
+    return view_.width != 0.0 && wanted_ != surface_ && wanted_ != asked_;
 }
 
 // After a rest, one ordinary frame passes.
@@ -156,14 +164,17 @@ LiveWater::Frame LiveWater::frame(double now) {
     }
     if (surface_.width == 0) return Frame::waiting;
     prepare();
+    if (known_ != kAllPictures) return Frame::waiting;
     const double seconds = std::min(secondsUntil(now), longestFrame_);
     for (const Splash& splash : splashes_) {
         const double x = double{splash.x} * surface_.width;
         const double y = double{splash.y} * surface_.height;
-        const bool withInk = splash.withInk && !host_.isTouched();
-        if (!withInk) host_.splash(x, y, splash.weight);
-        for (const TouchAction action : {TouchAction::down, TouchAction::up}) {
-            if (withInk) host_.touch(action, x, y, splash.weight, host_.time() + seconds);
+        if (splash.withInk && !host_.isTouched()) {
+            for (const TouchAction action : {TouchAction::down, TouchAction::up}) {
+                host_.touch(action, x, y, splash.weight, host_.time() + seconds);
+            }
+        } else {
+            host_.splash(x, y, splash.weight);
         }
     }
     splashes_.clear();
@@ -194,12 +205,9 @@ LiveWater::Frame LiveWater::frame(double now) {
 
 double LiveWater::due() const {
     constexpr double kNever = std::numeric_limits<double>::infinity();
-    if (isResting()) return kNever;
     const double surface = isSurfaceDue() ? settledAt_ : kNever;
-    if (surface_.width == 0) return surface;
-    const bool isDue = setUpDue_ || pictureDue_ || !touches_.empty() || !splashes_.empty();
-    const bool isStill = host_.isResting() && !isDue;
-    return std::min(surface, isStill ? kNever : now_ + (isDue ? 0.0 : host_.due() - host_.time()));
+    if (surface_.width == 0 || isStill()) return surface;
+    return std::min(surface, now_ + (isChangeDue() ? 0.0 : host_.due() - host_.time()));
 }
 
 }  // namespace tidemark

@@ -77,7 +77,8 @@ public:
     // down it adds no ink, because the library has one stroke at a time.
     void splash(float x, float y, float weight, bool withInk = false);
 
-    // Reports new pictures, as a sum of k...Picture. Nothing is drawn before all three have been reported once.
+    // Reports new pictures, as a sum of k...Picture. Nothing is drawn before all three have been reported once, but
+    // frame() sets up the library, which compiles its programs.
     void picturesChanged(unsigned which);
 
     // Returns the factors for a picture's colours, which the front end applies before the transfer; see shade.h. If a
@@ -110,6 +111,8 @@ private:
     void draw(double seconds);
     void fitSurface();
     bool isSurfaceDue() const;
+    bool isChangeDue() const;
+    bool isStill() const;
     double secondsUntil(double now);
 
     WaterHost host_;

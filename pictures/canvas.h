@@ -25,6 +25,10 @@ inline Rgb operator*(Rgb colour, float light) {
 struct Canvas {
     Canvas(int w, int h) : width(w), height(h), pixels(static_cast<std::size_t>(w) * static_cast<std::size_t>(h)) {}
 
+    Rgb& at(int column, int row) {
+        return pixels[static_cast<std::size_t>(row) * static_cast<std::size_t>(width) + static_cast<std::size_t>(column)];
+    }
+
     int width, height;
     std::vector<Rgb> pixels;
 };
@@ -33,6 +37,13 @@ struct Canvas {
 Picture toPicture(const Canvas& canvas);
 Canvas toCanvas(const Picture& picture);
 
+// Not inlined, like the other functions that handle a row of pixels: a browser replaces its first, slower code for a
+// WebAssembly function by optimised code only between two calls.
+template <class Paint>
+[[gnu::noinline]] void paintRow(Rgb* pixels, int left, int right, int row, Paint& paint) {
+    for (int column = left; column < right; ++column) paint(pixels[column], column, row);
+}
+
 // Calls paint(pixel, column, row) for the pixels of the canvas within `reach` of (x, y).
 template <class Paint>
 void forPixelsAround(Canvas& canvas, float x, float y, float reach, Paint paint) {
@@ -40,10 +51,7 @@ void forPixelsAround(Canvas& canvas, float x, float y, float reach, Paint paint)
     const int right = std::min(canvas.width, static_cast<int>(x + reach) + 2);
     const int top = std::max(0, static_cast<int>(y - reach));
     const int bottom = std::min(canvas.height, static_cast<int>(y + reach) + 2);
-    for (int row = top; row < bottom; ++row) {
-        Rgb* pixels = &canvas.pixels[static_cast<std::size_t>(row) * static_cast<std::size_t>(canvas.width)];
-        for (int column = left; column < right; ++column) paint(pixels[column], column, row);
-    }
+    for (int row = top; row < bottom; ++row) paintRow(&canvas.at(0, row), left, right, row, paint);
 }
 
 template <class Paint>

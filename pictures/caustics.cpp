@@ -2,10 +2,10 @@
 
 #include <array>
 #include <cmath>
-#include <complex>
 #include <numbers>
 
 #include "pictures/noise.h"
+#include "pictures/turn.h"
 
 namespace tidemark {
 
@@ -31,6 +31,16 @@ std::array<Wave, kWaves> makeWaves(float cell, unsigned seed) {
     return waves;
 }
 
+// Moves the photons of a row, which starts at (x, y).
+[[gnu::noinline]] void bend(const Wave& wave, float x, float y, std::vector<float>& landX, std::vector<float>& landY) {
+    Turn turn(wave.kx * x + wave.ky * y + wave.phase, wave.kx * kPhotonStep);
+    for (std::size_t i = 0; i < landX.size(); ++i) {
+        landX[i] += wave.amplitude * wave.kx * turn.cosine();
+        landY[i] += wave.amplitude * wave.ky * turn.cosine();
+        turn.advance();
+    }
+}
+
 // Adds a photon's brightness to the four nearest pixels.
 void deposit(std::vector<float>& map, int width, int height, float x, float y) {
     const float left = std::floor(x);
@@ -45,6 +55,11 @@ void deposit(std::vector<float>& map, int width, int height, float x, float y) {
         map[static_cast<std::size_t>(row) * static_cast<std::size_t>(width) + static_cast<std::size_t>(column)] +=
             energy * shareX * shareY;
     }
+}
+
+[[gnu::noinline]] void depositRow(
+    std::vector<float>& map, int width, int height, const std::vector<float>& x, const std::vector<float>& y) {
+    for (std::size_t i = 0; i < x.size(); ++i) deposit(map, width, height, x[i], y[i]);
 }
 
 }  // namespace
@@ -64,19 +79,8 @@ std::vector<float> causticNet(int width, int height, float cell, unsigned seed) 
             landX[static_cast<std::size_t>(i)] = static_cast<float>(i) * kPhotonStep - margin;
             landY[static_cast<std::size_t>(i)] = y;
         }
-        for (const Wave& wave : waves) {
-            // Along a row, each step turns the phase of the wave by the same angle.
-            std::complex<float> turn = std::polar(1.0f, wave.kx * -margin + wave.ky * y + wave.phase);
-            const std::complex<float> step = std::polar(1.0f, wave.kx * kPhotonStep);
-            for (std::size_t i = 0; i < landX.size(); ++i) {
-                landX[i] += wave.amplitude * wave.kx * turn.real();
-                landY[i] += wave.amplitude * wave.ky * turn.real();
-                turn = {
-                    turn.real() * step.real() - turn.imag() * step.imag(),
-                    turn.real() * step.imag() + turn.imag() * step.real()};
-            }
-        }
-        for (std::size_t i = 0; i < landX.size(); ++i) deposit(map, width, height, landX[i], landY[i]);
+        for (const Wave& wave : waves) bend(wave, -margin, y, landX, landY);
+        depositRow(map, width, height, landX, landY);
     }
     return map;
 }

@@ -77,13 +77,11 @@ function completeSite() {
 }
 
 // Adds tags that load the modules together with the page and start the painter, which saves round trips before the first
-// picture.
+// picture. The painter comes first, because it takes longest.
 function preloadModules() {
     const tags = [
-        // After <meta name=viewport>, because the script reads the size of the view.
-        [/\/early_painter-/, (src) => ({ tag: 'script', attrs: { src }, injectTo: 'head' })],
-        [/\/painter-|painter.*\.wasm$/, (href) => ({ tag: 'link', attrs: { rel: 'prefetch', href } })],  // loaded by the worker
-        [/\.wasm$/, (href) => ({ tag: 'link', attrs: { rel: 'preload', as: 'fetch', crossorigin: true, href } })],
+        [/\/painter-|painter.*\.wasm$/, { rel: 'prefetch', fetchpriority: 'high' }],  // loaded by the worker
+        [/water.*\.wasm$/, { rel: 'preload', as: 'fetch', crossorigin: true }],
     ];
     return {
         name: 'preload-modules',
@@ -96,10 +94,16 @@ function preloadModules() {
         },
         transformIndexHtml: {
             order: 'post',
-            handler: (html, { bundle }) => Object.keys(bundle).flatMap((file) => {
-                const tag = tags.find(([pattern]) => pattern.test(file))?.[1](`./${file}`);
-                return tag ? [{ injectTo: 'head-prepend', ...tag }] : [];
-            }),
+            handler: (html, { bundle }) => {
+                const files = Object.keys(bundle).map((file) => `./${file}`);
+                const early = files.find((file) => file.includes('/early_painter-'));
+                return {
+                    // The script reads the size of the view. After a style sheet it would wait for that.
+                    html: html.replace(/<meta name="viewport".*>/, `$&\n        <script src="${early}"></script>`),
+                    tags: tags.flatMap(([pattern, attrs]) => files.filter((file) => pattern.test(file)).map((href) => ({
+                        tag: 'link', attrs: { ...attrs, href }, injectTo: 'head-prepend' }))),
+                };
+            },
         },
     };
 }

@@ -87,11 +87,6 @@ protected:
 }  // namespace
 
 TEST_F(Live, drawsWhatHasChangedAndRestsOtherwise) {
-    LiveWater without(sourceOf(pictures), 1);
-    without.setView(kWidth, kHeight, 1.0, 0.0);
-    EXPECT_EQ(without.frame(0.0), Frame::resting) << "there is no picture yet";
-    EXPECT_EQ(without.due(), std::numeric_limits<double>::infinity());
-
     begin({.meshVertices = 24});
     water.clearInk();
     EXPECT_EQ(next(), Frame::drawn);
@@ -113,6 +108,20 @@ TEST_F(Live, drawsWhatHasChangedAndRestsOtherwise) {
     EXPECT_EQ(next(), Frame::drawn) << "no drop falls";
     water.setRain(false);
     EXPECT_LT(framesToRest(), 600);
+}
+
+TEST_F(Live, isSetUpBeforeThePicturesAreThere) {
+    water = LiveWater(sourceOf(pictures), 1);
+    water.setView(kWidth, kHeight, 1.0, now);
+    water.picturesChanged(kPortraitPicture);
+    water.splash(0.5f, 0.5f, 1.0f);
+    EXPECT_EQ(calls(), "|");
+    EXPECT_EQ(next(), Frame::resting);
+    EXPECT_EQ(water.due(), std::numeric_limits<double>::infinity());
+    water.picturesChanged(kLandscapePicture | kLightPicture);
+    EXPECT_LE(water.due(), now);
+    EXPECT_EQ(calls(), "PLWpl");
+    EXPECT_EQ(next(), Frame::drawn) << "of the drop";
 }
 
 // While a divider is dragged, frames keep the old size.

@@ -78,12 +78,13 @@ for (const [code, body, options, lack] of [
     ['cross-origin', '<tidemark-water src="http://pond.test/pond.png">', { at: 'http://other.test/page.html' }],
     ['decode', '<tidemark-water src="words.png">'],
     ['load', '<tidemark-water src="none.png">'],
+    ['load', '<tidemark-water><img slot="fallback" src="none.png" alt="">'],
     ['module', '<tidemark-water>', { files: { 'tidemark-water.wasm': 'words' } }],
     ['csp', '<tidemark-water>', { headers: { 'content-security-policy': "default-src 'self'" } }],
     ['simd', '<tidemark-water>', {}, () => { WebAssembly.validate = () => false; }],
     ['webgl', '<tidemark-water src="pond.png">', {}, () => { HTMLCanvasElement.prototype.getContext = () => null; }],
 ]) {
-    test(`a failure has the code ${code}, and the fallback stays`, async ({ page, problems }) => {
+    test(`a failure of ${body} has the code ${code}, and the fallback stays`, async ({ page, problems }) => {
         if (lack) await page.addInitScript(lack);
         const asked = [];
         page.on('request', (request) => request.url().endsWith('pond.png') && asked.push(request));
@@ -444,6 +445,22 @@ test('the layout does not shift when the script arrives late, and a <picture> is
     expect(await element(page).evaluate(({ water }) => water.chooser.picture.size())).toEqual([64, 64]);
     expect(await page.evaluate(() => window.shift)).toBe(0);
 });
+
+for (const [attributes, image, requests] of [
+    ['', 'src="pond.png"', 1],
+    ['src="pond.png"', 'src="pond.png"', 1],
+    ['', 'src="http://cdn.test/pond.png" crossorigin', 1],
+    ['', 'src="http://cdn.test/pond.png"', 2],  // the first answer cannot be read
+]) {
+    test(`the fallback <img ${image}> of <tidemark-water ${attributes}> is requested ${requests} times`, async ({ page }) => {
+        let asked = 0;
+        page.on('request', (request) => { asked += request.url().endsWith('pond.png'); });
+        await show(page, `${script}<tidemark-water ${attributes}><img slot="fallback" ${image} alt=""></tidemark-water>`);
+        await element(page).and(page.locator('[shown]')).waitFor();
+        expect(await element(page).evaluate(({ water }) => water.chooser.picture.size())).toEqual([64, 64]);
+        expect(asked).toBe(requests);
+    });
+}
 
 test.describe('dense canvas', () => {
     test.use({ deviceScaleFactor: 2 });

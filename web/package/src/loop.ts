@@ -52,7 +52,7 @@ export class Loop {
 }
 
 /** Draws the frame for the time `now`, in milliseconds. Resizes the canvas if the library requests it. */
-export function drawFrame(native: Native, canvas: HTMLCanvasElement, now: number): Frame {
+export function drawFrame(native: Native, canvas: HTMLCanvasElement, now: number, hasPicture: boolean): Frame {
     const frame: Frame = native._frame(now / 1000);
     if (frame !== Frame.resize) return frame;
     const { clientWidth, clientHeight } = canvas;
@@ -63,7 +63,7 @@ export function drawFrame(native: Native, canvas: HTMLCanvasElement, now: number
     if (canvas.clientWidth !== clientWidth) canvas.style.width = `${clientWidth}px`;
     if (canvas.clientHeight !== clientHeight) canvas.style.height = `${clientHeight}px`;
     native._resized();
-    if (slot !== slotOf(canvas)) native._picturesChanged(backgrounds);
+    if (hasPicture && slot !== slotOf(canvas)) native._picturesChanged(backgrounds);
     // In the same task: a new size has cleared the canvas.
     return native._frame(now / 1000);
 }

@@ -121,9 +121,7 @@ export interface Native extends Instance {
 // The compiler's glue keeps a reference in the canvas, which may outlive the water.
 const unmark = ({ canvas }: WebGLRenderingContext) => delete (canvas as { GLctxObject?: unknown }).GLctxObject;
 
-export async function instantiate(
-    module: WebAssembly.Module, context: WebGLRenderingContext, load: Load, seed: number,
-): Promise<Native> {
+export async function instantiate(module: WebAssembly.Module, context: WebGLRenderingContext, load: Load): Promise<Native> {
     const instance = await new Promise<unknown>((resolve, reject) => {
         createInstance({
             context,
@@ -134,7 +132,7 @@ export async function instantiate(
             },
         }).then(resolve, reject);
     }) as Instance;
-    instance._begin(seed);
+    instance._begin(1 + Math.floor(Math.random() * 1e6));
     unmark(context);
     let drawing = '';
     return Object.assign(instance, {

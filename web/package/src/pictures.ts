@@ -90,7 +90,13 @@ async function loadVideo(video: HTMLVideoElement): Promise<void> {
 }
 
 export async function loadPicture(source: Source, priority: 'high' | 'low' | 'auto' = 'auto'): Promise<Picture> {
-    return probe(await load(source, priority));
+    try {
+        return probe(await load(source, priority));
+    } catch (error) {
+        if (!(source instanceof HTMLImageElement)) throw error;
+        // Its file, loaded again with `crossorigin`, may be usable; otherwise that says why not.
+        return probe(await load(source.currentSrc || source.src, priority));
+    }
 }
 
 async function load(source: Source, priority: 'high' | 'low' | 'auto'): Promise<Picture> {

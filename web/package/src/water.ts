@@ -5,7 +5,7 @@ import { WaterError, warnOnce } from './errors.js';
 import { Graphics } from './graphics.js';
 import { offer } from './lease.js';
 import { drawFrame, Loop, type Cost } from './loop.js';
-import { backgrounds, compile, Frame, instantiate, Slot, slotOf, type Load, type Native } from './native.js';
+import { backgrounds, compile, Frame, instantiate, Slot, slotOf, type Native } from './native.js';
 import type { Source } from './pictures.js';
 import { applyOptions } from './settings.js';
 import { Sight } from './sight.js';
@@ -84,7 +84,7 @@ export class Water extends EventTarget {
             urgency: () => this.urgency(),
             park: () => this.park(),
             resume: () => void (this.isRunning() && this.graphics.open()),
-            create: (module, gl) => this.create(module, gl),
+            create: (module, gl) => instantiate(module, gl, (...slot) => this.chooser.fill(this.graphics, ...slot)),
             opened: (wasLost) => this.opened(wasLost),
             lost: () => this.lost(),
             failed: (error) => this.fail(error),
@@ -233,21 +233,15 @@ export class Water extends EventTarget {
     private wake(): void {
         if (!this.isRunning()) return;
         if (this.state === 'none' || this.state === 'parked') void this.graphics.open();
-        else if (this.isComplete()) this.loop.wake();
-    }
-
-    private async create(module: WebAssembly.Module, gl: WebGLRenderingContext): Promise<Native> {
-        const load: Load = (...slot) => this.chooser.fill(this.graphics, ...slot);
-        const native = await instantiate(module, gl, load, 1 + Math.floor(Math.random() * 1e6));
-        if (this.chooser.picture) native._picturesChanged(backgrounds);
-        if (this.chooser.light) native._picturesChanged(1 << Slot.light);
-        this.viewSize = '';
-        return native;
+        else if (this.state === 'live') this.loop.wake();
     }
 
     private opened(wasLost: boolean): void {
         const gl = this.graphics.gl!;
         this.longestSide = Math.min(gl.getParameter(gl.MAX_TEXTURE_SIZE), ...gl.getParameter(gl.MAX_VIEWPORT_DIMS));
+        if (this.chooser.picture) this.changed(backgrounds);
+        if (this.chooser.light) this.changed(1 << Slot.light);
+        this.viewSize = '';
         this.stale = true;
         this.apply();
         if (wasLost) this.dispatchEvent(new Event('contextrestored'));
@@ -317,16 +311,16 @@ export class Water extends EventTarget {
     }
 
     private frame(native: Native, now: number): Frame {
-        return drawFrame(native, this.canvas, now);
+        return drawFrame(native, this.canvas, now, Boolean(this.chooser.picture));
     }
 
     private draw(now: number): Frame | null {
         const { native, options: { paused }, graphics: { gl }, chooser: { picture } } = this;
-        if (!native || !picture || !this.isComplete()) return null;
+        if (!native || this.state !== 'live') return null;
         this.sight.look();
         if (!this.isRunning() || gl!.isContextLost()) return null;  // the event of the loss follows
         if (paused) native._redraw();
-        if (picture.changed()) native._picturesChanged(1 << slotOf(this.canvas));
+        if (picture?.changed()) native._picturesChanged(1 << slotOf(this.canvas));
         let frame: Frame;
         try {
             frame = this.frame(native, paused ? this.loop.last : now);
@@ -334,13 +328,14 @@ export class Water extends EventTarget {
             this.fail(error);
             return null;
         }
-        if (gl!.isContextLost()) return null;
+        // Without its pictures, the library has only compiled its programs.
+        if (gl!.isContextLost() || !this.isComplete()) return null;
         const isFitted = this.canvas.width === native._width() && this.canvas.height === native._height();
         if (frame !== Frame.waiting && isFitted) this.stale = false;
         if (frame === Frame.drawn) this.show(native);
         if (frame === Frame.drawn && paused) this.still.copy(this.canvas);
         if (!paused) this.setCalm(frame === Frame.resting);
-        if (frame !== Frame.resting || picture.moving()) this.wake();
+        if (frame !== Frame.resting || picture!.moving()) this.wake();
         return paused ? null : frame;
     }
 

@@ -195,7 +195,7 @@ LiveWater::Frame LiveWater::frame(double now) {
     // A change of the resolution loses the ink.
     const bool hasInk = host_.inkMoves();
     // Frames of still water take no time and have no pace.
-    if (seconds > 0.0 && pace_.frameDrawn(now, std::max(shortestFrame_, hasInk ? 1.0 / 60 : 0.0), hasInk)) {
+    if (seconds > 0.0 && pace_.frameDrawn(now, shortestFrame_, hasInk)) {
         host_.setMeshShare(pace_.level().mesh);
         fitSurface();
     }

@@ -14,6 +14,9 @@ constexpr int kLowest = static_cast<int>(std::size(kLevels)) - 1;
 // The intervals of a display that shows every frame vary by less than this factor.
 constexpr double kLate = 1.4;
 
+// Faster displays do not make frames of this interval late: full resolution is worth more than more frames.
+constexpr double kSufficient = 1.0 / 60;
+
 // Frames that are this many times too late select the coarsest level at once.
 constexpr double kFarTooLate = 3.0;
 
@@ -69,7 +72,7 @@ bool Pace::judge(double now, double shortest, bool keepsResolution) {
     auto* const middle = intervals_.begin() + (isFull ? count_ / 2 : 0);
     std::nth_element(intervals_.begin(), middle, intervals_.begin() + count_);
     const double median = *middle;
-    rhythm_ = std::min(rhythm_, std::max(median, 1.0 / 240));
+    rhythm_ = std::min(rhythm_, std::max(median, kSufficient));
     const double late = median / std::max(rhythm_, shortest);
     const bool isLate = late > kLate;
     if (isLate && level_ < lowest_) {

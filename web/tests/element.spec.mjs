@@ -480,8 +480,13 @@ test.describe('dense canvas', () => {
                 second = error.message;
             }
             await new Promise((resolve) => setTimeout(resolve, 500));
-            return [defined, second, water.state, canvas.clientWidth, canvas.width];
-        })).toEqual([undefined, expect.stringMatching(/destroy\(\) first/), 'live', 300, 600]);
+            const seen = [defined, second, water.state, canvas.clientWidth, canvas.width];
+            water.destroy();
+            water.set({ src: 'white.png', pointers: 'page' });
+            water.drop(1, 1);
+            await createWater(canvas).ready;
+            return [...seen, water.state];
+        })).toEqual([undefined, expect.stringMatching(/destroy\(\) first/), 'live', 300, 600, 'dead']);
         expect(problems.splice(0).every((text) => /none\.png/.test(text))).toBe(true);
     });
 });

@@ -28,10 +28,10 @@ done
 out=build/bench-results
 rm -rf "$out"
 mkdir -p "$out"
-options=(--benchmark_format=json --benchmark_repetitions=7 --benchmark_enable_random_interleaving=true)
+options=(--benchmark_format=json --benchmark_repetitions=14 --benchmark_enable_random_interleaving=true)
 for round in 1 2 3; do
     for name in gcc clang; do
-        "build/bench-$name/bench/tidemark_bench" "${options[@]}" --benchmark_min_time=0.02 >"$out/$name-$round.json"
+        "build/bench-$name/bench/tidemark_bench" "${options[@]}" --benchmark_min_time=0.01 >"$out/$name-$round.json"
     done
 done
 build/bench-gcc/bench/tidemark_bench_driver "${options[@]}" --benchmark_repetitions=3 --benchmark_min_time=0.1 >"$out/driver.json"

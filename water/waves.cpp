@@ -28,32 +28,33 @@ F laplacian(const float* h, std::ptrdiff_t stride) {
 // A copy of the integrated heights of the region and its border: smoothing reads it and writes the host's array.
 Scratch<float> snapshot("smoothing the water");
 
-bool isFast(float speed) {
-    return std::fabs(speed) > kCalmSpeed;
+float magnitude(float speed) {
+    return std::fabs(speed);
 }
 
-int4 isFast(float4 speed) {
-    const int4 magnitude = reinterpret_cast<int4>(speed) & 0x7fffffff;
-    return reinterpret_cast<float4>(magnitude) > kCalmSpeed;
+float4 magnitude(float4 speed) {
+    return reinterpret_cast<float4>(reinterpret_cast<int4>(speed) & 0x7fffffff);
 }
 
 // Updates the velocities of one row. With `test` returns whether every one is within the calm band, else true.
 template <bool test>
 bool accelerate(
     float* velocity, const float* height, std::ptrdiff_t stride, int width, float damping, float waveSpeed) {
-    int4 fastLanes = {};
-    bool fast = false;
-    forGroups(0, width, [=, &fast, &fastLanes]<class F>(F, int x) {
+    // The highest speeds. A comparison with NaN keeps them.
+    float4 peaks = {};
+    float peak = 0.0f;
+    forGroups(0, width, [=, &peak, &peaks]<class F>(F, int x) {
         const F v = (laplacian<F>(height + x, stride) * waveSpeed + load<F>(velocity + x)) * damping;
         store(v, velocity + x);
         if constexpr (!test) return;
         if constexpr (sizeof(F) == sizeof(float4)) {
-            fastLanes |= isFast(v);
+            peaks = greater(magnitude(v), peaks);
         } else {
-            fast |= isFast(v);
+            peak = greater(magnitude(v), peak);
         }
     });
-    return !fast && !(fastLanes[0] | fastLanes[1] | fastLanes[2] | fastLanes[3]);
+    for (int i = 0; i < 4; ++i) peak = greater(peaks[i], peak);
+    return peak <= kCalmSpeed;
 }
 
 // integrated = clamp(height + velocity) for one row. `integrated` may be `height`.

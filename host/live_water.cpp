@@ -47,7 +47,8 @@ void LiveWater::setView(double width, double height, double density, double now)
     const ViewSize view = {width, height, density};
     if (!(width > 0.0 && height > 0.0 && density > 0.0) || view == view_) return;
     view_ = view;
-    settledAt_ = surface_.width == 0 ? now : now + kSettleSeconds;
+    // The time of the first frame may be that of a refresh before this call.
+    settledAt_ = surface_.width == 0 ? std::numeric_limits<double>::lowest() : now + kSettleSeconds;
     fitSurface();
 }
 

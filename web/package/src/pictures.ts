@@ -63,11 +63,14 @@ const still = (drawable: CanvasImageSource, size: () => [number, number]): Pictu
 
 /** Throws if a texture would refuse the picture. */
 function probe(picture: Picture): Picture {
+    const { drawable } = picture;
+    // Such an image loads only if its pixels can be read. Drawing it would decode it once more.
+    if (drawable instanceof HTMLImageElement && drawable.crossOrigin !== null && drawable.naturalWidth > 0) return picture;
     const context = canvasOf(1, 1).getContext('2d', { willReadFrequently: true });
     const [width, height] = picture.size();
     if (!context || !width || !height) return picture;
     try {
-        context.drawImage(picture.drawable, 0, 0, 1, 1, 0, 0, 1, 1);
+        context.drawImage(drawable, 0, 0, 1, 1, 0, 0, 1, 1);
     } catch {
         throw new WaterError('decode', 'The picture is broken.');
     }

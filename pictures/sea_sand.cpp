@@ -13,12 +13,15 @@ namespace {
 
 constexpr float kPi = std::numbers::pi_v<float>;
 
-// Heights of the sand ripples at successive points of a row, from 0 to 1. Ripples meander, split and join; their crests are
-// sharper than their troughs. Coordinates are in units.
+// Heights of the sand ripples at successive points of a row, from 0 to 1. Ripples meander, split and join; their crests
+// are sharper than their troughs. Coordinates are in units.
 class RibRow {
 public:
     RibRow(float u, float v, float step)
-        : u_(u), v_(v), step_(step), bends_{along(0.21f, 0.13f, 0.0f), along(0.11f, -0.34f, 1.7f), along(0.55f, 0.23f, 0.4f)},
+        : u_(u),
+          v_(v),
+          step_(step),
+          bends_{along(0.21f, 0.13f, 0.0f), along(0.11f, -0.34f, 1.7f), along(0.55f, 0.23f, 0.4f)},
           height_(along(0.17f, -0.29f, 0.0f)) {}
 
     float next() {
@@ -72,8 +75,8 @@ void drawStarfish(Canvas& canvas, const Starfish& star) {
         if (coverage <= 0.0f) return;
         // Rounded arms with a row of pale knobs.
         const float round = std::sqrt(std::max(0.0f, 1.0f - rim * rim));
-        const float knob =
-            std::max(0.0f, 1.0f - across * 28.0f) * (0.5f + 0.5f * std::cos(std::sqrt(dx * dx + dy * dy) / star.size * 55.0f));
+        const float knob = std::max(0.0f, 1.0f - across * 28.0f) *
+                           (0.5f + 0.5f * std::cos(std::sqrt(dx * dx + dy * dy) / star.size * 55.0f));
         const float side = 0.16f * (-dx - dy) / star.size;
         Rgb skin = star.skin * (0.50f + 0.55f * round + side + 0.25f * grainAt(column, row));
         skin = mix(skin, {0.85f, 0.66f, 0.42f}, 0.65f * knob);

@@ -31,10 +31,11 @@ function sheetsOf(document: Document): CSSStyleSheet[] {
 }
 
 // The image itself, which the browser has requested, so that its file is not loaded twice. The pixels of another server's
-// image can be read only if it was requested with `crossorigin`.
+// image can be read only if it was requested with `crossorigin`. An image of another window has another class.
 function fileOf(image: HTMLImageElement): Source {
     const address = image.currentSrc || image.src;
-    return image.crossOrigin !== null || address.startsWith(`${location.origin}/`) ? image : address;
+    const isReadable = image.crossOrigin !== null || address.startsWith(`${location.origin}/`);
+    return isReadable && image instanceof HTMLImageElement ? image : address;
 }
 
 // On a server, where the package may be imported, there is no HTMLElement.

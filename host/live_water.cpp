@@ -108,12 +108,13 @@ void LiveWater::renewContext() {
     texturesDue_ = kAllPictures;
 }
 
-void LiveWater::prepare() {
+// Returns whether a frame can be drawn.
+bool LiveWater::prepare() {
     if (std::exchange(setUpDue_, false)) {
         host_.setUp(withInk_);
         pace_.interrupt();  // but not for a picture, because a moving one is loaded with every frame
     }
-    if (known_ != kAllPictures) return;
+    if (known_ != kAllPictures) return false;
     const int longer = std::max(surface_.width, surface_.height);
     if (host_.proportions() != proportions_ || longer > kGrowth * longest_) {
         pictureDue_ |= kBackgrounds;
@@ -122,6 +123,7 @@ void LiveWater::prepare() {
     }
     const unsigned textures = pictureDue_ | texturesDue_;
     if (textures) host_.loadPictures(pictures_, std::exchange(pictureDue_, 0), std::exchange(texturesDue_, 0));
+    return true;
 }
 
 bool LiveWater::isResting() const {
@@ -163,9 +165,7 @@ LiveWater::Frame LiveWater::frame(double now) {
         asked_ = wanted_;
         return Frame::resize;
     }
-    if (surface_.width == 0) return Frame::waiting;
-    prepare();
-    if (known_ != kAllPictures) return Frame::waiting;
+    if (surface_.width == 0 || !prepare()) return Frame::waiting;
     const double seconds = std::min(secondsUntil(now), longestFrame_);
     for (const Splash& splash : splashes_) {
         const double x = double{splash.x} * surface_.width;

@@ -98,7 +98,7 @@ public:
     // without ink into the current framebuffer, with ink into framebuffer 0.
     Frame frame(double now);
 
-    // Returns when frame() will next draw: infinity while the water rests, a time in the past if immediately.
+    // Returns when frame() will next draw or set up: infinity while the water rests, a time in the past if immediately.
     double due() const;
 
 private:
@@ -107,7 +107,7 @@ private:
         bool withInk;
     };
 
-    void prepare();
+    bool prepare();
     void draw(double seconds);
     void fitSurface();
     bool isSurfaceDue() const;

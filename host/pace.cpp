@@ -14,8 +14,10 @@ constexpr int kLowest = static_cast<int>(std::size(kLevels)) - 1;
 // The intervals of a display that shows every frame vary by less than this factor.
 constexpr double kLate = 1.4;
 
-// Faster displays do not make frames of this interval late: full resolution is worth more than more frames.
+// Frames of this interval are not late on a faster display: full resolution is worth more than more frames. There the
+// next longer interval is late, 1/45 s at 90 Hz.
 constexpr double kSufficient = 1.0 / 60;
+constexpr double kLateOnFast = 1.2;
 
 // Frames that are this many times too late select the coarsest level at once.
 constexpr double kFarTooLate = 3.0;
@@ -72,9 +74,9 @@ bool Pace::judge(double now, double shortest, bool keepsResolution) {
     auto* const middle = intervals_.begin() + (isFull ? count_ / 2 : 0);
     std::nth_element(intervals_.begin(), middle, intervals_.begin() + count_);
     const double median = *middle;
-    rhythm_ = std::min(rhythm_, std::max(median, kSufficient));
-    const double late = median / std::max(rhythm_, shortest);
-    const bool isLate = late > kLate;
+    rhythm_ = std::min(rhythm_, median);
+    const double late = median / std::max(std::max(rhythm_, shortest), kSufficient);
+    const bool isLate = late > (rhythm_ < 0.9 * kSufficient ? kLateOnFast : kLate);
     if (isLate && level_ < lowest_) {
         if (level_ == 0) atBest_ = median;
         // An attempt at a better level has failed.

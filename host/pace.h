@@ -38,7 +38,7 @@ private:
     bool isFollowing_ = false;
     double last_ = 0.0;         // time of the last frame
     double quietUntil_ = -1.0;  // the first second and a moment after each change are ignored
-    double rhythm_ = 1.0 / 60;  // interval of frames that are not late: longer on a slow display
+    double rhythm_ = 1.0 / 60;  // the shortest interval that the display has shown
     std::array<double, 11> intervals_ = {};
     int count_ = 0;
     double judged_ = 0.0;    // seconds, the sum of those intervals

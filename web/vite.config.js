@@ -97,9 +97,11 @@ function preloadModules() {
             handler: (html, { bundle }) => {
                 const files = Object.keys(bundle).map((file) => `./${file}`);
                 const early = files.find((file) => file.includes('/early_painter-'));
+                const viewport = html.match(/<meta name="viewport".*>/);
+                if (!early || !viewport) throw new Error('the early painter has no place in the page');
                 return {
-                    // The script reads the size of the view. After a style sheet it would wait for that.
-                    html: html.replace(/<meta name="viewport".*>/, `$&\n        <script src="${early}"></script>`),
+                    // The script reads the size of the view. Below a style sheet it would run only once that has loaded.
+                    html: html.replace(viewport[0], `$&\n        <script src="${early}"></script>`),
                     tags: tags.flatMap(([pattern, attrs]) => files.filter((file) => pattern.test(file)).map((href) => ({
                         tag: 'link', attrs: { ...attrs, href }, injectTo: 'head-prepend' }))),
                 };

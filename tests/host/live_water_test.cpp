@@ -444,6 +444,11 @@ TEST(Pace, settlesWithinTwoSecondsDoesNotSwingAndRecovers) {
     Paced fast;
     for (const double needed : {0.004, 0.012}) fast.run(4.0, needed, 1.0 / 120);
     EXPECT_EQ(fast.changes, 0) << "60 frames a second are enough, also where 120 were possible";
+    for (const double rate : {90.0, 144.0}) {
+        Paced slower;
+        for (const double needed : {0.004, 0.016}) slower.run(4.0, needed, 1.0 / rate);
+        EXPECT_GT(slower.changes, 0) << "45 and 48 are not";
+    }
     Paced fixed;
     fixed.pace.allowResolution(false);
     fixed.run(5.0, 0.018);

@@ -157,6 +157,13 @@ test('each failure is reported once, and a paused water shows another picture at
     expect(problems.splice(0)).toEqual([/no values with these names: Exponent\./, /decode: words.png/].map((text) => expect.stringMatching(text)));
 });
 
+test('a water that is paused from the start fits another size, and then draws no more', async ({ page }) => {
+    await show(page, `${script}<tidemark-water src="pond.png" paused></tidemark-water>`);
+    await element(page).and(page.locator('[shown]')).waitFor();
+    await page.setViewportSize({ width: 300, height: 300 });
+    await expect.poll(() => element(page).evaluate(({ canvas: { width }, water: { stale } }) => [width, stale])).toEqual([284, false]);
+});
+
 test('a paused water keeps its picture when options change and the element moves, and takes no drops', async ({ page }) => {
     await show(page, `${script}<tidemark-water src="pond.png" ink look='{"breeze": 0}'></tidemark-water><p></p>`);
     await element(page).and(page.locator('[shown]')).waitFor();
@@ -449,7 +456,7 @@ test('the layout does not shift when the script arrives late, and a <picture> is
 for (const [attributes, image, requests] of [
     ['', 'src="pond.png"', 1],
     ['src="pond.png"', 'src="pond.png"', 1],
-    ['', 'src="http://cdn.test/pond.png" crossorigin', 1],
+    ['', 'src="pond.png" crossorigin', 1],
     ['', 'src="http://cdn.test/pond.png"', 2],  // the first answer cannot be read
 ]) {
     test(`the fallback <img ${image}> of <tidemark-water ${attributes}> is requested ${requests} times`, async ({ page }) => {
@@ -461,6 +468,18 @@ for (const [attributes, image, requests] of [
         expect(asked).toBe(requests);
     });
 }
+
+test('another file of the fallback and the source is shown, and a broken one afterwards changes nothing', async ({ page, problems }) => {
+    await show(page, `${script}<tidemark-water src="pond.png"><img slot="fallback" src="pond.png" alt=""></tidemark-water>`);
+    await element(page).and(page.locator('[shown]')).waitFor();
+    await element(page).evaluate((water) => { water.src = water.querySelector('img').src = 'white.png'; });
+    await expect.poll(() => element(page).evaluate(({ water }) => water.chooser.picture.size())).toEqual([2, 2]);
+    await element(page).evaluate((water) => { water.querySelector('img').src = 'none.png'; });
+    await page.setViewportSize({ width: 300, height: 300 });
+    await expect.poll(() => element(page).evaluate(({ canvas: { width } }) => width)).toBe(284);
+    expect(await element(page).evaluate(({ water }) => water.state)).toBe('live');
+    expect(problems.splice(0).every((text) => /none\.png|404/.test(text))).toBe(true);
+});
 
 test.describe('dense canvas', () => {
     test.use({ deviceScaleFactor: 2 });
@@ -649,7 +668,7 @@ test('an address of the page may redirect to a server that allows all pages', as
         const name = url === '/' ? null : join(dist, url);
         if (name && !existsSync(name)) return response.writeHead(404).end();
         response.writeHead(200, { 'content-type': types[name?.split('.').pop() ?? 'html'] });
-        return response.end(name ? readFileSync(name) : `<link rel="icon" href="data:,">${script}<tidemark-water src="away.png"></tidemark-water>`);
+        return response.end(name ? readFileSync(name) : `<link rel="icon" href="data:,">${script}<tidemark-water><img slot="fallback" src="away.png" alt=""></tidemark-water>`);
     });
     await new Promise((resolve) => server.listen(0, resolve));
     try {

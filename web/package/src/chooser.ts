@@ -1,6 +1,6 @@
 // Loads the picture under the water and the light on it. Of several requests the last one wins.
 import type { Options } from './attributes.js';
-import type { WaterError } from './errors.js';
+import { WaterError } from './errors.js';
 import type { Graphics } from './graphics.js';
 import { Slot, slotOf } from './native.js';
 import { greyPicture, loadPicture, placeOf, plainPicture, shippedLight, uploadCover, type Picture, type Source } from './pictures.js';
@@ -83,9 +83,10 @@ export class Chooser {
         try {
             uploadCover(gl!, this[part]!, ...size, place, shade);
         } catch (error) {
+            const known = error instanceof WaterError ? error : new WaterError('decode', 'The picture is broken.');
             uploadCover(gl!, (this[part] = plainPicture()), ...size, place, shade);
             // A listener may call the water, which has to finish its frame first.
-            queueMicrotask(() => this.owner.failed(error as WaterError, !isLight));
+            queueMicrotask(() => this.owner.failed(known, !isLight));
         }
     }
 

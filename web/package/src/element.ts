@@ -30,14 +30,6 @@ function sheetsOf(document: Document): CSSStyleSheet[] {
     return made;
 }
 
-// The image itself, which the browser has requested, so that its file is not loaded twice. The pixels of another server's
-// image can be read only if it was requested with `crossorigin`. An image of another window has another class.
-function fileOf(image: HTMLImageElement): Source {
-    const address = image.currentSrc || image.src;
-    const isReadable = image.crossOrigin !== null || address.startsWith(`${location.origin}/`);
-    return isReadable && image instanceof HTMLImageElement ? image : address;
-}
-
 // On a server, where the package may be imported, there is no HTMLElement.
 const Base = (globalThis.HTMLElement ?? class {}) as typeof HTMLElement;
 
@@ -221,7 +213,7 @@ export class WaterElement extends Base {
         for (const name of names) options[name] = this[name];
         // Without `src`, the picture of the fallback is the picture under the water.
         const image = this.querySelector<HTMLImageElement>(':scope > img[slot=fallback], :scope > [slot=fallback] img');
-        if ('src' in options && image && [null, image.getAttribute('src')].includes(this.src)) options.src = fileOf(image);
+        if ('src' in options) options.src ??= image?.currentSrc || image?.src;
         for (const [name, value] of Object.entries(this.#objects)) if (name in options && value !== undefined) options[name] = value;
         return options as Options;
     }

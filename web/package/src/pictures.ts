@@ -27,7 +27,14 @@ function canvasOf(width: number, height: number): HTMLCanvasElement {
     return canvas;
 }
 
-async function loadImage(url: string, priority: 'high' | 'low' | 'auto', blob?: Blob): Promise<HTMLImageElement> {
+// A browser requests a file once if all images request it in the same mode. One from the page's own server can be used
+// without `crossorigin`, unless the server redirects to another one.
+function modeOf(address: URL): string | null {
+    const shown = [...document.images].find((image) => (image.currentSrc || image.src) === address.href);
+    return shown && address.origin === self.origin ? shown.crossOrigin : 'anonymous';
+}
+
+async function loadImage(url: string, priority: 'high' | 'low' | 'auto', blob?: Blob, mode = modeOf): Promise<HTMLImageElement> {
     const image = new Image();
     let address: URL;
     try {
@@ -36,7 +43,7 @@ async function loadImage(url: string, priority: 'high' | 'low' | 'auto', blob?: 
         throw new WaterError('load', `${url} is no address.`);
     }
     // Same-origin addresses, too: they may redirect to another server, and a sandboxed frame has an origin of its own.
-    if (/^https?:/.test(address.protocol)) image.crossOrigin = 'anonymous';
+    if (/^https?:/.test(address.protocol)) image.crossOrigin = mode(address);
     image.fetchPriority = priority;
     image.src = url;
     const loaded = await new Promise<boolean>((resolve) => {
@@ -93,14 +100,17 @@ async function loadVideo(video: HTMLVideoElement): Promise<void> {
 }
 
 export async function loadPicture(source: Source, priority: 'high' | 'low' | 'auto' = 'auto'): Promise<Picture> {
+    const picture = await load(source, priority);
     try {
-        return probe(await load(source, priority));
+        return probe(picture);
     } catch (error) {
-        if (!(source instanceof HTMLImageElement)) throw error;
-        // Its file, loaded again with `crossorigin`, may be usable; otherwise that says why not.
-        return probe(await load(source.currentSrc || source.src, priority));
+        if (typeof source !== 'string' && !(source instanceof URL)) throw error;
+        return probe(pictureOf(await loadImage(String(source), priority, undefined, () => 'anonymous')));
     }
 }
+
+// An SVG may have no size of its own.
+const pictureOf = (image: HTMLImageElement): Picture => still(image, () => [image.naturalWidth || 1024, image.naturalHeight || 1024]);
 
 async function load(source: Source, priority: 'high' | 'low' | 'auto'): Promise<Picture> {
     if (source instanceof HTMLVideoElement) {
@@ -128,8 +138,7 @@ async function load(source: Source, priority: 'high' | 'low' | 'auto'): Promise<
     } else {
         image = await loadImage(String(source), priority);
     }
-    // An SVG may have no size of its own.
-    return still(image, () => [image.naturalWidth || 1024, image.naturalHeight || 1024]);
+    return pictureOf(image);
 }
 
 // The part of a picture that a view of another shape shows: 0 is left or top, 1 is right or bottom.

@@ -285,7 +285,8 @@ export class Water extends EventTarget {
         const size = this.sight.size(this.longestSide);
         if (!size || this.viewSize === String(size) || this.end.signal.aborted) return;
         this.viewSize = String(size);
-        this.native?._setView(...size, this.options.paused ? 0 : performance.now() / 1000);
+        // While paused, the clock is that of the last frame, at least 0: the new size is applied at once.
+        this.native?._setView(...size, this.options.paused ? -1 : performance.now() / 1000);
         this.stale = true;
         this.choosePictures();
         this.wake();

@@ -45,7 +45,7 @@ const pages = {
 <script src="/peer/jquery.ripples/dist/jquery.ripples-min.js"></script><script>$('#peer').ripples({ resolution: 512 })</script>`,
     first: `<link rel="modulepreload" href="/dist/shared.js">
 <link rel="preload" href="/dist/tidemark-water.wasm" as="fetch" crossorigin><script type="module" src="/dist/tidemark-water.js"></script>
-<tidemark-water><img slot="fallback" src="/picture.webp" alt=""></tidemark-water>
+<tidemark-water><img slot="fallback" src="/picture.webp" alt="" crossorigin></tidemark-water>
 <script>document.querySelector('tidemark-water').addEventListener('ready', () => (window.readyAt = performance.now()))</script>`,
 };
 const page = (scene, script) => `<!doctype html><html lang="en"><meta charset="utf-8"><title>bench</title>
